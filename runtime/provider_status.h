@@ -1,0 +1,95 @@
+#pragma once
+
+namespace KPRV {
+
+// What the operations of a provider answer. 0 is success in every family; the numbers are fixed.
+
+enum Load_Status : int
+{
+    LOAD_OK = 0,
+};
+enum Unload_Status : int
+{
+    UNLOAD_OK = 0,
+};
+enum Get_Instance_Status : int
+{
+    GET_INSTANCE_OK = 0,
+    GET_INSTANCE_NOT_FOUND = 60,
+    GET_INSTANCE_UNSUPPORTED = 61,
+    GET_INSTANCE_INVALID_PARAMETER = 62,
+    GET_INSTANCE_ACCESS_DENIED = 63,
+    GET_INSTANCE_FAILED = 64,
+};
+enum Enum_Instances_Status : int
+{
+    ENUM_INSTANCES_OK = 0,
+    ENUM_INSTANCES_FAILED = 70,
+    ENUM_INSTANCES_ACCESS_DENIED = 71,
+};
+enum Create_Instance_Status : int
+{
+    CREATE_INSTANCE_OK = 0,
+    CREATE_INSTANCE_ALREADY_EXISTS = 80,
+    CREATE_INSTANCE_UNSUPPORTED = 81,
+    CREATE_INSTANCE_INVALID_PARAMETER = 82,
+    CREATE_INSTANCE_ACCESS_DENIED = 83,
+    CREATE_INSTANCE_FAILED = 84,
+};
+enum Delete_Instance_Status : int
+{
+    DELETE_INSTANCE_OK = 0,
+    DELETE_INSTANCE_NOT_FOUND = 90,
+    DELETE_INSTANCE_UNSUPPORTED = 91,
+    DELETE_INSTANCE_ACCESS_DENIED = 92,
+    DELETE_INSTANCE_FAILED = 93,
+};
+enum Modify_Instance_Status : int
+{
+    MODIFY_INSTANCE_OK = 0,
+    MODIFY_INSTANCE_NOT_FOUND = 100,
+    MODIFY_INSTANCE_UNSUPPORTED = 101,
+    MODIFY_INSTANCE_INVALID_PARAMETER = 102,
+    MODIFY_INSTANCE_ACCESS_DENIED = 103,
+    MODIFY_INSTANCE_FAILED = 104,
+};
+enum Enum_Associator_Names_Status : int
+{
+    ENUM_ASSOCIATOR_NAMES_OK = 0,
+    ENUM_ASSOCIATOR_NAMES_FAILED = 110,
+    ENUM_ASSOCIATOR_NAMES_UNSUPPORTED = 111,
+    ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED = 112,
+};
+enum Enum_References_Status : int
+{
+    ENUM_REFERENCES_OK = 0,
+    ENUM_REFERENCES_FAILED = 120,
+    ENUM_REFERENCES_UNSUPPORTED = 121,
+    ENUM_REFERENCES_ACCESS_DENIED = 122,
+};
+enum Invoke_Method_Status : int
+{
+    INVOKE_METHOD_OK = 0,
+    INVOKE_METHOD_FAILED = 130,
+    INVOKE_METHOD_UNSUPPORTED = 131,
+    INVOKE_METHOD_ACCESS_DENIED = 132,
+};
+enum Enable_Indications_Status : int
+{
+    ENABLE_INDICATIONS_OK = 0,
+    ENABLE_INDICATIONS_FAILED = 140,
+};
+enum Disable_Indications_Status : int
+{
+    DISABLE_INDICATIONS_OK = 0,
+    DISABLE_INDICATIONS_FAILED = 150,
+};
+enum Enum_Associators_Status : int
+{
+    ENUM_ASSOCIATORS_OK = 0,
+    ENUM_ASSOCIATORS_FAILED = 170,
+    ENUM_ASSOCIATORS_UNSUPPORTED = 171,
+    ENUM_ASSOCIATORS_ACCESS_DENIED = 172,
+};
+
+} // namespace KPRV
