@@ -46,34 +46,19 @@ struct Log_Call_Frame
     void invoke(const char* format, ...) const __attribute__((format(printf, 2, 3)));
 };
 
-/// Base name of a source path, at compile time: log lines carry no folders.
-constexpr const char* base_name(const char* path)
-{
-    const char* name = path;
-    for (const char* p = path; *p; p++) {
-        if (*p == '/')
-            name = p + 1;
-    }
-    return name;
-}
-
-/// Where a shared function was called from, so that its log lines carry the caller's file and line.
+/// Where a shared function was called from, so that its log lines carry the caller's file and line: pass
+/// `LOG_HERE`.
 struct Call_Site
 {
     const char* file;
     uint32 line;
-    static consteval Call_Site here(const char* path = __builtin_FILE(), uint32 line = __builtin_LINE())
-    {
-        return {base_name(path), line};
-    }
 };
 
 /// Trace of a function: "Entering: %s" now, "Returning: %s" at the end of the scope, both at DBG.
 class Log_Scope
 {
 public:
-    explicit Log_Scope(const char* function, Call_Site site = Call_Site::here())
-        : _function(function), _site(site)
+    explicit Log_Scope(const char* function, Call_Site site) : _function(function), _site(site)
     {
         log(Log_Level::DBG, _site.file, _site.line, "Entering: %s", _function);
     }
@@ -88,16 +73,16 @@ private:
 
 } // namespace KPRV
 
-/// LOG(ERR, "format", ...): one line at the level, with this file and line.
-#define LOG(level, ...)                                                                                      \
-    ::KPRV::log(::KPRV::Log_Level::level, ::KPRV::base_name(__FILE__), __LINE__, __VA_ARGS__)
+/// LOG(ERR, "format", ...): one line at the level, with the base name of this file and its line.
+#define LOG(level, ...) ::KPRV::log(::KPRV::Log_Level::level, __FILE_NAME__, __LINE__, __VA_ARGS__)
 
-#define LOG_SCOPE(function) ::KPRV::Log_Scope _log_scope(function)
+#define LOG_HERE (::KPRV::Call_Site{__FILE_NAME__, __LINE__})
+
+#define LOG_SCOPE(function) ::KPRV::Log_Scope _log_scope(function, LOG_HERE)
 
 /// The runtime's own conversion lines, which `log_enable(false)` silences.
 #define LOG_CONVERSION(level, ...)                                                                           \
     do {                                                                                                     \
         if (::KPRV::_log_enabled_state)                                                                      \
-            ::KPRV::Log_Call_Frame{::KPRV::Log_Level::level, ::KPRV::base_name(__FILE__), __LINE__}.invoke(  \
-                __VA_ARGS__);                                                                                \
+            ::KPRV::Log_Call_Frame{::KPRV::Log_Level::level, __FILE_NAME__, __LINE__}.invoke(__VA_ARGS__);   \
     } while (0)
