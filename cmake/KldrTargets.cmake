@@ -1,0 +1,73 @@
+# How every target of the house is compiled, and the two functions that declare libraries and tests.
+
+set(KLDR_WORD_SIZE "" CACHE STRING "32 builds for i386; empty builds for the compiler's own word size")
+set(KLDR_SANITIZE "" CACHE STRING "argument of -fsanitize, empty for none")
+set(KLDR_CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/cmpi/interface" CACHE PATH
+    "folder of cmpidt.h, cmpift.h and cmpimacs.h; a server's own headers may stand in for ours")
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_CXX_VISIBILITY_PRESET hidden)
+set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(CMAKE_CXX_FLAGS_RELWITHDEBINFO "-O2 -g1")
+
+find_program(KLDR_CCACHE ccache)
+if(KLDR_CCACHE)
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${KLDR_CCACHE})
+endif()
+
+# Records are walked through their metadata, from addresses: no compiler may reason about their types. Unique symbols would
+# keep the library mapped after its last close.
+add_compile_options(-Wall -Wextra -Wshadow -Wnon-virtual-dtor -Wpedantic -Werror -Wno-invalid-offsetof
+                    -fno-strict-aliasing -fno-gnu-unique)
+add_compile_definitions(_GNU_SOURCE)
+include_directories(${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR}/generated)
+
+if(KLDR_WORD_SIZE STREQUAL "32")
+  add_compile_options(-m32)
+  add_link_options(-m32)
+endif()
+if(KLDR_SANITIZE)
+  # Less optimisation and no vague promises: a report should name a line.
+  add_compile_options(-fsanitize=${KLDR_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer -O1)
+  add_link_options(-fsanitize=${KLDR_SANITIZE})
+endif()
+
+find_package(Threads REQUIRED)
+
+# Linked by name: the compiler's search path finds the library of the word size in hand.
+add_library(kldr_jsoncpp INTERFACE)
+target_include_directories(kldr_jsoncpp SYSTEM INTERFACE /usr/include/jsoncpp)
+target_link_libraries(kldr_jsoncpp INTERFACE -ljsoncpp)
+
+# kldr_library(<name> SOURCES ... LIBS ...): a static, position-independent library.
+function(kldr_library name)
+  cmake_parse_arguments(ARG "" "" "SOURCES;LIBS" ${ARGN})
+  add_library(${name} STATIC ${ARG_SOURCES})
+  target_link_libraries(${name} PUBLIC ${ARG_LIBS} Threads::Threads ${CMAKE_DL_LIBS})
+endfunction()
+
+# kldr_test(<name> SOURCES ... LIBS ... [ENV K=V ...] [DEPENDS target ...]): a GoogleTest program, run by CTest in its build
+# folder.
+function(kldr_test name)
+  cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV;DEPENDS" ${ARGN})
+  add_executable(${name} ${ARG_SOURCES})
+  target_link_libraries(${name} PRIVATE ${ARG_LIBS} kldr_gtest)
+  if(ARG_DEPENDS)
+    add_dependencies(${name} ${ARG_DEPENDS})
+  endif()
+  add_test(NAME ${name} COMMAND ${name})
+  set_tests_properties(${name} PROPERTIES TIMEOUT 300 ENVIRONMENT "${ARG_ENV}")
+endfunction()
+
+# GoogleTest comes as source, so that it is built for the word size and the sanitizer in hand.
+if(BUILD_TESTING OR NOT DEFINED BUILD_TESTING)
+  set(gtest_root /usr/src/googletest/googletest)
+  add_library(kldr_gtest STATIC EXCLUDE_FROM_ALL ${gtest_root}/src/gtest-all.cc ${gtest_root}/src/gtest_main.cc)
+  target_include_directories(kldr_gtest SYSTEM PUBLIC ${gtest_root}/include PRIVATE ${gtest_root})
+  target_compile_options(kldr_gtest PRIVATE -w)
+  target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
+endif()
