@@ -4,6 +4,7 @@
 #include "runtime/Operation.h"
 #include "runtime/Registration.h"
 #include "runtime/provider_status.h"
+#include "runtime/version.h"
 
 namespace KPRV {
 

@@ -44,6 +44,11 @@ public:
                         Instance_Handler_Proc proc, void* client_data);
 
 private:
+    /// Null if the provider's class is no association.
+    const Meta_Class* _association_class() const;
+    /// The operations whose first argument is where the answer goes.
+    int _query(int operation, void* out) const;
+    /// The operations on the provider object.
     int _call(int operation, const void* arg1 = nullptr, const void* arg2 = nullptr,
               const void* arg3 = nullptr, const void* arg4 = nullptr, const void* arg5 = nullptr,
               const void* arg6 = nullptr) const;

@@ -2,6 +2,7 @@
 
 #include "runtime/Types.h"
 
+#include <atomic>
 #include <cstdarg>
 
 namespace KPRV {
@@ -29,7 +30,7 @@ void vlog(Log_Level level, const char* file, size_t line, const char* format, va
 /// so already.
 int log_enable(bool flag);
 /// Read by call sites before they build a `Log_Call_Frame`.
-extern bool _log_enabled_state;
+extern std::atomic<bool> _log_enabled_state;
 
 /// Sets the level in memory only: the configuration file overrides it. -1 for an unknown name.
 int log_set_level(const char* name);

@@ -1,0 +1,43 @@
+#include "runtime/Thread_Context.h"
+
+#include <pthread.h>
+
+namespace KPRV {
+
+static pthread_key_t _thread_context_key;
+static pthread_once_t _thread_context_key_once = PTHREAD_ONCE_INIT;
+
+static void _make_key()
+{
+    // No destructor function: the stack does not own its elements.
+    pthread_key_create(&_thread_context_key, nullptr);
+}
+
+static pthread_key_t key()
+{
+    pthread_once(&_thread_context_key_once, _make_key);
+    return _thread_context_key;
+}
+
+Thread_Context::~Thread_Context() = default;
+
+Thread_Context* Thread_Context::top()
+{
+    return static_cast<Thread_Context*>(pthread_getspecific(key()));
+}
+
+void Thread_Context::push(Thread_Context* context)
+{
+    context->_next = top();
+    pthread_setspecific(key(), context);
+}
+
+void Thread_Context::pop()
+{
+    if (Thread_Context* const context = top()) {
+        pthread_setspecific(key(), context->_next);
+        context->_next = nullptr;
+    }
+}
+
+} // namespace KPRV

@@ -1,0 +1,149 @@
+#include "runtime/log.h"
+#include "runtime/Buffer.h"
+#include "runtime/Datetime.h"
+#include "runtime/File_Lock.h"
+#include "runtime/log_configuration.h"
+
+#include <cstdio>
+#include <cstring>
+#include <pthread.h>
+#include <strings.h>
+#include <sys/stat.h>
+
+namespace KPRV {
+
+const char* const _log_level_strings[5] = {"FATAL", "ERR", "WARN", "INFO", "DBG"};
+
+constinit std::atomic<bool> _log_enabled_state = true;
+
+// All of this is guarded by the mutex. It is a plain one: nothing inside calls back into the logger.
+static pthread_mutex_t _mutex = PTHREAD_MUTEX_INITIALIZER;
+static bool _initialized;
+static Log_Level _level;
+static FILE* _log_file_handle;
+static File_Lock* _lock;
+
+namespace {
+
+class Auto_Log_Mutex
+{
+public:
+    Auto_Log_Mutex() { pthread_mutex_lock(&_mutex); }
+    ~Auto_Log_Mutex() { pthread_mutex_unlock(&_mutex); }
+    Auto_Log_Mutex(const Auto_Log_Mutex&) = delete;
+    Auto_Log_Mutex& operator=(const Auto_Log_Mutex&) = delete;
+};
+
+} // namespace
+
+/// Tried anew by every call until it succeeds: a user may put the rc file in place while the server runs.
+static void configure()
+{
+    Log_Configuration configuration;
+    if (!read_log_configuration(configuration))
+        return;
+    _level = configuration.level;
+
+    mkdir(configuration.directory, 0777);
+    _lock = new File_Lock(configuration.lock);
+    if (_lock->okay())
+        _log_file_handle = fopen(configuration.messages, "ae");
+    if (_log_file_handle) {
+        _initialized = true;
+    } else {
+        delete _lock;
+        _lock = nullptr;
+    }
+}
+
+static void write_line(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+{
+    char time[32];
+    Datetime::now().ascii(time, true);
+    if (char* const fraction = strchr(time, '.'))
+        *fraction = '\0';
+
+    Buffer text;
+    text.format("%s %s: %s(%d): ", time, _log_level_strings[int(level)], file, int(line));
+    text.vformat(format, arguments);
+    if (text.data()[text.size() - 1] != '\n')
+        text.append('\n');
+
+    // A lock that cannot be had does not keep the line out of the log.
+    _lock->lock();
+    fwrite(text.data(), 1, text.size(), _log_file_handle);
+    fflush(_log_file_handle);
+    _lock->unlock();
+}
+
+void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+{
+    const Auto_Log_Mutex guard;
+    if (!_initialized)
+        configure();
+    if (_log_file_handle && level <= _level)
+        write_line(level, file, line, format, arguments);
+}
+
+void log(Log_Level level, const char* file, size_t line, const char* format, ...)
+{
+    va_list arguments;
+    va_start(arguments, format);
+    vlog(level, file, line, format, arguments);
+    va_end(arguments);
+}
+
+void Log_Call_Frame::invoke(const char* format, ...) const
+{
+    va_list arguments;
+    va_start(arguments, format);
+    vlog(level, file, line, format, arguments);
+    va_end(arguments);
+}
+
+int log_enable(bool flag)
+{
+    return _log_enabled_state.exchange(flag) == flag ? -1 : 0;
+}
+
+int _validate_log_level(const char* name, Log_Level& level)
+{
+    for (int i = 0; i < 5; i++) {
+        if (strcasecmp(name, _log_level_strings[i]) == 0) {
+            level = Log_Level(i);
+            return 0;
+        }
+    }
+    return -1;
+}
+
+int log_set_level(const char* name)
+{
+    Log_Level level;
+    if (_validate_log_level(name, level) != 0)
+        return -1;
+    const Auto_Log_Mutex guard;
+    _level = level;
+    return 0;
+}
+
+void close_log()
+{
+    const Auto_Log_Mutex guard;
+    if (!_initialized)
+        return;
+    delete _lock;
+    _lock = nullptr;
+    fclose(_log_file_handle);
+    _log_file_handle = nullptr;
+    _initialized = false;
+}
+
+/// A server may load and unload the module many times in one process: the log must not keep a descriptor of
+/// each time. The priority makes this the last of the destructors, since the others may still log.
+[[gnu::destructor(101)]] static void close_log_at_unload()
+{
+    close_log();
+}
+
+} // namespace KPRV
