@@ -1,0 +1,24 @@
+#include "providers/deliver.h"
+#include "providers/managers.h"
+#include "providers/proc.h"
+#include "schema/KALDERA_HBASoftwareInstallationServiceCapabilities_Skeleton.h"
+
+namespace KPRV {
+
+class KALDERA_HBASoftwareInstallationServiceCapabilities_Provider
+    : public KALDERA_HBASoftwareInstallationServiceCapabilities_Skeleton
+{
+public:
+    Enum_Instances_Status
+    enum_instances(const KALDERA_HBASoftwareInstallationServiceCapabilities*,
+                   Enum_Instances_Handler<KALDERA_HBASoftwareInstallationServiceCapabilities>* handler)
+    {
+        LOG_SCOPE("enum_instances");
+        return deliver_one(fc_hba_instances(HBASOFTWAREINSTALLATIONSERVICECAPABILITIES), *handler,
+                           SAYING(ERR, "Error: Invalid mapping information"), ENUM_INSTANCES_OK);
+    }
+};
+
+PROVIDER_PROC(KALDERA_HBASoftwareInstallationServiceCapabilities)
+
+} // namespace KPRV

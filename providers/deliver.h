@@ -1,0 +1,101 @@
+#pragma once
+
+#include "runtime/Array.h"
+#include "runtime/Handler.h"
+#include "runtime/log.h"
+#include "runtime/provider_status.h"
+
+namespace KPRV {
+
+/// What a provider says when its list does not have the count that it needs; `text` null says nothing. Write
+/// it as `SAYING(ERR, "...")` or `SAYING_NOTHING`, which add the provider's own file and line.
+struct Message
+{
+    Call_Site site;
+    Log_Level level;
+    const char* text;
+
+    void say() const
+    {
+        if (text)
+            log(level, site.file, site.line, "%s", text);
+    }
+    Enum_Instances_Status answer(Enum_Instances_Status status) const
+    {
+        say();
+        return status;
+    }
+    void trace(const char* words) const { log(Log_Level::DBG, site.file, site.line, "%s", words); }
+};
+
+#define SAYING(level, text) (::KPRV::Message{LOG_HERE, ::KPRV::Log_Level::level, text})
+#define SAYING_NOTHING (::KPRV::Message{LOG_HERE, ::KPRV::Log_Level::DBG, nullptr})
+
+/// Owner of the elements that a manager hands out: what was not delivered is destroyed, also when an
+/// exception passes.
+class Instance_List
+{
+public:
+    explicit Instance_List(const Array<Instance*>& instances) : _instances(instances) {}
+    ~Instance_List()
+    {
+        for (uint32 i = _next; i < _instances.size(); i++)
+            destroyer(_instances[i]);
+    }
+    Instance_List(const Instance_List&) = delete;
+    Instance_List& operator=(const Instance_List&) = delete;
+
+    uint32 size() const { return _instances.size(); }
+    bool empty() const { return size() == 0; }
+
+    /// Hands a clone of each element of the class to the handler, in order. The element itself outlives the
+    /// handler's call.
+    template <class T>
+    void deliver(Enum_Instances_Handler<T>& handler)
+    {
+        for (; _next < _instances.size(); _next++) {
+            if (const T* instance = cast<T>(_instances[_next]))
+                handler.handle(clone_of(instance));
+            destroyer(_instances[_next]);
+        }
+    }
+
+private:
+    Array<Instance*> _instances;
+    uint32 _next = 0;
+};
+
+/// Delivers the list, whatever its length; an empty one is said and is a success.
+template <class T>
+Enum_Instances_Status deliver_all(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
+                                  const Message& when_empty)
+{
+    Instance_List list(instances);
+    if (list.empty())
+        return when_empty.answer(ENUM_INSTANCES_OK);
+    when_empty.trace("Returning instances");
+    list.deliver(handler);
+    return ENUM_INSTANCES_OK;
+}
+
+/// Delivers a list of exactly one; any other count is said and answered with `otherwise`.
+template <class T>
+Enum_Instances_Status deliver_one(Instance_List& list, Enum_Instances_Handler<T>& handler,
+                                  const Message& when_not_one, Enum_Instances_Status otherwise)
+{
+    if (list.size() != 1)
+        return when_not_one.answer(otherwise);
+    when_not_one.trace("Returning instances");
+    list.deliver(handler);
+    return ENUM_INSTANCES_OK;
+}
+
+template <class T>
+Enum_Instances_Status deliver_one(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
+                                  const Message& when_not_one, Enum_Instances_Status otherwise)
+{
+    Instance_List list(instances);
+    return deliver_one(list, handler, when_not_one, otherwise);
+}
+
+} // namespace KPRV

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "model/FCHBAManager.h"
+#include "model/HDRManager.h"
+#include "model/ServerManager.h"
+
+namespace KPRV {
+
+// Where the lists come from. The caller owns the elements.
+
+inline Array<Instance*> fc_hba_instances(classId_t id)
+{
+    return FCHBAManager::getFCHBAManager()->getInstances(id);
+}
+
+inline Array<Instance*> hdr_instances(classId_t id)
+{
+    return HDRManager::getHDRManager()->getInstances(id);
+}
+
+inline Array<Instance*> server_instances(classId_t id)
+{
+    return ServerManager::getServerManager()->getInstances(id);
+}
+
+} // namespace KPRV

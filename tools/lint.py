@@ -1,0 +1,106 @@
+#!/usr/bin/env python3
+"""House rules that a machine can check: include arrows, file sizes, mirrored tests, known traps."""
+
+import re
+import subprocess
+import sys
+from pathlib import Path
+
+ROOT = Path(__file__).resolve().parent.parent
+
+# A room may include what stands on a lower floor, and itself.
+FLOORS = {
+    "runtime": 1,
+    "adapter": 2,
+    "schema": 2,
+    "cmpi": 3,
+    "model": 4,
+    "agent": 5,
+    "diagnostics": 5,
+    "alerts": 5,
+    "update": 5,
+    "providers": 6,
+    "module": 7,
+}
+# Beside the house: what they may include of it. The simulator shares the exception type with the module, and the host reads
+# the catalogue's records.
+BESIDE = {
+    "host": {"host", "cmpi", "runtime"},
+    "simulator": {"simulator", "adapter"},
+    "tests": None,
+    "bench": None,
+    "fuzz": None,
+}
+
+LONGEST = 600
+
+# Patterns that have bitten before, with the folders where they are at home.
+TRAPS = [
+    (r"\.as(String|Int|UInt|Bool|CString|Double|Int64|UInt64)\(\)", "Json::Value conversions go through adapter/Json.h",
+     {"adapter/Json.cpp", "adapter/Json.h"}, {"host", "simulator", "tests"}),
+    (r"\b(system|popen)\s*\(", "no shell: run argument vectors", set(), {"tests"}),
+    (r"using namespace std\b", "no 'using namespace std'", set(), set()),
+    (r"\bstd::cout\b|\bprintf\(", "nothing writes to standard output inside a server", set(),
+     {"host", "tests", "simulator", "bench"}),
+    (r"^\s*#\s*include\s*<iostream>", "iostream brings static constructors and compile time", set(), {"tests"}),
+]
+
+
+def sources():
+    out = subprocess.run(["git", "ls-files", "-co", "--exclude-standard", "--", "*.h", "*.cpp", "*.py"], cwd=ROOT,
+                         capture_output=True, text=True, check=True).stdout
+    return [Path(line) for line in out.splitlines() if (ROOT / line).is_file()]
+
+
+def check_arrows(path, lines, complain):
+    room = path.parts[0]
+    for number, line in enumerate(lines, 1):
+        match = re.match(r'\s*#\s*include\s*"([^"/]+)/', line)
+        if not match:
+            continue
+        target = match.group(1)
+        if target == room or (target not in FLOORS and target not in BESIDE):
+            continue
+        if room in FLOORS:
+            if FLOORS.get(target, 99) >= FLOORS[room]:
+                complain(path, number, f"{room}/ may not include {target}/, which does not stand below it")
+        elif room in BESIDE and BESIDE[room] is not None and target not in BESIDE[room]:
+            complain(path, number, f"{room}/ may not include {target}/")
+
+
+def check_traps(path, lines, complain):
+    for pattern, reason, files, rooms in TRAPS:
+        if str(path) in files or path.parts[0] in rooms:
+            continue
+        for number, line in enumerate(lines, 1):
+            code = re.sub(r"//.*", "", line)
+            if re.search(pattern, code):
+                complain(path, number, reason)
+
+
+def main():
+    failures = []
+
+    def complain(path, number, text):
+        failures.append(f"{path}:{number}: {text}")
+
+    for path in sources():
+        text = (ROOT / path).read_text(encoding="utf-8")
+        lines = text.splitlines()
+        if len(lines) > LONGEST:
+            complain(path, len(lines), f"longer than {LONGEST} lines: is it one thing?")
+        if path.suffix == ".h" and "#pragma once" not in text and not text.startswith("#ifndef") and \
+                "#ifndef" not in text:
+            complain(path, 1, "header without include guard")
+        if path.suffix in (".h", ".cpp"):
+            check_arrows(path, lines, complain)
+            check_traps(path, lines, complain)
+
+    for failure in failures:
+        print(failure)
+    print(f"lint: {len(failures)} failures")
+    return 1 if failures else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())
