@@ -3,8 +3,7 @@
 #include <cstdint>
 #include <string>
 
-namespace KPRV
-{
+namespace KPRV {
 
 /// An application failure, told by a number and a text.
 ///

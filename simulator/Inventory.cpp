@@ -1,0 +1,126 @@
+#include "simulator/Inventory.h"
+
+#include "simulator/Adapter_Reader.h"
+#include "simulator/Inventory_Members.h"
+
+#include <algorithm>
+#include <cctype>
+
+namespace KPRV::simulator {
+
+namespace {
+
+constexpr const char* default_version = "3.2.1";
+
+// "init" is the whole answer, or only its result.
+Json::Value init_answer(const Json::Value& written)
+{
+    if (written.isObject() && !written.isNull())
+        return written;
+    Json::Value answer;
+    answer["result"] = written.isNull() ? Json::Value(0) : written;
+    return answer;
+}
+
+} // namespace
+
+std::string lower_case(std::string text)
+{
+    std::transform(text.begin(), text.end(), text.begin(),
+                   [](unsigned char letter) { return static_cast<char>(std::tolower(letter)); });
+    return text;
+}
+
+Inventory::Inventory() : Inventory(Json_Text("default", "{}")) {}
+
+Inventory::Inventory(const Json_Text& source)
+{
+    const Json::Value written = source.parse();
+    check_members(source, written, inventory_members, "the inventory");
+    Json::Value parts = written;
+    complete_members(parts, inventory_members);
+
+    host = parts["host"];
+    check_members(source, host, host_members, "host");
+    complete_members(host, host_members);
+    Json::Value extra;
+    host.removeMember("extra", &extra);
+    for (const std::string& name : extra.getMemberNames())
+        host[name] = extra[name];
+
+    const Json::Value& library = parts["library"];
+    check_members(source, library, library_members, "library");
+    version = library.isMember("version") ? library["version"] : Json::Value(default_version);
+    init = init_answer(library["init"]);
+    faults = parts["faults"];
+    answers = parts["answers"];
+    check_answers(source, written["answers"]);
+
+    std::size_t eth_ports = 0;
+    for (const Json::Value& each : parts["adapters"]) {
+        adapters.push_back(read_adapter(source, each, {adapters.size() + 1, eth_ports}));
+        eth_ports += adapters.back().eth_ports.size();
+        index_adapter(source, each, adapters.size() - 1);
+    }
+}
+
+void Inventory::index_adapter(const Json_Text& source, const Json::Value& written, std::size_t number)
+{
+    // An adapter may share an address with a port of its own, but with nothing of another adapter.
+    const auto put = [&](Index& index, const Json::Value& address, Position position,
+                         bool may_stand = false) {
+        if (address.isNull())
+            return;
+        const std::string key = lower_case(address.asString());
+        bool taken = !index.try_emplace(key, position).second && !may_stand;
+        for (const Index* each : {&adapter_index_, &port_index_}) {
+            const auto found = each->find(key);
+            taken = taken || (found != each->end() && found->second.adapter != number);
+        }
+        if (taken)
+            source.refuse(address, "duplicate address " + compact_text(address));
+    };
+    const Json::Value& hba = written["hbaData"];
+    const Position self{number, 0, false};
+    put(adapter_index_, hba["wwn"], self);
+    put(adapter_index_, hba["hbaMAC"], self);
+    put(adapter_index_, written["address"], self, true);
+
+    std::size_t place = 0;
+    for (const Json::Value& port : written["ethPorts"])
+        put(port_index_, port["mac"], {number, place++, true});
+    place = 0;
+    for (const Json::Value& port : written["fcPorts"]) {
+        put(port_index_, port["wwn"], {number, place, false});
+        // FCoE traffic leaves by an Ethernet port, whose MAC it may use.
+        const auto found = port_index_.find(lower_case(port["fcoeMac"].asString()));
+        put(port_index_, port["fcoeMac"], {number, place++, false},
+            found != port_index_.end() && found->second.ethernet);
+    }
+}
+
+Inventory::Place Inventory::adapter_at(const std::string& address)
+{
+    const auto found = adapter_index_.find(lower_case(address));
+    if (found == adapter_index_.end())
+        return {};
+    return {&adapters[found->second.adapter], nullptr};
+}
+
+Inventory::Place Inventory::port_at(const std::string& address)
+{
+    const auto found = port_index_.find(lower_case(address));
+    if (found == port_index_.end())
+        return {};
+    const Position& position = found->second;
+    Adapter& adapter = adapters[position.adapter];
+    auto& ports = position.ethernet ? adapter.eth_ports : adapter.fc_ports;
+    return {&adapter, &ports[position.port]};
+}
+
+unsigned Inventory::adapter_id(const Adapter& adapter) const
+{
+    return static_cast<unsigned>(&adapter - adapters.data()) + 1;
+}
+
+} // namespace KPRV::simulator

@@ -1,0 +1,87 @@
+#pragma once
+
+#include "simulator/Json_Text.h"
+
+#include <cstddef>
+#include <json/json.h>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace KPRV::simulator {
+
+/// A port, as the library's answers tell it.
+struct Port
+{
+    std::string address;  // WWN of an FC port, MAC of an Ethernet port
+    Json::Value data;     // the answer of getPortByWwn
+    Json::Value eth_data; // `ethData` of getEthPortByEthMac; null for an FC port
+    Json::Value answers;  // answers of the author's own, by entry point
+};
+
+/// An adapter, as the library's answers tell it.
+struct Adapter
+{
+    std::string address; // what getAllAdaptersIndexString lists
+    Json::Value data;    // the answer of getHbaByWwn: `hbaData`, `driver`, `firmware`
+    Json::Value flash_status;
+    std::vector<Port> fc_ports;
+    std::vector<Port> eth_ports;
+    Json::Value answers;
+};
+
+/// A host with its adapters: what an inventory file describes, and what "set" calls change.
+class Inventory
+{
+public:
+    /// A host without adapters.
+    Inventory();
+
+    /// Reads an inventory; simulator/INVENTORY.md tells its shape. Throws Refused.
+    explicit Inventory(const Json_Text& source);
+
+    /// Where an address leads. `port` is null for an adapter's own address; both are null for an
+    /// address that the inventory does not have.
+    struct Place
+    {
+        Adapter* adapter = nullptr;
+        Port* port = nullptr;
+        explicit operator bool() const { return adapter != nullptr; }
+    };
+
+    /// The adapter that has this WWN, MAC or listed address, in colon form and in any letter case.
+    Place adapter_at(const std::string& address);
+
+    /// The port that has this address. An Ethernet port comes before an FCoE port of the same MAC.
+    Place port_at(const std::string& address);
+
+    /// The number from 1 by which the library knows the adapter.
+    unsigned adapter_id(const Adapter& adapter) const;
+
+    Json::Value host;    // `hostManufacturer`, `hostModel`
+    Json::Value version; // text, or null
+    Json::Value init;    // the answer of init_hba_lib
+    Json::Value faults;  // as written, for Fault to read
+    Json::Value answers; // answers of the author's own that belong to no adapter
+    std::vector<Adapter> adapters;
+
+private:
+    // Positions, not pointers: an inventory can be copied and moved.
+    struct Position
+    {
+        std::size_t adapter;
+        std::size_t port;
+        bool ethernet;
+    };
+    using Index = std::unordered_map<std::string, Position>;
+
+    void index_adapter(const Json_Text& source, const Json::Value& written, std::size_t number);
+
+    Index adapter_index_;
+    Index port_index_;
+};
+
+/// `text` in lower case: the form in which addresses compare.
+std::string lower_case(std::string text);
+
+} // namespace KPRV::simulator

@@ -1,0 +1,99 @@
+#include "simulator/Behaviours.h"
+#include "simulator/Inventory_Members.h"
+#include "simulator/Lookup.h"
+#include "simulator/Status.h"
+
+#include <algorithm>
+
+namespace KPRV::simulator {
+
+namespace {
+
+Json::Value port_addresses(State& state, const Json::Value& request, std::vector<Port> Adapter::*ports)
+{
+    const Json::Value& address = request["indexStr"];
+    return answer_at(state.inventory.adapter_at(address.asString()), address,
+                     [&](const Inventory::Place& place) {
+                         Json::Value answer;
+                         answer["indexStrings"] = Json::Value(Json::arrayValue);
+                         for (const Port& port : place.adapter->*ports)
+                             answer["indexStrings"].append(port.address);
+                         return answer;
+                     });
+}
+
+// The first of the names that cannot be set, in words; empty if all can.
+std::string objection(const Json::Value& names, const Json::Value& values)
+{
+    if (!names.isArray() || !values.isObject())
+        return "port must be an object and propArray an array";
+    for (const Json::Value& name : names) {
+        if (!name.isString() || !values.isMember(name.asString()))
+            return "propArray names what port does not have: " + compact_text(name);
+        const auto known = std::find_if(std::begin(fc_port_members), std::end(fc_port_members),
+                                        [&](const Member& each) { return name == each.name; });
+        if (known != std::end(fc_port_members) && !has_type(values[name.asString()], known->type))
+            return name.asString() + " must be " + type_words(known->type);
+    }
+    return "";
+}
+
+// A port that is enabled or disabled shows it in each member that tells its state.
+void show_status(Port& port, bool enabled)
+{
+    const Status status = enabled ? IN_SERVICE : STOPPED;
+    port.data["portStatusValue"] = status;
+    if (!port.eth_data.isNull())
+        port.eth_data["ethPortStateMOFValue"] = status;
+}
+
+} // namespace
+
+Json::Value fc_port_addresses(State& state, const Json::Value& request)
+{
+    return port_addresses(state, request, &Adapter::fc_ports);
+}
+
+Json::Value eth_port_addresses(State& state, const Json::Value& request)
+{
+    return port_addresses(state, request, &Adapter::eth_ports);
+}
+
+Json::Value port_data(State& state, const Json::Value& request)
+{
+    const Json::Value address = wwn_or_mac(request);
+    return answer_at(state.inventory.port_at(address.asString()), address,
+                     [](const Inventory::Place& place) { return place.port->data; });
+}
+
+Json::Value eth_port_data(State& state, const Json::Value& request)
+{
+    Inventory::Place place = state.inventory.port_at(request["mac"].asString());
+    if (place && place.port->eth_data.isNull())
+        place = {};
+    return answer_at(place, request["mac"], [](const Inventory::Place& found) {
+        Json::Value answer;
+        answer["ethData"] = found.port->eth_data;
+        return answer;
+    });
+}
+
+Json::Value set_port(State& state, const Json::Value& request)
+{
+    const Json::Value& names = request["propArray"];
+    const Json::Value& values = request["port"];
+    const std::string refused = objection(names, values);
+    if (!refused.empty())
+        return error_answer(Error_Code::REQUEST, refused);
+    const Json::Value& address = request["indexStr"];
+    return answer_at(state.inventory.port_at(address.asString()), address,
+                     [&](const Inventory::Place& place) {
+                         for (const Json::Value& name : names)
+                             place.port->data[name.asString()] = values[name.asString()];
+                         if (std::find(names.begin(), names.end(), "portStatus") != names.end())
+                             show_status(*place.port, values["portStatus"].asBool());
+                         return done_answer();
+                     });
+}
+
+} // namespace KPRV::simulator

@@ -1,0 +1,35 @@
+#pragma once
+
+#include <cstddef>
+#include <deque>
+#include <json/json.h>
+#include <string>
+
+namespace KPRV::simulator {
+
+/// Remembers every call of an entry point, in order. A server may run for days on the simulator, so
+/// of very many calls the oldest are forgotten.
+class Recorder
+{
+public:
+    static constexpr std::size_t most_calls = 65536;
+
+    void add(const char* symbol, const Json::Value& request);
+    void clear() { calls_.clear(); }
+
+    /// An array of {"call", "request"}, oldest first.
+    Json::Value calls() const;
+
+    /// How many calls of that entry point are remembered.
+    std::size_t count(const std::string& symbol) const;
+
+private:
+    struct Call
+    {
+        const char* symbol;
+        Json::Value request;
+    };
+    std::deque<Call> calls_;
+};
+
+} // namespace KPRV::simulator

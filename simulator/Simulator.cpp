@@ -1,0 +1,206 @@
+#include "simulator/Simulator.h"
+
+#include "simulator/Answers.h"
+
+#include <cstdio>
+#include <cstdlib>
+#include <thread>
+
+namespace KPRV::simulator {
+
+namespace {
+
+constexpr const char* inventory_variable = "KLDR_SIMULATOR_INVENTORY";
+
+} // namespace
+
+Simulator& Simulator::instance()
+{
+    static Simulator& simulator = *new Simulator;
+    return simulator;
+}
+
+Json::Value Simulator::answer(Entry entry, const Json::Value& request)
+{
+    const Entry_Row& row = entry_rows()[static_cast<std::size_t>(entry)];
+    const std::vector<Fault> faults = striking_faults(row, request);
+    wait_out(faults);
+    for (const Fault& fault : faults)
+        if (replaces_answer(fault.kind))
+            return replaced_answer(fault);
+    Json::Value answer;
+    {
+        const std::lock_guard lock(mutex_);
+        answer = answer_by_row(state_, row, request);
+    }
+    for (const Fault& fault : faults)
+        if (fault.kind == Fault_Kind::REMOVE || fault.kind == Fault_Kind::SET)
+            edit_answer(fault, answer);
+    return answer;
+}
+
+std::vector<Fault> Simulator::striking_faults(const Entry_Row& row, const Json::Value& request)
+{
+    const std::lock_guard lock(mutex_);
+    load_from_environment();
+    recorder_.add(row.symbol, request);
+    called_.notify_all();
+    std::vector<Fault> striking;
+    for (Fault& fault : faults_)
+        if (strikes(fault, row.symbol, request))
+            striking.push_back(fault);
+    return striking;
+}
+
+void Simulator::wait_out(const std::vector<Fault>& faults)
+{
+    for (const Fault& fault : faults) {
+        if (fault.kind == Fault_Kind::DELAY)
+            std::this_thread::sleep_for(std::chrono::milliseconds(fault.words["milliseconds"].asUInt()));
+        if (fault.kind != Fault_Kind::HOLD)
+            continue;
+        std::unique_lock lock(mutex_);
+        released_.wait(lock, [&, before = releases_] { return releases_ != before; });
+    }
+}
+
+void Simulator::load_from_environment()
+{
+    if (state_.loaded)
+        return;
+    state_.loaded = true;
+    state_.problem.clear();
+    state_.inventory = {};
+    faults_.clear();
+    const char* path = std::getenv(inventory_variable);
+    if (!path)
+        return;
+    try {
+        put_in_place(Json_Text::of_file(path));
+    } catch (const Refused& refused) {
+        state_.problem = refused.what();
+        std::fprintf(stderr, "simulator: %s\n", refused.what());
+    }
+}
+
+void Simulator::put_in_place(const Json_Text& source)
+{
+    Inventory inventory(source);
+    faults_ = read_faults(source, inventory.faults);
+    state_.inventory = std::move(inventory);
+}
+
+void Simulator::load(const Json_Text& source)
+{
+    const std::lock_guard lock(mutex_);
+    state_.loaded = true;
+    state_.from_environment = false;
+    state_.problem.clear();
+    try {
+        put_in_place(source);
+    } catch (const Refused& refused) {
+        state_.problem = refused.what();
+        state_.inventory = {};
+        faults_.clear();
+        throw;
+    }
+}
+
+void Simulator::unload()
+{
+    const std::lock_guard lock(mutex_);
+    state_.loaded = false;
+    state_.from_environment = true;
+}
+
+void Simulator::set_log_callback(Log_Callback callback)
+{
+    const std::lock_guard lock(mutex_);
+    state_.session.log_callback = callback;
+}
+
+void Simulator::set_event_callback(Event_Callback callback)
+{
+    const std::lock_guard lock(mutex_);
+    state_.session.event_callback = callback;
+}
+
+void Simulator::add_fault(const Json_Text& source)
+{
+    Fault fault = read_fault(source, source.parse());
+    const std::lock_guard lock(mutex_);
+    load_from_environment();
+    faults_.push_back(std::move(fault));
+}
+
+void Simulator::clear_faults()
+{
+    const std::lock_guard lock(mutex_);
+    load_from_environment();
+    faults_.clear();
+}
+
+void Simulator::release()
+{
+    const std::lock_guard lock(mutex_);
+    ++releases_;
+    released_.notify_all();
+}
+
+bool Simulator::wait_for_calls(const std::string& symbol, std::size_t count, std::chrono::milliseconds limit)
+{
+    std::unique_lock lock(mutex_);
+    return called_.wait_for(lock, limit, [&] { return recorder_.count(symbol) >= count; });
+}
+
+Json::Value Simulator::calls()
+{
+    const std::lock_guard lock(mutex_);
+    return recorder_.calls();
+}
+
+void Simulator::clear_calls()
+{
+    const std::lock_guard lock(mutex_);
+    recorder_.clear();
+}
+
+Json::Value Simulator::status()
+{
+    const std::lock_guard lock(mutex_);
+    load_from_environment();
+    Json::Value status;
+    status["initialised"] = state_.session.initialised;
+    status["wantsEvents"] = state_.session.wants_events;
+    status["logCallback"] = state_.session.log_callback != nullptr;
+    status["eventCallback"] = state_.session.event_callback != nullptr;
+    status["problem"] = state_.problem;
+    return status;
+}
+
+bool Simulator::log(int level, const char* file, int line, const char* text)
+{
+    Log_Callback callback = nullptr;
+    {
+        const std::lock_guard lock(mutex_);
+        callback = state_.session.log_callback;
+    }
+    if (callback)
+        callback(level, file, line, text);
+    return callback != nullptr;
+}
+
+bool Simulator::event(const char* text)
+{
+    Event_Callback callback = nullptr;
+    {
+        const std::lock_guard lock(mutex_);
+        if (state_.session.wants_events)
+            callback = state_.session.event_callback;
+    }
+    if (callback)
+        callback(text);
+    return callback != nullptr;
+}
+
+} // namespace KPRV::simulator

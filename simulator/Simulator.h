@@ -1,0 +1,72 @@
+#pragma once
+
+#include "simulator/Entry_Points.h"
+#include "simulator/Faults.h"
+#include "simulator/Recorder.h"
+#include "simulator/State.h"
+
+#include <chrono>
+#include <condition_variable>
+#include <json/json.h>
+#include <mutex>
+#include <string>
+#include <vector>
+
+namespace KPRV::simulator {
+
+/// The library that entry points and control functions meet in. Any thread may call anything; no
+/// callback is called and no fault is waited for under the lock.
+class Simulator
+{
+public:
+    /// The one of this process. Never destroyed: callers say goodbye from static destructors.
+    static Simulator& instance();
+
+    /// One call of an entry point. Throws only what a fault says.
+    Json::Value answer(Entry entry, const Json::Value& request);
+
+    void set_log_callback(Log_Callback callback);
+    void set_event_callback(Event_Callback callback);
+
+    /// Puts the inventory and its faults in place of the present ones. Throws Refused, in which
+    /// case a host without adapters stands in, and init_hba_lib says why.
+    void load(const Json_Text& source);
+
+    /// Forgets what load() gave: the next call reads what the environment names.
+    void unload();
+
+    void add_fault(const Json_Text& source);
+    void clear_faults();
+
+    /// Lets every call go that a fault holds at this moment.
+    void release();
+
+    /// Waits until `count` calls of the entry point are recorded. False if that takes too long.
+    bool wait_for_calls(const std::string& symbol, std::size_t count, std::chrono::milliseconds limit);
+
+    Json::Value calls();
+    void clear_calls();
+
+    /// What a caller has registered, and why the inventory was refused.
+    Json::Value status();
+
+    /// Calls the callback on this thread. False if none is registered.
+    bool log(int level, const char* file, int line, const char* text);
+    bool event(const char* text);
+
+private:
+    void load_from_environment();
+    void put_in_place(const Json_Text& source);
+    std::vector<Fault> striking_faults(const Entry_Row& row, const Json::Value& request);
+    void wait_out(const std::vector<Fault>& faults);
+
+    std::mutex mutex_;
+    std::condition_variable called_;
+    std::condition_variable released_;
+    unsigned releases_ = 0;
+    State state_;
+    std::vector<Fault> faults_;
+    Recorder recorder_;
+};
+
+} // namespace KPRV::simulator
