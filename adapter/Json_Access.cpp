@@ -1,0 +1,100 @@
+#include "adapter/Json_Access.h"
+
+#include <limits>
+
+namespace KPRV {
+
+namespace {
+
+/// Any JSON number, and what counts as one, within the limits of T.
+template <class T>
+T number(const Json::Value& value, const char* failure)
+{
+    switch (value.type()) {
+    case Json::nullValue:
+        return 0;
+    case Json::booleanValue:
+        return value.asBool() ? 1 : 0;
+    case Json::intValue: {
+        const Json::LargestInt n = value.asLargestInt();
+        if (n >= std::numeric_limits<T>::min() && n <= std::numeric_limits<T>::max())
+            return static_cast<T>(n);
+        break;
+    }
+    case Json::uintValue:
+        if (value.asLargestUInt() <= std::numeric_limits<T>::max())
+            return static_cast<T>(value.asLargestUInt());
+        break;
+    case Json::realValue: {
+        const double n = value.asDouble();
+        if (n >= std::numeric_limits<T>::min() && n <= std::numeric_limits<T>::max())
+            return static_cast<T>(n);
+        break;
+    }
+    default:
+        break;
+    }
+    throw Not_Convertible(failure);
+}
+
+} // namespace
+
+bool isArrayOrNull(const Json::Value& value)
+{
+    return value.isArray() || value.isNull();
+}
+
+bool isObjectOrNull(const Json::Value& value)
+{
+    return value.isObject() || value.isNull();
+}
+
+std::string asString(const Json::Value& value)
+{
+    if (value.isNull() || value.isString() || value.isBool())
+        return value.asString();
+    throw Not_Convertible("Type is not convertible to string");
+}
+
+int asInt(const Json::Value& value)
+{
+    return number<int>(value, "Type is not convertible to int");
+}
+
+unsigned asUInt(const Json::Value& value)
+{
+    return number<unsigned>(value, "Type is not convertible to uint");
+}
+
+bool asBool(const Json::Value& value)
+{
+    switch (value.type()) {
+    case Json::booleanValue:
+    case Json::intValue:
+    case Json::uintValue:
+        return value.asBool();
+    case Json::realValue:
+        return value.asDouble() != 0.0;
+    case Json::stringValue:
+        return !value.asString().empty();
+    default:
+        return value.isArray() || value.isObject() ? !value.empty() : false;
+    }
+}
+
+bool hasMember(const Json::Value& object, const char* name)
+{
+    return object.isObject() && object.isMember(name);
+}
+
+const Json::Value& member(const Json::Value& object, const char* name)
+{
+    return hasMember(object, name) ? object[name] : Json::Value::nullSingleton();
+}
+
+const Json::Value& element(const Json::Value& array, unsigned index)
+{
+    return array.isArray() && index < array.size() ? array[index] : Json::Value::nullSingleton();
+}
+
+} // namespace KPRV

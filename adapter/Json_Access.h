@@ -1,0 +1,43 @@
+#pragma once
+
+#include <json/value.h>
+
+#include <stdexcept>
+#include <string>
+
+namespace KPRV {
+
+// The one place where JSON values are taken apart. The installed JSON library counts null neither as an array nor
+// as an object, turns numbers into texts without a word and fails in words of its own; callers and clients rely on
+// the rules below instead. Nothing else calls `Json::Value::as*`.
+
+/// A value of the wrong type. `what()` is "Type is not convertible to string", "... to int" or "... to uint".
+struct Not_Convertible : std::runtime_error
+{
+    using std::runtime_error::runtime_error;
+};
+
+/// True for an array and for null.
+bool isArrayOrNull(const Json::Value& value);
+/// True for an object and for null.
+bool isObjectOrNull(const Json::Value& value);
+
+// Conversions. Null gives "", 0 and false; a boolean gives "true" or "false", 1 or 0. A string is no number and a
+// number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
+
+std::string asString(const Json::Value& value);
+/// A fraction is cut off.
+int asInt(const Json::Value& value);
+/// A fraction is cut off.
+unsigned asUInt(const Json::Value& value);
+/// Never throws: a number is true unless 0; a string, an array or an object is true unless empty.
+bool asBool(const Json::Value& value);
+
+/// True if the value is an object that has the member, whatever the member holds.
+bool hasMember(const Json::Value& object, const char* name);
+/// The member, or null if it is absent or the value is no object. Never adds a member.
+const Json::Value& member(const Json::Value& object, const char* name);
+/// Element of an array, or null beyond its end.
+const Json::Value& element(const Json::Value& array, unsigned index);
+
+} // namespace KPRV
