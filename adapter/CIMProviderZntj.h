@@ -6,10 +6,10 @@
 
 namespace KPRV {
 
-// The door to the adapters: one variable per entry point of the library "libdzntj.so", named lib<Name>. They are
-// written once while the module loads and read without a lock from then on, by any thread; the library accepts
-// concurrent calls. Without the library each one holds the stub of its class, so callers never ask whether it is
-// there: a stub's answer counts as a failed one.
+// The door to the adapters: one variable per entry point of the library "libdzntj.so", named lib<Name>. They
+// are written once while the module loads and read without a lock from then on, by any thread; the library
+// accepts concurrent calls. Without the library each one holds the stub of its class, so callers never ask
+// whether it is there: a stub's answer counts as a failed one.
 
 /// Called by the library for each of its events, on any of its threads.
 using evtProcessCB = void (*)(const char* event);
@@ -48,9 +48,9 @@ extern bool gZntjLibLoaded;
 #include "adapter/Entry_Points.def"
 #undef ENTRY_POINT
 
-/// Opens the library and fills all variables; called once, while the module loads. Nothing fails: an absent library
-/// is told at DBG and leaves the stubs. A symbol that an opened library lacks is told at ERR and leaves a null
-/// variable, which is called all the same: a library has all the symbols or is not one.
+/// Opens the library and fills all variables; called once, while the module loads. Nothing fails: an absent
+/// library is told at DBG and leaves the stubs. A symbol that an opened library lacks is told at ERR and
+/// leaves a null variable, which is called all the same: a library has all the symbols or is not one.
 void setupDLLEntryPoints();
 
 } // namespace KPRV

@@ -18,7 +18,8 @@ struct Guarded_Entry
     const char* name;
     /// If set, starts each text: "<address> - libGetPortByWwn got ...".
     const char* address = nullptr;
-    /// If set, the third text is "libGetPortByWwn got default exception for <default_for>", without address in front.
+    /// If set, the third text is "libGetPortByWwn got default exception for <default_for>", without address
+    /// in front.
     const char* default_for = nullptr;
 };
 
@@ -41,10 +42,10 @@ bool guarded(Call_Site site, const Guarded_Entry& entry, Body&& body)
     }
 }
 
-/// Calls an entry point whose failure must not reach the caller. `response` is its answer; false and null if it
-/// threw. An answer may still be a bad one: see `ProviderUtil::isValidJsonResponse`.
-inline bool guarded_call(Call_Site site, const Guarded_Entry& entry, JsonReqFP call, const Json::Value& request,
-                         Json::Value& response)
+/// Calls an entry point whose failure must not reach the caller. `response` is its answer; false and null if
+/// it threw. An answer may still be a bad one: see `ProviderUtil::isValidJsonResponse`.
+inline bool guarded_call(Call_Site site, const Guarded_Entry& entry, JsonReqFP call,
+                         const Json::Value& request, Json::Value& response)
 {
     response = Json::Value();
     return guarded(site, entry, [&] { response = call(request); });

@@ -7,9 +7,9 @@
 
 namespace KPRV {
 
-// The one place where JSON values are taken apart. The installed JSON library counts null neither as an array nor
-// as an object, turns numbers into texts without a word and fails in words of its own; callers and clients rely on
-// the rules below instead. Nothing else calls `Json::Value::as*`.
+// The one place where JSON values are taken apart. The installed JSON library counts null neither as an array
+// nor as an object, turns numbers into texts without a word and fails in words of its own; callers and
+// clients rely on the rules below instead. Nothing else calls `Json::Value::as*`.
 
 /// A value of the wrong type. `what()` is "Type is not convertible to string", "... to int" or "... to uint".
 struct Not_Convertible : std::runtime_error
@@ -22,8 +22,8 @@ bool isArrayOrNull(const Json::Value& value);
 /// True for an object and for null.
 bool isObjectOrNull(const Json::Value& value);
 
-// Conversions. Null gives "", 0 and false; a boolean gives "true" or "false", 1 or 0. A string is no number and a
-// number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
+// Conversions. Null gives "", 0 and false; a boolean gives "true" or "false", 1 or 0. A string is no number
+// and a number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
 
 std::string asString(const Json::Value& value);
 /// A fraction is cut off.

@@ -1,0 +1,141 @@
+#include "adapter/Host_Calls.h"
+#include "adapter/ProviderUtil.h"
+#include "adapter/ProviderUtil_Log.h"
+
+#include <arpa/inet.h>
+
+#include <cstring>
+#include <mutex>
+
+namespace KPRV {
+
+namespace {
+
+constexpr size_t NAME_SIZE = 255;
+
+/// A text of the caller's, cut to its room.
+struct Out_Text
+{
+    char* data;
+    size_t size;
+
+    void set(const char* text)
+    {
+        if (size > 0)
+            data[0] = '\0';
+        append(text);
+    }
+    void append(const char* text)
+    {
+        const size_t used = strnlen(data, size);
+        if (used + 1 < size)
+            strncat(data, text, size - used - 1);
+    }
+};
+
+/// Asks for a name; false if there is none. The C library may leave a cut name unterminated.
+bool ask_name(int (*call)(char*, size_t), char (&name)[NAME_SIZE])
+{
+    if (call(name, sizeof name) != 0)
+        return false;
+    name[sizeof name - 1] = '\0';
+    return true;
+}
+
+enum class Lookup
+{
+    NONE,
+    LOOPBACK_ONLY,
+    FOUND
+};
+
+/// Finds the host's first address that is no loopback address.
+Lookup look_up(const char* host, Out_Text out)
+{
+    // The resolver's answer is one static record.
+    static constinit std::mutex resolver;
+    const std::lock_guard lock(resolver);
+    const hostent* entry = host_calls.gethostbyname(host);
+    if (!entry || !entry->h_addr_list || !entry->h_addr_list[0])
+        return Lookup::NONE;
+    for (char** next = entry->h_addr_list; *next; next++) {
+        in_addr address;
+        memcpy(&address, *next, sizeof address);
+        const char* text = inet_ntoa(address);
+        if (strncmp(text, "127", 3) != 0) {
+            out.set(text);
+            return Lookup::FOUND;
+        }
+    }
+    return Lookup::LOOPBACK_ONLY;
+}
+
+} // namespace
+
+int ProviderUtil::getHostInfo(char* buffer, int length)
+{
+    UTIL_SCOPE("getHostInfo");
+    Out_Text out = {buffer, length > 0 ? static_cast<size_t>(length) : 0};
+    char host[NAME_SIZE] = {};
+    if (!ask_name(host_calls.gethostname, host)) {
+        out.set("localhost");
+        UTIL_LOG(INFO, "gethostname() FAILED. hostString will be filled with localhost");
+        return 3;
+    }
+
+    const auto use_host_name = [&] {
+        out.set(host);
+        UTIL_LOG(INFO, "gethostbyname() FAILED. hostString will have hostname instead of ipAddress");
+        return 2;
+    };
+    switch (look_up(host, out)) {
+    case Lookup::NONE:
+        return use_host_name();
+    case Lookup::FOUND:
+        return 0;
+    case Lookup::LOOPBACK_ONLY:
+        break;
+    }
+
+    if (!ask_name(host_calls.gethostname, host)) {
+        UTIL_LOG(INFO, "gethostname() failed");
+        return 2;
+    }
+    out.set(host);
+    char domain[NAME_SIZE] = {};
+    if (!ask_name(host_calls.getdomainname, domain)) {
+        UTIL_LOG(INFO, "getdomainname() failed");
+        return 2;
+    }
+    // The name with its domain is tested and then dropped: callers have always seen the bare name. The test
+    // can only hold where the buffer had no room for the domain.
+    out.append(".");
+    out.append(domain);
+    if (strncmp(buffer, "localhost", out.size) == 0 && strcmp(domain, "(none)") == 0)
+        return 4;
+    return use_host_name();
+}
+
+String ProviderUtil::getHostName()
+{
+    UTIL_SCOPE("getHostName");
+    utsname name = {};
+    const int status = host_calls.uname(&name);
+    if (status < 0) {
+        UTIL_LOG(ERR, "uname() returned error = %d", status);
+        return "localhost";
+    }
+    return name.nodename;
+}
+
+String ProviderUtil::updateNamespacePath(const String& path)
+{
+    UTIL_SCOPE("updateNamespacePath");
+    char host[NAME_SIZE] = {};
+    getHostInfo(host, sizeof host);
+    String full("//", host, "/root/kaldera:");
+    full.append(path);
+    return full;
+}
+
+} // namespace KPRV

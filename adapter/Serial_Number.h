@@ -1,0 +1,15 @@
+#pragma once
+
+#include <json/value.h>
+
+#include <optional>
+#include <string>
+
+namespace KPRV {
+
+/// The serial number that the maker of an OEM card gave it: `oemSerialNum` of `hbaData`, without `partNum` at
+/// its front if that is glued to it (which can leave nothing). None if the card has no such number. Throws
+/// `Not_Convertible`.
+std::optional<std::string> oem_serial_number(const Json::Value& hba_data);
+
+} // namespace KPRV
