@@ -1,0 +1,60 @@
+"""The command line of the generator."""
+
+import argparse
+import sys
+
+from . import module, records, skeletons, tables
+from .errors import MofError
+from .flags import ASSOCIATION, INDICATION
+from .output import Output
+from .parser import parse
+from .resolver import resolve
+
+
+def provider_kind(class_):
+    if class_.flags & INDICATION:
+        return "indication"
+    return "association" if class_.flags & ASSOCIATION else "instance"
+
+
+def providers_of(classes, prefix, without):
+    """The classes that have a provider, with their kind, in the order of the catalogue."""
+    return [
+        (class_, provider_kind(class_))
+        for class_ in classes
+        if class_.name.startswith(prefix) and class_.name not in without
+    ]
+
+
+def generate(files, prefix, without=()):
+    """All generated files of the MOF files, in memory."""
+    classes = resolve(parse(files))
+    providers = providers_of(classes, prefix, without)
+    output = Output()
+    records.emit(classes, output)
+    tables.emit(classes, output)
+    skeletons.emit(providers, output)
+    module.emit(providers, output)
+    return output
+
+
+def main(arguments=None):
+    parser = argparse.ArgumentParser(prog="generate.py", description="Generates the class catalogue from MOF.")
+    parser.add_argument("mof", nargs="+", help="MOF files, in order")
+    parser.add_argument("--output", metavar="DIR", help="where the generated files go")
+    parser.add_argument("--list", action="store_true", help="print the names of the generated files, write none")
+    parser.add_argument("--provider-prefix", default="KALDERA_", help="prefix of the classes that have a provider")
+    parser.add_argument("--without-provider", action="append", default=[], metavar="CLASS")
+    options = parser.parse_args(arguments)
+    if not options.list and not options.output:
+        parser.error("--output or --list is needed")
+    try:
+        output = generate(options.mof, options.provider_prefix, options.without_provider)
+    except MofError as error:
+        print(error, file=sys.stderr)
+        return 1
+    if options.list:
+        print("\n".join(output.files))
+    else:
+        output.write(options.output)
+    return 0

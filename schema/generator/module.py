@@ -1,0 +1,91 @@
+"""module/*.cpp: dispatchers, registration records and exported factories of the providers."""
+
+from . import cpp
+
+#: Translation units that the dispatchers are dealt out to; each compiles a share of all provider headers.
+PARTS = 4
+
+PROC = (
+    "#define PROC(P) int __cimple_##P##_proc(const Registration* r, int op, void* a0, void* a1, void* a2, void* a3, "
+    "void* a4, void* a5, void* a6, void* a7) { return dispatch<P>(r, op, a0, a1, a2, a3, a4, a5, a6, a7); }"
+)
+
+#: The name of the list, then the kinds of management interface with their letters.
+INTERFACES = {
+    "instance": [("Instance", "I"), ("Method", "M")],
+    "association": [("Association", "A"), ("Instance", "I"), ("Method", "M")],
+    "indication": [("Indication", "N"), ("Method", "M")],
+}
+
+# One provider's block, and a pair of factories per kind: the long name does the work, the short one forwards.
+FACTORY_MACROS = """\
+#define EXPORT extern "C" __attribute__((visibility("default")))
+#define AREA(C) alignas(16) static char _cmpi_static_data##C##_Provider[2048];
+#define FACTORY(C, KIND, LETTER) \\
+    EXPORT CMPI##KIND##MI* C##_Provider_Create_##KIND##MI(const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*) \\
+    { \\
+        void* mi = nullptr; \\
+        cimple_cmpi_adapter('C', _cmpi_static_data##C##_Provider, &_cimple_registration_##C##_Provider, broker, context, \\
+                            #C "_Provider", LETTER, &mi); \\
+        return static_cast<CMPI##KIND##MI*>(mi); \\
+    } \\
+    EXPORT CMPI##KIND##MI* C##_Create_##KIND##MI(const CMPIBroker* broker, const CMPIContext* context, CMPIStatus* status) \\
+    { \\
+        return C##_Provider_Create_##KIND##MI(broker, context, status); \\
+    }"""
+
+
+def procs(run):
+    includes = ["runtime/Provider_Dispatch.h", "runtime/version.h"]
+    includes += [f"providers/{class_.name}_Provider.h" for class_, _ in run]
+    body = [PROC, *(f"PROC({class_.name}_Provider)" for class_, _ in run)]
+    return cpp.namespaced(includes, body)
+
+
+def registration(providers):
+    """The records, and the one initialiser that fills and links them: each takes the previous head as its next."""
+    names = [class_.name for class_, _ in providers]
+    includes = ["schema/module_registration.h", "runtime/version.h", *(f"schema/{name}.h" for name in names)]
+    body = [
+        "#define PROVIDER(C) \\",
+        "int __cimple_##C##_Provider_proc(const Registration*, int, void*, void*, void*, void*, void*, void*, void*, void*); \\",
+        "Registration _cimple_registration_##C##_Provider;",
+        *(f"PROVIDER({name})" for name in names),
+        'const char _cimple_module_name[] = "kldrprovider_Module";',
+        "const Registration* _cimple_registration_head;",
+        "static bool link_record(Registration& record, const char* name, Provider_Proc proc, const Meta_Class& meta_class)",
+        "{",
+        "record = {_cimple_module_name, name, proc, &meta_class, _cimple_registration_head};",
+        "_cimple_registration_head = &record;",
+        "return true;",
+        "}",
+        "#define LINK(C) link_record(_cimple_registration_##C##_Provider, #C \"_Provider\", __cimple_##C##_Provider_proc, C::static_meta_class)",
+        "[[maybe_unused]] static const bool _cimple_linked =",
+        "\n&& ".join(f"LINK({name})" for name in names) + ";",
+       
+    ]
+    return cpp.namespaced(includes, body)
+
+
+def factories(providers):
+    includes = [
+        "cmpi/cimple_cmpi_adapter.h",
+        "runtime/Registration.h",
+        "runtime/version.h",
+    ]
+    names = [class_.name for class_, _ in providers]
+    body = [f"extern Registration _cimple_registration_{name}_Provider;" for name in names]
+    text = cpp.namespaced(includes, body) + "using namespace KPRV;\n" + FACTORY_MACROS + "\n"
+    for class_, kind in providers:
+        text += f"AREA({class_.name})\n"
+        for interface, letter in INTERFACES[kind]:
+            text += f"FACTORY({class_.name}, {interface}, '{letter}')\n"
+    return text
+
+
+def emit(providers, output):
+    for number in range(PARTS):
+        run = providers[number * len(providers) // PARTS : (number + 1) * len(providers) // PARTS]
+        output.add(f"module/procs_{number + 1}.cpp", procs(run))
+    output.add("module/registration.cpp", registration(providers))
+    output.add("module/factories.cpp", factories(providers))
