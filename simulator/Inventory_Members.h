@@ -9,98 +9,100 @@ namespace KPRV::simulator {
 // clang-format off
 
 inline constexpr Member host_members[] = {
-    {"hostManufacturer",      Type::TEXT,     Presence::NULLABLE, "\"KLDR\""},
-    {"hostModel",             Type::TEXT,     Presence::NULLABLE, "\"Simulated host\""},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
+    {"hostManufacturer",      Type::TEXT,    Presence::NULLABLE, "\"KLDR\""},
+    {"hostModel",             Type::TEXT,    Presence::NULLABLE, "\"Simulated host\""},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member library_members[] = {
-    {"version",               Type::TEXT,     Presence::NULLABLE},
-    {"init",                  Type::ANY,      Presence::OPTIONAL},
+    {"version",               Type::TEXT,    Presence::NULLABLE},
+    {"init",                  Type::ANY,     Presence::OPTIONAL},
 };
 
 inline constexpr Member inventory_members[] = {
-    {"host",                  Type::OBJECT,   Presence::OPTIONAL, "{}"},    {"library", Type::OBJECT, Presence::OPTIONAL, "{}"},
-    {"adapters",              Type::ARRAY,    Presence::OPTIONAL, "[]"}, {"faults", Type::ARRAY, Presence::OPTIONAL, "[]"},
-    {"answers",               Type::OBJECT,   Presence::OPTIONAL, "{}"},
+    {"host",                  Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"library",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"adapters",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
+    {"faults",                Type::ARRAY,   Presence::OPTIONAL, "[]"},
+    {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
 };
 
 inline constexpr Member adapter_members[] = {
-    {"address",               Type::ADDRESS,  Presence::OPTIONAL},
-    {"hbaData",               Type::OBJECT,   Presence::REQUIRED},
-    {"driver",                Type::OBJECT,   Presence::NULLABLE, "{}"},
-    {"firmware",              Type::OBJECT,   Presence::NULLABLE, "{}"},
-    {"flashStatus",           Type::BOOL,     Presence::NULLABLE, "true"},
-    {"fcPorts",               Type::ARRAY,    Presence::OPTIONAL, "[]"},
-    {"ethPorts",              Type::ARRAY,    Presence::OPTIONAL, "[]"},
-    {"answers",               Type::OBJECT,   Presence::OPTIONAL, "{}"},
+    {"address",               Type::ADDRESS, Presence::OPTIONAL},
+    {"hbaData",               Type::OBJECT,  Presence::REQUIRED},
+    {"driver",                Type::OBJECT,  Presence::NULLABLE, "{}"},
+    {"firmware",              Type::OBJECT,  Presence::NULLABLE, "{}"},
+    {"flashStatus",           Type::BOOL,    Presence::NULLABLE, "true"},
+    {"fcPorts",               Type::ARRAY,   Presence::OPTIONAL, "[]"},
+    {"ethPorts",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
+    {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
 };
 
 inline constexpr Member hba_data_members[] = {
-    {"wwn",                   Type::WWN,      Presence::OPTIONAL},
-    {"hbaMAC",                Type::MAC,      Presence::OPTIONAL},
-    {"model",                 Type::TEXT,     Presence::NULLABLE},
-    {"serialNumber",          Type::TEXT,     Presence::NULLABLE},
-    {"portCount",             Type::COUNT,    Presence::NULLABLE},
-    {"isCNA",                 Type::BOOL,     Presence::NULLABLE},
-    {"hasEthPort",            Type::BOOL,     Presence::NULLABLE},
-    {"hbaStatus",             Type::BOOL,     Presence::NULLABLE, "true"},
-    {"oem",                   Type::TEXT,     Presence::NULLABLE, "\"\""},
-    {"fruNum",                Type::TEXT,     Presence::NULLABLE},
-    {"partNum",               Type::TEXT,     Presence::NULLABLE, "\"\""},
-    {"oemSerialNum",          Type::TEXT,     Presence::NULLABLE, "\"\""},
-    {"uuid",                  Type::TEXT,     Presence::NULLABLE, "\"\""},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
+    {"wwn",                   Type::WWN,     Presence::OPTIONAL},
+    {"hbaMAC",                Type::MAC,     Presence::OPTIONAL},
+    {"model",                 Type::TEXT,    Presence::NULLABLE},
+    {"serialNumber",          Type::TEXT,    Presence::NULLABLE},
+    {"portCount",             Type::COUNT,   Presence::NULLABLE},
+    {"isCNA",                 Type::BOOL,    Presence::NULLABLE},
+    {"hasEthPort",            Type::BOOL,    Presence::NULLABLE},
+    {"hbaStatus",             Type::BOOL,    Presence::NULLABLE, "true"},
+    {"oem",                   Type::TEXT,    Presence::NULLABLE, "\"\""},
+    {"fruNum",                Type::TEXT,    Presence::NULLABLE},
+    {"partNum",               Type::TEXT,    Presence::NULLABLE, "\"\""},
+    {"oemSerialNum",          Type::TEXT,    Presence::NULLABLE, "\"\""},
+    {"uuid",                  Type::TEXT,    Presence::NULLABLE, "\"\""},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member driver_members[] = {
-    {"storageDriverName",     Type::TEXT,     Presence::NULLABLE, "\"kldrfc\""},
-    {"storageDriverVersion",  Type::TEXT,     Presence::NULLABLE, "\"3.2.1.0\""},
-    {"networkDriverName",     Type::TEXT,     Presence::NULLABLE},
-    {"networkDriverVersion",  Type::TEXT,     Presence::NULLABLE},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
+    {"storageDriverName",     Type::TEXT,    Presence::NULLABLE, "\"kldrfc\""},
+    {"storageDriverVersion",  Type::TEXT,    Presence::NULLABLE, "\"3.2.1.0\""},
+    {"networkDriverName",     Type::TEXT,    Presence::NULLABLE},
+    {"networkDriverVersion",  Type::TEXT,    Presence::NULLABLE},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member firmware_members[] = {
-    {"version",               Type::TEXT,     Presence::NULLABLE, "\"3.2.1.0\""},
-    {"biosVersion",           Type::TEXT,     Presence::NULLABLE, "\"3.2.1.0\""},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
+    {"version",               Type::TEXT,    Presence::NULLABLE, "\"3.2.1.0\""},
+    {"biosVersion",           Type::TEXT,    Presence::NULLABLE, "\"3.2.1.0\""},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member fc_port_members[] = {
-    {"wwn",                   Type::WWN,      Presence::REQUIRED},
-    {"nodeWwn",               Type::WWN,      Presence::NULLABLE},
-    {"fcoeMac",               Type::MAC,      Presence::OPTIONAL},
-    {"PortSymbolicName",      Type::TEXT,     Presence::NULLABLE},
-    {"operatingSpeed",        Type::COUNT,    Presence::NULLABLE, "8"},
-    {"supportedPortSpeeds",   Type::COUNTS,   Presence::NULLABLE, "[8, 4, 2]"},
-    {"portTypeMOFValue",      Type::INTEGER,  Presence::NULLABLE, "10"},
-    {"maxFrameSize",          Type::INTEGER,  Presence::NULLABLE, "2112"},
-    {"portStatus",            Type::BOOL,     Presence::NULLABLE, "true"},
-    {"portStatusValue",       Type::INTEGER,  Presence::NULLABLE},
-    {"isFCoE",                Type::BOOL,     Presence::NULLABLE},
-    {"isMezz",                Type::BOOL,     Presence::NULLABLE, "false"},
-    {"beaconState",           Type::BOOL,     Presence::NULLABLE, "false"},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
-    {"answers",               Type::OBJECT,   Presence::OPTIONAL},
+    {"wwn",                   Type::WWN,     Presence::REQUIRED},
+    {"nodeWwn",               Type::WWN,     Presence::NULLABLE},
+    {"fcoeMac",               Type::MAC,     Presence::OPTIONAL},
+    {"PortSymbolicName",      Type::TEXT,    Presence::NULLABLE},
+    {"operatingSpeed",        Type::COUNT,   Presence::NULLABLE, "8"},
+    {"supportedPortSpeeds",   Type::COUNTS,  Presence::NULLABLE, "[8, 4, 2]"},
+    {"portTypeMOFValue",      Type::INTEGER, Presence::NULLABLE, "10"},
+    {"maxFrameSize",          Type::INTEGER, Presence::NULLABLE, "2112"},
+    {"portStatus",            Type::BOOL,    Presence::NULLABLE, "true"},
+    {"portStatusValue",       Type::INTEGER, Presence::NULLABLE},
+    {"isFCoE",                Type::BOOL,    Presence::NULLABLE},
+    {"isMezz",                Type::BOOL,    Presence::NULLABLE, "false"},
+    {"beaconState",           Type::BOOL,    Presence::NULLABLE, "false"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+    {"answers",               Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_port_members[] = {
-    {"mac",                   Type::MAC,      Presence::REQUIRED},
-    {"portStatus",            Type::BOOL,     Presence::NULLABLE, "true"},
-    {"portStatusValue",       Type::INTEGER,  Presence::NULLABLE},
-    {"isMezz",                Type::BOOL,     Presence::NULLABLE, "false"},
-    {"beaconState",           Type::BOOL,     Presence::NULLABLE, "false"},
-    {"ethData",               Type::OBJECT,   Presence::NULLABLE, "{}"},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
-    {"answers",               Type::OBJECT,   Presence::OPTIONAL},
+    {"mac",                   Type::MAC,     Presence::REQUIRED},
+    {"portStatus",            Type::BOOL,    Presence::NULLABLE, "true"},
+    {"portStatusValue",       Type::INTEGER, Presence::NULLABLE},
+    {"isMezz",                Type::BOOL,    Presence::NULLABLE, "false"},
+    {"beaconState",           Type::BOOL,    Presence::NULLABLE, "false"},
+    {"ethData",               Type::OBJECT,  Presence::NULLABLE, "{}"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+    {"answers",               Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_data_members[] = {
-    {"ethDev",                Type::TEXT,     Presence::NULLABLE},
-    {"ethPortStateMOFValue",  Type::COUNT,    Presence::NULLABLE},
-    {"mtu",                   Type::COUNT,    Presence::NULLABLE, "1500"},
-    {"extra",                 Type::OBJECT,   Presence::OPTIONAL},
+    {"ethDev",                Type::TEXT,    Presence::NULLABLE},
+    {"ethPortStateMOFValue",  Type::COUNT,   Presence::NULLABLE},
+    {"mtu",                   Type::COUNT,   Presence::NULLABLE, "1500"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 
 // clang-format on

@@ -136,7 +136,6 @@ void Simulator::add_fault(const Json_Text& source)
 void Simulator::clear_faults()
 {
     const std::lock_guard lock(mutex_);
-    load_from_environment();
     faults_.clear();
 }
 

@@ -1,0 +1,87 @@
+#include "tests/simulator/Simulator_Fixture.h"
+
+#include <dlfcn.h>
+#include <iterator>
+#include <set>
+
+namespace KPRV::simulator {
+namespace {
+
+constexpr const char* resolved_symbols[] = {
+#include "tests/simulator/resolved_symbols.inc"
+};
+
+const std::set<std::string> not_json = {
+    "free_hba_lib",     "get_agt_version",           "getNumberOfAdapters",
+    "registerLogMsgCb", "registerEventProcessingCb", "getRequestID"};
+
+// Every member that any entry point asks for, so that no request is refused for lacking one.
+const char* everything = R"({
+    "indexStr": "a", "wwn": "a", "pwwn": "a", "nwwn": "a", "vwwn": "a", "lwwn": "a", "hbaWwn": "a", "portWwn": "a",
+    "mac": "a", "pPortWwn": "a", "lPortWwn": "a", "rPortWwn": "a", "lunId": "0", "vfId": 0, "vfID": 0, "appId": 2,
+    "dropOldEvents": true, "requestID": "1", "enableState": true, "adapterMode": 1, "type": 0, "Node": "a",
+    "port": {}, "propArray": [], "fcPortData": {}, "paramsConfigured": [], "fcoePort": {}, "ethPort": {},
+    "portAuth": {}, "removedLunMaskData": [], "addedLunMaskData": [], "clearLunMaskData": false,
+    "addedAdvancedIoProfiles": [], "removedAdvancedIoProfiles": [], "symbolicName": "a", "vportArray": [],
+    "minBandwidth": 1, "maxBandwidth": 2, "pciFunctionIndices": [], "vNICs": [], "state": true, "file": "a",
+    "dataPattern": 1, "frameCount": 1, "mode": 1, "speed": 1, "function": "a", "stopOnError": true})";
+
+class Entry_Points_test : public Simulator_Fixture
+{
+};
+
+TEST_F(Entry_Points_test, exports_every_symbol_that_the_module_resolves)
+{
+    ASSERT_EQ(std::size(resolved_symbols), 117u);
+    EXPECT_EQ(std::set<std::string>(std::begin(resolved_symbols), std::end(resolved_symbols)).size(), 117u);
+    for (const char* name : resolved_symbols)
+        EXPECT_NO_THROW(simulator.symbol<void()>(name)) << name;
+}
+
+TEST_F(Entry_Points_test, every_json_entry_point_answers_an_object_whatever_is_asked)
+{
+    for (const char* name : resolved_symbols) {
+        if (not_json.contains(name))
+            continue;
+        for (const Json::Value& request :
+             {Json::Value(), Json::Value(Json::arrayValue), Json::Value(7), json("{}"), json(everything)}) {
+            const Json::Value answer = call(name, request);
+            EXPECT_TRUE(answer.isObject()) << name << " " << request;
+        }
+    }
+}
+
+TEST_F(Entry_Points_test, what_nothing_answers_is_refused_by_name)
+{
+    const Json::Value answer = call("getLldp", "{'mac': '02:4b:4c:20:00:00'}");
+    EXPECT_EQ(error_code(answer), 3);
+    EXPECT_EQ(answer["error"]["message"].asString(), "getLldp: not supported");
+}
+
+TEST_F(Entry_Points_test, a_request_that_lacks_a_member_is_refused)
+{
+    const Json::Value answer = call("getCompleteRemotePort", "{'pPortWwn': 'a', 'lPortWwn': 'b'}");
+    EXPECT_EQ(error_code(answer), 1);
+    EXPECT_EQ(answer["error"]["message"].asString(), "getCompleteRemotePort: the request must have rPortWwn");
+    EXPECT_EQ(error_code(call("getHbaByWwn", "{'indexStr': 'a'}")), 1);
+    EXPECT_EQ(error_code(call("getHbaByWwn", "{'wwn': 7}")), 1);
+}
+
+TEST_F(Entry_Points_test, the_fabric_statistics_are_asked_for_with_an_upper_case_d)
+{
+    EXPECT_EQ(error_code(call("getDynamicFabricStatistics", "{'wwn': 'a', 'vfID': 0}")), 3);
+    EXPECT_EQ(error_code(call("getDynamicFabricStatistics", "{'wwn': 'a', 'vfId': 0}")), 1);
+}
+
+TEST_F(Entry_Points_test, exports_nothing_of_its_own_but_entry_points_and_control_functions)
+{
+    void* library = dlopen(SIMULATOR_LIBRARY, RTLD_NOW);
+    ASSERT_NE(library, nullptr);
+    EXPECT_EQ(dlsym(library, "_ZN4KPRV9simulator9Simulator8instanceEv"), nullptr);
+    // The exception's type information is the one thing that both sides must share.
+    EXPECT_NE(dlsym(library, "_ZTIN4KPRV13HbaAgentErrorE"), nullptr);
+    dlclose(library);
+}
+
+} // namespace
+} // namespace KPRV::simulator

@@ -1,0 +1,180 @@
+#include "tests/simulator/Simulator_Fixture.h"
+
+#include <filesystem>
+#include <fstream>
+#include <unistd.h>
+
+namespace KPRV::simulator {
+namespace {
+
+struct Refusal
+{
+    const char* inventory;
+    const char* reason;
+};
+
+const std::string deep = std::string(65, '[') + std::string(65, ']');
+
+// clang-format off
+const Refusal refusals[] = {
+    // Syntax.
+    {"",                                                    "1: Syntax error: value, object or array expected."},
+    {"{\n  \"adapters\": [\n}",                             "3: Syntax error: value, object or array expected."},
+    {"{\n  \"host\": {}\n  \"library\": {}\n}",             "3: Missing ',' or '}' in object declaration"},
+    {"{}\n\n7",                                             "3: Extra non-whitespace after JSON value."},
+    {"{\"host\": {},\n\n\"host\": {}}",                     "3: Duplicate key: 'host'"},
+    {"// [[[\n/* [[[ */ \"[[[\\\"[[\"",                     "2: the inventory must be an object"},
+    {deep.c_str(),                                          "1: nested deeper than 64 levels"},
+
+    // The host.
+    {"[]",                                                  "1: the inventory must be an object"},
+    {"{\n\"adapter\": []}",                                 "2: unknown member \"adapter\" in the inventory"},
+    {"{\n\"adapters\":\n{}}",                               "3: \"adapters\" in the inventory must be an array, not {}"},
+    {"{\"host\": {\n\"hostModel\": 7}}",                    "2: \"hostModel\" in host must be a text, not 7"},
+    {"{\"host\": null}",                                    "1: \"host\" in the inventory must be an object, not null"},
+    {"{\"library\": {\n\"version\": 3}}",                   "2: \"version\" in library must be a text, not 3"},
+    {"{\"answers\": {\n\"getPort\": 1}}",                   "2: unknown entry point \"getPort\" in answers"},
+
+    // Adapters.
+    {"{\"adapters\": [\n7]}",                               "2: an adapter must be an object"},
+    {"{\"adapters\": [\n{}]}",                              "2: missing member \"hbaData\" in an adapter"},
+    {"{\"adapters\": [{\n\"hbaData\": {}}]}",               "2: missing member \"wwn\" or \"hbaMAC\" in hbaData"},
+    {"{\"adapters\": [{\"hbaData\": {\n\"wwn\": \"10:00\"}}]}",
+     "2: \"wwn\" in hbaData must be a WWN, eight colon-separated pairs of hexadecimal digits, not \"10:00\""},
+    {"{\"adapters\": [{\"hbaData\": {\n\"hbaMAC\": \"02:4b:4c:20:00:0g\"}}]}",
+     "2: \"hbaMAC\" in hbaData must be a MAC, six colon-separated pairs of hexadecimal digits, "
+     "not \"02:4b:4c:20:00:0g\""},
+    {"{\"adapters\": [{\"address\":\n\"2000024b4c100000\", \"hbaData\": {}}]}",
+     "2: \"address\" in an adapter must be a WWN or a MAC in colon form, not \"2000024b4c100000\""},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\",\n\"modle\": \"825\"}}]}",
+     "2: unknown member \"modle\" in hbaData"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\",\n\"portCount\": -1}}]}",
+     "2: \"portCount\" in hbaData must be an unsigned integer of 32 bits, not -1"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\",\n\"hbaStatus\": \"on\"}}]}",
+     "2: \"hbaStatus\" in hbaData must be true or false, not \"on\""},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"},\n\"driver\": {\"name\": \"x\"}}]}",
+     "2: unknown member \"name\" in driver"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"},\n\"firmware\": {\"bios\": \"x\"}}]}",
+     "2: unknown member \"bios\" in firmware"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"},\n\"answers\": {\"x\": 1}}]}",
+     "2: unknown entry point \"x\" in answers"},
+
+    // Ports.
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"fcPorts\": [\n{}]}]}",
+     "2: missing member \"wwn\" in an FC port"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"fcPorts\": [{\n"
+     "\"wwn\": \"10:00:02:4b:4c:20:00:00\",\n\"operatingSpeed\": 8.0}]}]}",
+     "3: \"operatingSpeed\" in an FC port must be an unsigned integer of 32 bits, not 8.0"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"fcPorts\": [{\n"
+     "\"wwn\": \"10:00:02:4b:4c:20:00:00\",\n\"supportedPortSpeeds\": [\"8\"]}]}]}",
+     "3: \"supportedPortSpeeds\" in an FC port must be an array of unsigned integers, not [\"8\"]"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"ethPorts\": [\n{}]}]}",
+     "2: missing member \"mac\" in an Ethernet port"},
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"ethPorts\": [{\n"
+     "\"mac\": \"02:4b:4c:20:00:00\", \"ethData\": {\n\"mtu\": \"big\"}}]}]}",
+     "3: \"mtu\" in ethData must be an unsigned integer of 32 bits, not \"big\""},
+
+    // Duplicates: of another adapter, in another letter case; of another port; of another adapter's port.
+    {"{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}},\n"
+     "{\"hbaData\": {\"wwn\": \"20:00:02:4B:4C:20:00:00\"}}]}",
+     "2: duplicate address \"20:00:02:4B:4C:20:00:00\""},
+    {"{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}, \"fcPorts\": [\n"
+     "{\"wwn\": \"10:00:02:4b:4c:20:00:00\"},\n{\"wwn\": \"10:00:02:4b:4c:20:00:00\"}]}]}",
+     "3: duplicate address \"10:00:02:4b:4c:20:00:00\""},
+    {"{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}},\n"
+     "{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:01\"}, \"fcPorts\": [{\"wwn\": \"20:00:02:4b:4c:20:00:00\"}]}]}",
+     "2: duplicate address \"20:00:02:4b:4c:20:00:00\""},
+
+    // Faults.
+    {"{\"faults\": [\n{\"do\": \"null\"}]}",                "2: missing member \"call\" in a fault"},
+    {"{\"faults\": [\n{\"call\": \"getHost\"}]}",           "2: missing member \"do\" in a fault"},
+    {"{\"faults\": [{\n\"call\": \"get\", \"do\": \"null\"}]}", "2: unknown entry point \"get\""},
+    {"{\"faults\": [{\"call\": \"*\",\n\"do\": \"sing\"}]}", "2: unknown fault \"sing\""},
+    {"{\"faults\": [{\"call\": \"*\", \"do\": \"null\",\n\"at\": -1}]}",
+     "2: \"at\" in a fault must be an unsigned integer of 32 bits, not -1"},
+    {"{\"faults\": [\n{\"call\": \"*\", \"do\": \"delay\"}]}",
+     "2: missing member \"milliseconds\" in a fault that does \"delay\""},
+    {"{\"faults\": [\n{\"call\": \"*\", \"do\": \"set\", \"member\": \"a\"}]}",
+     "2: missing member \"value\" in a fault that does \"set\""},
+    {"{\"faults\": [{\"call\": \"*\", \"do\": \"throw\",\n\"type\": \"long\"}]}", "2: unknown exception \"long\""},
+};
+// clang-format on
+
+std::string reason_of(Simulator_Control& simulator, const std::string& text)
+{
+    try {
+        simulator.load_text(text);
+        return "";
+    } catch (const std::runtime_error& refused) {
+        return refused.what();
+    }
+}
+
+class Refusals_test : public Simulator_Fixture
+{
+};
+
+TEST_F(Refusals_test, each_mistake_is_told_with_its_line)
+{
+    for (const Refusal& refusal : refusals)
+        EXPECT_EQ(reason_of(simulator, refusal.inventory), std::string("inventory:") + refusal.reason);
+}
+
+TEST_F(Refusals_test, sixty_four_levels_are_not_too_many)
+{
+    std::string text = "{\"answers\": {\"getHost\": " + std::string(62, '[') + std::string(62, ']') + "}}";
+    EXPECT_EQ(reason_of(simulator, text), "");
+}
+
+TEST_F(Refusals_test, a_refused_inventory_leaves_no_adapters_and_initialising_says_why)
+{
+    simulator.load_file(inventory("twins.json"));
+    const std::string reason = reason_of(simulator, "{\"host\": 7}");
+    EXPECT_EQ(simulator.status()["problem"].asString(), reason);
+    EXPECT_EQ(simulator.symbol<unsigned()>("getNumberOfAdapters")(), 0u);
+    const Json::Value answer = call("init_hba_lib", "{'appId': 2}");
+    EXPECT_EQ(error_code(answer), 4);
+    EXPECT_EQ(answer["error"]["message"].asString(), reason);
+    simulator.load_file(inventory("twins.json"));
+    EXPECT_EQ(call("init_hba_lib", "{'appId': 2}"), json("{'result': 0}"));
+}
+
+TEST_F(Refusals_test, a_refused_file_of_the_environment_is_told_once_on_standard_error)
+{
+    const auto path = std::filesystem::current_path() / ("refused_" + std::to_string(getpid()) + ".json");
+    std::ofstream(path) << "{\n\"adapters\": 7}";
+    setenv("KLDR_SIMULATOR_INVENTORY", path.c_str(), 1);
+    simulator.reset();
+    testing::internal::CaptureStderr();
+    testing::internal::CaptureStdout();
+    const Json::Value answer = call("init_hba_lib", "{'appId': 2}");
+    call("getHost");
+    const std::string reason = path.string() + ":2: \"adapters\" in the inventory must be an array, not 7";
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "simulator: " + reason + "\n");
+    EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
+    EXPECT_EQ(answer["error"]["message"].asString(), reason);
+    std::filesystem::remove(path);
+}
+
+TEST_F(Refusals_test, a_file_that_is_not_there_is_refused)
+{
+    try {
+        simulator.load_file("no/such/file.json");
+        FAIL();
+    } catch (const std::runtime_error& refused) {
+        EXPECT_STREQ(refused.what(), "no/such/file.json:0: cannot be read: No such file or directory");
+    }
+}
+
+TEST_F(Refusals_test, a_fault_that_is_added_is_checked_like_one_of_the_inventory)
+{
+    try {
+        simulator.add_fault("{\"call\": \"*\",\n\"do\": \"sing\"}");
+        FAIL();
+    } catch (const std::runtime_error& refused) {
+        EXPECT_STREQ(refused.what(), "fault:2: unknown fault \"sing\"");
+    }
+}
+
+} // namespace
+} // namespace KPRV::simulator

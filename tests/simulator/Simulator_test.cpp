@@ -1,0 +1,105 @@
+#include "tests/simulator/Simulator_Fixture.h"
+
+#include <atomic>
+#include <dlfcn.h>
+#include <thread>
+
+namespace KPRV::simulator {
+namespace {
+
+class Simulator_test : public Simulator_Fixture
+{
+};
+
+TEST_F(Simulator_test, records_every_call_with_its_request_in_order)
+{
+    version();
+    call("init_hba_lib", "{'appId': 2}");
+    call("getHbaByWwn", "{'wwn': 'nobody'}");
+    simulator.symbol<unsigned()>("getNumberOfAdapters")();
+    const std::vector<Simulator_Call> calls = simulator.calls();
+    EXPECT_EQ(simulator.call_names(), (std::vector<std::string>{"get_agt_version", "init_hba_lib",
+                                                                "getHbaByWwn", "getNumberOfAdapters"}));
+    EXPECT_TRUE(calls[0].request.isNull());
+    EXPECT_EQ(calls[1].request, json("{'appId': 2}"));
+    EXPECT_EQ(simulator.requests("getHbaByWwn").at(0), json("{'wwn': 'nobody'}"));
+    simulator.clear_calls();
+    EXPECT_TRUE(simulator.calls().empty());
+}
+
+TEST_F(Simulator_test, records_a_call_that_throws)
+{
+    simulator.add_fault(R"({"call": "getHost", "do": "throw", "type": "int"})");
+    EXPECT_ANY_THROW(call("getHost"));
+    EXPECT_EQ(simulator.requests("getHost").size(), 1u);
+}
+
+TEST_F(Simulator_test, forgets_the_oldest_of_very_many_calls)
+{
+    call("getServerTime");
+    for (int number = 0; number < 65536; ++number)
+        integer("getRequestID");
+    EXPECT_EQ(simulator.calls().size(), 65536u);
+    EXPECT_TRUE(simulator.requests("getServerTime").empty());
+}
+
+TEST_F(Simulator_test, a_call_that_is_held_lets_the_others_go_on)
+{
+    simulator.add_fault(R"({"call": "getHost", "do": "hold"})");
+    std::atomic<bool> answered = false;
+    std::thread caller([&] {
+        call("getHost");
+        answered = true;
+    });
+    EXPECT_TRUE(simulator.wait_for_calls("getHost", 1));
+    EXPECT_TRUE(call("getGlobalInfo").isObject());
+    EXPECT_FALSE(answered);
+    EXPECT_FALSE(simulator.wait_for_calls("getHost", 2, 1));
+    // A release is for those who wait by then, and a recorded caller may be a step away from it.
+    while (!answered)
+        simulator.release();
+    caller.join();
+}
+
+TEST_F(Simulator_test, many_threads_may_call_at_once)
+{
+    simulator.load_file(inventory("demo.json"));
+    const char* wwn = "10:00:02:4b:4c:10:00:00";
+    std::atomic<int> wrong = 0;
+    const auto work = [&](bool on) {
+        Json::Value request;
+        request["indexStr"] = wwn;
+        request["port"]["beaconState"] = on;
+        request["propArray"].append("beaconState");
+        Json::Value question;
+        question["wwn"] = wwn;
+        for (int turn = 0; turn < 200; ++turn) {
+            wrong += call("setPortByWwn", request)["status"] != Json::Value(0);
+            wrong += !call("getPortByWwn", question)["beaconState"].isBool();
+            wrong += call("getGlobalInfo")["numOfAdapters"] != Json::Value(3);
+        }
+    };
+    std::vector<std::thread> threads;
+    for (int number = 0; number < 4; ++number)
+        threads.emplace_back(work, number % 2 == 0);
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(wrong, 0);
+    EXPECT_EQ(simulator.calls().size(), 4u * 200 * 3);
+}
+
+TEST_F(Simulator_test, one_that_is_open_is_found_by_its_bare_name)
+{
+    void* library = dlopen("libdzntj.so", RTLD_NOW | RTLD_NOLOAD);
+    EXPECT_NE(library, nullptr);
+    dlclose(library);
+}
+
+TEST_F(Simulator_test, a_library_or_a_function_that_is_not_there_is_told)
+{
+    EXPECT_THROW(Simulator_Control("no/such/library.so"), std::runtime_error);
+    EXPECT_THROW(simulator.symbol<void()>("getNothing"), std::runtime_error);
+}
+
+} // namespace
+} // namespace KPRV::simulator
