@@ -41,6 +41,9 @@ enum Flag : uint32
     FLAG_EMBEDDED_INSTANCE = 1u << 31,
 };
 
+/// Mask of the look-ups that take any kind of feature.
+inline constexpr uint32 ANY_FEATURE = FLAG_PROPERTY | FLAG_REFERENCE | FLAG_METHOD;
+
 inline constexpr uint32 FLAG_EMBEDDED = FLAG_EMBEDDED_OBJECT | FLAG_EMBEDDED_INSTANCE;
 
 inline constexpr uint32 num_flag_names = 32;

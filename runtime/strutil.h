@@ -13,7 +13,17 @@ size_t strlcat(char* dest, const char* src, size_t size);
 /// Folds "A" to "Z" and leaves every other byte: case folding of CIM names.
 extern const uint8 __lower[256];
 
+/// Equality of the first n bytes, or up to a zero byte in both, with `__lower` folded. It does not ask the
+/// locale, which belongs to the server: under some of them "I" and "i" are different letters.
+bool folded_eq(const char* a, const char* b, size_t n);
+
 /// Case-insensitive equality of CIM names. The first characters are compared before a call is paid for.
-bool name_eq(const char* a, const char* b);
+inline bool name_eq(const char* a, const char* b)
+{
+    if (__lower[static_cast<uint8>(*a)] != __lower[static_cast<uint8>(*b)])
+        return false;
+    // Names of one binary are mostly the very same literal.
+    return a == b || folded_eq(a, b, ~size_t(0));
+}
 
 } // namespace KPRV
