@@ -1,0 +1,163 @@
+#include "runtime/Instance.h"
+
+#include "runtime/Atomic.h"
+#include "runtime/features.h"
+#include "runtime/type_dispatch.h"
+
+#include <cstring>
+#include <new>
+
+namespace KPRV {
+
+constinit const Meta_Class Instance::static_meta_class = {
+    {{0, FLAG_CLASS, "Instance", nullptr, 0}}, nullptr, 0, sizeof(Instance), nullptr, nullptr, 0, nullptr};
+
+namespace {
+
+/// Elements of text types are `const char*` in a default.
+template <class T>
+__Array_Rep* array_of_texts(const Meta_Value* value)
+{
+    const char* const* texts = static_cast<const char* const*>(value->array_value.elements);
+    __Array_Rep* rep;
+    __construct(rep, __Array_Traits_Factory<T>::traits());
+    __reserve(rep, value->array_value.num_elements);
+    for (uint32 i = 0; i < value->array_value.num_elements; i++) {
+        const T element(texts[i]);
+        __append(rep, &element, 1);
+    }
+    return rep;
+}
+
+__Array_Rep* default_array(Type type, const Meta_Value* value)
+{
+    return visit_storage(
+        type, [value] { return array_of_texts<String>(value); },
+        [value] { return array_of_texts<Datetime>(value); },
+        [type, value] {
+            __Array_Rep* rep;
+            __construct(rep, __cim_array_traits[type]);
+            __append(rep, value->array_value.elements, value->array_value.num_elements);
+            return rep;
+        });
+}
+
+/// Builds the cell of one feature.
+struct Constructor
+{
+    Instance* instance;
+    bool defaults;
+
+    void operator()(Scalar_Feature f) const
+    {
+        void* value = f.value(instance);
+        const Meta_Value* literal = defaults ? f.meta->value : nullptr;
+        visit_storage(
+            f.type(), [=] { literal ? new (value) String(literal->string_value) : new (value) String(); },
+            [=] { literal ? new (value) Datetime(literal->string_value) : new (value) Datetime(); },
+            [=] {
+                if (literal)
+                    memcpy(value, literal, type_size[f.type()]);
+            });
+        if (defaults)
+            f.null(instance) = literal == nullptr;
+    }
+    void operator()(Array_Feature f) const
+    {
+        const Meta_Value* literal = defaults ? f.meta->value : nullptr;
+        if (literal)
+            f.array(instance) = default_array(f.type(), literal);
+        else
+            __construct(f.array(instance), __cim_array_traits[f.type()]);
+        if (defaults)
+            f.null(instance) = literal == nullptr;
+    }
+    // References have no defaults, and their null bytes are left alone, with defaults too.
+    void operator()(Reference_Feature f) const { f.target(instance) = nullptr; }
+    void operator()(Reference_Array_Feature f) const { new (&f.targets(instance)) Array<Instance*>(); }
+    void operator()(Method_Feature) const {}
+};
+
+/// Releases what the cell of one feature holds.
+struct Destructor
+{
+    Instance* instance;
+
+    void operator()(Scalar_Feature f) const
+    {
+        void* value = f.value(instance);
+        visit_storage(
+            f.type(), [=] { static_cast<String*>(value)->~String(); },
+            [=] { static_cast<Datetime*>(value)->~Datetime(); }, [] {});
+    }
+    void operator()(Array_Feature f) const { __destruct(f.array(instance)); }
+    void operator()(Reference_Feature f) const { unref(f.target(instance)); }
+    void operator()(Reference_Array_Feature f) const
+    {
+        for (Instance* target : f.targets(instance))
+            unref(target);
+        f.targets(instance).~Array();
+    }
+    void operator()(Method_Feature) const {}
+};
+
+} // namespace
+
+Instance* create(const Meta_Class* meta_class, bool defaults)
+{
+    Instance* instance = static_cast<Instance*>(::operator new(meta_class->size));
+    __default_construct(meta_class, instance, true, defaults);
+    return instance;
+}
+
+Instance* create(const Meta_Method* meta_method)
+{
+    return create(as_class(meta_method), false);
+}
+
+void __default_construct(const Meta_Class* meta_class, Instance* instance, bool clear, bool defaults)
+{
+    ref(meta_class);
+    if (clear)
+        memset(static_cast<void*>(instance), 0, meta_class->size);
+    instance->__magic = INSTANCE_MAGIC;
+    instance->__refs = 1;
+    instance->__meta_class = meta_class;
+    new (&instance->__name_space) String();
+    for (const Meta_Feature* feature : features_of(meta_class))
+        visit_feature(feature, Constructor{instance, defaults});
+}
+
+void __destruct(Instance* instance)
+{
+    for (const Meta_Feature* feature : features_of(instance->__meta_class))
+        visit_feature(feature, Destructor{instance});
+    unref(instance->__meta_class);
+    instance->__name_space.~String();
+}
+
+void ref(const Instance* instance)
+{
+    if (instance)
+        atomic_inc(const_cast<Instance*>(instance)->__refs);
+}
+
+void unref(const Instance* instance)
+{
+    if (instance && atomic_dec_and_test(const_cast<Instance*>(instance)->__refs))
+        destroy(const_cast<Instance*>(instance));
+}
+
+void destroy(Instance* instance)
+{
+    __destruct(instance);
+    ::operator delete(instance);
+}
+
+void destroyer(Instance* instance)
+{
+    if (instance)
+        destroy(instance);
+}
+
+} // namespace KPRV

@@ -1,0 +1,61 @@
+#include "runtime/Instance.h"
+
+#include "runtime/features.h"
+
+namespace KPRV {
+
+void __visit(Instance* instance, void (*function)(Instance* instance, void* data), void* data)
+{
+    if (!instance)
+        return;
+    function(instance, data);
+    for (const Meta_Feature* feature : features_of(instance->__meta_class)) {
+        visit_feature(feature, Overloaded{
+                                   [=](Reference_Feature f) { __visit(f.target(instance), function, data); },
+                                   [=](Reference_Array_Feature f) {
+                                       for (Instance* target : f.targets(instance))
+                                           __visit(target, function, data);
+                                   },
+                                   [](auto) {},
+                               });
+    }
+}
+
+namespace {
+
+struct Name_Space_Giver
+{
+    String name_space;
+    bool force;
+
+    static void give(Instance* instance, void* data)
+    {
+        const Name_Space_Giver* giver = static_cast<const Name_Space_Giver*>(data);
+        if (giver->force || instance->__name_space.empty())
+            instance->__name_space = giver->name_space;
+    }
+};
+
+} // namespace
+
+void __set_name_space_recursive(Instance* instance, const char* name_space, bool force)
+{
+    // One text for all of them.
+    Name_Space_Giver giver{String(name_space), force};
+    __visit(instance, Name_Space_Giver::give, &giver);
+}
+
+void __create_refs(Instance* instance)
+{
+    for (const Meta_Feature* feature : features_of(instance->__meta_class)) {
+        visit_feature(feature, Overloaded{
+                                   [=](Reference_Feature f) {
+                                       if (!f.target(instance))
+                                           f.target(instance) = create(f.meta->meta_class, true);
+                                   },
+                                   [](auto) {},
+                               });
+    }
+}
+
+} // namespace KPRV
