@@ -3,6 +3,7 @@
 #include "runtime/Array.h"
 #include "runtime/Datetime.h"
 #include "runtime/Instance.h"
+#include "runtime/type_dispatch.h"
 
 #include <cstdio>
 
@@ -32,23 +33,56 @@ public:
     void clear();
 
     // clang-format off
-    void set_value(boolean x); void set_value(uint8 x);  void set_value(sint8 x);  void set_value(uint16 x);
-    void set_value(sint16 x);  void set_value(uint32 x); void set_value(sint32 x); void set_value(uint64 x);
-    void set_value(sint64 x);  void set_value(real32 x); void set_value(real64 x); void set_value(char16 x);
-    void set_value(const String& x); void set_value(const char* x); void set_value(const Datetime& x);
+    void set_value(boolean x) { _set(x); }
+    void set_value(uint8 x)   { _set(x); }
+    void set_value(sint8 x)   { _set(x); }
+    void set_value(uint16 x)  { _set(x); }
+    void set_value(sint16 x)  { _set(x); }
+    void set_value(uint32 x)  { _set(x); }
+    void set_value(sint32 x)  { _set(x); }
+    void set_value(uint64 x)  { _set(x); }
+    void set_value(sint64 x)  { _set(x); }
+    void set_value(real32 x)  { _set(x); }
+    void set_value(real64 x)  { _set(x); }
+    void set_value(char16 x)  { _set(x); }
+    void set_value(const String& x)   { _set(x); }
+    void set_value(const char* x)     { _set(String(x)); }
+    void set_value(const Datetime& x) { _set(x); }
     // clang-format on
-    /// Takes over the caller's count.
+    /// Takes over the caller's count. Null is a value here: `null` stays false.
     void set_value(Instance* x);
     template <class T>
-    void set_value(const Array<T>& x);
+    void set_value(const Array<T>& x)
+    {
+        _set_array(array_type<T>, reinterpret_cast<const __Array&>(x).rep);
+    }
     /// Takes over the caller's count on each element.
-    void set_value(const Array<Instance*>& x);
+    void set_value(const Array<Instance*>& x)
+    {
+        _set_array(INSTANCE_ARRAY, reinterpret_cast<const __Array&>(x).rep);
+    }
+    /// Null of a known type: zero, an empty text or array, no instance.
+    void set_null(Type x);
 
     /// Copies out; -1 if the type is another one (nothing is widened), and `x` is left alone.
     template <class T>
-    int get_value(T& x) const;
+    int get_value(T& x) const
+    {
+        if (type != static_cast<Type>(Type_Code<T>::value))
+            return -1;
+        x = _as<T>();
+        return 0;
+    }
     template <class T>
-    int get_value(Array<T>& x) const;
+    int get_value(Array<T>& x) const
+    {
+        return _get_array(array_type<T>, reinterpret_cast<__Array&>(x).rep);
+    }
+    /// Hands the elements out without raising their counts.
+    int get_value(Array<Instance*>& x) const
+    {
+        return _get_array(INSTANCE_ARRAY, reinterpret_cast<__Array&>(x).rep);
+    }
     /// Hands the pointer out without raising the count.
     int get_value(Instance*& x) const;
 
@@ -65,12 +99,42 @@ public:
     bool null = false;
 
 private:
-    union
+    template <class T>
+    static constexpr Type array_type = static_cast<Type>(ARRAY_BIT |
+                                                         static_cast<sint32>(Type_Code<T>::value));
+
+    template <class T>
+    T& _as()
     {
-        uint64 _bits = 0;
-        alignas(8) unsigned char _bytes[8];
-    };
-    friend struct Value_Access;
+        return *reinterpret_cast<T*>(_bytes);
+    }
+    template <class T>
+    const T& _as() const
+    {
+        return *reinterpret_cast<const T*>(_bytes);
+    }
+
+    template <class T>
+    void _set(const T& x)
+    {
+        // Copied first: it may lie in what is released.
+        const T hold(x);
+        _release();
+        new (_bytes) T(hold);
+        _become(static_cast<Type>(Type_Code<T>::value));
+    }
+    void _set_array(Type x, const __Array_Rep* rep);
+    int _get_array(Type x, __Array_Rep*& rep) const;
+    void _become(Type x)
+    {
+        type = x;
+        null = false;
+    }
+    void _release();
+    void _copy_from(const Value& x);
+
+    /// Any scalar, a `String` or `Datetime` handle, an `Instance*`, an array handle.
+    alignas(8) unsigned char _bytes[8] = {};
 };
 
 /// Upper-case name for printing, such as "UINT8_ARRAY".

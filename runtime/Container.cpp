@@ -1,0 +1,73 @@
+#include "runtime/Container.h"
+
+#include "runtime/features.h"
+#include "runtime/log.h"
+
+namespace KPRV {
+
+Container::~Container() = default;
+
+/// Nulls never leave the instance, and methods have no value.
+static bool has_value(const Instance* instance, const Meta_Feature* feature)
+{
+    return visit_feature(feature, Overloaded{
+                                      [=](Reference_Feature f) { return f.target(instance) != nullptr; },
+                                      [](Method_Feature) { return false; },
+                                      [=](auto f) { return f.null(instance) == 0; },
+                                  });
+}
+
+int Container::convert(const Instance* instance, uint32 mask)
+{
+    if (!instance) {
+        LOG_CONVERSION(WARN, "ignored null instance arg");
+        return -1;
+    }
+    const Meta_Class* meta_class = instance->__meta_class;
+    for (const Meta_Feature* feature : features_of(meta_class)) {
+        if ((mask && !(feature->flags & mask)) || !has_value(instance, feature))
+            continue;
+        Value value;
+        if (value.set(instance, feature) != 0) {
+            LOG_CONVERSION(WARN, "unexpected failure: %s.%s", meta_class->name, feature->name);
+            continue;
+        }
+        if (set_value(feature->name, value, feature->flags) != 0)
+            LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
+    }
+    return 0;
+}
+
+int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& instance)
+{
+    if (!instance)
+        instance = create(meta_class, false);
+    __set_null_flags(instance, true, true, 1);
+
+    const uint32 size = get_size();
+    for (uint32 i = 0; i < size; i++) {
+        String name;
+        if (get_name(i, name) != 0) {
+            LOG_CONVERSION(WARN, "get_name() failed: class=%s, index=%u", meta_class->name, i);
+            continue;
+        }
+        const Meta_Feature* feature = find_feature(meta_class, name.c_str(), FLAG_PROPERTY | FLAG_REFERENCE);
+        if (!feature) {
+            LOG_CONVERSION(WARN, "unknown feature: %s.%s", meta_class->name, name.c_str());
+            continue;
+        }
+        if (mask && !(feature->flags & mask))
+            continue;
+        const Value::Type type = type_of(feature);
+        if (type == Value::NONE) {
+            LOG_CONVERSION(WARN, "unexpected error: %s.%s", meta_class->name, feature->name);
+            continue;
+        }
+        Value value;
+        if (get_value(i, type, value) != 0 || value.get(instance, feature) != 0)
+            LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
+    }
+    return 0;
+}
+
+} // namespace KPRV

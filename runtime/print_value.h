@@ -1,0 +1,19 @@
+#pragma once
+
+#include "runtime/Array.h"
+
+#include <cstdio>
+
+namespace KPRV {
+
+/// Writes the text between double quotes, with tab, newline, form feed, carriage return and the double quote
+/// as backslash sequences, and all else as it is.
+void fprint_string(FILE* file, const char* text);
+
+/// Writes a value of a cell or a `Value`: "true", digits, "%f", 'c' or 0x%04X, or a quoted text.
+void fprint_scalar_value(FILE* file, Type type, const void* value);
+
+/// Writes "{ ", the elements joined by ", ", " }"; an empty array is "{ }".
+void fprint_array_value(FILE* file, Type type, const __Array_Rep* array);
+
+} // namespace KPRV
