@@ -23,9 +23,9 @@ Simulator& Simulator::instance()
 Json::Value Simulator::answer(Entry entry, const Json::Value& request)
 {
     const Entry_Row& row = entry_rows()[static_cast<std::size_t>(entry)];
-    const std::vector<Fault> faults = striking_faults(row, request);
-    wait_out(faults);
-    for (const Fault& fault : faults)
+    const Strike strike = record(row, request);
+    wait_out(strike);
+    for (const Fault& fault : strike.faults)
         if (replaces_answer(fault.kind))
             return replaced_answer(fault);
     Json::Value answer;
@@ -33,34 +33,34 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
         const std::lock_guard lock(mutex_);
         answer = answer_by_row(state_, row, request);
     }
-    for (const Fault& fault : faults)
+    for (const Fault& fault : strike.faults)
         if (fault.kind == Fault_Kind::REMOVE || fault.kind == Fault_Kind::SET)
             edit_answer(fault, answer);
     return answer;
 }
 
-std::vector<Fault> Simulator::striking_faults(const Entry_Row& row, const Json::Value& request)
+Simulator::Strike Simulator::record(const Entry_Row& row, const Json::Value& request)
 {
     const std::lock_guard lock(mutex_);
     load_from_environment();
     recorder_.add(row.symbol, request);
     called_.notify_all();
-    std::vector<Fault> striking;
+    Strike strike{{}, releases_};
     for (Fault& fault : faults_)
         if (strikes(fault, row.symbol, request))
-            striking.push_back(fault);
-    return striking;
+            strike.faults.push_back(fault);
+    return strike;
 }
 
-void Simulator::wait_out(const std::vector<Fault>& faults)
+void Simulator::wait_out(const Strike& strike)
 {
-    for (const Fault& fault : faults) {
+    for (const Fault& fault : strike.faults) {
         if (fault.kind == Fault_Kind::DELAY)
             std::this_thread::sleep_for(std::chrono::milliseconds(fault.words["milliseconds"].asUInt()));
         if (fault.kind != Fault_Kind::HOLD)
             continue;
         std::unique_lock lock(mutex_);
-        released_.wait(lock, [&, before = releases_] { return releases_ != before; });
+        released_.wait(lock, [&] { return releases_ != strike.releases; });
     }
 }
 

@@ -38,7 +38,7 @@ public:
     void add_fault(const Json_Text& source);
     void clear_faults();
 
-    /// Lets every call go that a fault holds at this moment.
+    /// Lets every recorded call go that a fault holds.
     void release();
 
     /// Waits until `count` calls of the entry point are recorded. False if that takes too long.
@@ -57,8 +57,15 @@ public:
 private:
     void load_from_environment();
     void put_in_place(const Json_Text& source);
-    std::vector<Fault> striking_faults(const Entry_Row& row, const Json::Value& request);
-    void wait_out(const std::vector<Fault>& faults);
+
+    // The faults that strike a call, and the count of releases when it came in: the next one is its.
+    struct Strike
+    {
+        std::vector<Fault> faults;
+        unsigned releases;
+    };
+    Strike record(const Entry_Row& row, const Json::Value& request);
+    void wait_out(const Strike& strike);
 
     std::mutex mutex_;
     std::condition_variable called_;

@@ -42,7 +42,7 @@ public:
     void add_fault(const std::string& fault);
     void clear_faults();
 
-    /// Lets the calls go that a "hold" fault holds at this moment.
+    /// Lets every recorded call go that a "hold" fault holds.
     void release();
 
     /// Waits until the entry point has been called so often. False if that takes too long.

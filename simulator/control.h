@@ -26,7 +26,7 @@ SIMULATOR_EXPORT void simulator_unload(void);
 SIMULATOR_EXPORT const char* simulator_add_fault(const char* json);
 SIMULATOR_EXPORT void simulator_clear_faults(void);
 
-/* Lets every call go that a "hold" fault holds at this moment. */
+/* Lets every recorded call go that a "hold" fault holds. */
 SIMULATOR_EXPORT void simulator_release(void);
 
 /* Waits until `count` calls of the entry point are recorded; 0 if that takes too long. A call that
