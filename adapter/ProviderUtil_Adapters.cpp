@@ -1,3 +1,4 @@
+#include "adapter/Adapter_List.h"
 #include "adapter/Ethernet_Port_Query.h"
 #include "adapter/Guarded_Call.h"
 #include "adapter/Json_Access.h"
@@ -20,32 +21,12 @@ Guarded_Entry adapter_entry(const String& address)
     return {"libGetHbaByWwn", address.c_str()};
 }
 
-/// The list of adapter addresses, or null, told at ERR.
-const Json::Value* address_list(const Json::Value& response)
-{
-    if (ProviderUtil::isValidJsonResponse(response) && hasMember(response, "indexStrings") &&
-        isArrayOrNull(response["indexStrings"]))
-        return &response["indexStrings"];
-    UTIL_LOG(ERR, "libGetAllAdaptersIndexString returns NULL.");
-    return nullptr;
-}
-
-/// Address of an adapter by its place in the list; empty, told at ERR, if it is no text.
-String address_at(const Json::Value& list, unsigned index)
-{
-    String address;
-    guarded(UTIL_HERE, {"libGetAllAdaptersIndexString"},
-            [&] { address = asString(element(list, index)).c_str(); });
-    return address;
-}
-
 } // namespace
 
 int ProviderUtil::getNumberOfAdapters(Json::Value& out)
 {
     UTIL_SCOPE("getNumberOfAdapters");
-    out = libGetAllAdaptersIndexString(Json::Value());
-    const Json::Value* list = address_list(out);
+    const Json::Value* list = query_adapter_list(UTIL_HERE, out);
     if (!list)
         return -1;
     const int count = static_cast<int>(list->size());
@@ -56,8 +37,8 @@ int ProviderUtil::getNumberOfAdapters(Json::Value& out)
 String ProviderUtil::getAddrByAdapterId(int id)
 {
     UTIL_SCOPE("getAddrByAdapterId");
-    const Json::Value response = libGetAllAdaptersIndexString(Json::Value());
-    const Json::Value* list = address_list(response);
+    Json::Value response;
+    const Json::Value* list = query_adapter_list(UTIL_HERE, response);
     if (!list || list->empty())
         return String();
     const unsigned wanted = static_cast<unsigned>(id);
@@ -65,7 +46,7 @@ String ProviderUtil::getAddrByAdapterId(int id)
         UTIL_LOG(INFO, "numOfAdapters = %u. Id = %u", list->size(), wanted);
         return String();
     }
-    return address_at(*list, wanted - 1);
+    return adapter_address(UTIL_HERE, *list, wanted - 1);
 }
 
 int ProviderUtil::getAdapterDetails(const String& address, Json::Value& out)
@@ -175,7 +156,7 @@ int ProviderUtil::checkIfThisAdapterModelPresent(const char* model)
     }
     const Json::Value& list = response["indexStrings"];
     for (int i = 0; i < count; i++) {
-        const String address = address_at(list, static_cast<unsigned>(i));
+        const String address = adapter_address(UTIL_HERE, list, static_cast<unsigned>(i));
         Json::Value adapter;
         if (getAdapterDetails(address, adapter) != 0) {
             UTIL_LOG(INFO, "Unable to get Adapter info %d - %s", i + 1, address.c_str());

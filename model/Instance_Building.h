@@ -1,0 +1,32 @@
+#pragma once
+
+#include "runtime/Array.h"
+#include "runtime/Instance.h"
+
+#include <initializer_list>
+#include <string>
+
+namespace KPRV {
+
+/// A fresh instance with a count of 1 in which every property is null, those with a default in the schema
+/// too: what a builder does not set is not known.
+template <class T>
+T* create_null()
+{
+    T* instance = create<T>(false);
+    clear(instance);
+    return instance;
+}
+
+template <class T>
+Array<T> array_of(std::initializer_list<T> elements)
+{
+    return Array<T>(elements.begin(), static_cast<uint32>(elements.size()));
+}
+
+inline String to_String(const std::string& text)
+{
+    return String(text.data(), static_cast<uint32>(text.size()));
+}
+
+} // namespace KPRV
