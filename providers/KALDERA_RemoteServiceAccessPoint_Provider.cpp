@@ -13,7 +13,7 @@ public:
     {
         LOG_SCOPE("enum_instances");
         // The access point comes and goes with its process, so none is no failure.
-        Instance_List list(fc_hba_instances(REMOTESERVICEACCESSPOINT));
+        List<KALDERA_RemoteServiceAccessPoint> list(fc_hba_instances(REMOTESERVICEACCESSPOINT));
         if (list.empty())
             return SAYING(WARN, "Warning: No service is available").answer(ENUM_INSTANCES_OK);
         return deliver_one(list, *handler, SAYING(ERR, "Error: Invalid mapping information"),

@@ -33,36 +33,38 @@ struct Message
 
 /// Owner of the elements that a manager hands out: what was not delivered is destroyed, also when an
 /// exception passes.
-class Instance_List
+template <class T>
+class List
 {
 public:
-    explicit Instance_List(const Array<Instance*>& instances) : _instances(instances) {}
-    ~Instance_List()
+    explicit List(const Array<Instance*>& instances) : _instances(instances) {}
+    ~List()
     {
-        for (uint32 i = _next; i < _instances.size(); i++)
-            destroyer(_instances[i]);
+        for (Instance* instance : _instances)
+            destroyer(instance);
     }
-    Instance_List(const Instance_List&) = delete;
-    Instance_List& operator=(const Instance_List&) = delete;
+    List(const List&) = delete;
+    List& operator=(const List&) = delete;
 
     uint32 size() const { return _instances.size(); }
     bool empty() const { return size() == 0; }
+    /// Null for an element that is no T.
+    const T* operator[](uint32 i) const { return cast<T>(const_cast<const Instance*>(_instances[i])); }
 
-    /// Hands a clone of each element of the class to the handler, in order. The element itself outlives the
-    /// handler's call.
-    template <class T>
+    /// Hands a clone of each element to the handler, in order. The element itself outlives the handler's
+    /// call.
     void deliver(Enum_Instances_Handler<T>& handler)
     {
-        for (; _next < _instances.size(); _next++) {
-            if (const T* instance = cast<T>(_instances[_next]))
-                handler.handle(clone_of(instance));
-            destroyer(_instances[_next]);
+        for (Instance*& instance : _instances) {
+            if (const T* element = cast<T>(const_cast<const Instance*>(instance)))
+                handler.handle(clone_of(element));
+            destroyer(instance);
+            instance = nullptr;
         }
     }
 
 private:
     Array<Instance*> _instances;
-    uint32 _next = 0;
 };
 
 /// Delivers the list, whatever its length; an empty one is said and is a success.
@@ -70,7 +72,7 @@ template <class T>
 Enum_Instances_Status deliver_all(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
                                   const Message& when_empty)
 {
-    Instance_List list(instances);
+    List<T> list(instances);
     if (list.empty())
         return when_empty.answer(ENUM_INSTANCES_OK);
     when_empty.trace("Returning instances");
@@ -80,7 +82,7 @@ Enum_Instances_Status deliver_all(const Array<Instance*>& instances, Enum_Instan
 
 /// Delivers a list of exactly one; any other count is said and answered with `otherwise`.
 template <class T>
-Enum_Instances_Status deliver_one(Instance_List& list, Enum_Instances_Handler<T>& handler,
+Enum_Instances_Status deliver_one(List<T>& list, Enum_Instances_Handler<T>& handler,
                                   const Message& when_not_one, Enum_Instances_Status otherwise)
 {
     if (list.size() != 1)
@@ -94,7 +96,7 @@ template <class T>
 Enum_Instances_Status deliver_one(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
                                   const Message& when_not_one, Enum_Instances_Status otherwise)
 {
-    Instance_List list(instances);
+    List<T> list(instances);
     return deliver_one(list, handler, when_not_one, otherwise);
 }
 
