@@ -10,22 +10,6 @@ namespace KPRV::simulator {
 
 namespace {
 
-// Moves the members of "extra" up among their neighbours.
-void merge_extra(Json::Value& object)
-{
-    Json::Value extra;
-    object.removeMember("extra", &extra);
-    for (const std::string& name : extra.getMemberNames())
-        object[name] = extra[name];
-}
-
-Json::Value finished(Json::Value object, Members members)
-{
-    complete_members(object, members);
-    merge_extra(object);
-    return object;
-}
-
 // Takes the member out of its object, as an object that may be empty.
 Json::Value take_object(Json::Value& from, const char* name)
 {
@@ -60,8 +44,7 @@ public:
 
     Adapter adapter()
     {
-        Json::Value parts = written_;
-        complete_members(parts, adapter_members);
+        const Json::Value parts = answered_members(written_, adapter_members);
         Adapter adapter;
         for (const Json::Value& port : parts["fcPorts"])
             adapter.fc_ports.push_back(fc_port(port, adapter.fc_ports.size()));
@@ -92,7 +75,7 @@ private:
     Json::Value part(const Json::Value& object, Members members, const char* what) const
     {
         check_members(source_, object, members, what);
-        return finished(object, members);
+        return answered_members(object, members);
     }
 
     Json::Value hba_data(const Adapter& adapter) const
@@ -104,7 +87,7 @@ private:
         set_default(data, "hasEthPort", !adapter.eth_ports.empty());
         const std::size_t ports = std::max(adapter.fc_ports.size(), adapter.eth_ports.size());
         set_default(data, "portCount", static_cast<Json::UInt>(ports));
-        return finished(data, hba_data_members);
+        return answered_members(data, hba_data_members);
     }
 
     Json::Value driver(Json::Value data) const
@@ -114,7 +97,7 @@ private:
             set_default(data, "networkDriverName", "kldrnet");
             set_default(data, "networkDriverVersion", "3.2.1.0");
         }
-        return finished(data, driver_members);
+        return answered_members(data, driver_members);
     }
 
     Port fc_port(const Json::Value& written, std::size_t index) const
@@ -130,7 +113,7 @@ private:
         set_default(port.data, "PortSymbolicName", "KLDR port " + std::to_string(index));
         set_default(port.data, "isFCoE", is_cna());
         default_status(port.data, "portStatusValue", written["portStatus"]);
-        port.data = finished(port.data, fc_port_members);
+        port.data = answered_members(port.data, fc_port_members);
         return port;
     }
 
@@ -139,7 +122,7 @@ private:
         check_members(source_, written, eth_port_members, "an Ethernet port");
         check_answers(source_, written["answers"]);
         Port port;
-        port.data = finished(written, eth_port_members);
+        port.data = answered_members(written, eth_port_members);
         port.answers = take_object(port.data, "answers");
         port.address = written["mac"].asString();
         default_status(port.data, "portStatusValue", port.data["portStatus"]);
@@ -154,7 +137,7 @@ private:
         check_members(source_, data, eth_data_members, "ethData");
         set_default(data, "ethDev", "eth" + std::to_string(place_.eth_ports_before + index));
         default_status(data, "ethPortStateMOFValue", enabled);
-        return finished(data, eth_data_members);
+        return answered_members(data, eth_data_members);
     }
 
     const Json_Text& source_;

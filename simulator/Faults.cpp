@@ -115,9 +115,7 @@ Fault read_fault(const Json_Text& source, const Json::Value& written)
     fault.first = std::max(1U, written["at"].asUInt());
     fault.times = written.get("times", written.isMember("at") ? 1U : 0U).asUInt();
     fault.words = written;
-    for (const Member& member : fault_members)
-        if (member.fallback)
-            set_default(fault.words, member.name, Json_Text("default", member.fallback).parse());
+    fill_defaults(fault.words, fault_members);
     return fault;
 }
 

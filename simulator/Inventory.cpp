@@ -38,15 +38,10 @@ Inventory::Inventory(const Json_Text& source)
     const Json::Value written = source.parse();
     check_members(source, written, inventory_members, "the inventory");
     Json::Value parts = written;
-    complete_members(parts, inventory_members);
+    fill_defaults(parts, inventory_members);
 
-    host = parts["host"];
-    check_members(source, host, host_members, "host");
-    complete_members(host, host_members);
-    Json::Value extra;
-    host.removeMember("extra", &extra);
-    for (const std::string& name : extra.getMemberNames())
-        host[name] = extra[name];
+    check_members(source, parts["host"], host_members, "host");
+    host = answered_members(parts["host"], host_members);
 
     const Json::Value& library = parts["library"];
     check_members(source, library, library_members, "library");

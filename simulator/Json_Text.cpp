@@ -5,8 +5,8 @@
 #include <cstdio>
 #include <cstring>
 #include <fstream>
-#include <iterator>
 #include <memory>
+#include <sstream>
 
 namespace KPRV::simulator {
 
@@ -54,10 +54,11 @@ Json_Text::Json_Text(std::string name, std::string text) : name_(std::move(name)
 Json_Text Json_Text::of_file(const std::string& path)
 {
     std::ifstream file(path, std::ios::binary);
-    std::string text{std::istreambuf_iterator<char>(file), {}};
-    if (!file.is_open() || file.bad())
-        throw Refused(path + ":0: cannot be read: " + std::strerror(errno));
-    return {path, std::move(text)};
+    std::ostringstream text;
+    // An empty file gives nothing to insert, which counts as a failure of the insertion alone.
+    if (file && (text << file.rdbuf() || file.peek() == std::ifstream::traits_type::eof()) && !file.bad())
+        return {path, text.str()};
+    throw Refused(path + ":0: cannot be read: " + std::strerror(errno));
 }
 
 Json::Value Json_Text::parse() const

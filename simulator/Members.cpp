@@ -120,14 +120,24 @@ void check_members(const Json_Text& source, const Json::Value& object, Members m
             source.refuse(object, "missing member " + quoted(member.name) + " in " + what);
 }
 
-void complete_members(Json::Value& object, Members members)
+void fill_defaults(Json::Value& object, Members members)
 {
     for (const Member& member : members)
         if (member.fallback)
             set_default(object, member.name, Json_Text("default", member.fallback).parse());
+}
+
+Json::Value answered_members(Json::Value object, Members members)
+{
+    fill_defaults(object, members);
+    Json::Value extra;
+    object.removeMember("extra", &extra);
     for (const std::string& name : object.getMemberNames())
         if (object[name].isNull())
             object.removeMember(name);
+    for (const std::string& name : extra.getMemberNames())
+        object[name] = extra[name];
+    return object;
 }
 
 void set_default(Json::Value& object, const char* name, const Json::Value& value)

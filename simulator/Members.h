@@ -49,10 +49,14 @@ using Members = std::span<const Member>;
 void check_members(const Json_Text& source, const Json::Value& object, Members members,
                    const std::string& what);
 
-/// Gives `object` a default for each member that is left out. What is null afterwards is removed.
-void complete_members(Json::Value& object, Members members);
+/// Gives `object` a default for each member that is left out.
+void fill_defaults(Json::Value& object, Members members);
 
-/// As complete_members for one member: `value` unless the object's author named the member.
+/// `object` as an answer tells it: with defaults, without what is null, and with the members of
+/// "extra" among its own.
+Json::Value answered_members(Json::Value object, Members members);
+
+/// As fill_defaults for one member: `value` unless the object's author named the member.
 void set_default(Json::Value& object, const char* name, const Json::Value& value);
 
 /// True if `value` is as `type` asks. `type_words` tells in words what that is.

@@ -135,8 +135,11 @@ void Simulator::add_fault(const Json_Text& source)
 
 void Simulator::clear_faults()
 {
-    const std::lock_guard lock(mutex_);
-    faults_.clear();
+    {
+        const std::lock_guard lock(mutex_);
+        faults_.clear();
+    }
+    release();
 }
 
 void Simulator::release()

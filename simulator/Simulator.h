@@ -36,6 +36,8 @@ public:
     void unload();
 
     void add_fault(const Json_Text& source);
+
+    /// Also lets go whom they hold.
     void clear_faults();
 
     /// Lets every recorded call go that a fault holds.

@@ -22,7 +22,7 @@ SIMULATOR_EXPORT const char* simulator_load_file(const char* path);
 /* Goes back to the inventory that the environment names, to be read by the next call. */
 SIMULATOR_EXPORT void simulator_unload(void);
 
-/* Adds a fault, in JSON; INVENTORY.md tells its shape. */
+/* Adds a fault, in JSON; INVENTORY.md tells its shape. To clear the faults releases whom they hold. */
 SIMULATOR_EXPORT const char* simulator_add_fault(const char* json);
 SIMULATOR_EXPORT void simulator_clear_faults(void);
 

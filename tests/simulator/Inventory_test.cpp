@@ -58,11 +58,12 @@ TEST_F(Inventory_test, what_is_null_is_left_out_of_the_answer)
 TEST_F(Inventory_test, extra_members_join_the_answer)
 {
     simulator.load_text(R"({"host": {"hostModel": "X", "extra": {"hostName": "h"}}, "adapters": [
-        {"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00", "extra": {"pcieSpeed": [1, 2]}}}]})");
+        {"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00", "extra": {"pcieSpeed": [1, 2], "slot": null}}}]})");
     EXPECT_EQ(call("getHost"),
               json("{'result': {'hostManufacturer': 'KLDR', 'hostModel': 'X', 'hostName': 'h'}}"));
     const Json::Value hba = call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:10:00:00'}")["hbaData"];
     EXPECT_EQ(hba["pcieSpeed"], json("[1, 2]"));
+    EXPECT_TRUE(hba.isMember("slot"));
     EXPECT_FALSE(hba.isMember("extra"));
 }
 

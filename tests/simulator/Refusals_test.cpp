@@ -100,14 +100,21 @@ const Refusal refusals[] = {
 };
 // clang-format on
 
-std::string reason_of(Simulator_Control& simulator, const std::string& text)
+// What the action throws; empty if it throws nothing.
+template <typename Action>
+std::string thrown_text(Action action)
 {
     try {
-        simulator.load_text(text);
+        action();
         return "";
     } catch (const std::runtime_error& refused) {
         return refused.what();
     }
+}
+
+std::string reason_of(Simulator_Control& simulator, const std::string& text)
+{
+    return thrown_text([&] { simulator.load_text(text); });
 }
 
 class Refusals_test : public Simulator_Fixture
@@ -156,24 +163,26 @@ TEST_F(Refusals_test, a_refused_file_of_the_environment_is_told_once_on_standard
     std::filesystem::remove(path);
 }
 
-TEST_F(Refusals_test, a_file_that_is_not_there_is_refused)
+TEST_F(Refusals_test, a_file_that_cannot_be_read_is_refused)
 {
-    try {
-        simulator.load_file("no/such/file.json");
-        FAIL();
-    } catch (const std::runtime_error& refused) {
-        EXPECT_STREQ(refused.what(), "no/such/file.json:0: cannot be read: No such file or directory");
-    }
+    const std::pair<std::string, std::string> unreadable[] = {
+        {"no/such/file.json", "No such file or directory"},
+        {SIMULATOR_INVENTORIES, "Is a directory"},
+    };
+    for (const auto& [path, reason] : unreadable)
+        EXPECT_EQ(thrown_text([&] { simulator.load_file(path); }), path + ":0: cannot be read: " + reason);
+}
+
+TEST_F(Refusals_test, an_empty_file_is_no_inventory)
+{
+    EXPECT_EQ(thrown_text([&] { simulator.load_file("/dev/null"); }),
+              "/dev/null:1: Syntax error: value, object or array expected.");
 }
 
 TEST_F(Refusals_test, a_fault_that_is_added_is_checked_like_one_of_the_inventory)
 {
-    try {
-        simulator.add_fault("{\"call\": \"*\",\n\"do\": \"sing\"}");
-        FAIL();
-    } catch (const std::runtime_error& refused) {
-        EXPECT_STREQ(refused.what(), "fault:2: unknown fault \"sing\"");
-    }
+    EXPECT_EQ(thrown_text([&] { simulator.add_fault("{\"call\": \"*\",\n\"do\": \"sing\"}"); }),
+              "fault:2: unknown fault \"sing\"");
 }
 
 } // namespace

@@ -60,6 +60,15 @@ TEST_F(Simulator_test, a_call_that_is_held_lets_the_others_go_on)
     EXPECT_TRUE(answered);
 }
 
+TEST_F(Simulator_test, clearing_the_faults_lets_go_whom_they_hold)
+{
+    simulator.add_fault(R"({"call": "getHost", "do": "hold"})");
+    std::thread caller([&] { EXPECT_TRUE(call("getHost").isObject()); });
+    EXPECT_TRUE(simulator.wait_for_calls("getHost", 1));
+    simulator.clear_faults();
+    caller.join();
+}
+
 TEST_F(Simulator_test, many_threads_may_call_at_once)
 {
     simulator.load_file(inventory("demo.json"));
