@@ -1,0 +1,179 @@
+#include "cmpi/CMPI_Containers.h"
+#include "cmpi/cmpi_text.h"
+#include "cmpi/to_cimple_value.h"
+#include "cmpi/to_cmpi_data.h"
+#include "runtime/log.h"
+#include "runtime/type_dispatch.h"
+
+#include <cstring>
+
+namespace KPRV {
+
+uint32 CMPI_Container::get_size()
+{
+    return _count();
+}
+
+bool CMPI_Container::_in_bounds(uint32 index)
+{
+    if (index < _count())
+        return true;
+    LOG_CONVERSION(WARN, "bounds error");
+    return false;
+}
+
+int CMPI_Container::get_name(uint32 index, String& name)
+{
+    if (!_in_bounds(index))
+        return -1;
+    CMPIString* string = nullptr;
+    _at(index, &string);
+    if (!string)
+        return -1;
+    name = text_of(string);
+    return 0;
+}
+
+int CMPI_Container::get_value(uint32 index, Value::Type type, Value& value)
+{
+    value.clear();
+    if (!_in_bounds(index))
+        return -1;
+    CMPIString* name = nullptr;
+    const CMPIData data = _at(index, &name);
+    if (cmpi_to_cimple_value(_repository, _broker, _name_space, data, value) != 0) {
+        LOG_CONVERSION(WARN, "cmpi_to_cimple_value() failed");
+        return -1;
+    }
+    if (value.type != type)
+        _relax(type, value);
+    if (value.type != type) {
+        LOG_CONVERSION(WARN, "type mismatch on %s: %s/%s", text_of(name), name_of(value.type), name_of(type));
+        return -1;
+    }
+    return 0;
+}
+
+void CMPI_Container::_relax(Value::Type, Value&) {}
+
+int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
+{
+    CMPIData data;
+    if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data) != 0) {
+        LOG_CONVERSION(WARN, "_to_cmpi_data() failed: feature=%s", name);
+        return -1;
+    }
+    return _set(name, data);
+}
+
+int CMPIInstance_Container::get_name(uint32 index, String& name)
+{
+    if (!_in_bounds(index))
+        return -1;
+    try {
+        CMPIString* string = nullptr;
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        CMGetPropertyAt(_instance, index, &string, &status);
+        if (status.rc != CMPI_RC_OK || !string) {
+            LOG_CONVERSION(WARN, "CMGetPropertyAt() failed");
+            return -1;
+        }
+        name = text_of(string);
+        return 0;
+    } catch (...) {
+        LOG_CONVERSION(WARN, "CMGetPropertyAt() threw exception: index=%u size=%u", index, get_size());
+        return -1;
+    }
+}
+
+CMPICount CMPIInstance_Container::_count()
+{
+    return CMGetPropertyCount(_instance, nullptr);
+}
+
+CMPIData CMPIInstance_Container::_at(CMPICount index, CMPIString** name)
+{
+    return CMGetPropertyAt(_instance, index, name, nullptr);
+}
+
+int CMPIInstance_Container::_set(const char* name, const CMPIData& data)
+{
+    if (CMSetProperty(_instance, name, &data.value, data.type).rc == CMPI_RC_OK)
+        return 0;
+    LOG_CONVERSION(WARN, "CMSetProperty() failed: %s", name);
+    return -1;
+}
+
+CMPICount CMPIObjectPath_Container::_count()
+{
+    return CMGetKeyCount(_path, nullptr);
+}
+
+CMPIData CMPIObjectPath_Container::_at(CMPICount index, CMPIString** name)
+{
+    return CMGetKeyAt(_path, index, name, nullptr);
+}
+
+int CMPIObjectPath_Container::_set(const char* name, const CMPIData& data)
+{
+    if (CMAddKey(_path, name, &data.value, data.type).rc == CMPI_RC_OK)
+        return 0;
+    LOG_CONVERSION(WARN, "CMAddKey() failed");
+    return -1;
+}
+
+/// Plain truncation, whatever the number; the null state stays.
+template <class From>
+static void narrow(Value::Type type, Value& value)
+{
+    From wide = 0;
+    value.get_value(wide);
+    const bool null = value.null;
+    visit_type(Type(type), [&](auto tag) {
+        using T = typename decltype(tag)::type;
+        if constexpr (tag.code >= UINT8 && tag.code <= SINT64)
+            value.set_value(T(wide));
+    });
+    value.null = null;
+}
+
+void CMPIObjectPath_Container::_relax(Value::Type type, Value& value)
+{
+    // A signed number fits only a uint32 key: other keys of a server that sends signed ones stay unset.
+    if (value.type == int(UINT64) && type >= int(UINT8) && type <= int(SINT64))
+        narrow<uint64>(type, value);
+    else if (value.type == int(SINT64) && type == int(UINT32))
+        narrow<sint64>(type, value);
+}
+
+CMPICount CMPIArgs_Container::_count()
+{
+    return CMGetArgCount(_args, nullptr);
+}
+
+CMPIData CMPIArgs_Container::_at(CMPICount index, CMPIString** name)
+{
+    return CMGetArgAt(_args, index, name, nullptr);
+}
+
+int CMPIArgs_Container::_set(const char* name, const CMPIData& data)
+{
+    if (strcmp(name, "return_value") == 0) {
+        return_value = data;
+        return 0;
+    }
+    if (CMAddArg(_args, name, &data.value, CMPIType(data.type & 0xFFFF)).rc == CMPI_RC_OK)
+        return 0;
+    LOG_CONVERSION(WARN, "CMAddArg() failed");
+    return -1;
+}
+
+void CMPIArgs_Container::_relax(Value::Type type, Value& value)
+{
+    if (value.type == int(BOOLEAN) && type == Value::INSTANCE_ARRAY) {
+        value.set_value(Array<Instance*>());
+        value.null = true;
+    }
+}
+
+} // namespace KPRV

@@ -1,0 +1,20 @@
+#pragma once
+
+#include "runtime/Instance.h"
+#include "runtime/Meta_Repository.h"
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+namespace KPRV {
+
+/// An embedded instance or a reference of the server as an instance of whatever class of the repository it
+/// names, so that it keeps its most derived class. Null on failure, with a log line (but none for a null
+/// `CMPIInstance`). The caller owns the result.
+Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
+                              const char* name_space, const CMPIInstance* instance);
+/// As above, with the keys only.
+Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
+                              const char* name_space, const CMPIObjectPath* path);
+
+} // namespace KPRV

@@ -1,0 +1,28 @@
+#pragma once
+
+#include "runtime/Meta_Repository.h"
+#include "runtime/Value.h"
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+namespace KPRV {
+
+/// Translates one value for the server. `flags` are the feature's: they tell an embedded instance from a
+/// reference. 0, or -1 with a log line. The objects made belong to the server.
+int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                  const Value& value, uint32 flags, CMPIData& data);
+
+template <class T>
+struct to_cmpi_scalar;
+
+/// An instance as object path (word `CMPI_ref`) or as a whole (word `CMPI_instance`). One without a name
+/// space takes that of the call.
+template <>
+struct to_cmpi_scalar<Instance*>
+{
+    static int func(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                    const Instance* instance, CMPIType type, CMPIData& data);
+};
+
+} // namespace KPRV
