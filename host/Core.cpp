@@ -1,0 +1,103 @@
+#include "host/Core.h"
+
+#include "host/Call_Frame.h"
+
+#include <array>
+#include <shared_mutex>
+
+namespace KPRV::host {
+
+namespace {
+
+/// Released shells that are remembered. Enough for every object of one large operation.
+constexpr std::size_t max_retired = 1 << 18;
+
+/// All addresses that any host has handed out, in shards so that threads rarely wait for each other.
+class Address_Book
+{
+public:
+    void add(Object* object)
+    {
+        Shard& shard = at(object->address());
+        std::unique_lock lock(shard.mutex);
+        shard.objects[object->address()] = object;
+    }
+
+    void remove(const Object* object)
+    {
+        Shard& shard = at(object->address());
+        std::unique_lock lock(shard.mutex);
+        shard.objects.erase(object->address());
+    }
+
+    Object* find(const void* address)
+    {
+        Shard& shard = at(address);
+        std::shared_lock lock(shard.mutex);
+        auto found = shard.objects.find(address);
+        return found == shard.objects.end() ? nullptr : found->second;
+    }
+
+private:
+    struct Shard
+    {
+        std::shared_mutex mutex;
+        std::unordered_map<const void*, Object*> objects;
+    };
+
+    Shard& at(const void* address)
+    {
+        return shards_[(reinterpret_cast<std::uintptr_t>(address) >> 6) % shards_.size()];
+    }
+
+    std::array<Shard, 16> shards_;
+};
+
+Address_Book& address_book()
+{
+    static Address_Book book;
+    return book;
+}
+
+} // namespace
+
+Object* find_object(const void* address)
+{
+    return address ? address_book().find(address) : nullptr;
+}
+
+Core::~Core()
+{
+    for (auto& [object, owner] : objects_)
+        address_book().remove(object);
+    for (auto& object : retired_)
+        address_book().remove(object.get());
+}
+
+void Core::adopt(std::unique_ptr<Object> object)
+{
+    Object* known = object.get();
+    address_book().add(known);
+    if (known->owner != Owner::HOST)
+        ledger.made(known->kind, known->maker);
+    std::lock_guard lock(mutex_);
+    objects_[known] = std::move(object);
+}
+
+void Core::retire(Object& object)
+{
+    object.live = false;
+    object.drop();
+    std::lock_guard lock(mutex_);
+    auto at = objects_.find(&object);
+    if (at == objects_.end())
+        return;
+    retired_.push_back(std::move(at->second));
+    objects_.erase(at);
+    if (retired_.size() > max_retired) {
+        address_book().remove(retired_.front().get());
+        retired_.pop_front();
+    }
+}
+
+} // namespace KPRV::host

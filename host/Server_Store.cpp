@@ -1,0 +1,148 @@
+#include "host/Server_Store.h"
+
+#include "host/Class_Catalogue.h"
+#include "host/Convert.h"
+
+#include <algorithm>
+
+namespace KPRV::host {
+
+namespace {
+
+std::string method_key(const std::string& class_name, const std::string& method)
+{
+    return lower_name(class_name + "." + method);
+}
+
+Result failed(CMPIrc rc)
+{
+    Result result;
+    result.rc = rc;
+    return result;
+}
+
+} // namespace
+
+void Server_Store::add_name_space(const std::string& name_space)
+{
+    std::lock_guard lock(mutex_);
+    spaces_[lower_name(name_space)];
+}
+
+void Server_Store::add(const std::string& name_space, Instance_Value instance)
+{
+    instance.path.name_space = name_space;
+    std::lock_guard lock(mutex_);
+    spaces_[lower_name(name_space)].instances.push_back(std::move(instance));
+}
+
+void Server_Store::on_method(const std::string& name_space, const std::string& class_name,
+                             const std::string& method, Method answer)
+{
+    std::lock_guard lock(mutex_);
+    spaces_[lower_name(name_space)].methods[method_key(class_name, method)] = std::move(answer);
+}
+
+bool Server_Store::has_name_space(const std::string& name_space) const
+{
+    std::lock_guard lock(mutex_);
+    return spaces_.count(lower_name(name_space)) != 0;
+}
+
+bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& path) const
+{
+    std::lock_guard lock(mutex_);
+    auto space = spaces_.find(lower_name(path.name_space));
+    if (space == spaces_.end())
+        return false;
+    std::string prefix = lower_name(path.class_name) + ".";
+    auto method = space->second.methods.lower_bound(prefix);
+    if (method != space->second.methods.end() && method->first.starts_with(prefix))
+        return true;
+    const auto& instances = space->second.instances;
+    return std::any_of(instances.begin(), instances.end(), [&](const Instance_Value& instance) {
+        return catalogue.is_a(instance.path.class_name, path.class_name);
+    });
+}
+
+std::vector<Instance_Value> Server_Store::instances(const std::string& name_space) const
+{
+    std::lock_guard lock(mutex_);
+    auto space = spaces_.find(lower_name(name_space));
+    return space == spaces_.end() ? std::vector<Instance_Value>() : space->second.instances;
+}
+
+std::vector<Instance_Value>::iterator Server_Store::find(Name_Space& space, const Path_Value& path)
+{
+    return std::find_if(space.instances.begin(), space.instances.end(),
+                        [&](const Instance_Value& instance) { return same_object(instance.path, path); });
+}
+
+Result Server_Store::run(const Class_Catalogue& catalogue, const Request& request)
+{
+    std::unique_lock lock(mutex_);
+    Name_Space& space = spaces_[lower_name(request.path.name_space)];
+    switch (request.operation) {
+    case Operation::ENUMERATE_INSTANCES:
+    case Operation::ENUMERATE_INSTANCE_NAMES:
+        return enumerate(catalogue, space, request);
+    case Operation::INVOKE_METHOD: {
+        auto method = space.methods.find(method_key(request.path.class_name, request.method));
+        if (method == space.methods.end())
+            return failed(CMPI_RC_ERR_METHOD_NOT_FOUND);
+        Method answer = method->second;
+        lock.unlock();
+        return answer(request);
+    }
+    case Operation::GET_INSTANCE:
+    case Operation::CREATE_INSTANCE:
+    case Operation::MODIFY_INSTANCE:
+    case Operation::DELETE_INSTANCE:
+        return change(space, request);
+    default:
+        return failed(CMPI_RC_ERR_NOT_SUPPORTED);
+    }
+}
+
+Result Server_Store::enumerate(const Class_Catalogue& catalogue, const Name_Space& space,
+                               const Request& request) const
+{
+    Result result;
+    for (const Instance_Value& instance : space.instances) {
+        if (!catalogue.is_a(instance.path.class_name, request.path.class_name))
+            continue;
+        if (request.operation == Operation::ENUMERATE_INSTANCES)
+            result.instances.push_back(instance);
+        else
+            result.paths.push_back(instance.path);
+    }
+    return result;
+}
+
+Result Server_Store::change(Name_Space& space, const Request& request)
+{
+    auto at = find(space, request.path);
+    bool create = request.operation == Operation::CREATE_INSTANCE;
+    if (create != (at == space.instances.end()))
+        return failed(create ? CMPI_RC_ERR_ALREADY_EXISTS : CMPI_RC_ERR_NOT_FOUND);
+    Result result;
+    switch (request.operation) {
+    case Operation::GET_INSTANCE:
+        result.instances.push_back(*at);
+        break;
+    case Operation::CREATE_INSTANCE:
+        space.instances.push_back({request.path, request.instance.properties});
+        result.paths.push_back(request.path);
+        break;
+    case Operation::MODIFY_INSTANCE:
+        for (const Named_Value& property : request.instance.properties)
+            if (!request.properties || contains_name(*request.properties, property.name))
+                set_value(at->properties, property.name, property.value);
+        break;
+    default:
+        space.instances.erase(at);
+    }
+    return result;
+}
+
+} // namespace KPRV::host

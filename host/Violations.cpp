@@ -1,0 +1,37 @@
+#include "host/Violations.h"
+
+namespace KPRV::host {
+
+void Violations::add(const char* call, const std::string& what)
+{
+    std::lock_guard lock(mutex_);
+    list_.push_back(std::string(call) + ": " + what);
+}
+
+std::vector<std::string> Violations::list() const
+{
+    std::lock_guard lock(mutex_);
+    return list_;
+}
+
+std::size_t Violations::count() const
+{
+    std::lock_guard lock(mutex_);
+    return list_.size();
+}
+
+void Violations::clear()
+{
+    std::lock_guard lock(mutex_);
+    list_.clear();
+}
+
+std::string Violations::text() const
+{
+    std::string text;
+    for (const std::string& line : list())
+        text += line + "\n";
+    return text;
+}
+
+} // namespace KPRV::host
