@@ -1,14 +1,7 @@
-"""module/*.cpp: dispatchers, registration records and exported factories of the providers."""
+"""module/*.cpp: registration records and exported factories of the providers; each provider file defines its own
+dispatcher, __cimple_<Class>_Provider_proc."""
 
 from . import cpp
-
-#: Translation units that the dispatchers are dealt out to; each compiles a share of all provider headers.
-PARTS = 4
-
-PROC = (
-    "#define PROC(P) int __cimple_##P##_proc(const Registration* r, int op, void* a0, void* a1, void* a2, void* a3, "
-    "void* a4, void* a5, void* a6, void* a7) { return dispatch<P>(r, op, a0, a1, a2, a3, a4, a5, a6, a7); }"
-)
 
 #: The name of the list, then the kinds of management interface with their letters.
 INTERFACES = {
@@ -33,13 +26,6 @@ FACTORY_MACROS = """\
     { \\
         return C##_Provider_Create_##KIND##MI(broker, context, status); \\
     }"""
-
-
-def procs(run):
-    includes = ["runtime/Provider_Dispatch.h", "runtime/version.h"]
-    includes += [f"providers/{class_.name}_Provider.h" for class_, _ in run]
-    body = [PROC, *(f"PROC({class_.name}_Provider)" for class_, _ in run)]
-    return cpp.namespaced(includes, body)
 
 
 def registration(providers):
@@ -84,8 +70,5 @@ def factories(providers):
 
 
 def emit(providers, output):
-    for number in range(PARTS):
-        run = providers[number * len(providers) // PARTS : (number + 1) * len(providers) // PARTS]
-        output.add(f"module/procs_{number + 1}.cpp", procs(run))
     output.add("module/registration.cpp", registration(providers))
     output.add("module/factories.cpp", factories(providers))
