@@ -1,0 +1,87 @@
+#include "adapter/Json_Access.h"
+
+#include "tests/support/Fake_Library.h"
+
+#include <gtest/gtest.h>
+
+using namespace KPRV;
+
+namespace {
+
+template <class Conversion>
+std::string failure(Conversion conversion, const char* text)
+{
+    try {
+        conversion(json(text));
+        return "";
+    } catch (const std::runtime_error& error) {
+        return error.what();
+    }
+}
+
+} // namespace
+
+TEST(Json_Access, null_counts_as_array_and_object)
+{
+    EXPECT_TRUE(isArrayOrNull(json("null")));
+    EXPECT_TRUE(isArrayOrNull(json("[]")));
+    EXPECT_FALSE(isArrayOrNull(json("{}")));
+    EXPECT_FALSE(isArrayOrNull(json("5")));
+    EXPECT_TRUE(isObjectOrNull(json("null")));
+    EXPECT_TRUE(isObjectOrNull(json("{}")));
+    EXPECT_FALSE(isObjectOrNull(json("[]")));
+    EXPECT_FALSE(isObjectOrNull(json("'x'")));
+}
+
+TEST(Json_Access, null_converts_to_nothing)
+{
+    EXPECT_EQ(asString(json("null")), "");
+    EXPECT_EQ(asInt(json("null")), 0);
+    EXPECT_EQ(asUInt(json("null")), 0u);
+    EXPECT_FALSE(asBool(json("null")));
+}
+
+TEST(Json_Access, texts_are_texts_and_numbers_are_numbers)
+{
+    EXPECT_EQ(asString(json("'gr\\u00fcn'")), "gr\xC3\xBCn");
+    EXPECT_EQ(asString(json("true")), "true");
+    EXPECT_EQ(asInt(json("-7")), -7);
+    EXPECT_EQ(asInt(json("7.9")), 7);
+    EXPECT_EQ(asInt(json("true")), 1);
+    EXPECT_EQ(asInt(Json::Value(7u)), 7);
+    EXPECT_EQ(asUInt(json("4294967295")), 4294967295u);
+    EXPECT_EQ(asUInt(json("1.5")), 1u);
+
+    for (const char* text : {"5", "1.5", "[]", "{}"})
+        EXPECT_EQ(failure(asString, text), "Type is not convertible to string") << text;
+    for (const char* text : {"'5'", "[]", "{}", "2147483648", "-2147483649", "1e300", "18446744073709551615"})
+        EXPECT_EQ(failure(asInt, text), "Type is not convertible to int") << text;
+    for (const char* text : {"'5'", "[]", "{}", "-1", "4294967296", "-1.5"})
+        EXPECT_EQ(failure(asUInt, text), "Type is not convertible to uint") << text;
+}
+
+TEST(Json_Access, everything_is_true_or_false)
+{
+    for (const char* text : {"true", "1", "-1", "0.5", "'x'", "[0]", "{'a': 0}"})
+        EXPECT_TRUE(asBool(json(text))) << text;
+    EXPECT_TRUE(asBool(Json::Value(1u)));
+    for (const char* text : {"false", "0", "0.0", "''", "[]", "{}"})
+        EXPECT_FALSE(asBool(json(text))) << text;
+}
+
+TEST(Json_Access, reading_adds_nothing_and_never_throws)
+{
+    const Json::Value object = json("{'a': 1, 'n': null}");
+    EXPECT_TRUE(hasMember(object, "n"));
+    EXPECT_FALSE(hasMember(object, "b"));
+    EXPECT_EQ(asInt(member(object, "a")), 1);
+    EXPECT_TRUE(member(object, "b").isNull());
+    EXPECT_EQ(object.size(), 2u);
+    for (const char* text : {"null", "[1]", "5", "'x'"}) {
+        EXPECT_FALSE(hasMember(json(text), "a")) << text;
+        EXPECT_TRUE(member(json(text), "a").isNull()) << text;
+    }
+    EXPECT_EQ(asInt(element(json("[3, 4]"), 1)), 4);
+    EXPECT_TRUE(element(json("[3, 4]"), 2).isNull());
+    EXPECT_TRUE(element(json("{}"), 0).isNull());
+}

@@ -1,0 +1,182 @@
+#include "adapter/ProviderUtil.h"
+
+#include "adapter/Host_Calls.h"
+#include "tests/support/Log_Capture.h"
+
+#include <gtest/gtest.h>
+
+#include <arpa/inet.h>
+
+#include <array>
+#include <cstring>
+
+using namespace KPRV;
+
+namespace {
+
+constexpr const char* BY_NAME =
+    "INFO gethostbyname() FAILED. hostString will have hostname instead of ipAddress";
+
+/// A host as the operating system would describe it.
+struct ProviderUtil_Host : testing::Test
+{
+    ProviderUtil_Host()
+    {
+        current = this;
+        host_calls = {
+            [](char* out, size_t size) { return current->tell(current->name, out, size); },
+            [](char* out, size_t size) { return current->tell(current->domain, out, size); },
+            [](const char*) { return current->look_up(); },
+            [](utsname* out) {
+                strcpy(out->nodename, "node");
+                return current->uname_result;
+            },
+        };
+    }
+    ~ProviderUtil_Host() override { host_calls = old; }
+
+    /// A null text is a failing call; so is one more call than allowed.
+    int tell(const char* text, char* out, size_t size)
+    {
+        if (!text || (text == name && names_left-- == 0))
+            return -1;
+        strncpy(out, text, size);
+        return 0;
+    }
+    hostent* look_up()
+    {
+        if (!resolves)
+            return nullptr;
+        pointers.clear();
+        for (in_addr& address : addresses)
+            pointers.push_back(reinterpret_cast<char*>(&address));
+        pointers.push_back(nullptr);
+        entry.h_addrtype = AF_INET;
+        entry.h_length = 4;
+        entry.h_addr_list = pointers.data();
+        return &entry;
+    }
+    void has(std::initializer_list<const char*> texts)
+    {
+        addresses.clear();
+        for (const char* text : texts)
+            addresses.push_back({inet_addr(text)});
+    }
+
+    static inline ProviderUtil_Host* current;
+    const Host_Calls old = host_calls;
+    const char* name = "alpha";
+    int names_left = 9;
+    const char* domain = "example.org";
+    bool resolves = true;
+    int uname_result = 0;
+    std::vector<in_addr> addresses;
+    std::vector<char*> pointers;
+    hostent entry = {};
+    Log_Capture log;
+    char buffer[64] = "left over";
+};
+
+} // namespace
+
+TEST_F(ProviderUtil_Host, first_address_that_is_no_loopback)
+{
+    has({"127.0.0.1", "10.1.2.3", "192.168.0.1"});
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 0);
+    EXPECT_STREQ(buffer, "10.1.2.3");
+    EXPECT_EQ(log.said(), Lines{});
+    EXPECT_EQ(log.traces(), (Lines{"DBG Entering: getHostInfo", "DBG Returning: getHostInfo"}));
+}
+
+TEST_F(ProviderUtil_Host, without_a_name_it_is_localhost)
+{
+    name = nullptr;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 3);
+    EXPECT_STREQ(buffer, "localhost");
+    EXPECT_EQ(log.said(), Lines{"INFO gethostname() FAILED. hostString will be filled with localhost"});
+}
+
+TEST_F(ProviderUtil_Host, without_an_address_it_is_the_name)
+{
+    resolves = false;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "alpha");
+    resolves = true;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "alpha");
+    EXPECT_EQ(log.said(), Lines(2, BY_NAME));
+}
+
+TEST_F(ProviderUtil_Host, with_loopback_addresses_alone_it_is_the_bare_name)
+{
+    has({"127.0.0.1", "127.0.1.1"});
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "alpha");
+    EXPECT_EQ(log.said(), Lines{BY_NAME});
+    // Also where the text of the name is localhost and there is no domain: the domain is part of what is
+    // compared.
+    name = "localhost";
+    domain = "(none)";
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "localhost");
+}
+
+TEST_F(ProviderUtil_Host, a_name_that_is_lost_in_between)
+{
+    has({"127.0.0.1"});
+    names_left = 1;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_EQ(log.said(), Lines{"INFO gethostname() failed"});
+}
+
+TEST_F(ProviderUtil_Host, without_a_domain_call_it_is_the_bare_name)
+{
+    has({"127.0.0.1"});
+    domain = nullptr;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "alpha");
+    EXPECT_EQ(log.said(), Lines{"INFO getdomainname() failed"});
+}
+
+TEST_F(ProviderUtil_Host, no_domain_counts_where_it_does_not_fit)
+{
+    has({"127.0.0.1"});
+    name = "localhost";
+    domain = "(none)";
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof "localhost"), 4);
+    EXPECT_STREQ(buffer, "localhost");
+    EXPECT_EQ(log.said(), Lines{});
+}
+
+TEST_F(ProviderUtil_Host, nothing_is_written_beyond_the_buffer)
+{
+    has({"10.1.2.3"});
+    memset(buffer, '#', sizeof buffer);
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, 5), 0);
+    EXPECT_STREQ(buffer, "10.1");
+    EXPECT_EQ(buffer[5], '#');
+    resolves = false;
+    const std::string long_name(300, 'n');
+    name = long_name.c_str();
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, 8), 2);
+    EXPECT_STREQ(buffer, "nnnnnnn");
+    buffer[0] = '#';
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, 0), 2);
+    EXPECT_EQ(buffer[0], '#');
+}
+
+TEST_F(ProviderUtil_Host, node_name)
+{
+    EXPECT_TRUE(ProviderUtil::getHostName() == "node");
+    EXPECT_EQ(log.said(), Lines{});
+    uname_result = -3;
+    EXPECT_TRUE(ProviderUtil::getHostName() == "localhost");
+    EXPECT_EQ(log.said(), Lines{"ERR uname() returned error = -3"});
+}
+
+TEST_F(ProviderUtil_Host, a_path_as_a_client_sees_it)
+{
+    has({"10.1.2.3"});
+    EXPECT_TRUE(ProviderUtil::updateNamespacePath("KALDERA_FCPort.DeviceID=\"a\"") ==
+                "//10.1.2.3/root/kaldera:KALDERA_FCPort.DeviceID=\"a\"");
+}
