@@ -1,1 +1,1 @@
-"""Turns the MOF of the catalogue into C++: records, metadata tables, skeletons, dispatchers, factories."""
+"""Turns the MOF of the catalogue into C++: records, metadata tables, skeletons, registration, factories."""

@@ -3,52 +3,59 @@ dispatcher, __cimple_<Class>_Provider_proc."""
 
 from . import cpp
 
-#: The name of the list, then the kinds of management interface with their letters.
+#: The management interfaces of a kind of provider, each with the letter that asks for it.
 INTERFACES = {
     "instance": [("Instance", "I"), ("Method", "M")],
     "association": [("Association", "A"), ("Instance", "I"), ("Method", "M")],
     "indication": [("Indication", "N"), ("Method", "M")],
 }
 
-# One provider's block, and a pair of factories per kind: the long name does the work, the short one forwards.
-FACTORY_MACROS = """\
+# One provider's block, and a pair of factories per interface: the long name does the work, the short one forwards.
+FACTORY_MACROS = r"""
 #define EXPORT extern "C" __attribute__((visibility("default")))
+#define ARGUMENTS const CMPIBroker *broker, const CMPIContext *context, CMPIStatus *
 #define AREA(C) alignas(16) static char _cmpi_static_data##C##_Provider[2048];
-#define FACTORY(C, KIND, LETTER) \\
-    EXPORT CMPI##KIND##MI* C##_Provider_Create_##KIND##MI(const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*) \\
-    { \\
-        void* mi = nullptr; \\
-        cimple_cmpi_adapter('C', _cmpi_static_data##C##_Provider, &_cimple_registration_##C##_Provider, broker, context, \\
-                            #C "_Provider", LETTER, &mi); \\
-        return static_cast<CMPI##KIND##MI*>(mi); \\
-    } \\
-    EXPORT CMPI##KIND##MI* C##_Create_##KIND##MI(const CMPIBroker* broker, const CMPIContext* context, CMPIStatus* status) \\
-    { \\
-        return C##_Provider_Create_##KIND##MI(broker, context, status); \\
-    }"""
+#define FACTORY(C, KIND, LETTER) \
+    EXPORT CMPI##KIND##MI* C##_Provider_Create_##KIND##MI(ARGUMENTS) \
+    { \
+        void* mi = nullptr; \
+        cimple_cmpi_adapter('C', _cmpi_static_data##C##_Provider, &_cimple_registration_##C##_Provider, \
+                            broker, context, #C "_Provider", LETTER, &mi); \
+        return static_cast<CMPI##KIND##MI*>(mi); \
+    } \
+    EXPORT CMPI##KIND##MI* C##_Create_##KIND##MI(ARGUMENTS status) \
+    { \
+        return C##_Provider_Create_##KIND##MI(broker, context, status); \
+    }
+"""
+
+# The records, and the one initialiser that fills and links them: each takes the previous head as its next.
+REGISTRATION = r"""
+const char _cimple_module_name[] = "kldrprovider_Module";
+const Registration* _cimple_registration_head;
+static bool link_record(Registration& record, const char* name, Provider_Proc proc, const Meta_Class& meta_class)
+{
+    record = {_cimple_module_name, name, proc, &meta_class, _cimple_registration_head};
+    _cimple_registration_head = &record;
+    return true;
+}
+#define PROVIDER(C) \
+    int __cimple_##C##_Provider_proc(const Registration*, int, void*, void*, void*, void*, void*, void*, void*, void*); \
+    Registration _cimple_registration_##C##_Provider;
+#define LINK(C) \
+    link_record(_cimple_registration_##C##_Provider, #C "_Provider", __cimple_##C##_Provider_proc, \
+                C::static_meta_class)
+"""
 
 
 def registration(providers):
-    """The records, and the one initialiser that fills and links them: each takes the previous head as its next."""
     names = [class_.name for class_, _ in providers]
     includes = ["schema/module_registration.h", "runtime/version.h", *(f"schema/{name}.h" for name in names)]
     body = [
-        "#define PROVIDER(C) \\",
-        "int __cimple_##C##_Provider_proc(const Registration*, int, void*, void*, void*, void*, void*, void*, void*, void*); \\",
-        "Registration _cimple_registration_##C##_Provider;",
+        REGISTRATION,
         *(f"PROVIDER({name})" for name in names),
-        'const char _cimple_module_name[] = "kldrprovider_Module";',
-        "const Registration* _cimple_registration_head;",
-        "static bool link_record(Registration& record, const char* name, Provider_Proc proc, const Meta_Class& meta_class)",
-        "{",
-        "record = {_cimple_module_name, name, proc, &meta_class, _cimple_registration_head};",
-        "_cimple_registration_head = &record;",
-        "return true;",
-        "}",
-        "#define LINK(C) link_record(_cimple_registration_##C##_Provider, #C \"_Provider\", __cimple_##C##_Provider_proc, C::static_meta_class)",
         "[[maybe_unused]] static const bool _cimple_linked =",
         "\n&& ".join(f"LINK({name})" for name in names) + ";",
-       
     ]
     return cpp.namespaced(includes, body)
 
@@ -61,7 +68,7 @@ def factories(providers):
     ]
     names = [class_.name for class_, _ in providers]
     body = [f"extern Registration _cimple_registration_{name}_Provider;" for name in names]
-    text = cpp.namespaced(includes, body) + "using namespace KPRV;\n" + FACTORY_MACROS + "\n"
+    text = cpp.namespaced(includes, body) + "using namespace KPRV;" + FACTORY_MACROS
     for class_, kind in providers:
         text += f"AREA({class_.name})\n"
         for interface, letter in INTERFACES[kind]:

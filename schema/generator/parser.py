@@ -168,9 +168,9 @@ class Parser:
             self.refuse(self.token, f"'{name.text}' is an array of fixed size, which the catalogue does not know")
         if reference and kind == "property":
             kind = "reference"
-        element = Element(kind, name.text, type_name.text, array, qualifiers, name.where)
-        element.is_reference = reference
-        return element
+        return Element(
+            kind, name.text, type_name.text, array, qualifiers, name.where, is_reference=reference
+        )
 
     def literal(self):
         opening = self.accept("{")

@@ -3,7 +3,7 @@
 import hashlib
 
 from . import cpp
-from .flags import KEY, KINDS, OUT
+from .flags import KEY, OUT, PROPERTY
 
 SAME_OFFSET = (
     "#define SAME(C, S, F) static_assert(__builtin_offsetof(C, F) == __builtin_offsetof(S, F))"
@@ -32,17 +32,24 @@ def reference_record(symbol, record, feature):
     )
 
 
+def is_text(feature):
+    """Strings and datetimes have defaults that are texts."""
+    return feature.type in ("string", "datetime")
+
+
 def default_record(feature):
     """The default of the feature, at the class that states it."""
     symbol = cpp.default_symbol(feature)
     if isinstance(feature.default, list):
-        element = "const char* const" if feature.type in ("string", "datetime") else f"const {cpp.cpp_type(feature.type)}"
         # A zero-length array is no C++: an empty default has no elements at all.
-        elements = f"{symbol}_elements" if feature.default else "nullptr"
-        lines = [f"static {element} {elements}[] = {{{', '.join(feature.default)}}};"] if feature.default else []
+        lines, elements = [], "nullptr"
+        if feature.default:
+            element = "const char* const" if is_text(feature) else f"const {feature.type}"
+            elements = f"{symbol}_elements"
+            lines = [f"static {element} {elements}[] = {{{', '.join(feature.default)}}};"]
         value = f".array_value = {{{elements}, {len(feature.default)}}}"
         return [*lines, f"static constinit const Meta_Value {symbol}{{{value}}};"]
-    member = "string" if feature.type in ("string", "datetime") else feature.type
+    member = "string" if is_text(feature) else feature.type
     return [f"static constinit const Meta_Value {symbol}{{.{member}_value = {feature.default}}};"]
 
 
@@ -67,8 +74,9 @@ def method_table(method):
         make = reference_record if parameter.kind == "reference" else property_record
         lines.append(make(f"{symbol}_{parameter.name}", record, parameter))
         addresses.append(f"&{symbol}_{parameter.name}")
+    result = head(PROPERTY | OUT, "return_value")
     lines.append(
-        f"static constinit const Meta_Property {symbol}_return_value{{{{{head(KINDS['property'] | OUT, 'return_value')}}}, "
+        f"static constinit const Meta_Property {symbol}_return_value{{{{{result}}}, "
         f"{cpp.type_code(method.type)}, 0, __builtin_offsetof({record}, return_value), nullptr}};"
     )
     addresses.append(f"&{symbol}_return_value")
@@ -91,7 +99,8 @@ def class_table(class_, repository):
             lines.append(make(cpp.record_symbol(feature), class_.name, feature))
     if class_.superclass:
         # Heirs share the records, and with them the offsets, of what they inherit.
-        lines += [f"SAME({class_.name}, {class_.superclass.name}, {cell.name});" for cell in class_.superclass.cells]
+        pair = f"{class_.name}, {class_.superclass.name}"
+        lines += [f"SAME({pair}, {cell.name});" for cell in class_.superclass.cells]
     array, features = feature_array(f"_{class_.name}_MFA", [address(feature) for feature in class_.features])
     lines += array
     locals_ = "nullptr"

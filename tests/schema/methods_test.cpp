@@ -4,6 +4,7 @@
 #include "schema/KALDERA_AgentService_methods.h"
 
 #include <gtest/gtest.h>
+#include <set>
 
 using namespace KPRV;
 using namespace KPRV::catalogue_view;
@@ -53,6 +54,68 @@ TEST(Methods, HaveTheirOwnersAndParameters)
             EXPECT_EQ(shown(*method.meta_features[i]), row.parameters[i]);
         EXPECT_EQ(shown(*method.meta_features[row.parameters.size()]),
                   "out " + row.return_type + " return_value");
+    }
+}
+
+/// The methods that clients can ask of the product classes, inherited ones included; all other classes have
+/// none.
+struct Served_Row
+{
+    std::set<std::string> classes;
+    std::set<std::string> methods;
+};
+
+const std::set<std::string> of_devices = {"RequestStateChange", "SetPowerState",    "Reset",
+                                          "EnableDevice",       "OnlineDevice",     "QuiesceDevice",
+                                          "SaveProperties",     "RestoreProperties"};
+
+std::set<std::string> operator+(std::set<std::string> a, const std::set<std::string>& b)
+{
+    a.insert(b.begin(), b.end());
+    return a;
+}
+
+const std::set<std::string> of_services = {"RequestStateChange", "StartService", "StopService",
+                                           "ChangeAffectedElementsAssignedSequence"};
+
+const Served_Row served_rows[] = {
+    {{"FCPort", "EthernetPort", "PortController", "StorageExtent", "LogicalDisk"}, of_devices},
+    {{"TapeDrive"}, of_devices + std::set<std::string>{"LockMedia"}},
+    {{"AlarmDevice"}, of_devices + std::set<std::string>{"SetAlarmIndicator", "SetAlarmState", "SetUrgency"}},
+    {{"ComputerSystem"}, {"RequestStateChange", "SetPowerState"}},
+    {{"CIMXMLCommunicationMechanism", "RemoteServiceAccessPoint"}, {"RequestStateChange"}},
+    {{"LANEndpoint", "SCSIProtocolEndpoint"}, {"RequestStateChange", "BroadcastReset"}},
+    {{"ObjectManager"}, of_services},
+    {{"ConcreteJob"}, {"KillJob", "RequestStateChange", "GetError", "GetErrors"}},
+    {{"FCPortStatistics"}, {"ResetSelectedStats"}},
+    {{"PhysicalPackage"}, {"IsCompatible"}},
+    {{"RegisteredProfile", "RegisteredSubProfile"},
+     {"OpenConformantInstances", "PullConformantInstances", "CloseConformantInstances"}},
+    {{"HBASoftwareInstallationServiceCapabilities"}, {"CreateGoalSettings"}},
+    {{"HBASoftwareInstallationService"},
+     of_services + std::set<std::string>{"CheckSoftwareIdentity", "InstallFromByteStream",
+                                         "InstallFromSoftwareIdentity", "InstallFromURI"}},
+    {{"DiagnosticTest", "MemoryDiagnosticTest", "LoopbackDiagnosticTest", "PCILoopbackDiagnosticTest",
+      "EthLoopbackDiagnosticTest"},
+     of_services + std::set<std::string>{"RunDiagnostic", "RunDiagnosticService", "RunTest", "ClearResults",
+                                         "DiscontinueTest"}},
+    {{"AgentService"}, {"executeMethod"}},
+};
+
+TEST(Methods, OfTheProductClassesWithWhatTheyInherit)
+{
+    for (const Meta_Class* meta_class : classes()) {
+        const std::string name = meta_class->name;
+        if (!name.starts_with("KALDERA_"))
+            continue;
+        std::set<std::string> expected, found;
+        for (const Served_Row& row : served_rows)
+            if (row.classes.count(name.substr(8)))
+                expected = row.methods;
+        for (uint32 i = 0; i < meta_class->num_meta_features; i++)
+            if (meta_class->meta_features[i]->flags & FLAG_METHOD)
+                found.insert(meta_class->meta_features[i]->name);
+        EXPECT_EQ(found, expected) << name;
     }
 }
 
