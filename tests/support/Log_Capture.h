@@ -1,9 +1,9 @@
 #pragma once
 
 #include "runtime/log.h"
+#include "tests/support/Log_Lines.h"
 #include "tests/support/Temp_Folder.h"
 
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -17,12 +17,7 @@ namespace KPRV {
 class Log_Capture
 {
 public:
-    struct Line
-    {
-        std::string level;
-        std::string file;
-        std::string text;
-    };
+    using Line = Log_Line;
 
     explicit Log_Capture(const char* level = "DBG") : _home_override("HOME", _home.path())
     {
@@ -32,51 +27,22 @@ public:
     ~Log_Capture() { close_log(); }
 
     /// All lines so far, taken apart.
-    std::vector<Line> lines() const
-    {
-        std::vector<Line> result;
-        std::istringstream file(_home.read(".cimple/messages"));
-        for (std::string raw; std::getline(file, raw);) {
-            // "2026/01/31 12:00:00 ERR: Source.cpp(12): text"
-            std::istringstream words(raw);
-            std::string date, time, level, source;
-            words >> date >> time >> level >> source;
-            if (!level.ends_with(':') || !source.ends_with("):"))
-                result.back().text += "\n" + raw;
-            else {
-                std::string text;
-                std::getline(words, text);
-                result.push_back(
-                    {level.substr(0, level.size() - 1), source.substr(0, source.find('(')), text.substr(1)});
-            }
-        }
-        return result;
-    }
+    std::vector<Log_Line> lines() const { return parse_log(_home.read(".cimple/messages")); }
 
     /// The lines but for the traces of entering and returning, each as "LEVEL text".
-    std::vector<std::string> said() const
+    Lines said() const
     {
-        std::vector<std::string> result;
-        for (const Line& line : lines()) {
-            if (!line.text.starts_with("Entering: ") && !line.text.starts_with("Returning: "))
-                result.push_back(line.level + " " + line.text);
-        }
-        return result;
+        return told(lines(), [](const Log_Line& line) { return !line.is_trace(); });
     }
     /// As `said`, the traces alone.
-    std::vector<std::string> traces() const
+    Lines traces() const
     {
-        std::vector<std::string> result;
-        for (const Line& line : lines()) {
-            if (line.text.starts_with("Entering: ") || line.text.starts_with("Returning: "))
-                result.push_back(line.level + " " + line.text);
-        }
-        return result;
+        return told(lines(), [](const Log_Line& line) { return line.is_trace(); });
     }
     /// Those of `said` that begin with the words, usually a level.
-    std::vector<std::string> said(const char* words) const
+    Lines said(const char* words) const
     {
-        std::vector<std::string> result = said();
+        Lines result = said();
         std::erase_if(result, [&](const std::string& line) { return !line.starts_with(words); });
         return result;
     }
@@ -99,7 +65,5 @@ private:
     Temp_Folder _home;
     Environment_Override _home_override;
 };
-
-using Lines = std::vector<std::string>;
 
 } // namespace KPRV
