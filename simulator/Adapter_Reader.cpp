@@ -1,8 +1,7 @@
 #include "simulator/Adapter_Reader.h"
 
-#include "simulator/Entry_Points.h"
 #include "simulator/Inventory_Members.h"
-#include "simulator/Status.h"
+#include "simulator/Port_Reader.h"
 
 #include <algorithm>
 
@@ -10,29 +9,10 @@ namespace KPRV::simulator {
 
 namespace {
 
-// Takes the member out of its object, as an object that may be empty.
-Json::Value take_object(Json::Value& from, const char* name)
-{
-    Json::Value taken;
-    from.removeMember(name, &taken);
-    return taken.isNull() ? Json::Value(Json::objectValue) : taken;
-}
-
-void default_status(Json::Value& object, const char* name, const Json::Value& enabled)
-{
-    set_default(object, name, enabled.isBool() && !enabled.asBool() ? STOPPED : IN_SERVICE);
-}
-
-std::string padded(std::size_t number)
-{
-    const std::string digits = std::to_string(number);
-    return std::string(digits.size() < 6 ? 6 - digits.size() : 0, '0') + digits;
-}
-
 class Reader
 {
 public:
-    Reader(const Json_Text& source, const Json::Value& written, Adapter_Place place)
+    Reader(const Json_Text& source, Json::Value& written, const Adapter_Place& place)
         : source_(source), written_(written), place_(place)
     {
         check_members(source_, written_, adapter_members, "an adapter");
@@ -44,12 +24,9 @@ public:
 
     Adapter adapter()
     {
-        const Json::Value parts = answered_members(written_, adapter_members);
         Adapter adapter;
-        for (const Json::Value& port : parts["fcPorts"])
-            adapter.fc_ports.push_back(fc_port(port, adapter.fc_ports.size()));
-        for (const Json::Value& port : parts["ethPorts"])
-            adapter.eth_ports.push_back(eth_port(port, adapter.eth_ports.size()));
+        read_ports(adapter);
+        const Json::Value parts = answered_members(written_, adapter_members);
         adapter.data["hbaData"] = hba_data(adapter);
         if (parts.isMember("driver"))
             adapter.data["driver"] = driver(parts["driver"]);
@@ -58,11 +35,28 @@ public:
         adapter.flash_status = parts["flashStatus"];
         adapter.address = address();
         adapter.answers = parts["answers"];
-        check_answers(source_, written_["answers"]);
+        check_answers(source_, adapter.answers);
         return adapter;
     }
 
 private:
+    void read_ports(Adapter& adapter)
+    {
+        Json::Value& fc = written_["fcPorts"];
+        Json::Value& eth = written_["ethPorts"];
+        for (Json::ArrayIndex index = 0; index < std::min(fc.size(), eth.size()); ++index)
+            share_optics(fc[index], eth[index]);
+        for (Json::Value& port : fc)
+            adapter.fc_ports.push_back(read_fc_port(source_, port, port_place(adapter.fc_ports.size())));
+        for (const Json::Value& port : eth)
+            adapter.eth_ports.push_back(read_eth_port(source_, port, port_place(adapter.eth_ports.size())));
+    }
+
+    Port_Place port_place(std::size_t index) const
+    {
+        return {place_.number, index, place_.eth_ports_before, is_cna(), hba_["wwn"], place_.known_ports};
+    }
+
     bool is_cna() const { return hba_.isMember("hbaMAC"); }
 
     std::string address() const
@@ -82,7 +76,7 @@ private:
     {
         Json::Value data = hba_;
         set_default(data, "model", is_cna() ? "1020" : "825");
-        set_default(data, "serialNumber", "KLDR" + padded(place_.number));
+        set_default(data, "serialNumber", "KLDR" + six_digits(place_.number));
         set_default(data, "isCNA", is_cna());
         set_default(data, "hasEthPort", !adapter.eth_ports.empty());
         const std::size_t ports = std::max(adapter.fc_ports.size(), adapter.eth_ports.size());
@@ -100,64 +94,17 @@ private:
         return answered_members(data, driver_members);
     }
 
-    Port fc_port(const Json::Value& written, std::size_t index) const
-    {
-        check_members(source_, written, fc_port_members, "an FC port");
-        check_answers(source_, written["answers"]);
-        Port port;
-        port.data = written;
-        port.answers = take_object(port.data, "answers");
-        port.address = written["wwn"].asString();
-        if (hba_.isMember("wwn"))
-            set_default(port.data, "nodeWwn", hba_["wwn"]);
-        set_default(port.data, "PortSymbolicName", "KLDR port " + std::to_string(index));
-        set_default(port.data, "isFCoE", is_cna());
-        default_status(port.data, "portStatusValue", written["portStatus"]);
-        port.data = answered_members(port.data, fc_port_members);
-        return port;
-    }
-
-    Port eth_port(const Json::Value& written, std::size_t index) const
-    {
-        check_members(source_, written, eth_port_members, "an Ethernet port");
-        check_answers(source_, written["answers"]);
-        Port port;
-        port.data = answered_members(written, eth_port_members);
-        port.answers = take_object(port.data, "answers");
-        port.address = written["mac"].asString();
-        default_status(port.data, "portStatusValue", port.data["portStatus"]);
-        Json::Value eth;
-        if (port.data.removeMember("ethData", &eth))
-            port.eth_data = eth_data(eth, index, port.data["portStatus"]);
-        return port;
-    }
-
-    Json::Value eth_data(Json::Value data, std::size_t index, const Json::Value& enabled) const
-    {
-        check_members(source_, data, eth_data_members, "ethData");
-        set_default(data, "ethDev", "eth" + std::to_string(place_.eth_ports_before + index));
-        default_status(data, "ethPortStateMOFValue", enabled);
-        return answered_members(data, eth_data_members);
-    }
-
     const Json_Text& source_;
-    const Json::Value& written_;
-    Adapter_Place place_;
+    Json::Value& written_;
+    const Adapter_Place& place_;
     Json::Value hba_;
 };
 
 } // namespace
 
-Adapter read_adapter(const Json_Text& source, const Json::Value& written, Adapter_Place place)
+Adapter read_adapter(const Json_Text& source, Json::Value& written, const Adapter_Place& place)
 {
     return Reader(source, written, place).adapter();
-}
-
-void check_answers(const Json_Text& source, const Json::Value& answers)
-{
-    for (const std::string& name : answers.getMemberNames())
-        if (!find_entry(name))
-            source.refuse(answers[name], "unknown entry point \"" + name + "\" in answers");
 }
 
 } // namespace KPRV::simulator

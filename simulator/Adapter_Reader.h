@@ -4,18 +4,16 @@
 
 namespace KPRV::simulator {
 
-/// What the defaults of an adapter depend on: its own number from 1, and how many Ethernet ports
-/// the adapters before it have.
+/// What an adapter depends on.
 struct Adapter_Place
 {
-    std::size_t number;
-    std::size_t eth_ports_before;
+    std::size_t number;              // from 1
+    std::size_t eth_ports_before;    // how many the adapters before have
+    const Remote_Ports& known_ports; // the host's remote ports
 };
 
-/// Builds an adapter from an element of "adapters". Throws Refused.
-Adapter read_adapter(const Json_Text& source, const Json::Value& written, Adapter_Place place);
-
-/// Throws Refused unless each member of `answers` bears the name of an entry point.
-void check_answers(const Json_Text& source, const Json::Value& answers);
+/// Builds an adapter from an element of "adapters", out of which it takes the remote ports. Throws
+/// Refused.
+Adapter read_adapter(const Json_Text& source, Json::Value& written, const Adapter_Place& place);
 
 } // namespace KPRV::simulator

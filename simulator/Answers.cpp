@@ -10,8 +10,9 @@ namespace KPRV::simulator {
 
 namespace {
 
-// The request members that name an adapter or a local port.
-constexpr const char* address_members[] = {"indexStr", "wwn", "mac", "pwwn", "pPortWwn", "portWwn", "hbaWwn"};
+// The request members that name an adapter or a port.
+constexpr const char* address_members[] = {"indexStr", "wwn",    "mac",      "pwwn",    "pPortWwn",
+                                           "portWwn",  "hbaWwn", "lPortWwn", "rPortWwn"};
 
 bool is_address_member(const std::string& name)
 {

@@ -15,6 +15,7 @@ enum class Error_Code
     ADDRESS = 2,     // no adapter or port has the address
     UNSUPPORTED = 3, // nothing answers this entry point
     INVENTORY = 4,   // the inventory was refused
+    EMPTY_SLOT = 5,  // nothing is plugged into the port
     INJECTED = 99,   // a fault asked for it
 };
 

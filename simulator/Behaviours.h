@@ -38,6 +38,19 @@ Json::Value port_data(State& state, const Json::Value& request);
 Json::Value eth_port_data(State& state, const Json::Value& request);
 Json::Value set_port(State& state, const Json::Value& request);
 
+// Optics_Answers.cpp
+Json::Value optics_identity(State& state, const Json::Value& request);
+Json::Value optics_readings(State& state, const Json::Value& request);
+
+// Statistics_Answers.cpp
+Json::Value port_counters(State& state, const Json::Value& request);
+Json::Value reset_port_counters(State& state, const Json::Value& request);
+
+// Remote_Port_Answers.cpp
+Json::Value remote_ports(State& state, const Json::Value& request);
+Json::Value remote_port_data(State& state, const Json::Value& request);
+Json::Value remote_port_luns(State& state, const Json::Value& request);
+
 /// Marks the rows that nothing answers yet.
 Json::Value unsupported(State& state, const Json::Value& request);
 

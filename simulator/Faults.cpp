@@ -1,9 +1,9 @@
 #include "simulator/Faults.h"
 
 #include "adapter/HbaAgentError.h"
+#include "simulator/Address.h"
 #include "simulator/Answers.h"
 #include "simulator/Entry_Points.h"
-#include "simulator/Inventory.h"
 #include "simulator/Members.h"
 
 #include <algorithm>

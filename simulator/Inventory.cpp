@@ -1,10 +1,10 @@
 #include "simulator/Inventory.h"
 
 #include "simulator/Adapter_Reader.h"
+#include "simulator/Address.h"
 #include "simulator/Inventory_Members.h"
-
-#include <algorithm>
-#include <cctype>
+#include "simulator/Port_Reader.h"
+#include "simulator/Remote_Port_Reader.h"
 
 namespace KPRV::simulator {
 
@@ -24,20 +24,13 @@ Json::Value init_answer(const Json::Value& written)
 
 } // namespace
 
-std::string lower_case(std::string text)
-{
-    std::transform(text.begin(), text.end(), text.begin(),
-                   [](unsigned char letter) { return static_cast<char>(std::tolower(letter)); });
-    return text;
-}
-
 Inventory::Inventory() : Inventory(Json_Text("default", "{}")) {}
 
 Inventory::Inventory(const Json_Text& source)
 {
-    const Json::Value written = source.parse();
-    check_members(source, written, inventory_members, "the inventory");
-    Json::Value parts = written;
+    // Read in place and taken apart: a large host should not stand in memory more than once.
+    Json::Value parts = source.parse();
+    check_members(source, parts, inventory_members, "the inventory");
     fill_defaults(parts, inventory_members);
 
     check_members(source, parts["host"], host_members, "host");
@@ -49,11 +42,12 @@ Inventory::Inventory(const Json_Text& source)
     init = init_answer(library["init"]);
     faults = parts["faults"];
     answers = parts["answers"];
-    check_answers(source, written["answers"]);
+    check_answers(source, answers);
 
+    const Remote_Ports remote_ports = read_remote_ports(source, take_part(parts, "remotePorts"));
     std::size_t eth_ports = 0;
-    for (const Json::Value& each : parts["adapters"]) {
-        adapters.push_back(read_adapter(source, each, {adapters.size() + 1, eth_ports}));
+    for (Json::Value& each : parts["adapters"]) {
+        adapters.push_back(read_adapter(source, each, {adapters.size() + 1, eth_ports, remote_ports}));
         eth_ports += adapters.back().eth_ports.size();
         index_adapter(source, each, adapters.size() - 1);
     }

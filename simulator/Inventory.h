@@ -1,22 +1,42 @@
 #pragma once
 
+#include "simulator/Counters.h"
 #include "simulator/Json_Text.h"
+#include "simulator/Remote_Ports.h"
 
 #include <cstddef>
 #include <json/json.h>
+#include <optional>
 #include <string>
 #include <unordered_map>
 #include <vector>
 
 namespace KPRV::simulator {
 
+/// What is plugged into a port, as the library's answers tell it.
+struct Optics
+{
+    Json::Value identity; // the answer of getOpticsSFP
+    Json::Value readings; // the answer of getOpticsPOM; null for optics that are not monitored
+};
+
+enum class Port_Kind
+{
+    FC,
+    ETHERNET,
+};
+
 /// A port, as the library's answers tell it.
 struct Port
 {
+    Port_Kind kind = Port_Kind::FC;
     std::string address;  // WWN of an FC port, MAC of an Ethernet port
     Json::Value data;     // the answer of getPortByWwn
     Json::Value eth_data; // `ethData` of getEthPortByEthMac; null for an FC port
-    Json::Value answers;  // answers of the author's own, by entry point
+    std::optional<Optics> optics;
+    Counters counters;         // of an FC port
+    Remote_Ports remote_ports; // of an FC port
+    Json::Value answers;       // answers of the author's own, by entry point
 };
 
 /// An adapter, as the library's answers tell it.
@@ -80,8 +100,4 @@ private:
     Index adapter_index_;
     Index port_index_;
 };
-
-/// `text` in lower case: the form in which addresses compare.
-std::string lower_case(std::string text);
-
 } // namespace KPRV::simulator

@@ -5,7 +5,7 @@
 namespace KPRV::simulator {
 
 // What people may write in an inventory, and what stands for what they leave out. Defaults that
-// depend on the rest of the adapter are filled in by Adapter_Reader.cpp.
+// depend on what surrounds the member are filled in by the readers.
 // clang-format off
 
 inline constexpr Member host_members[] = {
@@ -22,6 +22,7 @@ inline constexpr Member library_members[] = {
 inline constexpr Member inventory_members[] = {
     {"host",                  Type::OBJECT,  Presence::OPTIONAL, "{}"},
     {"library",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"remotePorts",           Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"adapters",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"faults",                Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
@@ -83,6 +84,9 @@ inline constexpr Member fc_port_members[] = {
     {"isFCoE",                Type::BOOL,    Presence::NULLABLE},
     {"isMezz",                Type::BOOL,    Presence::NULLABLE, "false"},
     {"beaconState",           Type::BOOL,    Presence::NULLABLE, "false"},
+    {"optics",                Type::OBJECT,  Presence::NULLABLE},
+    {"statistics",            Type::ARRAY,   Presence::NULLABLE},
+    {"remotePorts",           Type::ARRAY,   Presence::OPTIONAL},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
 };
@@ -93,7 +97,8 @@ inline constexpr Member eth_port_members[] = {
     {"portStatusValue",       Type::INTEGER, Presence::NULLABLE},
     {"isMezz",                Type::BOOL,    Presence::NULLABLE, "false"},
     {"beaconState",           Type::BOOL,    Presence::NULLABLE, "false"},
-    {"ethData",               Type::OBJECT,  Presence::NULLABLE, "{}"},
+    {"ethData",               Type::OBJECT,  Presence::NULLABLE},
+    {"optics",                Type::OBJECT,  Presence::NULLABLE},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
 };
@@ -102,6 +107,52 @@ inline constexpr Member eth_data_members[] = {
     {"ethDev",                Type::TEXT,    Presence::NULLABLE},
     {"ethPortStateMOFValue",  Type::COUNT,   Presence::NULLABLE},
     {"mtu",                   Type::COUNT,   Presence::NULLABLE, "1500"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member optics_members[] = {
+    {"transceiver",           Type::TEXT,    Presence::NULLABLE},
+    {"vendorName",            Type::TEXT,    Presence::NULLABLE, "\"KLDR\""},
+    {"vendorPart",            Type::TEXT,    Presence::NULLABLE, "\"KO-SFP\""},
+    {"serialNo",              Type::TEXT,    Presence::NULLABLE},
+    {"revision",              Type::TEXT,    Presence::NULLABLE, "\"A\""},
+    {"speed",                 Type::TEXT,    Presence::NULLABLE},
+    {"extendedID",            Type::TEXT,    Presence::NULLABLE, "\"SFP+\""},
+    {"readings",              Type::OBJECT,  Presence::NULLABLE},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member optics_reading_members[] = {
+    {"temperature",           Type::INTEGER, Presence::NULLABLE, "38"},
+    {"voltage",               Type::COUNT,   Presence::NULLABLE, "3290"},
+    {"biasCurrent",           Type::COUNT,   Presence::NULLABLE, "6500"},
+    {"txPower",               Type::COUNT,   Presence::NULLABLE, "560"},
+    {"rxPower",               Type::COUNT,   Presence::NULLABLE, "480"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member remote_port_members[] = {
+    {"remotePortWwn",         Type::WWN,     Presence::REQUIRED},
+    {"remoteNodeWwn",         Type::WWN,     Presence::NULLABLE},
+    {"deviceData",            Type::OBJECT,  Presence::NULLABLE, "{}"},
+    {"lunList",               Type::ARRAY,   Presence::NULLABLE, "[]"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member device_data_members[] = {
+    {"isTarget",              Type::BOOL,    Presence::NULLABLE, "true"},
+    {"type",                  Type::TEXT,    Presence::NULLABLE},
+    {"stateMofValue",         Type::INTEGER, Presence::NULLABLE, "11"},
+    {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member lun_members[] = {
+    {"number",                Type::COUNT,   Presence::NULLABLE},
+    {"vendor",                Type::TEXT,    Presence::NULLABLE, "\"KLDR\""},
+    {"productID",             Type::TEXT,    Presence::NULLABLE, "\"Simulated LUN\""},
+    {"productSerialNumber",   Type::TEXT,    Presence::NULLABLE},
+    {"lunDescription",        Type::TEXT,    Presence::NULLABLE},
+    {"lunDescIdType",         Type::COUNT,   Presence::NULLABLE},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
 };
 

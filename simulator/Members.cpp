@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <cctype>
+#include <mutex>
+#include <unordered_map>
 
 namespace KPRV::simulator {
 
@@ -39,6 +41,18 @@ bool is_number(const Json::Value& value)
     return value.type() == Json::intValue || value.type() == Json::uintValue;
 }
 
+// A large host has the same few defaults hundreds of thousands of times. The tables that hold the
+// texts are constants, so a text's place names it. Never destroyed: see Simulator::instance.
+const Json::Value& fallback_value(const char* text)
+{
+    static std::mutex& mutex = *new std::mutex;
+    static auto& values = *new std::unordered_map<const char*, Json::Value>;
+    const std::lock_guard lock(mutex);
+    const auto found = values.find(text);
+    return found != values.end() ? found->second
+                                 : values.emplace(text, Json_Text("default", text).parse()).first->second;
+}
+
 } // namespace
 
 bool has_type(const Json::Value& value, Type type)
@@ -52,6 +66,8 @@ bool has_type(const Json::Value& value, Type type)
         return is_number(value) && value.isInt();
     case Type::COUNT:
         return is_number(value) && value.isUInt();
+    case Type::COUNTER:
+        return is_number(value) && value.isUInt64();
     case Type::TEXT:
         return value.isString();
     case Type::WWN:
@@ -81,6 +97,8 @@ const char* type_words(Type type)
         return "an integer of 32 bits";
     case Type::COUNT:
         return "an unsigned integer of 32 bits";
+    case Type::COUNTER:
+        return "an unsigned integer of 64 bits";
     case Type::TEXT:
         return "a text";
     case Type::WWN:
@@ -124,14 +142,13 @@ void fill_defaults(Json::Value& object, Members members)
 {
     for (const Member& member : members)
         if (member.fallback)
-            set_default(object, member.name, Json_Text("default", member.fallback).parse());
+            set_default(object, member.name, fallback_value(member.fallback));
 }
 
 Json::Value answered_members(Json::Value object, Members members)
 {
     fill_defaults(object, members);
-    Json::Value extra;
-    object.removeMember("extra", &extra);
+    const Json::Value extra = take_part(object, "extra");
     for (const std::string& name : object.getMemberNames())
         if (object[name].isNull())
             object.removeMember(name);
@@ -144,6 +161,22 @@ void set_default(Json::Value& object, const char* name, const Json::Value& value
 {
     if (!object.isMember(name))
         object[name] = value;
+}
+
+Json::Value take_part(Json::Value& object, const char* name)
+{
+    Json::Value taken(Json::objectValue);
+    object.removeMember(name, &taken);
+    return taken;
+}
+
+void pad_text(Json::Value& object, const char* name, std::size_t length)
+{
+    if (!object.isMember(name) || !object[name].isString())
+        return;
+    std::string text = object[name].asString();
+    text.resize(std::max(text.size(), length), ' ');
+    object[name] = text;
 }
 
 } // namespace KPRV::simulator

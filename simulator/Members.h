@@ -2,6 +2,7 @@
 
 #include "simulator/Json_Text.h"
 
+#include <cstddef>
 #include <json/json.h>
 #include <span>
 #include <string>
@@ -15,6 +16,7 @@ enum class Type
     BOOL,
     INTEGER, // signed, 32 bits
     COUNT,   // unsigned, 32 bits
+    COUNTER, // unsigned, 64 bits
     TEXT,
     WWN,     // text: eight colon-separated pairs of hexadecimal digits
     MAC,     // text: six of them
@@ -58,6 +60,12 @@ Json::Value answered_members(Json::Value object, Members members);
 
 /// As fill_defaults for one member: `value` unless the object's author named the member.
 void set_default(Json::Value& object, const char* name, const Json::Value& value);
+
+/// Takes a part out of `object`: null if its author wrote null, an empty object if nothing is written.
+Json::Value take_part(Json::Value& object, const char* name);
+
+/// Fills a member that is a text with blanks up to `length`, as the fields of a device are filled.
+void pad_text(Json::Value& object, const char* name, std::size_t length);
 
 /// True if `value` is as `type` asks. `type_words` tells in words what that is.
 bool has_type(const Json::Value& value, Type type);

@@ -61,9 +61,7 @@ Json::Value eth_port_addresses(State& state, const Json::Value& request)
 
 Json::Value port_data(State& state, const Json::Value& request)
 {
-    const Json::Value address = wwn_or_mac(request);
-    return answer_at(state.inventory.port_at(address.asString()), address,
-                     [](const Inventory::Place& place) { return place.port->data; });
+    return answer_for_port(state, wwn_or_mac(request), [](const Port& port) { return port.data; });
 }
 
 Json::Value eth_port_data(State& state, const Json::Value& request)
@@ -85,15 +83,13 @@ Json::Value set_port(State& state, const Json::Value& request)
     const std::string refused = objection(names, values);
     if (!refused.empty())
         return error_answer(Error_Code::REQUEST, refused);
-    const Json::Value& address = request["indexStr"];
-    return answer_at(state.inventory.port_at(address.asString()), address,
-                     [&](const Inventory::Place& place) {
-                         for (const Json::Value& name : names)
-                             place.port->data[name.asString()] = values[name.asString()];
-                         if (std::find(names.begin(), names.end(), "portStatus") != names.end())
-                             show_status(*place.port, values["portStatus"].asBool());
-                         return done_answer();
-                     });
+    return answer_for_port(state, request["indexStr"], [&](Port& port) {
+        for (const Json::Value& name : names)
+            port.data[name.asString()] = values[name.asString()];
+        if (std::find(names.begin(), names.end(), "portStatus") != names.end())
+            show_status(port, values["portStatus"].asBool());
+        return done_answer();
+    });
 }
 
 } // namespace KPRV::simulator
