@@ -21,7 +21,7 @@ static CMPIStatus invokeMethod(CMPIMethodMI* mi, const CMPIContext* context, con
     const Meta_Feature* const feature = find_feature(meta_class, method, FLAG_METHOD);
     if (!feature)
         return scope.ret(LOG_HERE, CMPI_RC_ERR_METHOD_NOT_FOUND, method);
-    const auto* const meta_method = reinterpret_cast<const Meta_Method*>(feature);
+    const auto* const meta_method = static_cast<const Meta_Method*>(feature);
 
     // A method named like the class of its path is refused, whatever it would do.
     if (strcasecmp(class_name_of(cop), meta_method->name) == 0)

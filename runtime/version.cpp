@@ -1,7 +1,3 @@
 #include "runtime/version.h"
 
-namespace KPRV {
-
-extern constexpr int __cimple_version_2_0_16 = 0x02000010;
-
-} // namespace KPRV
+extern "C" const int __cimple_version_2_0_16 = 0x02000010;

@@ -67,12 +67,14 @@ TEST(log_configuration, names_the_files_below_home)
 {
     Temp_Folder home;
     home.write(".cimplerc", "LOG_LEVEL=DBG\n");
-    const Environment_Override override("HOME", home.path());
+    std::string folder = home.path("");
+    folder.pop_back(); // the slash
+    const Environment_Override override("HOME", folder);
     Log_Configuration configuration;
     ASSERT_TRUE(read_log_configuration(configuration));
-    EXPECT_EQ(configuration.directory, home.path(".cimple"));
-    EXPECT_EQ(configuration.messages, home.path(".cimple/messages"));
-    EXPECT_EQ(configuration.lock, home.path(".cimple/messages.lock"));
+    EXPECT_EQ(configuration.directory, folder + "/.cimple");
+    EXPECT_EQ(configuration.messages, folder + "/.cimple/messages");
+    EXPECT_EQ(configuration.lock, folder + "/.cimple/messages.lock");
 }
 
 TEST(log_configuration, nothing_without_home_or_file)
