@@ -1,0 +1,35 @@
+#pragma once
+
+#include "adapter/Host_Calls.h"
+
+#include <arpa/inet.h>
+
+namespace KPRV {
+
+/// A host with the address 10.0.0.1, for a scope.
+class Fixed_Host
+{
+public:
+    Fixed_Host()
+    {
+        host_calls.gethostname = [](char* name, size_t) {
+            name[0] = 'h';
+            name[1] = '\0';
+            return 0;
+        };
+        host_calls.gethostbyname = [](const char*) {
+            static in_addr address = {inet_addr("10.0.0.1")};
+            static char* addresses[] = {reinterpret_cast<char*>(&address), nullptr};
+            static hostent entry = {nullptr, nullptr, AF_INET, sizeof address, addresses};
+            return &entry;
+        };
+    }
+    ~Fixed_Host() { host_calls = _old; }
+    Fixed_Host(const Fixed_Host&) = delete;
+    Fixed_Host& operator=(const Fixed_Host&) = delete;
+
+private:
+    const Host_Calls _old = host_calls;
+};
+
+} // namespace KPRV
