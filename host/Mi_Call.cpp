@@ -154,13 +154,23 @@ private:
             call(mi, &Table::modifyInstance, static_cast<const CMPIInstance*>(instance.cmpi()), list_.get());
     }
 
-    /// Servers add the class's other properties, with default or null.
+    /// Servers add the keys of the path, and the class's other properties with default or null.
     Instance_Value complete(Instance_Value instance)
     {
-        if (const Class_Info* info = core().catalogue->find(instance.path.class_name))
-            for (const Feature_Info& feature : info->properties)
-                if (!instance.property(feature.name))
-                    instance.properties.push_back({feature.name, feature.default_value});
+        const Class_Info* info = core().catalogue->find(instance.path.class_name);
+        if (!info)
+            return instance;
+        for (const Feature_Info& feature : info->properties) {
+            if (instance.property(feature.name))
+                continue;
+            const Value* key = feature.key ? instance.path.key(feature.name) : nullptr;
+            if (!key)
+                instance.properties.push_back({feature.name, feature.default_value});
+            else if (is_integer(key->type) && is_integer(feature.type))
+                instance.properties.push_back({feature.name, with_integer_type(*key, feature.type)});
+            else
+                instance.properties.push_back({feature.name, *key});
+        }
         return instance;
     }
 

@@ -188,6 +188,12 @@ bool operator==(const Instance_Value& a, const Instance_Value& b)
     return a.path == b.path && a.properties == b.properties;
 }
 
+Value with_integer_type(const Value& value, CMPIType type)
+{
+    return is_signed(type) ? Value::signed_number(type, value.as_sint())
+                           : Value::unsigned_number(type, value.as_uint());
+}
+
 bool same_name(std::string_view a, std::string_view b)
 {
     return a.size() == b.size() && strncasecmp(a.data(), b.data(), a.size()) == 0;

@@ -98,6 +98,9 @@ struct Instance_Value
 
 bool operator==(const Instance_Value& a, const Instance_Value& b);
 
+/// The same integer under another integer word: how a key of a path becomes a property of its class.
+Value with_integer_type(const Value& value, CMPIType type);
+
 /// Names of CIM are compared without case.
 bool same_name(std::string_view a, std::string_view b);
 std::string lower_name(std::string_view name);

@@ -101,7 +101,7 @@ std::string plain_text(const Value& value)
     if (value.null)
         return "null";
     if (value.is_array())
-        return list_text(value, plain_text);
+        return list_text(value, mof_text);
     if (value.type == CMPI_string || value.type == CMPI_dateTime)
         return value.as_text();
     if (const Path_Value* path = value.as_path())

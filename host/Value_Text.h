@@ -4,7 +4,7 @@
 
 namespace KPRV::host {
 
-/// A value as people read it: texts as they are, arrays as "{1, 2}", "null" for null.
+/// A value as people read it: a text as it is, an array as `{"a", "b"}`, "null" for null.
 std::string plain_text(const Value& value);
 
 /// A value as MOF writes it: texts quoted and escaped, "NULL" for null, references as quoted object paths.

@@ -1,0 +1,203 @@
+#include "host/Cli.h"
+
+#include "host/Cli_Options.h"
+#include "host/Cli_Output.h"
+#include "host/Host.h"
+#include "host/Module_Search.h"
+#include "host/Type_Words.h"
+#include "host/Typed_Input.h"
+
+#include <dlfcn.h>
+
+namespace KPRV::host {
+
+namespace {
+
+constexpr int USAGE_ERROR = 2;
+
+/// One line on standard error.
+int complain(const std::string& text, int status)
+{
+    std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
+    return status;
+}
+
+/// Runs one verb on an open module.
+class Cli
+{
+public:
+    Cli(const Cli_Options& options, Host& host) : options_(options), host_(host), catalogue_(host.catalogue())
+    {
+    }
+
+    int run()
+    {
+        const std::string& verb = options_.verb;
+        if (verb == "classes")
+            return list_classes();
+        Request request;
+        if (!read_request(request))
+            return complain(error_, USAGE_ERROR);
+        Result result = host_.run(request);
+        if (!result.ok())
+            return complain(status_text(request, result), 1);
+        write(request, result);
+        return 0;
+    }
+
+private:
+    const std::string& argument(std::size_t index) const { return options_.arguments[index]; }
+
+    bool read_request(Request& request)
+    {
+        static const std::pair<const char*, Operation> verbs[] = {
+            {"ei", Operation::ENUMERATE_INSTANCES}, {"ein", Operation::ENUMERATE_INSTANCE_NAMES},
+            {"gi", Operation::GET_INSTANCE},        {"ci", Operation::CREATE_INSTANCE},
+            {"mi", Operation::MODIFY_INSTANCE},     {"di", Operation::DELETE_INSTANCE},
+            {"cm", Operation::INVOKE_METHOD},
+        };
+        for (auto [verb, operation] : verbs)
+            if (options_.verb == verb)
+                request.operation = operation;
+        if (!typed_path(catalogue_, argument(0), request.path, error_))
+            return false;
+        request.properties = options_.properties;
+        if (request.properties &&
+            !check_properties(catalogue_, request.path.class_name, *request.properties, error_))
+            return false;
+        switch (request.operation) {
+        case Operation::CREATE_INSTANCE:
+            return read_new_instance(request);
+        case Operation::MODIFY_INSTANCE:
+            return read_changes(request);
+        case Operation::INVOKE_METHOD:
+            request.method = argument(1);
+            return read_assignments(request, request.method, 2, request.in);
+        default:
+            return true;
+        }
+    }
+
+    bool read_assignments(const Request& request, const std::string& method, std::size_t from,
+                          std::vector<Named_Value>& values)
+    {
+        for (std::size_t i = from; i < options_.arguments.size(); ++i) {
+            Named_Value assignment;
+            if (!typed_assignment(catalogue_, request.path.class_name, method, argument(i), assignment,
+                                  error_))
+                return false;
+            set_value(values, assignment.name, std::move(assignment.value));
+        }
+        return true;
+    }
+
+    bool read_new_instance(Request& request)
+    {
+        Instance_Value& instance = request.instance;
+        if (!read_assignments(request, "", 1, instance.properties))
+            return false;
+        if (const Class_Info* info = catalogue_.find(request.path.class_name))
+            for (const Named_Value& property : instance.properties)
+                if (info->property(property.name)->key && !property.value.null)
+                    set_value(request.path.keys, property.name, property.value);
+        instance.path = request.path;
+        return true;
+    }
+
+    /// Only what is named is modified.
+    bool read_changes(Request& request)
+    {
+        request.instance.path = request.path;
+        if (!read_assignments(request, "", 1, request.instance.properties))
+            return false;
+        request.properties.emplace();
+        for (const Named_Value& property : request.instance.properties)
+            request.properties->push_back(property.name);
+        return true;
+    }
+
+    std::string status_text(const Request& request, const Result& result) const
+    {
+        std::string text = std::string(status_name(result.rc)) + " (" + std::to_string(result.rc) + ")";
+        if (result.exception)
+            text += ": an exception left the provider: " + *result.exception;
+        else if (!result.message.empty())
+            text += ": " + result.message;
+        else if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
+            text +=
+                ": the module has no class " + request.path.class_name + "; \"kldrcim classes\" lists them";
+        else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
+            text += ": " + request.path.class_name + " has no method " + request.method;
+        return text;
+    }
+
+    void write(const Request& request, const Result& result) const
+    {
+        switch (request.operation) {
+        case Operation::ENUMERATE_INSTANCES:
+            return write_instances(options_, result.instances);
+        case Operation::GET_INSTANCE:
+            return write_instance(options_, result.instances);
+        case Operation::INVOKE_METHOD:
+            return write_method(options_, result);
+        case Operation::ENUMERATE_INSTANCE_NAMES:
+        case Operation::CREATE_INSTANCE:
+            return write_paths(options_, result.paths);
+        default:
+            return;
+        }
+    }
+
+    int list_classes() const
+    {
+        if (!catalogue_.is_known())
+            return complain(host_.module().path() + " does not publish its classes", 0);
+        write_classes(options_, host_);
+        return 0;
+    }
+
+    const Cli_Options& options_;
+    Host& host_;
+    const Class_Catalogue& catalogue_;
+    std::string error_;
+};
+
+/// Without its adapter library the module loads and finds nothing, which should not look like "no adapters".
+void warn_without_adapter_library(const Host& host)
+{
+    if (host.catalogue().module_name() != "kldrprovider_Module")
+        return;
+    if (void* library = dlopen("libdzntj.so", RTLD_NOW | RTLD_NOLOAD))
+        dlclose(library);
+    else
+        complain("warning: the adapter library libdzntj.so is not loaded; enumerations will be empty", 0);
+}
+
+} // namespace
+
+int run_cli(const std::vector<std::string>& arguments)
+{
+    Cli_Options options;
+    std::string error;
+    if (!parse_options(arguments, options, error))
+        return complain(error, USAGE_ERROR);
+    if (options.help)
+        return std::fputs(cli_usage, stdout) < 0;
+    if (options.version)
+        return std::puts("kldrcim " KLDR_VERSION) < 0;
+    Host_Options host_options;
+    host_options.user = options.user;
+    host_options.name_space = options.name_space;
+    auto host = Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
+    if (!host)
+        return complain("cannot load the provider module: " + error, USAGE_ERROR);
+    warn_without_adapter_library(*host);
+    int status = Cli(options, *host).run();
+    for (const std::string& violation : host->violations().list())
+        complain("warning: the provider broke the CMPI contract: " + violation, 0);
+    if (options.leaks)
+        host->ledger().report(stderr);
+    return status;
+}
+
+} // namespace KPRV::host

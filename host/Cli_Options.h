@@ -1,0 +1,41 @@
+#pragma once
+
+#include "host/Request.h"
+
+namespace KPRV::host {
+
+/// What stands on the command line of `kldrcim`.
+struct Cli_Options
+{
+    enum class Format
+    {
+        TABLE,
+        JSON,
+        MOF,
+    };
+
+    Format format = Format::TABLE;
+    Property_List properties;
+    std::string name_space = "root/kaldera";
+    /// Empty: look for it.
+    std::string module;
+    std::optional<std::string> user;
+    bool leaks = false;
+    bool help = false;
+    bool version = false;
+    std::string verb;
+    /// What follows the verb.
+    std::vector<std::string> arguments;
+};
+
+/// Reads the arguments behind the program's name. False with a one-line `error` for what is not understood,
+/// wrong numbers of arguments for the verb included. Options may stand anywhere; "--" ends them.
+bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error);
+
+/// The text of `--help`.
+extern const char* const cli_usage;
+
+/// "NAME=VALUE" apart; false if there is no name or no equals sign.
+bool split_assignment(const std::string& text, std::string& name, std::string& value);
+
+} // namespace KPRV::host

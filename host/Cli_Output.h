@@ -1,0 +1,18 @@
+#pragma once
+
+#include "host/Cli_Options.h"
+#include "host/Host.h"
+
+namespace KPRV::host {
+
+/// Results on standard output, in the format of the options.
+void write_instances(const Cli_Options& options, const std::vector<Instance_Value>& instances);
+/// One instance: the object itself in JSON, a block in the table format.
+void write_instance(const Cli_Options& options, const std::vector<Instance_Value>& instances);
+void write_paths(const Cli_Options& options, const std::vector<Path_Value>& paths);
+/// Return value, then out parameters.
+void write_method(const Cli_Options& options, const Result& result);
+/// Classes that have a provider and match the verb's pattern: superclass, provider kinds, keys.
+void write_classes(const Cli_Options& options, const Host& host);
+
+} // namespace KPRV::host

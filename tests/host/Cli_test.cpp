@@ -1,0 +1,197 @@
+// The program as users run it.
+#include "Toy_Host.h"
+
+#include <json/json.h>
+#include <sys/wait.h>
+
+namespace KPRV::host {
+namespace {
+
+struct Run
+{
+    int status;
+    std::string out;
+    std::string error;
+};
+
+std::string read_file(const char* name)
+{
+    std::string text;
+    if (std::FILE* file = std::fopen(name, "r")) {
+        char buffer[4096];
+        while (std::size_t size = std::fread(buffer, 1, sizeof buffer, file))
+            text.append(buffer, size);
+        std::fclose(file);
+    }
+    return text;
+}
+
+/// `arguments` as a shell reads them.
+Run kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED)
+{
+    std::string command = std::string(KLDRCIM) + " --module " + library + " --namespace root/toy " +
+                          arguments + " >cli_test.out 2>cli_test.err";
+    int status = std::system(command.c_str());
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, read_file("cli_test.out"),
+            read_file("cli_test.err")};
+}
+
+TEST(Cli, EnumeratesNames)
+{
+    Run run = kldrcim("ein toy_item");
+    EXPECT_EQ(0, run.status);
+    EXPECT_EQ("root/toy:TOY_Item.Id=1,Name=\"one\"\n"
+              "root/toy:TOY_Item.Id=2,Name=\"two \\\"quoted\\\" \\\\\"\n",
+              run.out);
+    EXPECT_EQ("", run.error);
+}
+
+TEST(Cli, EveryPathThatItPrintsCanBeGivenBack)
+{
+    Run run = kldrcim("gi \"$(" KLDRCIM " --module " TOY_DESCRIBED
+                      " --namespace root/toy ein TOY_Item | tail -1)\"");
+    EXPECT_EQ(0, run.status) << run.error;
+    EXPECT_NE(std::string::npos, run.out.find("  Id      = 2\n")) << run.out;
+    EXPECT_EQ(std::string::npos, run.out.find("Nothing"));
+}
+
+TEST(Cli, TablesOfChosenProperties)
+{
+    Run run = kldrcim("ei TOY_Item --properties Id,U8");
+    EXPECT_EQ("Id  U8\n--  ---\n1   200\n2   200\n", run.out);
+}
+
+TEST(Cli, ManyPropertiesMakeBlocks)
+{
+    Run run = kldrcim("ei TOY_Item");
+    EXPECT_EQ(0u, run.out.find("root/toy:TOY_Item.Id=1,Name=\"one\"\n")) << run.out;
+    EXPECT_NE(std::string::npos, run.out.find("  Numbers = {0, 1, 2}\n")) << run.out;
+}
+
+TEST(Cli, Json)
+{
+    Run run = kldrcim("--format=json ei TOY_Item");
+    Json::Value parsed;
+    ASSERT_TRUE(Json::Reader().parse(run.out, parsed)) << run.out;
+    EXPECT_EQ(2u, parsed.size());
+    EXPECT_EQ(200, parsed[0]["properties"]["U8"].asInt());
+    EXPECT_TRUE(parsed[0]["properties"]["Nothing"].isNull());
+}
+
+TEST(Cli, Mof)
+{
+    Run run = kldrcim("--format mof gi 'TOY_Item.Id=1,Name=\"one\"'");
+    EXPECT_EQ(0u, run.out.find("instance of TOY_Item {\n    Id = 1;\n    Name = \"one\";\n")) << run.out;
+    EXPECT_NE(std::string::npos, run.out.find("    Texts = {\"line\\nbreak\", NULL};\n")) << run.out;
+}
+
+TEST(Cli, CreateModifyDelete)
+{
+    EXPECT_EQ("root/toy:TOY_Item.Id=9,Name=\"n\"\n", kldrcim("ci TOY_Item Id=9 Name=n U8=1").out);
+    EXPECT_EQ(0, kldrcim("mi 'TOY_Item.Id=1,Name=\"one\"' Name=new").status);
+    Run refused = kldrcim("mi 'TOY_Item.Id=1,Name=\"one\"' U8=1");
+    EXPECT_EQ(1, refused.status);
+    EXPECT_EQ("kldrcim: CIM_ERR_INVALID_PARAMETER (4)\n", refused.error);
+    EXPECT_EQ(0, kldrcim("di 'TOY_Item.Id=1,Name=\"one\"'").status);
+}
+
+TEST(Cli, MethodsInAllFormats)
+{
+    EXPECT_EQ("  return_value = 1\n  Text         = {\"a\": 1}\n",
+              kldrcim("cm TOY_Item Echo 'Text={\"a\": 1}'").out);
+    EXPECT_EQ("return_value = 1;\nText = \"t\";\n", kldrcim("--format mof cm TOY_Item Echo Text=t").out);
+    EXPECT_EQ("{\n  \"return_value\": 1,\n  \"out\": {\n    \"Text\": \"t\"\n  }\n}\n",
+              kldrcim("--format json cm TOY_Item Echo Text=t").out);
+    Run run = kldrcim("cm TOY_Item Missing");
+    EXPECT_EQ(1, run.status);
+    EXPECT_EQ("kldrcim: CIM_ERR_METHOD_NOT_FOUND (17): TOY_Item has no method Missing\n", run.error);
+}
+
+TEST(Cli, TheUserReachesTheProvider)
+{
+    EXPECT_EQ("  return_value = 0\n  User         = me\n",
+              kldrcim("--user me cm TOY_Item User", TOY_PLAIN).out);
+}
+
+TEST(Cli, Classes)
+{
+    EXPECT_EQ("Class     Superclass  Provider          Keys\n"
+              "--------  ----------  ----------------  --------\n"
+              "TOY_Item  TOY_Base    instance, method  Id, Name\n",
+              kldrcim("classes '*item'").out);
+    EXPECT_EQ("[]\n", kldrcim("--format json classes X*").out);
+    Run run = kldrcim("classes", TOY_PLAIN);
+    EXPECT_EQ(0, run.status);
+    EXPECT_NE(std::string::npos, run.error.find("does not publish its classes")) << run.error;
+}
+
+TEST(Cli, LeaksGoToStandardError)
+{
+    Run run = kldrcim("--leaks cm TOY_Item LostClone");
+    EXPECT_EQ(0, run.status);
+    EXPECT_NE(std::string::npos, run.error.find("Objects left to the server: ")) << run.error;
+    EXPECT_NE(std::string::npos, run.error.find("Objects lost: 1\n")) << run.error;
+}
+
+TEST(Cli, ViolationsAreWarnings)
+{
+    Run run = kldrcim("cm TOY_Item NullText");
+    EXPECT_EQ(0, run.status);
+    EXPECT_EQ("kldrcim: warning: the provider broke the CMPI contract: CMNewString: null text\n", run.error);
+}
+
+struct Refusal
+{
+    const char* arguments;
+    int status;
+    const char* error;
+};
+
+TEST(Cli, OneClearLineForEachMistake)
+{
+    const Refusal refusals[] = {
+        {"gi 'TOY_Item.Id=3,Name=\"x\"'", 1, "kldrcim: CIM_ERR_NOT_FOUND (6): no such item\n"},
+        {"ei TOY_None", 1,
+         "kldrcim: CIM_ERR_INVALID_CLASS (5): the module has no class TOY_None; \"kldrcim classes\" lists "
+         "them\n"},
+        {"gi 'TOY_Item.Id='", 2,
+         "kldrcim: malformed object path at column 13: expected a quoted text, a number, true or false: "
+         "TOY_Item.Id=\n"},
+        {"ei TOY_Item --properties Id,Foo", 2, "kldrcim: TOY_Item has no property \"Foo\"\n"},
+        {"ci TOY_Item Foo=1", 2, "kldrcim: TOY_Item has no property \"Foo\"\n"},
+        {"", 2, "kldrcim: no verb; \"kldrcim --help\" lists them\n"},
+        {"frobnicate", 2, "kldrcim: no verb \"frobnicate\"; \"kldrcim --help\" lists them\n"},
+        {"ei", 2, "kldrcim: usage: kldrcim [options] ei CLASS\n"},
+        {"ei TOY_Item --format xml", 2, "kldrcim: --format takes table, json or mof, not \"xml\"\n"},
+        {"ei TOY_Item --nothing", 2, "kldrcim: no option \"--nothing\"; \"kldrcim --help\" lists them\n"},
+        {"ei TOY_Item --user", 2, "kldrcim: --user wants a value\n"},
+        {"cm TOY_Item Throws", 1,
+         "kldrcim: CIM_ERR_FAILED (1): an exception left the provider: thrown by the toy\n"
+         "kldrcim: warning: the provider broke the CMPI contract: MI entry: an exception left the provider: "
+         "thrown by the toy\n"},
+    };
+    for (const Refusal& refusal : refusals) {
+        Run run = kldrcim(refusal.arguments);
+        EXPECT_EQ(refusal.status, run.status) << refusal.arguments;
+        EXPECT_EQ(refusal.error, run.error) << refusal.arguments;
+        EXPECT_EQ("", run.out) << refusal.arguments;
+    }
+}
+
+TEST(Cli, AModuleThatCannotBeLoaded)
+{
+    Run run = kldrcim("ei X", "/nowhere/lib.so");
+    EXPECT_EQ(2, run.status);
+    EXPECT_EQ(0u, run.error.find("kldrcim: cannot load the provider module: /nowhere/lib.so: ")) << run.error;
+}
+
+TEST(Cli, HelpAndVersion)
+{
+    Run run = kldrcim("--help");
+    EXPECT_EQ(0, run.status);
+    EXPECT_EQ(0u, run.out.find("Usage: kldrcim [options] VERB ARGUMENT...\n"));
+    EXPECT_EQ(0u, kldrcim("--version").out.find("kldrcim "));
+}
+
+} // namespace
+} // namespace KPRV::host
