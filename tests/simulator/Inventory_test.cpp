@@ -92,9 +92,9 @@ TEST_F(Inventory_test, the_authors_answer_comes_from_the_port_the_adapter_or_the
 
 TEST_F(Inventory_test, every_inventory_that_comes_with_the_simulator_is_good)
 {
-    const std::pair<const char*, unsigned> shipped[] = {{"demo.json", 3},    {"empty.json", 0},
-                                                        {"one_cna.json", 1}, {"one_hba.json", 1},
-                                                        {"twins.json", 2},   {"portless.json", 2}};
+    const std::pair<const char*, unsigned> shipped[] = {
+        {"demo.json", 3}, {"empty.json", 0}, {"one_cna.json", 1}, {"one_hba.json", 1},
+        {"rich.json", 3}, {"twins.json", 2}, {"portless.json", 2}};
     for (const auto& [name, adapters] : shipped) {
         EXPECT_NO_THROW(simulator.load_file(inventory(name))) << name;
         EXPECT_EQ(simulator.symbol<unsigned()>("getNumberOfAdapters")(), adapters) << name;

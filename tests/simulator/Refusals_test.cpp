@@ -15,6 +15,19 @@ struct Refusal
 
 const std::string deep = std::string(65, '[') + std::string(65, ']');
 
+// An FC port whose members go on in line 3, and a remote port of it whose members go on in line 4.
+#define TARGET "50:24:b4:c0:00:00:00:01"
+#define ON_PORT(members, reason)                                                                             \
+    {                                                                                                        \
+        "{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}, \"fcPorts\": [\n"             \
+        "{\"wwn\": \"10:00:02:4b:4c:20:00:00\",\n" members "}]}]}",                                          \
+            reason                                                                                           \
+    }
+#define ON_REMOTE_PORT(members, reason)                                                                      \
+    ON_PORT("\"remotePorts\": [{\"remotePortWwn\": \"" TARGET "\",\n" members "}]", reason)
+#define COUNTER(line, text)                                                                                  \
+    line ": a counter must be [id, value] or [id, value, growth per second], not " text
+
 // clang-format off
 const Refusal refusals[] = {
     // Syntax.
@@ -73,6 +86,51 @@ const Refusal refusals[] = {
     {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"ethPorts\": [{\n"
      "\"mac\": \"02:4b:4c:20:00:00\", \"ethData\": {\n\"mtu\": \"big\"}}]}]}",
      "3: \"mtu\" in ethData must be an unsigned integer of 32 bits, not \"big\""},
+
+    // What is behind and inside a port.
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"}, \"ethPorts\": [\n"
+     "{\"mac\": \"02:4b:4c:20:00:00\",\n\"remotePorts\": []}]}]}",
+     "3: unknown member \"remotePorts\" in an Ethernet port"},
+    ON_PORT("\"optics\": \"SFP\"",                      "3: \"optics\" in an FC port must be an object, not \"SFP\""),
+    ON_PORT("\"optics\": {\n\"vendor\": \"x\"}",        "4: unknown member \"vendor\" in optics"),
+    ON_PORT("\"optics\": {\n\"serialNo\": 7}",          "4: \"serialNo\" in optics must be a text, not 7"),
+    ON_PORT("\"optics\": {\n\"readings\": []}",         "4: \"readings\" in optics must be an object, not []"),
+    ON_PORT("\"optics\": {\"readings\": {\n\"voltage\": -1}}",
+            "4: \"voltage\" in readings must be an unsigned integer of 32 bits, not -1"),
+    ON_PORT("\"statistics\": {}",                         "3: \"statistics\" in an FC port must be an array, not {}"),
+    ON_PORT("\"statistics\": [[1, 2],\n7]",               COUNTER("4", "7")),
+    ON_PORT("\"statistics\": [\n[1]]",                    COUNTER("4", "[1]")),
+    ON_PORT("\"statistics\": [\n[1, -2]]",                COUNTER("4", "[1,-2]")),
+    ON_PORT("\"statistics\": [\n[-1, 2]]",                COUNTER("4", "[-1,2]")),
+    ON_PORT("\"statistics\": [\n[1, 2.0]]",               COUNTER("4", "[1,2.0]")),
+    ON_PORT("\"statistics\": [\n[1, \"2\", 3]]",          COUNTER("4", "[1,\"2\",3]")),
+    ON_PORT("\"statistics\": [\n[1, 2, 3, 4]]",           COUNTER("4", "[1,2,3,4]")),
+    ON_PORT("\"remotePorts\": {}",                        "3: \"remotePorts\" in an FC port must be an array, not {}"),
+    ON_PORT("\"remotePorts\": null",                      "3: \"remotePorts\" in an FC port must be an array, not null"),
+    ON_PORT("\"remotePorts\": [\n7]",                     "4: a remote port must be an object"),
+    ON_PORT("\"remotePorts\": [\nnull]",                  "4: a remote port must be an object"),
+    ON_PORT("\"remotePorts\": [\n{}]",                    "4: missing member \"remotePortWwn\" in a remote port"),
+    ON_PORT("\"remotePorts\": [\n\"" TARGET "\"]",        "4: unknown remote port \"" TARGET "\""),
+    ON_PORT("\"remotePorts\": [{\"remotePortWwn\": \"" TARGET "\"},\n{\n\"remotePortWwn\": \"50:24:B4:C0:00:00:00:01\"}]",
+            "5: duplicate remote port \"50:24:B4:C0:00:00:00:01\""),
+    ON_REMOTE_PORT("\"lun\": []",                         "4: unknown member \"lun\" in a remote port"),
+    ON_REMOTE_PORT("\"remoteNodeWwn\": \"02:4b:4c:20:00:00\"",
+                   "4: \"remoteNodeWwn\" in a remote port must be a WWN, eight colon-separated pairs of hexadecimal "
+                   "digits, not \"02:4b:4c:20:00:00\""),
+    ON_REMOTE_PORT("\"deviceData\": []",                  "4: \"deviceData\" in a remote port must be an object, not []"),
+    ON_REMOTE_PORT("\"deviceData\": {\n\"istarget\": true}", "5: unknown member \"istarget\" in deviceData"),
+    ON_REMOTE_PORT("\"deviceData\": {\n\"isTarget\": 1}", "5: \"isTarget\" in deviceData must be true or false, not 1"),
+    ON_REMOTE_PORT("\"lunList\": {}",                     "4: \"lunList\" in a remote port must be an array, not {}"),
+    ON_REMOTE_PORT("\"lunList\": [{},\n7]",               "5: a LUN must be an object"),
+    ON_REMOTE_PORT("\"lunList\": [{\n\"lunId\": 1}]",    "5: unknown member \"lunId\" in a LUN"),
+    ON_REMOTE_PORT("\"lunList\": [{\n\"number\": -1}]",
+                   "5: \"number\" in a LUN must be an unsigned integer of 32 bits, not -1"),
+    ON_REMOTE_PORT("\"lunList\": [{\n\"vendor\": 7}]",   "5: \"vendor\" in a LUN must be a text, not 7"),
+    ON_REMOTE_PORT("\"lunList\": [{\"number\": 1},\n{}]", "5: duplicate LUN number 1"),
+    {"{\"remotePorts\":\n7}",                             "2: \"remotePorts\" in the inventory must be an array, not 7"},
+    {"{\"remotePorts\": [\n\"" TARGET "\"]}",             "2: unknown remote port \"" TARGET "\""},
+    {"{\"remotePorts\": [{\"remotePortWwn\": \"" TARGET "\"},\n{\"remotePortWwn\": \"" TARGET "\"}]}",
+     "2: duplicate remote port \"" TARGET "\""},
 
     // Duplicates: of another adapter, in another letter case; of another port; of another adapter's port.
     {"{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}},\n"
