@@ -47,7 +47,7 @@ struct Host_Options
     /// judged.
     bool null_bit_on_elements = false;
     /// Text of `CMPIPrincipal`; no entry without it.
-    std::optional<std::string> user;
+    std::optional<std::string> user = {};
     /// `CMPIPrincipal` is present but its string has no text.
     bool user_without_text = false;
     /// Up-calls for a class that nobody serves, and for a name space that nobody has.

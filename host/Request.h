@@ -28,10 +28,10 @@ enum class Operation
 /// count.
 struct Association_Filter
 {
-    std::string association_class;
-    std::string result_class;
-    std::string role;
-    std::string result_role;
+    std::string association_class = {};
+    std::string result_class = {};
+    std::string role = {};
+    std::string result_role = {};
 };
 
 /// One CIM operation, from a client or from a provider's up-call.

@@ -7,7 +7,7 @@
 namespace KPRV::host {
 namespace {
 
-struct Run
+struct Outcome
 {
     int status;
     std::string out;
@@ -27,7 +27,7 @@ std::string read_file(const char* name)
 }
 
 /// `arguments` as a shell reads them.
-Run kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED)
+Outcome kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED)
 {
     std::string command = std::string(KLDRCIM) + " --module " + library + " --namespace root/toy " +
                           arguments + " >cli_test.out 2>cli_test.err";
@@ -38,7 +38,7 @@ Run kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED)
 
 TEST(Cli, EnumeratesNames)
 {
-    Run run = kldrcim("ein toy_item");
+    Outcome run = kldrcim("ein toy_item");
     EXPECT_EQ(0, run.status);
     EXPECT_EQ("root/toy:TOY_Item.Id=1,Name=\"one\"\n"
               "root/toy:TOY_Item.Id=2,Name=\"two \\\"quoted\\\" \\\\\"\n",
@@ -48,8 +48,8 @@ TEST(Cli, EnumeratesNames)
 
 TEST(Cli, EveryPathThatItPrintsCanBeGivenBack)
 {
-    Run run = kldrcim("gi \"$(" KLDRCIM " --module " TOY_DESCRIBED
-                      " --namespace root/toy ein TOY_Item | tail -1)\"");
+    Outcome run = kldrcim("gi \"$(" KLDRCIM " --module " TOY_DESCRIBED
+                          " --namespace root/toy ein TOY_Item | tail -1)\"");
     EXPECT_EQ(0, run.status) << run.error;
     EXPECT_NE(std::string::npos, run.out.find("  Id      = 2\n")) << run.out;
     EXPECT_EQ(std::string::npos, run.out.find("Nothing"));
@@ -57,20 +57,20 @@ TEST(Cli, EveryPathThatItPrintsCanBeGivenBack)
 
 TEST(Cli, TablesOfChosenProperties)
 {
-    Run run = kldrcim("ei TOY_Item --properties Id,U8");
+    Outcome run = kldrcim("ei TOY_Item --properties Id,U8");
     EXPECT_EQ("Id  U8\n--  ---\n1   200\n2   200\n", run.out);
 }
 
 TEST(Cli, ManyPropertiesMakeBlocks)
 {
-    Run run = kldrcim("ei TOY_Item");
+    Outcome run = kldrcim("ei TOY_Item");
     EXPECT_EQ(0u, run.out.find("root/toy:TOY_Item.Id=1,Name=\"one\"\n")) << run.out;
     EXPECT_NE(std::string::npos, run.out.find("  Numbers = {0, 1, 2}\n")) << run.out;
 }
 
 TEST(Cli, Json)
 {
-    Run run = kldrcim("--format=json ei TOY_Item");
+    Outcome run = kldrcim("--format=json ei TOY_Item");
     Json::Value parsed;
     ASSERT_TRUE(Json::Reader().parse(run.out, parsed)) << run.out;
     EXPECT_EQ(2u, parsed.size());
@@ -80,7 +80,7 @@ TEST(Cli, Json)
 
 TEST(Cli, Mof)
 {
-    Run run = kldrcim("--format mof gi 'TOY_Item.Id=1,Name=\"one\"'");
+    Outcome run = kldrcim("--format mof gi 'TOY_Item.Id=1,Name=\"one\"'");
     EXPECT_EQ(0u, run.out.find("instance of TOY_Item {\n    Id = 1;\n    Name = \"one\";\n")) << run.out;
     EXPECT_NE(std::string::npos, run.out.find("    Texts = {\"line\\nbreak\", NULL};\n")) << run.out;
 }
@@ -89,7 +89,7 @@ TEST(Cli, CreateModifyDelete)
 {
     EXPECT_EQ("root/toy:TOY_Item.Id=9,Name=\"n\"\n", kldrcim("ci TOY_Item Id=9 Name=n U8=1").out);
     EXPECT_EQ(0, kldrcim("mi 'TOY_Item.Id=1,Name=\"one\"' Name=new").status);
-    Run refused = kldrcim("mi 'TOY_Item.Id=1,Name=\"one\"' U8=1");
+    Outcome refused = kldrcim("mi 'TOY_Item.Id=1,Name=\"one\"' U8=1");
     EXPECT_EQ(1, refused.status);
     EXPECT_EQ("kldrcim: CIM_ERR_INVALID_PARAMETER (4)\n", refused.error);
     EXPECT_EQ(0, kldrcim("di 'TOY_Item.Id=1,Name=\"one\"'").status);
@@ -102,7 +102,7 @@ TEST(Cli, MethodsInAllFormats)
     EXPECT_EQ("return_value = 1;\nText = \"t\";\n", kldrcim("--format mof cm TOY_Item Echo Text=t").out);
     EXPECT_EQ("{\n  \"return_value\": 1,\n  \"out\": {\n    \"Text\": \"t\"\n  }\n}\n",
               kldrcim("--format json cm TOY_Item Echo Text=t").out);
-    Run run = kldrcim("cm TOY_Item Missing");
+    Outcome run = kldrcim("cm TOY_Item Missing");
     EXPECT_EQ(1, run.status);
     EXPECT_EQ("kldrcim: CIM_ERR_METHOD_NOT_FOUND (17): TOY_Item has no method Missing\n", run.error);
 }
@@ -120,14 +120,14 @@ TEST(Cli, Classes)
               "TOY_Item  TOY_Base    instance, method  Id, Name\n",
               kldrcim("classes '*item'").out);
     EXPECT_EQ("[]\n", kldrcim("--format json classes X*").out);
-    Run run = kldrcim("classes", TOY_PLAIN);
+    Outcome run = kldrcim("classes", TOY_PLAIN);
     EXPECT_EQ(0, run.status);
     EXPECT_NE(std::string::npos, run.error.find("does not publish its classes")) << run.error;
 }
 
 TEST(Cli, LeaksGoToStandardError)
 {
-    Run run = kldrcim("--leaks cm TOY_Item LostClone");
+    Outcome run = kldrcim("--leaks cm TOY_Item LostClone");
     EXPECT_EQ(0, run.status);
     EXPECT_NE(std::string::npos, run.error.find("Objects left to the server: ")) << run.error;
     EXPECT_NE(std::string::npos, run.error.find("Objects lost: 1\n")) << run.error;
@@ -135,7 +135,7 @@ TEST(Cli, LeaksGoToStandardError)
 
 TEST(Cli, ViolationsAreWarnings)
 {
-    Run run = kldrcim("cm TOY_Item NullText");
+    Outcome run = kldrcim("cm TOY_Item NullText");
     EXPECT_EQ(0, run.status);
     EXPECT_EQ("kldrcim: warning: the provider broke the CMPI contract: CMNewString: null text\n", run.error);
 }
@@ -171,7 +171,7 @@ TEST(Cli, OneClearLineForEachMistake)
          "thrown by the toy\n"},
     };
     for (const Refusal& refusal : refusals) {
-        Run run = kldrcim(refusal.arguments);
+        Outcome run = kldrcim(refusal.arguments);
         EXPECT_EQ(refusal.status, run.status) << refusal.arguments;
         EXPECT_EQ(refusal.error, run.error) << refusal.arguments;
         EXPECT_EQ("", run.out) << refusal.arguments;
@@ -180,14 +180,14 @@ TEST(Cli, OneClearLineForEachMistake)
 
 TEST(Cli, AModuleThatCannotBeLoaded)
 {
-    Run run = kldrcim("ei X", "/nowhere/lib.so");
+    Outcome run = kldrcim("ei X", "/nowhere/lib.so");
     EXPECT_EQ(2, run.status);
     EXPECT_EQ(0u, run.error.find("kldrcim: cannot load the provider module: /nowhere/lib.so: ")) << run.error;
 }
 
 TEST(Cli, HelpAndVersion)
 {
-    Run run = kldrcim("--help");
+    Outcome run = kldrcim("--help");
     EXPECT_EQ(0, run.status);
     EXPECT_EQ(0u, run.out.find("Usage: kldrcim [options] VERB ARGUMENT...\n"));
     EXPECT_EQ(0u, kldrcim("--version").out.find("kldrcim "));

@@ -54,7 +54,7 @@ constexpr Misdeed misdeeds[] = {
 };
 
 INSTANTIATE_TEST_SUITE_P(Misdeeds, Contract_Test, testing::ValuesIn(misdeeds),
-                         [](const auto& info) { return info.param.method; });
+                         [](const auto& test) { return test.param.method; });
 
 TEST(Contract, ForeignObjectsAreSeenAsSelfAndAsArgument)
 {
