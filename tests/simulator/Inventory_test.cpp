@@ -1,5 +1,7 @@
 #include "tests/simulator/Simulator_Fixture.h"
 
+#include <map>
+
 namespace KPRV::simulator {
 namespace {
 
@@ -88,6 +90,47 @@ TEST_F(Inventory_test, the_authors_answer_comes_from_the_port_the_adapter_or_the
     EXPECT_EQ(call("getServerTime"), "noon");
     EXPECT_TRUE(call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:11:00:00'}").isNull());
     EXPECT_FALSE(call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:10:00:00'}").isMember("answers"));
+}
+
+TEST_F(Inventory_test, the_rich_host_has_every_kind_of_thing)
+{
+    simulator.load_file(inventory("rich.json"));
+    std::map<std::string, int> counts;
+    const Json::Value adapters = call("getAllAdaptersIndexString")["indexStrings"];
+    for (const Json::Value& adapter : adapters) {
+        Json::Value request;
+        request["indexStr"] = adapter;
+        counts["Ethernet"] += call("getEthPhyPortIndicesByAdapter", request)["indexStrings"].size();
+        const Json::Value ports = call("getFcPhyPortIndicesByAdapter", request)["indexStrings"];
+        for (const Json::Value& port : ports) {
+            request["indexStr"] = request["wwn"] = request["pPortWwn"] = request["lPortWwn"] = port;
+            const Json::Value data = call("getPortByWwn", request);
+            for (const char* flag : {"isFCoE", "isMezz", "beaconState", "portStatus"})
+                counts[flag] += data[flag].asBool();
+            counts["empty slot"] += call("getOpticsSFP", request).isMember("error");
+            counts["without statistics"] += call("getDynamicPortStatistics", request).empty();
+            for (const Json::Value& remote : call("getAllRemotePorts", request)) {
+                request["rPortWwn"] = remote["remotePortWwn"];
+                const Json::Value complete = call("getCompleteRemotePort", request);
+                counts[complete["deviceData"]["type"].asString()]++;
+                counts["LUN"] += complete["lunList"].size();
+            }
+        }
+        counts["FC"] += ports.size();
+    }
+    EXPECT_EQ(counts, (std::map<std::string, int>{{"Disk", 3},
+                                                  {"Ethernet", 2},
+                                                  {"FC", 5},
+                                                  {"LUN", 12},
+                                                  {"Media Changer", 1},
+                                                  {"Tape", 1},
+                                                  {"Unknown", 1},
+                                                  {"beaconState", 1},
+                                                  {"empty slot", 1},
+                                                  {"isFCoE", 2},
+                                                  {"isMezz", 1},
+                                                  {"portStatus", 4},
+                                                  {"without statistics", 1}}));
 }
 
 TEST_F(Inventory_test, every_inventory_that_comes_with_the_simulator_is_good)
