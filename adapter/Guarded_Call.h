@@ -33,10 +33,10 @@ bool guarded(Call_Site site, const Guarded_Entry& entry, Body&& body)
     try {
         body();
         return true;
-    } catch (const abi::__forced_unwind&) {
-        // The thread is being cancelled, which only its end may stop.
-        throw;
     } catch (...) {
+        // Without a type it is no exception of C++: the thread is being cancelled, which nothing may stop.
+        if (!abi::__cxa_current_exception_type())
+            throw;
         log_caught(entry, site);
         return false;
     }

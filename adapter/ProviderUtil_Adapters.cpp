@@ -21,6 +21,20 @@ Guarded_Entry adapter_entry(const String& address)
     return {"libGetHbaByWwn", address.c_str()};
 }
 
+/// A boolean of `hbaData`. None if the adapter is unknown, or if it lacks the member, which is told with the
+/// words.
+std::optional<bool> adapter_flag(const String& address, const char* name, const char* failure)
+{
+    Json::Value adapter;
+    if (ProviderUtil::getAdapterDetails(address, adapter) != 0)
+        return std::nullopt;
+    const Json::Value& hba_data = member(adapter, "hbaData");
+    if (hasMember(hba_data, name))
+        return asBool(member(hba_data, name));
+    UTIL_LOG(ERR, "%s %s", failure, address.c_str());
+    return std::nullopt;
+}
+
 } // namespace
 
 int ProviderUtil::getNumberOfAdapters(Json::Value& out)
@@ -91,31 +105,16 @@ String ProviderUtil::getAdapterSerialNumber(const String& address)
 bool ProviderUtil::isCNA(const String& address)
 {
     UTIL_SCOPE("isCNA");
-    Json::Value adapter;
-    if (getAdapterDetails(address, adapter) != 0)
-        return false;
-    const Json::Value& hba_data = member(adapter, "hbaData");
-    if (!hasMember(hba_data, "isCNA")) {
-        UTIL_LOG(ERR, "Unable to get CNA info for %s", address.c_str());
-        return false;
-    }
-    return asBool(hba_data["isCNA"]);
+    return adapter_flag(address, "isCNA", "Unable to get CNA info for").value_or(false);
 }
 
 bool ProviderUtil::hasEthernetPort(const String& address)
 {
     UTIL_SCOPE("hasEthernetPort");
-    Json::Value adapter;
-    if (getAdapterDetails(address, adapter) != 0)
-        return false;
-    const Json::Value& hba_data = member(adapter, "hbaData");
-    if (!hasMember(hba_data, "hasEthPort")) {
-        UTIL_LOG(ERR, "Unable to get Ethernet info %s", address.c_str());
-        return false;
-    }
-    const bool has = asBool(hba_data["hasEthPort"]);
-    UTIL_LOG(INFO, "ethFlag = %d", has);
-    return has;
+    const auto has = adapter_flag(address, "hasEthPort", "Unable to get Ethernet info");
+    if (has)
+        UTIL_LOG(INFO, "ethFlag = %d", *has);
+    return has.value_or(false);
 }
 
 String ProviderUtil::getDriverVersion()

@@ -82,7 +82,7 @@ std::string_view ProviderUtil::trimmed(std::string_view text)
 {
     const size_t first = text.find_first_not_of(' ');
     if (first == std::string_view::npos)
-        return {};
+        return text.substr(0, 0);
     return text.substr(first, text.find_last_not_of(' ') - first + 1);
 }
 

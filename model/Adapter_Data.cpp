@@ -1,33 +1,16 @@
 #include "model/Adapter_Data.h"
 
-#include "adapter/Json_Access.h"
-#include "adapter/ProviderUtil.h"
 #include "adapter/Serial_Number.h"
 #include "model/AdapterHelper.h"
+#include "model/Record_Filling.h"
 #include "runtime/log.h"
+
+#include <cstdio>
+#include <strings.h>
 
 namespace KPRV {
 
 namespace {
-
-template <size_t N>
-void copy_member(char (&field)[N], const Json::Value& object, const char* name)
-{
-    copy_text(field, asString(member(object, name)).c_str());
-}
-
-template <size_t N>
-void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
-{
-    const std::string text = asString(member(object, name));
-    copy_text(field, ProviderUtil::trimmed(text.c_str()));
-}
-
-template <size_t N>
-void copy_flat(char (&field)[N], const Json::Value& object, const char* name)
-{
-    copy_text(field, ProviderUtil::eraseColonsFromIndex(asString(member(object, name)).c_str()).c_str());
-}
 
 /// Vendors whose cards carry no FRU number.
 bool has_no_fru(const char* vendor)

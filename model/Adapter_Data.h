@@ -2,9 +2,6 @@
 
 #include "runtime/Types.h"
 
-#include <cstring>
-#include <string_view>
-
 namespace KPRV {
 
 /// What the builders know of one adapter. Texts are cut to their field and always terminated; an unknown one
@@ -31,13 +28,5 @@ struct _adapterData
 
     const char* address() const { return isCNA ? mac : nodeWWN; }
 };
-
-template <size_t N>
-void copy_text(char (&field)[N], std::string_view text)
-{
-    const size_t size = text.size() < N ? text.size() : N - 1;
-    memcpy(field, text.data(), size);
-    field[size] = '\0';
-}
 
 } // namespace KPRV

@@ -2,6 +2,7 @@
 
 #include "adapter/Json_Access.h"
 #include "model/AdapterHelper.h"
+#include "model/Record_Filling.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Log_Capture.h"
 

@@ -1,4 +1,5 @@
 #include "model/AdapterHelper.h"
+#include "model/Record_Filling.h"
 
 #include "adapter/ProviderUtil.h"
 #include "runtime/Ref.h"
