@@ -1,5 +1,7 @@
 #include "runtime/Array.h"
 
+#include "runtime/empty_arrays.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
@@ -9,8 +11,6 @@
 namespace KPRV {
 
 namespace {
-
-constexpr uint32 FIRST_CAPACITY = 8;
 
 /// The head, and on either word size what the elements' alignment leaves free behind it.
 constexpr size_t BLOCK_EXTRA = 24;
@@ -62,12 +62,33 @@ bool element_equal(const __Array_Traits* traits, const void* a, const void* b)
     return traits->equal ? traits->equal(a, b) : memcmp(a, b, traits->size) == 0;
 }
 
+/// An array without elements.
+__Array_Rep* make_empty(const __Array_Traits* traits, uint32 capacity)
+{
+    __Array_Rep* shared = empty_array_of(traits, capacity);
+    return shared ? shared : allocate(traits, capacity);
+}
+
 __Array_Rep* make(const __Array_Traits* traits, const void* data, uint32 n)
 {
+    if (n == 0)
+        return make_empty(traits, 0);
     __Array_Rep* rep = allocate(traits, n);
     construct_elements(traits, __data(rep), data, n);
     rep->size = n;
     return rep;
+}
+
+/// Before something is written: a block of the array's own with room for n elements. Exactly n, not a
+/// doubled figure: a cell in an instance is filled once and lives long.
+void make_room(__Array_Rep*& rep, uint32 n)
+{
+    if (is_empty_array(rep)) {
+        rep = allocate(rep->traits, std::max(n, rep->capacity));
+    } else if (rep->capacity < n) {
+        rep = static_cast<__Array_Rep*>(realloc(static_cast<void*>(rep), block_size(rep->traits, n)));
+        rep->capacity = n;
+    }
 }
 
 /// Elements given to an array may be its own, which a growing block would leave behind.
@@ -81,7 +102,7 @@ bool is_own(const __Array_Rep* rep, const void* data)
 
 void __construct(__Array_Rep*& rep, const __Array_Traits* traits)
 {
-    rep = allocate(traits, FIRST_CAPACITY);
+    rep = make_empty(traits, FIRST_CAPACITY);
 }
 
 void __construct(__Array_Rep*& rep, const __Array_Traits* traits, const void* data, uint32 n)
@@ -91,6 +112,8 @@ void __construct(__Array_Rep*& rep, const __Array_Traits* traits, const void* da
 
 void __destruct(__Array_Rep* rep)
 {
+    if (is_empty_array(rep))
+        return;
     destruct_elements(rep, 0, rep->size);
     free(rep);
 }
@@ -118,11 +141,8 @@ void __assign(__Array_Rep*& rep, const void* data, uint32 n)
 
 void __reserve(__Array_Rep*& rep, uint32 n)
 {
-    // Exactly n, not a doubled figure: a cell in an instance is filled once and lives long.
-    if (rep->capacity >= n)
-        return;
-    rep = static_cast<__Array_Rep*>(realloc(static_cast<void*>(rep), block_size(rep->traits, n)));
-    rep->capacity = n;
+    if (rep->capacity < n)
+        make_room(rep, n);
 }
 
 void __insert(__Array_Rep*& rep, uint32 pos, const void* data, uint32 n)
@@ -136,7 +156,7 @@ void __insert(__Array_Rep*& rep, uint32 pos, const void* data, uint32 n)
         return;
     }
     pos = std::min(pos, rep->size);
-    __reserve(rep, rep->size + n);
+    make_room(rep, rep->size + n);
     memmove(element(rep, pos + n), element(rep, pos), size_t(rep->size - pos) * rep->traits->size);
     construct_elements(rep->traits, element(rep, pos), data, n);
     rep->size += n;
@@ -175,7 +195,7 @@ void __resize(__Array_Rep*& rep, uint32 n, const void* fill)
         __destruct(aside);
         return;
     }
-    __reserve(rep, n);
+    make_room(rep, n);
     if (!fill || !rep->traits->construct)
         memset(element(rep, rep->size), 0, size_t(n - rep->size) * rep->traits->size);
     else

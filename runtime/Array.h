@@ -15,7 +15,8 @@ struct __Array_Rep
 /// Where the elements begin: 16 on 32-bit platforms, 24 on 64-bit ones (a word behind the head stays free).
 inline constexpr size_t __ARRAY_HEAD = sizeof(void*) == 4 ? 16 : 24;
 
-// The type-erased functions behind every array. They take the address of the handle where the block may move.
+// The type-erased functions behind every array. They take the address of the handle where the block may
+// move. Positions and counts beyond the end are cut to it.
 void __construct(__Array_Rep*& rep, const __Array_Traits* traits);
 void __construct(__Array_Rep*& rep, const __Array_Traits* traits, const void* data, uint32 n);
 void __destruct(__Array_Rep* rep);
@@ -52,7 +53,8 @@ struct __Array
     __Array_Rep* rep;
 };
 
-/// Vector of T over one pointer. Copies clone the elements; nothing is shared.
+/// Vector of T over one pointer. Copies clone the elements; nothing that can be written is shared. Elements
+/// move by their bytes when a block grows. An array may be given its own elements.
 template <class T>
 class Array
 {
@@ -88,6 +90,7 @@ public:
     void prepend(const T& x) { __prepend(_rep, &x, 1); }
     void insert(uint32 pos, const T& x) { __insert(_rep, pos, &x, 1); }
     void remove(uint32 pos, uint32 n = 1) { __remove(_rep, pos, n); }
+    /// New elements are copies of the fill only if T has a constructor; plain bytes become zero.
     void resize(uint32 n, const T& fill) { __resize(_rep, n, &fill); }
     void clear() { __clear(_rep); }
     /// See `__find`.

@@ -129,6 +129,25 @@ TYPED_TEST(Array_Typed_Test, ElementsBeginBehindTheHead)
     EXPECT_EQ(block + (sizeof(void*) == 4 ? 16 : 24), reinterpret_cast<const char*>(a.data()));
 }
 
+TYPED_TEST(Array_Typed_Test, ArraysWithoutElementsShareABlockUntilOneIsWritten)
+{
+    Array<TypeParam> a;
+    const Array<TypeParam> b;
+    const Array<TypeParam> clone(b);
+    EXPECT_EQ(a.data(), b.data());
+    EXPECT_EQ(8u, b.capacity());
+    EXPECT_EQ(0u, clone.capacity());
+    a.append(value_of<TypeParam>(1));
+    EXPECT_NE(a.data(), b.data());
+    EXPECT_EQ(8u, a.capacity());
+    EXPECT_EQ(0u, b.size());
+    Array<TypeParam> c;
+    c.resize(2, value_of<TypeParam>(1));
+    EXPECT_EQ(2u, c.size());
+    EXPECT_EQ(8u, c.capacity());
+    EXPECT_EQ(0u, b.size());
+}
+
 TEST(Array, ReserveIsExact)
 {
     Array<uint32> a;
