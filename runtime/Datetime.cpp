@@ -255,10 +255,10 @@ void Datetime::ascii(char* buffer, bool pretty) const
     sint32 utc;
     get_timestamp(year, month, days, hours, minutes, seconds, usec, utc);
     (void)!snprintf(buffer, SIZE,
-                    pretty ? "%04d/%02d/%02d %02d:%02d:%02d.%06d%c%03d"
-                           : "%04d%02d%02d%02d%02d%02d.%06d%c%03d",
+                    pretty ? "%04d/%02d/%02d %02d:%02d:%02d.%06d%c%03u"
+                           : "%04d%02d%02d%02d%02d%02d.%06d%c%03u",
                     int(year), int(month), int(days), int(hours), int(minutes), int(seconds), int(usec),
-                    utc < 0 ? '-' : '+', utc < 0 ? -utc : utc);
+                    utc < 0 ? '-' : '+', utc < 0 ? 0u - unsigned(utc) : unsigned(utc));
 }
 
 String Datetime::ascii(bool pretty) const

@@ -70,6 +70,7 @@ public:
     /// Writes into a buffer of at least 32 bytes; pretty separates the fields for people.
     void ascii(char* buffer, bool pretty = false) const;
     String ascii(bool pretty = false) const;
+    /// Writes the text, without a line end.
     void print(FILE* file, bool pretty = true) const;
 
 private:

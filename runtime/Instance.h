@@ -49,7 +49,8 @@ Instance* key_clone(const Instance* instance);
 
 /// The three below do nothing unless both instances have the very same class.
 void copy(Instance* dest, const Instance* src);
-/// Only what is not null in the model. Reference arrays are copied whatever the model says.
+/// Only what is not null in the model, which has the class of the two. Reference arrays are copied whatever
+/// the model says.
 void copy(Instance* dest, const Instance* src, const Instance* model);
 void copy_keys(Instance* dest, const Instance* src);
 
@@ -66,7 +67,8 @@ bool key_eq(const Instance* a, const Instance* b);
 bool identical(const Instance* a, const Instance* b);
 
 /// Marks in the null bytes what a CIM property list (null-terminated; null for all) selects. Unknown names
-/// are skipped. -1 if a name is a method, else 0.
+/// are skipped, and keys follow `keep_keys` alone. A named reference that is null is created. -1 if a name is
+/// a method, else 0.
 int filter_properties(Instance* instance, const char* const* names, bool keep_keys);
 
 /// Calls the function on the instance, then on each instance that it refers to, depth first.

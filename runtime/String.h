@@ -16,7 +16,8 @@ struct String_Rep
 
 /// Handle to a reference-counted, copy-on-write text; one machine word, so that it can sit in an instance.
 /// Handles that share a text may be used from different threads; one handle is written by one thread at a
-/// time. All zero bytes are not a valid `String`; the empty one points at `_empty`.
+/// time. All zero bytes are not a valid `String`; the empty one points at `_empty`. A null text is taken for
+/// an empty one, and a string may be given a stretch of its own text.
 class String
 {
 public:
