@@ -197,13 +197,7 @@ TEST(Instance_clear, ResetsAllValuesToNull)
     x->__name_space = "root";
     clear(x.ptr());
     EXPECT_TRUE(x->__name_space.empty());
-#define X(TYPE, CODE)                                                                                        \
-    EXPECT_TRUE(x->Scalar_##CODE.value == TYPE()) << #CODE;                                                  \
-    EXPECT_EQ(1, x->Scalar_##CODE.null) << #CODE;                                                            \
-    EXPECT_EQ(0u, x->Array_##CODE.value.size()) << #CODE;                                                    \
-    EXPECT_EQ(1, x->Array_##CODE.null) << #CODE;
-    SAMPLE_TYPES(X)
-#undef X
+    expect_zero_cells(x.ptr(), 1);
 }
 
 TEST(Instance_clear, ReleasesReferences)

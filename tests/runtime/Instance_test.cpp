@@ -22,13 +22,7 @@ TEST(Instance, CreateFillsTheHeader)
 TEST(Instance, WithoutDefaultsAllCellsAreZeroAndNotNull)
 {
     const Ref<Sample_Types> x(create<Sample_Types>(false));
-#define X(TYPE, CODE)                                                                                        \
-    EXPECT_TRUE(x->Scalar_##CODE.value == TYPE()) << #CODE;                                                  \
-    EXPECT_EQ(0, x->Scalar_##CODE.null) << #CODE;                                                            \
-    EXPECT_EQ(0u, x->Array_##CODE.value.size()) << #CODE;                                                    \
-    EXPECT_EQ(0, x->Array_##CODE.null) << #CODE;
-    SAMPLE_TYPES(X)
-#undef X
+    expect_zero_cells(x.ptr(), 0);
     const Ref<Sample_Element> element(create<Sample_Element>(false));
     EXPECT_EQ(0, element->EnabledState.value);
     EXPECT_EQ(0, element->EnabledState.null);
@@ -38,13 +32,7 @@ TEST(Instance, WithoutDefaultsAllCellsAreZeroAndNotNull)
 TEST(Instance, WithDefaultsCellsAreNullButForThoseWithADefault)
 {
     const Ref<Sample_Types> x(create<Sample_Types>(true));
-#define X(TYPE, CODE)                                                                                        \
-    EXPECT_TRUE(x->Scalar_##CODE.value == TYPE()) << #CODE;                                                  \
-    EXPECT_EQ(1, x->Scalar_##CODE.null) << #CODE;                                                            \
-    EXPECT_EQ(0u, x->Array_##CODE.value.size()) << #CODE;                                                    \
-    EXPECT_EQ(1, x->Array_##CODE.null) << #CODE;
-    SAMPLE_TYPES(X)
-#undef X
+    expect_zero_cells(x.ptr(), 1);
 }
 
 TEST(Instance, DefaultsOfEveryShape)
@@ -145,11 +133,7 @@ TEST(Instance, TheLastReferenceReleasesArraysOfReferences)
 
 TEST(Instance, CountsTheClassesMadeAtRunTime)
 {
-    Meta_Class* record = static_cast<Meta_Class*>(calloc(1, sizeof(Meta_Class)));
-    record->refs = 1;
-    record->flags = FLAG_CLASS;
-    record->name = strdup("Made");
-    record->size = sizeof(Instance);
+    Meta_Class* record = make_counted_class("Made");
     Instance* x = create(record, false);
     EXPECT_EQ(2, record->refs);
     // A clone does not count the class, though its end is counted.

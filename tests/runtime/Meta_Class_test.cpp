@@ -1,7 +1,7 @@
 #include "runtime/Meta_Class.h"
 
 #include "runtime/meta_destroy.h"
-#include "tests/runtime/sample_classes.h"
+#include "tests/runtime/sample_values.h"
 
 #include <gtest/gtest.h>
 
@@ -17,17 +17,6 @@ const Meta_Class* const PORT = &Sample_Port::static_meta_class;
 const Meta_Class* const GROUP = &Sample_Group::static_meta_class;
 const Meta_Method* const RESET = &Sample_Element_Reset_method::static_meta_class;
 const Meta_Class* const ROOT = &Instance::static_meta_class;
-
-/// A record as one made at run time, with a count.
-Meta_Class* make_counted(const char* name)
-{
-    Meta_Class* record = static_cast<Meta_Class*>(calloc(1, sizeof(Meta_Class)));
-    record->refs = 1;
-    record->flags = FLAG_CLASS;
-    record->name = strdup(name);
-    record->size = sizeof(Instance);
-    return record;
-}
 
 } // namespace
 
@@ -175,8 +164,8 @@ TEST(Meta_Class, StaticRecordsAreNeverCounted)
 // The address sanitizer tells whether the last count frees all that the record owns, and once.
 TEST(Meta_Class, RecordsMadeAtRunTimeAreFreedByTheLastCount)
 {
-    Meta_Class* super = make_counted("Super");
-    Meta_Class* record = make_counted("Class");
+    Meta_Class* super = make_counted_class("Super");
+    Meta_Class* record = make_counted_class("Class");
     record->super_meta_class = super;
     ref(record);
     EXPECT_EQ(2, record->refs);
@@ -190,8 +179,8 @@ TEST(Meta_Class, RecordsMadeAtRunTimeAreFreedByTheLastCount)
 
 TEST(Meta_Class, AFreedRecordTakesItsPartsAlong)
 {
-    Meta_Class* target = make_counted("Target");
-    Meta_Class* record = make_counted("Class");
+    Meta_Class* target = make_counted_class("Target");
+    Meta_Class* record = make_counted_class("Class");
 
     const char** words = static_cast<const char**>(malloc(2 * sizeof(char*)));
     words[0] = strdup("a");

@@ -5,6 +5,10 @@
 #include "runtime/Ref.h"
 #include "runtime/features.h"
 
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <cstring>
 #include <type_traits>
 
 namespace KPRV {
@@ -69,6 +73,29 @@ inline Ref<Sample_Group> make_group(const char* name)
     result->Members.value.append(nullptr);
     result->Members.value.append(make_port("member", 2));
     return result;
+}
+
+/// A bare class as one made at run time, with a count of 1 that belongs to the caller.
+inline Meta_Class* make_counted_class(const char* name)
+{
+    Meta_Class* record = static_cast<Meta_Class*>(calloc(1, sizeof(Meta_Class)));
+    record->refs = 1;
+    record->flags = FLAG_CLASS;
+    record->name = strdup(name);
+    record->size = sizeof(Instance);
+    return record;
+}
+
+/// Every cell holds the zero of its type and the null byte.
+inline void expect_zero_cells(const Sample_Types* x, uint8 null)
+{
+#define X(TYPE, CODE)                                                                                        \
+    EXPECT_TRUE(x->Scalar_##CODE.value == TYPE()) << #CODE;                                                  \
+    EXPECT_EQ(null, x->Scalar_##CODE.null) << #CODE;                                                         \
+    EXPECT_EQ(0u, x->Array_##CODE.value.size()) << #CODE;                                                    \
+    EXPECT_EQ(null, x->Array_##CODE.null) << #CODE;
+    SAMPLE_TYPES(X)
+#undef X
 }
 
 /// The null byte of each property with a cell, by a function of (feature, null byte).
