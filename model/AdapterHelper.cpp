@@ -32,15 +32,7 @@ bool flash_readable(const String& index)
 
 } // namespace
 
-AdapterHelper::AdapterHelper()
-{
-    LOG(DBG, "Inside AdapterHelper Constructor");
-}
-
-AdapterHelper::~AdapterHelper()
-{
-    LOG(DBG, "Inside AdapterHelper Destructor");
-}
+AdapterHelper::AdapterHelper() : _life("AdapterHelper", LOG_HERE) {}
 
 AdapterHelper* AdapterHelper::getAdapterHelperInstance()
 {

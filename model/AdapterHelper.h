@@ -2,6 +2,7 @@
 
 #include "adapter/classId_t.h"
 #include "model/Adapter_Data.h"
+#include "model/Logged_Life.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
 #include "schema/KALDERA_AdapterSoftwareIdentity.h"
@@ -46,7 +47,6 @@ public:
 
 private:
     AdapterHelper();
-    ~AdapterHelper();
 
     /// False if the adapter has no port; `number` and `index` name it in the log. Throws `Not_Convertible`.
     bool fill(const Json::Value& answer, int number, const char* index, _adapterData& adapter) const;
@@ -57,6 +57,8 @@ private:
     void publish(Walk& walk, const String& index, int number) const;
     void publish_software(Walk& walk, const Json::Value& answer, const String& index,
                           _adapterData& adapter) const;
+
+    const Logged_Life _life;
 };
 
 } // namespace KPRV

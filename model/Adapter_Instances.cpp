@@ -85,9 +85,7 @@ KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterD
     LOG_SCOPE("getPortControllerInstance");
     const bool stopped = adapter.status == 10;
     auto* controller = create_null<KALDERA_PortController>();
-    controller->CreationClassName.set(ProviderUtil::getClassName(PORTCONTROLLER));
-    controller->SystemName.set(adapter.systemName);
-    controller->SystemCreationClassName.set(ProviderUtil::getClassName(COMPUTERSYSTEM));
+    set_system_keys(*controller, PORTCONTROLLER, adapter.systemName);
     controller->Name.set(adapter.serialNumber);
     controller->DeviceID.set(adapter.address());
     controller->OperationalStatus.set(array_of({static_cast<uint16>(adapter.status)}));

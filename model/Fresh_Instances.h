@@ -3,6 +3,8 @@
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
 
+#include <vector>
+
 namespace KPRV {
 
 /// Instances on their way to a caller. It owns them until `release`, so that nothing is lost when an
@@ -20,20 +22,24 @@ public:
     Fresh_Instances& operator=(const Fresh_Instances&) = delete;
 
     /// Takes the instance over.
-    void append(Instance* instance) { _instances.append(instance); }
-    void append(const Array<Instance*>& instances) { _instances.append(instances.data(), instances.size()); }
-    uint32 size() const { return _instances.size(); }
+    void append(Instance* instance) { _instances.push_back(instance); }
+    void append(const Array<Instance*>& instances)
+    {
+        _instances.insert(_instances.end(), instances.begin(), instances.end());
+    }
+    uint32 size() const { return static_cast<uint32>(_instances.size()); }
 
     /// Gives the instances away; the receiver owns them.
     Array<Instance*> release()
     {
-        Array<Instance*> instances(_instances);
+        Array<Instance*> instances(_instances.data(), size());
         _instances.clear();
         return instances;
     }
 
 private:
-    Array<Instance*> _instances;
+    // An array grows by exactly what is appended, which is too slow for the LUNs of a large host.
+    std::vector<Instance*> _instances;
 };
 
 } // namespace KPRV

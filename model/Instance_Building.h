@@ -1,5 +1,6 @@
 #pragma once
 
+#include "adapter/ProviderUtil.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
 
@@ -22,6 +23,15 @@ template <class T>
 Array<T> array_of(std::initializer_list<T> elements)
 {
     return Array<T>(elements.begin(), static_cast<uint32>(elements.size()));
+}
+
+/// The keys that all that belongs to the host has: its own class, and the host's class and name.
+template <class T>
+void set_system_keys(T& instance, classId_t id, const char* system_name)
+{
+    instance.CreationClassName.set(ProviderUtil::getClassName(id));
+    instance.SystemCreationClassName.set(ProviderUtil::getClassName(COMPUTERSYSTEM));
+    instance.SystemName.set(system_name);
 }
 
 inline String to_String(const std::string& text)
