@@ -2,7 +2,11 @@
 
 #include "model/AdapterHelper.h"
 #include "model/Class_Dispatch.h"
+#include "model/CommonHelper.h"
+#include "model/EthernetPortHelper.h"
 #include "model/Fresh_Instances.h"
+#include "model/PhysicalAssetHelper.h"
+#include "model/PortHelper.h"
 
 namespace KPRV {
 
@@ -12,22 +16,38 @@ Array<Instance*> by_adapter_helper(classId_t id)
 {
     return AdapterHelper::getAdapterHelperInstance()->getInstancesByClass(id);
 }
+Array<Instance*> by_common_helper(classId_t id)
+{
+    return CommonHelper::getCommonHelperObject()->getComputerSystemInstances(id);
+}
+Array<Instance*> by_port_helper(classId_t id)
+{
+    return PortHelper::getPortHelperObject()->getInstancesByClass(id);
+}
+Array<Instance*> by_ethernet_port_helper(classId_t id)
+{
+    return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(id);
+}
+Array<Instance*> by_physical_asset_helper(classId_t id)
+{
+    return PhysicalAssetHelper::getPhysicalAssetHelperObject()->getInstancesByClass(id);
+}
 
 // clang-format off
 constexpr Class_Row rows[] = {
 //   class                                       needs            helper
-    {COMPUTERSYSTEM,                             Needs::NOTHING,  nullptr},
+    {COMPUTERSYSTEM,                             Needs::NOTHING,  by_common_helper},
     {PORTCONTROLLER,                             Needs::DRIVER,   by_adapter_helper},
-    {FCPORT,                                     Needs::DRIVER,   nullptr},
-    {SCSIPROTOCOLENDPOINT,                       Needs::DRIVER,   nullptr},
-    {FCPORTSTATISTICS,                           Needs::DRIVER,   nullptr},
+    {FCPORT,                                     Needs::DRIVER,   by_port_helper},
+    {SCSIPROTOCOLENDPOINT,                       Needs::DRIVER,   by_port_helper},
+    {FCPORTSTATISTICS,                           Needs::DRIVER,   by_port_helper},
     {PHYSICALPACKAGE,                            Needs::DRIVER,   by_adapter_helper},
     {PRODUCT,                                    Needs::DRIVER,   by_adapter_helper},
     {ADAPTERSOFTWAREIDENTITY,                    Needs::DRIVER,   by_adapter_helper},
     {REMOTESERVICEACCESSPOINT,                   Needs::NOTHING,  nullptr},
     {HBASOFTWAREINSTALLATIONSERVICE,             Needs::DRIVER,   nullptr},
     {HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, Needs::DRIVER,   nullptr},
-    {ETHERNETPORT,                               Needs::DRIVER,   nullptr},
+    {ETHERNETPORT,                               Needs::DRIVER,   by_ethernet_port_helper},
     {MEMORYDIAGNOSTICTEST,                       Needs::DRIVER,   nullptr},
     {LOOPBACKDIAGNOSTICTEST,                     Needs::DRIVER,   nullptr},
     {PCILOOPBACKDIAGNOSTICTEST,                  Needs::DRIVER,   nullptr},
@@ -36,13 +56,13 @@ constexpr Class_Row rows[] = {
     {CONCRETEJOB,                                Needs::DRIVER,   nullptr},
     {DIAGNOSTICSERVICERECORD,                    Needs::DRIVER,   nullptr},
     {DIAGNOSTICCOMPLETIONRECORD,                 Needs::DRIVER,   nullptr},
-    {LOGICALPORTGROUP,                           Needs::DRIVER,   nullptr},
+    {LOGICALPORTGROUP,                           Needs::DRIVER,   by_port_helper},
     {AFFECTEDJOBELEMENT,                         Needs::DRIVER,   nullptr},
     {SERVICERECORDAPPLIESTOELEMENT,              Needs::DRIVER,   nullptr},
     {COMPLETIONRECORDAPPLIESTOELEMENT,           Needs::DRIVER,   nullptr},
-    {LANENDPOINT,                                Needs::DRIVER,   nullptr},
-    {PHYSICALCONNECTOR,                          Needs::DRIVER,   nullptr},
-    {ALARMDEVICE,                                Needs::DRIVER,   nullptr},
+    {LANENDPOINT,                                Needs::DRIVER,   by_ethernet_port_helper},
+    {PHYSICALCONNECTOR,                          Needs::DRIVER,   by_physical_asset_helper},
+    {ALARMDEVICE,                                Needs::DRIVER,   by_port_helper},
 };
 // clang-format on
 
@@ -51,7 +71,11 @@ constexpr Class_Row rows[] = {
 FCHBAManager::FCHBAManager()
 {
     LOG(DBG, "Inside FCHBAManager Constructor");
+    CommonHelper::getCommonHelperObject();
     AdapterHelper::getAdapterHelperInstance();
+    PortHelper::getPortHelperObject();
+    EthernetPortHelper::getEthernetPortHelperObject();
+    PhysicalAssetHelper::getPhysicalAssetHelperObject();
 }
 
 FCHBAManager* FCHBAManager::getFCHBAManager()
@@ -66,6 +90,31 @@ Array<Instance*> FCHBAManager::getInstances(classId_t id) const
     return dispatch_class(LOG_HERE, rows, id);
 }
 
+Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(const String& address) const
+{
+    LOG_SCOPE("getFCPortInstancesByAdapter");
+    return PortHelper::getPortHelperObject()->getFCPortInstancesByAdapter(address);
+}
+
+Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& mac) const
+{
+    LOG_SCOPE("getEthernetPortInstancesByAdapter");
+    return EthernetPortHelper::getEthernetPortHelperObject()->getEthernetPortInstancesByAdapter(mac);
+}
+
+int FCHBAManager::setAlarmState(const String& port, int state) const
+{
+    return PortHelper::getPortHelperObject()->setAlarmState(port, state);
+}
+
+Array<Instance*> FCHBAManager::joined(std::initializer_list<classId_t> ids) const
+{
+    Fresh_Instances instances;
+    for (const classId_t id : ids)
+        instances.append(getInstances(id));
+    return instances.release();
+}
+
 Array<Instance*> FCHBAManager::getDiagnosticServicesForAdapter() const
 {
     LOG_SCOPE("getDiagnosticServicesForAdapter");
@@ -75,19 +124,20 @@ Array<Instance*> FCHBAManager::getDiagnosticServicesForAdapter() const
 Array<Instance*> FCHBAManager::getDiagnosticServicesForFCPort() const
 {
     LOG_SCOPE("getDiagnosticServicesForFCPort");
-    Fresh_Instances tests;
-    tests.append(getInstances(LOOPBACKDIAGNOSTICTEST));
-    tests.append(getInstances(PCILOOPBACKDIAGNOSTICTEST));
-    return tests.release();
+    return joined({LOOPBACKDIAGNOSTICTEST, PCILOOPBACKDIAGNOSTICTEST});
 }
 
 Array<Instance*> FCHBAManager::getDiagnosticServicesForEthernetPort() const
 {
     LOG_SCOPE("getDiagnosticServicesForEthernetPort");
-    Fresh_Instances tests;
-    tests.append(getInstances(ETHLOOPBACKDIAGNOSTICTEST));
-    tests.append(getInstances(PCILOOPBACKDIAGNOSTICTEST));
-    return tests.release();
+    return joined({ETHLOOPBACKDIAGNOSTICTEST, PCILOOPBACKDIAGNOSTICTEST});
+}
+
+Array<Instance*> FCHBAManager::getAllDiagnosticTestInstances() const
+{
+    LOG_SCOPE("getAllDiagnosticTestInstances");
+    return joined(
+        {MEMORYDIAGNOSTICTEST, LOOPBACKDIAGNOSTICTEST, ETHLOOPBACKDIAGNOSTICTEST, PCILOOPBACKDIAGNOSTICTEST});
 }
 
 } // namespace KPRV

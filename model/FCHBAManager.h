@@ -3,6 +3,9 @@
 #include "adapter/classId_t.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
+#include "runtime/String.h"
+
+#include <initializer_list>
 
 namespace KPRV {
 
@@ -17,6 +20,16 @@ public:
     /// All instances of the class, each fresh; the caller owns them. Read from the library at each call.
     Array<Instance*> getInstances(classId_t id) const;
 
+    // Ports of one adapter, asked for without a look at the driver; the caller owns them.
+
+    /// The FC ports of the adapter with that address.
+    Array<Instance*> getFCPortInstancesByAdapter(const String& address) const;
+    /// The Ethernet ports of the adapter that the MAC belongs to.
+    Array<Instance*> getEthernetPortInstancesByAdapter(const String& mac) const;
+
+    /// As `PortHelper::setAlarmState`.
+    int setAlarmState(const String& port, int state) const;
+
     // The diagnostic tests that an element can be put to; the caller owns them.
 
     /// The memory test.
@@ -25,9 +38,14 @@ public:
     Array<Instance*> getDiagnosticServicesForFCPort() const;
     /// The Ethernet loopback test, then the PCI loopback test.
     Array<Instance*> getDiagnosticServicesForEthernetPort() const;
+    /// All of them: memory, loopback, Ethernet loopback, PCI loopback.
+    Array<Instance*> getAllDiagnosticTestInstances() const;
 
 private:
     FCHBAManager();
+
+    /// The instances of several classes, one after the other.
+    Array<Instance*> joined(std::initializer_list<classId_t> ids) const;
 };
 
 } // namespace KPRV

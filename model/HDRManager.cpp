@@ -1,17 +1,23 @@
 #include "model/HDRManager.h"
 
 #include "model/Class_Dispatch.h"
+#include "model/PortHelper.h"
 
 namespace KPRV {
 
 namespace {
 
+Array<Instance*> by_port_helper(classId_t id)
+{
+    return PortHelper::getPortHelperObject()->getInstancesByClass(id);
+}
+
 // clang-format off
 constexpr Class_Row rows[] = {
 //   class           needs           helper
-    {STORAGEEXTENT,  Needs::DRIVER,  nullptr},
-    {TAPEDRIVE,      Needs::DRIVER,  nullptr},
-    {LOGICALDISK,    Needs::DRIVER,  nullptr},
+    {STORAGEEXTENT,  Needs::DRIVER,  by_port_helper},
+    {TAPEDRIVE,      Needs::DRIVER,  by_port_helper},
+    {LOGICALDISK,    Needs::DRIVER,  by_port_helper},
 };
 // clang-format on
 
@@ -20,6 +26,7 @@ constexpr Class_Row rows[] = {
 HDRManager::HDRManager()
 {
     LOG(DBG, "Inside HDRManager Constructor");
+    PortHelper::getPortHelperObject();
 }
 
 HDRManager* HDRManager::getHDRManager()

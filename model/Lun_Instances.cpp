@@ -1,0 +1,134 @@
+#include "adapter/ProviderUtil.h"
+#include "model/Instance_Building.h"
+#include "model/TargetHelper.h"
+#include "runtime/log.h"
+
+#include <algorithm>
+#include <iterator>
+
+namespace KPRV {
+
+namespace {
+
+enum class Named_By
+{
+    PRODUCT,
+    DESCRIPTION,
+    NOTHING,
+};
+
+struct Name_Row
+{
+    uint32 id_type;
+    Named_By source;
+    uint16 format;
+    uint16 name_space;
+};
+
+// clang-format off
+constexpr Name_Row name_rows[] = {
+//   id type  Name                    NameFormat  NameNamespace
+    { 0,      Named_By::PRODUCT,       7,         7},
+    { 1,      Named_By::DESCRIPTION,  11,         4},
+    { 2,      Named_By::DESCRIPTION,  10,         3},
+    { 3,      Named_By::DESCRIPTION,   9,         2},
+    { 8,      Named_By::DESCRIPTION,   1,         1},
+    {10,      Named_By::NOTHING,       0,         0},
+};
+// clang-format on
+
+/// Null for an id type that is not known.
+const Name_Row* name_row(const _hbaLunInfo& lun)
+{
+    const auto row = std::ranges::find(name_rows, lun.idType, &Name_Row::id_type);
+    return row == std::end(name_rows) ? nullptr : row;
+}
+
+std::string trimmed(const char* text)
+{
+    return std::string(ProviderUtil::trimmed(text));
+}
+
+String name(Named_By source, const _hbaLunInfo& lun)
+{
+    switch (source) {
+    case Named_By::PRODUCT:
+        return to_String(trimmed(lun.vendor) + "+" + trimmed(lun.productID) + "+" +
+                         trimmed(lun.serialNumber));
+    case Named_By::DESCRIPTION:
+        return lun.description;
+    case Named_By::NOTHING:
+        break;
+    }
+    return "Unable To Fetch";
+}
+
+/// What the three classes have in common. A LUN goes by the path on which it is seen.
+template <class T>
+T* create_lun(classId_t id, const char* identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
+{
+    // Signed: a number beyond the positive range shows as a negative one.
+    const std::string element = "LUN_" + std::to_string(static_cast<sint32>(lun.number));
+    const String device_id = to_String(std::string(port.portWWN) + "_" + lun.remoteWWN + "_" +
+                                       trimmed(lun.vendor) + "_" + trimmed(lun.productID) + "_" + element);
+    T* instance = create_null<T>();
+    set_system_keys(*instance, id, port.systemName);
+    instance->ElementName.set(to_String(element));
+    instance->DeviceID.set(device_id);
+    instance->OtherIdentifyingInfo.set(array_of({device_id}));
+    instance->IdentifyingDescriptions.set(array_of<String>({identification}));
+    instance->OperationalStatus.set(array_of<uint16>({2}));
+    return instance;
+}
+
+} // namespace
+
+KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo& port,
+                                                              const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getStorageExtentInstance");
+    auto* extent = create_lun<KALDERA_StorageExtent>(
+        STORAGEEXTENT, "It is a unique identification for a Storage Extent", port, lun);
+    if (const Name_Row* row = name_row(lun)) {
+        extent->Name.set(name(row->source, lun));
+        extent->NameFormat.set(row->format);
+        extent->NameNamespace.set(row->name_space);
+    } else {
+        LOG(ERR, "Default idType. Should not have reached here. ");
+        extent->Name.set("");
+    }
+    LOG(DBG, "Returned instance of StorageExtent for port WWN= %s", port.portWWN);
+    return extent;
+}
+
+KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getTapeDriveInstance");
+    auto* drive =
+        create_lun<KALDERA_TapeDrive>(TAPEDRIVE, "It is a unique identification for a Tape Drive", port, lun);
+    if (const Name_Row* row = name_row(lun)) {
+        drive->Name.set(name(row->source, lun));
+    } else {
+        LOG(ERR, "Default case for lunInfo.idType. Should not have reached here. ");
+        drive->Name.set("");
+    }
+    LOG(DBG, "Returned instance of TapeDrive for port WWN= %s", port.portWWN);
+    return drive;
+}
+
+KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& port,
+                                                          const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getLogicalDiskInstance");
+    auto* disk = create_lun<KALDERA_LogicalDisk>(
+        LOGICALDISK, "It is a unique identification for a Logical Disk", port, lun);
+    const std::string device = trimmed(lun.deviceName);
+    const bool by_device = !device.empty();
+    disk->Name.set(by_device ? to_String(device) : String(lun.description));
+    disk->NameFormat.set(by_device ? 12 : 1);
+    disk->NameNamespace.set(by_device ? 8 : 1);
+    LOG(DBG, "Returned instance of logicalDisk for port WWN= %s", port.portWWN);
+    return disk;
+}
+
+} // namespace KPRV
