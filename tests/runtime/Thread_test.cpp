@@ -150,7 +150,7 @@ public:
         pthread_getattr_default_np(&_old);
         pthread_attr_t huge;
         pthread_attr_init(&huge);
-        pthread_attr_setstacksize(&huge, size_t(1) << (sizeof(size_t) == 4 ? 31 : 47));
+        pthread_attr_setstacksize(&huge, sizeof(size_t) == 4 ? size_t(0xF0000000) : size_t(1) << 46 << 1);
         pthread_setattr_default_np(&huge);
         pthread_attr_destroy(&huge);
     }
