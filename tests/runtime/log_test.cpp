@@ -3,7 +3,6 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
-#include <regex>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <thread>
@@ -55,10 +54,10 @@ TEST(log, a_line_is_time_level_place_and_text)
     Home home;
     home.level("DBG");
     log(Log_Level::WARN, "File.cpp", 12, "%s is %d", "answer", 42);
-    EXPECT_TRUE(
-        std::regex_match(home.messages(), std::regex("[0-9]{4}/[0-9]{2}/[0-9]{2} [0-9]{2}:[0-9]{2}:[0-9]{2} "
-                                                     "WARN: File\\.cpp\\(12\\): answer is 42\n")))
-        << home.messages();
+    const testing::Matcher<const std::string&> line =
+        testing::MatchesRegex("[0-9]{4}/[0-9]{2}/[0-9]{2} [0-9]{2}:[0-9]{2}:[0-9]{2} "
+                              "WARN: File\\.cpp\\(12\\): answer is 42\n");
+    EXPECT_TRUE(line.Matches(home.messages())) << home.messages();
 }
 
 TEST(log, levels_up_to_the_configured_one_are_written)
