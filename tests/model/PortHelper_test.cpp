@@ -138,6 +138,18 @@ TEST_F(PortHelper_Walk, port_addresses_that_are_none)
                                         "Type is not convertible to string"));
 }
 
+TEST_F(PortHelper_Walk, an_adapter_address_that_is_none)
+{
+    library.answers("getAllAdaptersIndexString", list_of({5, ADAPTER}));
+    library.answers("getFcPhyPortIndicesByAdapter", [](const Json::Value& request) {
+        return request["indexStr"] == ADAPTER ? list_of({PORT}) : json("{'error': 'no such adapter'}");
+    });
+    EXPECT_EQ(walk(FCPORT).size(), 1u);
+    EXPECT_EQ(log.said("ERR"), (Lines{"ERR libGetAllAdaptersIndexString got std exception: "
+                                      "Type is not convertible to string",
+                                      "ERR libGetFcPhyPortIndicesByAdapter returns NULL."}));
+}
+
 TEST_F(PortHelper_Walk, no_adapter_list)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]", "{'indexStrings': {}}"}) {
