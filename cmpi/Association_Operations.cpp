@@ -5,6 +5,8 @@
 #include "cmpi/entries.h"
 #include "cmpi/status_translation.h"
 
+#include <optional>
+
 // None of the four ends its result with `CMReturnDone`: the return of the entry is the end. None reads the
 // association class, since the server has come to its provider already.
 
@@ -15,11 +17,17 @@ static String filter_of(const char* text)
     return String(text ? text : "");
 }
 
-/// The object that the associations are to touch. Null for a class that this module does not know: such an
-/// object simply has no associations here.
-static const Meta_Class* source_class(const Operation_Scope& scope, const CMPIObjectPath* cop)
+/// The object that the associations are to touch. Otherwise the status that ends the entry: an object of a
+/// class that this module does not know simply has no associations here, whatever the trace says.
+static std::optional<CMPIStatus> no_source(const Operation_Scope& scope, const CMPIObjectPath* cop,
+                                           CMPIrc traced_for_unknown, Ref<Instance>& source)
 {
-    return scope.adapter()->find_meta_class(class_name_of(cop));
+    const Meta_Class* const meta_class = scope.adapter()->find_meta_class(class_name_of(cop));
+    if (!meta_class)
+        return scope.ret_ok(LOG_HERE, traced_for_unknown);
+    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, source); rc != CMPI_RC_OK)
+        return scope.ret(LOG_HERE, rc);
+    return std::nullopt;
 }
 
 static Association_Results results_of(const Operation_Scope& scope, const CMPIContext* context,
@@ -34,12 +42,9 @@ static CMPIStatus associators(CMPIAssociationMI* mi, const CMPIContext* context,
                               const char* role, const char* result_role, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "associators", LOG_HERE);
-    const Meta_Class* const meta_class = source_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_OK);
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, instance); rc != CMPI_RC_OK)
-        return scope.ret(LOG_HERE, rc);
+    if (const auto end = no_source(scope, cop, CMPI_RC_OK, instance))
+        return *end;
 
     const String result_class_text = filter_of(result_class);
     const String role_text = filter_of(role);
@@ -63,12 +68,9 @@ static CMPIStatus associatorNames(CMPIAssociationMI* mi, const CMPIContext* cont
                                   const char* role, const char* result_role)
 {
     const Operation_Scope scope(_adapter(mi), context, "associatorNames", LOG_HERE);
-    const Meta_Class* const meta_class = source_class(scope, cop);
-    if (!meta_class)
-        return scope.ret_ok(LOG_HERE, CMPI_RC_ERR_INVALID_CLASS);
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, instance); rc != CMPI_RC_OK)
-        return scope.ret(LOG_HERE, rc);
+    if (const auto end = no_source(scope, cop, CMPI_RC_ERR_INVALID_CLASS, instance))
+        return *end;
 
     Association_Results data = results_of(scope, context, result, cop, nullptr);
     const int status =
@@ -90,12 +92,9 @@ static CMPIStatus references(CMPIAssociationMI* mi, const CMPIContext* context, 
                              const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "references", LOG_HERE);
-    const Meta_Class* const meta_class = source_class(scope, cop);
-    if (!meta_class)
-        return scope.ret_ok(LOG_HERE, CMPI_RC_ERR_INVALID_CLASS);
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, instance); rc != CMPI_RC_OK)
-        return scope.ret(LOG_HERE, rc);
+    if (const auto end = no_source(scope, cop, CMPI_RC_ERR_INVALID_CLASS, instance))
+        return *end;
 
     const Ref<Instance> model = own_model(scope);
     Association_Results data = results_of(scope, context, result, cop, properties);
@@ -108,12 +107,9 @@ static CMPIStatus referenceNames(CMPIAssociationMI* mi, const CMPIContext* conte
                                  const CMPIObjectPath* cop, const char*, const char* role)
 {
     const Operation_Scope scope(_adapter(mi), context, "referenceNames", LOG_HERE);
-    const Meta_Class* const meta_class = source_class(scope, cop);
-    if (!meta_class)
-        return scope.ret_ok(LOG_HERE, CMPI_RC_ERR_INVALID_CLASS);
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, instance); rc != CMPI_RC_OK)
-        return scope.ret(LOG_HERE, rc);
+    if (const auto end = no_source(scope, cop, CMPI_RC_ERR_INVALID_CLASS, instance))
+        return *end;
 
     const Ref<Instance> model = own_model(scope);
     __set_null_flags(model.ptr(), false, true, 1);

@@ -134,15 +134,21 @@ Ref<Instance> CMPI_Thread_Context::get_instance(const char* name_space, const In
     return instance;
 }
 
+/// Path and object of an instance that is to be created or modified.
+static bool make_both(const CMPIBroker* broker, const char* name_space, const Instance* instance,
+                      CMPIObjectPath*& path, CMPIInstance*& ci)
+{
+    return name_space && instance &&
+           make_cmpi_object_path(broker, instance, name_space, path) == CMPI_RC_OK &&
+           make_cmpi_instance(broker, instance, name_space, path, nullptr, ci) == CMPI_RC_OK;
+}
+
 int CMPI_Thread_Context::create_instance(const char* name_space, const Instance* instance)
 {
-    if (!name_space || !instance)
-        return -1;
     const CMPI_Thread_Context* const top = _top();
     CMPIObjectPath* path;
     CMPIInstance* ci;
-    if (make_cmpi_object_path(top->_broker, instance, name_space, path) != CMPI_RC_OK ||
-        make_cmpi_instance(top->_broker, instance, name_space, path, nullptr, ci) != CMPI_RC_OK)
+    if (!make_both(top->_broker, name_space, instance, path, ci))
         return -1;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     CBCreateInstance(top->_broker, top->_context, path, ci, &status);
@@ -151,13 +157,10 @@ int CMPI_Thread_Context::create_instance(const char* name_space, const Instance*
 
 int CMPI_Thread_Context::modify_instance(const char* name_space, const Instance* instance)
 {
-    if (!name_space || !instance)
-        return -1;
     const CMPI_Thread_Context* const top = _top();
     CMPIObjectPath* path;
     CMPIInstance* ci;
-    if (make_cmpi_object_path(top->_broker, instance, name_space, path) != CMPI_RC_OK ||
-        make_cmpi_instance(top->_broker, instance, name_space, path, nullptr, ci) != CMPI_RC_OK)
+    if (!make_both(top->_broker, name_space, instance, path, ci))
         return -1;
     const CMPIStatus status = CBModifyInstance(top->_broker, top->_context, path, ci, nullptr);
     return status.rc == CMPI_RC_OK ? 0 : -1;

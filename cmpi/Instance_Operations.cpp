@@ -6,9 +6,20 @@
 
 namespace KPRV {
 
-static const Meta_Class* model_class(const Operation_Scope& scope, const CMPIObjectPath* cop)
+/// The keys of the path as an instance. 1 for a class that the module does not know.
+static CMPIrc model_of(const Operation_Scope& scope, const CMPIObjectPath* cop, Ref<Instance>& model)
 {
-    return scope.adapter()->find_model_meta_class(class_name_of(cop));
+    const Meta_Class* const meta_class = scope.adapter()->find_model_meta_class(class_name_of(cop));
+    return meta_class ? make_cimple_reference(nullptr, meta_class, cop, model) : CMPI_RC_ERR_FAILED;
+}
+
+/// The instance of the request. 1 for a class that the module does not know.
+static CMPIrc instance_of(const Operation_Scope& scope, const CMPIObjectPath* cop, const CMPIInstance* ci,
+                          Ref<Instance>& instance)
+{
+    const Meta_Class* const meta_class = scope.adapter()->find_model_meta_class(class_name_of(cop));
+    return meta_class ? make_cimple_instance(scope.broker(), meta_class, cop, ci, instance)
+                      : CMPI_RC_ERR_FAILED;
 }
 
 namespace {
@@ -72,12 +83,8 @@ static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* 
                                          const CMPIResult* result, const CMPIObjectPath* cop)
 {
     const Operation_Scope scope(_adapter(mi), context, "enumInstanceNames", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> model;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, model); rc != CMPI_RC_OK)
+    if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
     __set_null_flags(model.ptr(), false, true, 1);
 
@@ -95,12 +102,8 @@ static CMPIStatus enumerateInstances(CMPIInstanceMI* mi, const CMPIContext* cont
                                      const CMPIObjectPath* cop, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "enumInstances", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> model;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, model); rc != CMPI_RC_OK)
+    if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
     // Without a list the model keeps its null non-keys, where `getInstance` marks all as wanted.
     if (properties)
@@ -119,12 +122,8 @@ static CMPIStatus getInstance(CMPIInstanceMI* mi, const CMPIContext* context, co
                               const CMPIObjectPath* cop, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "getInstance", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> model;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, model); rc != CMPI_RC_OK)
+    if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
     __set_null_flags(model.ptr(), true, true, 0);
     if (properties)
@@ -151,13 +150,8 @@ static CMPIStatus createInstance(CMPIInstanceMI* mi, const CMPIContext* context,
                                  const CMPIObjectPath* cop, const CMPIInstance* ci)
 {
     const Operation_Scope scope(_adapter(mi), context, "createInstance", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_instance(scope.broker(), meta_class, cop, ci, instance);
-        rc != CMPI_RC_OK)
+    if (const CMPIrc rc = instance_of(scope, cop, ci, instance); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
 
     const int status = scope.adapter()->create_instance(instance.ptr());
@@ -179,13 +173,8 @@ static CMPIStatus modifyInstance(CMPIInstanceMI* mi, const CMPIContext* context,
                                  const CMPIObjectPath* cop, const CMPIInstance* ci, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "modifyInstance", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_instance(scope.broker(), meta_class, cop, ci, instance);
-        rc != CMPI_RC_OK)
+    if (const CMPIrc rc = instance_of(scope, cop, ci, instance); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
     const Ref<Instance> model(clone(instance.ptr()));
     filter_properties(model.ptr(), properties, true);
@@ -202,12 +191,8 @@ static CMPIStatus deleteInstance(CMPIInstanceMI* mi, const CMPIContext* context,
                                  const CMPIObjectPath* cop)
 {
     const Operation_Scope scope(_adapter(mi), context, "deleteInstance", LOG_HERE);
-    const Meta_Class* const meta_class = model_class(scope, cop);
-    if (!meta_class)
-        return scope.ret(LOG_HERE, CMPI_RC_ERR_FAILED);
-
     Ref<Instance> instance;
-    if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, instance); rc != CMPI_RC_OK)
+    if (const CMPIrc rc = model_of(scope, cop, instance); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
 
     const int status = scope.adapter()->delete_instance(instance.ptr());

@@ -2,6 +2,7 @@
 #include "cmpi/to_cimple_value.h"
 #include "runtime/type_dispatch.h"
 #include "tests/cmpi/Fake_Objects.h"
+#include "tests/cmpi/Plain_Samples.h"
 #include "tests/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
 
@@ -73,18 +74,7 @@ TEST(to_cimple_value, type_words)
 
 TEST(to_cimple_value, numbers_are_copied)
 {
-    expect_plain<boolean>(CMPI_boolean, true);
-    expect_plain<uint8>(CMPI_uint8, 255);
-    expect_plain<sint8>(CMPI_sint8, -128);
-    expect_plain<uint16>(CMPI_uint16, 65535);
-    expect_plain<sint16>(CMPI_sint16, -32768);
-    expect_plain<uint32>(CMPI_uint32, 0xFFFFFFFFu);
-    expect_plain<sint32>(CMPI_sint32, -2147483647);
-    expect_plain<uint64>(CMPI_uint64, ~uint64(0));
-    expect_plain<sint64>(CMPI_sint64, sint64(-5000000000));
-    expect_plain<real32>(CMPI_real32, 1.5f);
-    expect_plain<real64>(CMPI_real64, -2.25);
-    expect_plain<char16>(CMPI_char16, u'\u20AC');
+    for_each_plain_sample([](CMPIType type, auto x) { expect_plain(type, x); });
 }
 
 TEST(to_cimple_value, any_nonzero_byte_is_true)
