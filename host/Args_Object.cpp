@@ -17,12 +17,8 @@ CMPIStatus add_arg(const CMPIArgs* self, const char* name, const CMPIValue* valu
 CMPIData get_arg(const CMPIArgs* self, const char* name, CMPIStatus* rc)
 {
     Call<Args_Object> call("CMGetArg", self, rc, name);
-    if (!call || !call.need_text(call.core(), name, "argument name"))
-        return no_data();
-    if (const Value* value = find_value(call->content, name))
-        return make_data(call.core(), call.name(), *value);
-    call.fail(CMPI_RC_ERR_NOT_FOUND);
-    return no_data();
+    return call ? make_entry(call, call.core(), call->content, name, "argument name", CMPI_RC_ERR_NOT_FOUND)
+                : no_data();
 }
 
 CMPIData get_arg_at(const CMPIArgs* self, CMPICount index, CMPIString** name, CMPIStatus* rc)

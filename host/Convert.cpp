@@ -189,6 +189,17 @@ CMPIData make_data(Core& core, const char* maker, const Value& value)
     return data;
 }
 
+CMPIData make_entry(Call_Base& call, Core& core, const std::vector<Named_Value>& entries, const char* name,
+                    const char* what, CMPIrc missing)
+{
+    if (!call.need_text(core, name, what))
+        return no_data();
+    if (const Value* value = find_value(entries, name))
+        return make_data(core, call.name(), *value);
+    call.fail(missing);
+    return no_data();
+}
+
 CMPIData make_entry_at(Call_Base& call, Core& core, const std::vector<Named_Value>& entries, CMPICount index,
                        CMPIString** name)
 {
@@ -200,6 +211,16 @@ CMPIData make_entry_at(Call_Base& call, Core& core, const std::vector<Named_Valu
     if (name)
         *name = make_object<String_Object>(core, call.name(), entries[index].name)->cmpi();
     return make_data(core, call.name(), entries[index].value);
+}
+
+bool fits_type(Call_Base& call, Core& core, const Class_Info& info, const Feature_Info& feature,
+               CMPIType type)
+{
+    if (feature.type != type)
+        call.violation(core, CMPI_RC_ERR_INVALID_DATA_TYPE,
+                       info.name + "." + feature.name + " is " + type_word_name(feature.type) + ", not " +
+                           type_word_name(type));
+    return feature.type == type;
 }
 
 std::optional<std::vector<std::string>> read_list(const char** list)

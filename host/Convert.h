@@ -15,10 +15,19 @@ CMPIData make_data(Core& core, const char* maker, const Value& value);
 /// The array's elements as a host value.
 CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Value& result);
 
+/// The entry of that name for the getters by name, whose code for a name that is not there differs. A null
+/// name is a violation; `what` calls it by its role.
+CMPIData make_entry(Call_Base& call, Core& core, const std::vector<Named_Value>& entries, const char* name,
+                    const char* what, CMPIrc missing);
+
 /// `entries[index]` for the getters by index: the name goes out as a string object. An index beyond the end
 /// is a violation and gives code 12.
 CMPIData make_entry_at(Call_Base& call, Core& core, const std::vector<Named_Value>& entries, CMPICount index,
                        CMPIString** name);
+
+/// True if a value of that type may become the class's property or key; otherwise a violation, code 13.
+bool fits_type(Call_Base& call, Core& core, const Class_Info& info, const Feature_Info& feature,
+               CMPIType type);
 
 /// Null-terminated list to vector; nothing for a null list.
 std::optional<std::vector<std::string>> read_list(const char** list);

@@ -33,12 +33,9 @@ namespace {
 CMPIData get_property(const CMPIInstance* self, const char* name, CMPIStatus* rc)
 {
     Call<Instance_Object> call("CMGetProperty", self, rc, name);
-    if (!call || !call.need_text(call.core(), name, "property name"))
-        return no_data();
-    if (const Value* value = call->content.property(name))
-        return make_data(call.core(), call.name(), *value);
-    call.fail(CMPI_RC_ERR_NO_SUCH_PROPERTY);
-    return no_data();
+    return call ? make_entry(call, call.core(), call->content.properties, name, "property name",
+                             CMPI_RC_ERR_NO_SUCH_PROPERTY)
+                : no_data();
 }
 
 CMPIData get_property_at(const CMPIInstance* self, CMPICount index, CMPIString** name, CMPIStatus* rc)
@@ -64,11 +61,7 @@ bool fits_class(Call<Instance_Object>& call, const char* name, const Value& valu
         call.core().violations.add(call.name(), info->name + " has no property " + name);
         return false;
     }
-    if (feature->type != value.type)
-        call.violation(call.core(), CMPI_RC_ERR_INVALID_DATA_TYPE,
-                       info->name + "." + feature->name + " is " + type_word_name(feature->type) + ", not " +
-                           type_word_name(value.type));
-    return feature->type == value.type;
+    return fits_type(call, call.core(), *info, *feature, value.type);
 }
 
 CMPIStatus set_property(const CMPIInstance* self, const char* name, const CMPIValue* value, CMPIType type)

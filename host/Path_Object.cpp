@@ -97,11 +97,7 @@ bool fits_class(Call<Path_Object>& call, const char* name, Value& value)
                    (value.type == CMPI_sint64 && is_signed(feature->type));
     if (widened)
         value.type = feature->type;
-    if (feature->type != value.type)
-        call.violation(call.core(), CMPI_RC_ERR_INVALID_DATA_TYPE,
-                       info->name + "." + feature->name + " is " + type_word_name(feature->type) + ", not " +
-                           type_word_name(value.type));
-    return feature->type == value.type;
+    return fits_type(call, call.core(), *info, *feature, value.type);
 }
 
 CMPIStatus add_key(const CMPIObjectPath* self, const char* name, const CMPIValue* value, CMPIType type)
@@ -121,15 +117,12 @@ CMPIStatus add_key(const CMPIObjectPath* self, const char* name, const CMPIValue
 CMPIData get_key(const CMPIObjectPath* self, const char* name, CMPIStatus* rc)
 {
     Call<Path_Object> call("CMGetKey", self, rc, name);
-    if (!call || !call.need_text(call.core(), name, "key name"))
+    if (!call)
         return no_data();
-    const Value* value = call->content.key(name);
-    if (!value) {
-        call.fail(CMPI_RC_ERR_NOT_FOUND);
-        return no_data();
-    }
-    CMPIData data = make_data(call.core(), call.name(), *value);
-    data.state |= call->key_state;
+    CMPIData data =
+        make_entry(call, call.core(), call->content.keys, name, "key name", CMPI_RC_ERR_NOT_FOUND);
+    if (call.status().rc == CMPI_RC_OK)
+        data.state |= call->key_state;
     return data;
 }
 
