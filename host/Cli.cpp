@@ -1,7 +1,9 @@
 #include "host/Cli.h"
 
+#include "host/Association_Routing.h"
 #include "host/Cli_Options.h"
 #include "host/Cli_Output.h"
+#include "host/Cli_Topology.h"
 #include "host/Host.h"
 #include "host/Module_Search.h"
 #include "host/Type_Words.h"
@@ -35,6 +37,8 @@ public:
         const std::string& verb = options_.verb;
         if (verb == "classes")
             return list_classes();
+        if (verb == "tree" || verb == "graph")
+            return draw();
         Request request;
         if (!read_request(request))
             return complain(error_, USAGE_ERROR);
@@ -42,6 +46,7 @@ public:
         if (!result.ok())
             return complain(status_text(request, result), 1);
         write(request, result);
+        warn_of(result.failures);
         return 0;
     }
 
@@ -54,7 +59,9 @@ private:
             {"ei", Operation::ENUMERATE_INSTANCES}, {"ein", Operation::ENUMERATE_INSTANCE_NAMES},
             {"gi", Operation::GET_INSTANCE},        {"ci", Operation::CREATE_INSTANCE},
             {"mi", Operation::MODIFY_INSTANCE},     {"di", Operation::DELETE_INSTANCE},
-            {"cm", Operation::INVOKE_METHOD},
+            {"cm", Operation::INVOKE_METHOD},       {"ai", Operation::ASSOCIATORS},
+            {"ain", Operation::ASSOCIATOR_NAMES},   {"ri", Operation::REFERENCES},
+            {"rin", Operation::REFERENCE_NAMES},
         };
         for (auto [verb, operation] : verbs)
             if (options_.verb == verb)
@@ -62,6 +69,8 @@ private:
         if (!typed_path(catalogue_, argument(0), request.path, error_))
             return false;
         request.properties = options_.properties;
+        if (is_association_operation(request.operation))
+            return read_filter(request);
         if (request.properties &&
             !check_properties(catalogue_, request.path.class_name, *request.properties, error_))
             return false;
@@ -76,6 +85,18 @@ private:
         default:
             return true;
         }
+    }
+
+    /// The instances that come back are of other classes than the path, so that property names stay
+    /// unchecked.
+    bool read_filter(Request& request)
+    {
+        request.filter = options_.filter;
+        if (request.operation == Operation::REFERENCES || request.operation == Operation::REFERENCE_NAMES)
+            std::swap(request.filter.association_class, request.filter.result_class);
+        if (request.path.keys.empty())
+            error_ = argument(0) + " is a class; " + options_.verb + " wants the path of an instance";
+        return !request.path.keys.empty();
     }
 
     bool read_assignments(const Request& request, const std::string& method, std::size_t from,
@@ -116,25 +137,57 @@ private:
         return true;
     }
 
+    static std::string code_text(CMPIrc rc)
+    {
+        return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
+    }
+
     std::string status_text(const Request& request, const Result& result) const
     {
-        std::string text = std::string(status_name(result.rc)) + " (" + std::to_string(result.rc) + ")";
+        std::string text = code_text(result.rc);
         if (result.exception)
             text += ": an exception left the provider: " + *result.exception;
         else if (!result.message.empty())
             text += ": " + result.message;
         else if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
             text +=
-                ": the module has no class " + request.path.class_name + "; \"kldrcim classes\" lists them";
+                ": the module has no class " + unknown_class(request) + "; \"kldrcim classes\" lists them";
         else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
             text += ": " + request.path.class_name + " has no method " + request.method;
         return text;
+    }
+
+    std::string unknown_class(const Request& request) const
+    {
+        bool named = is_association_operation(request.operation) && !named_association(request).empty();
+        return named ? named_association(request) : request.path.class_name;
+    }
+
+    /// What is missing from an answer should not look as if it were not there.
+    static void warn_of(const std::vector<Provider_Failure>& failures)
+    {
+        for (const Provider_Failure& failure : failures)
+            complain("warning: no answer from " + failure.provider_class + ": " + code_text(failure.rc) +
+                         (failure.message.empty() ? "" : ": " + failure.message),
+                     0);
+    }
+
+    int draw()
+    {
+        std::vector<Provider_Failure> failures;
+        if (!write_topology(options_, host_, failures))
+            return complain(
+                code_text(failures.front().rc) + ": no answer from " + failures.front().provider_class, 1);
+        warn_of(failures);
+        return 0;
     }
 
     void write(const Request& request, const Result& result) const
     {
         switch (request.operation) {
         case Operation::ENUMERATE_INSTANCES:
+        case Operation::ASSOCIATORS:
+        case Operation::REFERENCES:
             return write_instances(options_, result.instances);
         case Operation::GET_INSTANCE:
             return write_instance(options_, result.instances);
@@ -142,6 +195,8 @@ private:
             return write_method(options_, result);
         case Operation::ENUMERATE_INSTANCE_NAMES:
         case Operation::CREATE_INSTANCE:
+        case Operation::ASSOCIATOR_NAMES:
+        case Operation::REFERENCE_NAMES:
             return write_paths(options_, result.paths);
         default:
             return;

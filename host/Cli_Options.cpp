@@ -25,6 +25,12 @@ constexpr Verb verbs[] = {
     {"mi", 2, any, "PATH NAME=VALUE..."},
     {"di", 1, 1, "PATH"},
     {"cm", 2, any, "PATH METHOD [NAME=VALUE...]"},
+    {"ai", 1, 1, "PATH"},
+    {"ain", 1, 1, "PATH"},
+    {"ri", 1, 1, "PATH"},
+    {"rin", 1, 1, "PATH"},
+    {"tree", 0, 0, ""},
+    {"graph", 0, 0, ""},
     {"classes", 0, 1, "[PATTERN]"},
 };
 
@@ -41,7 +47,7 @@ std::vector<std::string> split_list(const std::string& text)
     return names;
 }
 
-bool set_format(const std::string& value, Cli_Options& options)
+bool set_format(Cli_Options& options, const std::string& value)
 {
     using Format = Cli_Options::Format;
     static constexpr std::pair<const char*, Format> formats[] = {
@@ -54,47 +60,103 @@ bool set_format(const std::string& value, Cli_Options& options)
     return false;
 }
 
-/// False if the option is unknown.
-bool set_flag(const std::string& name, Cli_Options& options)
+/// False for a value that is none; only formats have such.
+using Setter = bool (*)(Cli_Options& options, const std::string& value);
+
+/// A text of the options.
+template <std::string Cli_Options::*Member>
+bool set_text(Cli_Options& options, const std::string& value)
 {
-    bool* flag = name == "--leaks"     ? &options.leaks
-                 : name == "--help"    ? &options.help
-                 : name == "-h"        ? &options.help
-                 : name == "--version" ? &options.version
-                                       : nullptr;
-    if (flag)
-        *flag = true;
-    return flag != nullptr;
+    options.*Member = value;
+    return true;
 }
 
-bool takes_value(const std::string& name)
+template <std::string Association_Filter::*Member>
+bool set_filter(Cli_Options& options, const std::string& value)
 {
-    static const char* const names[] = {"--format", "--properties", "--namespace", "--module", "--user"};
-    return std::find(std::begin(names), std::end(names), name) != std::end(names);
+    options.filter.*Member = value;
+    return true;
 }
 
-bool set_value_option(const std::string& name, const std::string& value, Cli_Options& options,
-                      std::string& error)
+bool set_properties(Cli_Options& options, const std::string& value)
 {
-    if (name == "--format" && !set_format(value, options)) {
-        error = "--format takes table, json or mof, not \"" + value + "\"";
+    options.properties = split_list(value);
+    return true;
+}
+
+bool set_user(Cli_Options& options, const std::string& value)
+{
+    options.user = value;
+    return true;
+}
+
+struct Option
+{
+    const char* name;
+    /// Null if the option takes no value.
+    Setter set;
+    /// Of an option without value.
+    bool Cli_Options::*flag;
+    /// The verbs that know the option, null for all.
+    const char* verbs;
+};
+
+using Filter = Association_Filter;
+
+// clang-format off
+constexpr Option option_table[] = {
+    {"--format",      set_format,                              nullptr,                   nullptr},
+    {"--properties",  set_properties,                          nullptr,                   nullptr},
+    {"--namespace",   set_text<&Cli_Options::name_space>,      nullptr,                   nullptr},
+    {"--module",      set_text<&Cli_Options::module>,          nullptr,                   nullptr},
+    {"--user",        set_user,                                nullptr,                   nullptr},
+    {"--assoc",       set_filter<&Filter::association_class>,  nullptr,                   "ai ain ri rin"},
+    {"--result",      set_filter<&Filter::result_class>,       nullptr,                   "ai ain"},
+    {"--role",        set_filter<&Filter::role>,               nullptr,                   "ai ain ri rin"},
+    {"--result-role", set_filter<&Filter::result_role>,        nullptr,                   "ai ain"},
+    {"--software",    nullptr,                                 &Cli_Options::software,    "tree graph"},
+    {"--connectors",  nullptr,                                 &Cli_Options::connectors,  "tree graph"},
+    {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree"},
+    {"--leaks",       nullptr,                                 &Cli_Options::leaks,       nullptr},
+    {"--help",        nullptr,                                 &Cli_Options::help,        nullptr},
+    {"-h",            nullptr,                                 &Cli_Options::help,        nullptr},
+    {"--version",     nullptr,                                 &Cli_Options::version,     nullptr},
+};
+// clang-format on
+
+const Option* find_option(const std::string& name)
+{
+    auto at = std::find_if(std::begin(option_table), std::end(option_table),
+                           [&](const Option& option) { return name == option.name; });
+    return at == std::end(option_table) ? nullptr : &*at;
+}
+
+bool contains_word(const std::string& words, const std::string& word)
+{
+    return (" " + words + " ").find(" " + word + " ") != std::string::npos;
+}
+
+/// An option that the verb would ignore is a mistake of the user, who should hear of it.
+bool check_sense(const Cli_Options& options, const std::vector<const Option*>& given, std::string& error)
+{
+    for (const Option* option : given)
+        if (option->verbs && !contains_word(option->verbs, options.verb)) {
+            error = std::string(option->name) + " makes no sense for " + options.verb + "; it is for " +
+                    option->verbs;
+            return false;
+        }
+    using Format = Cli_Options::Format;
+    if ((options.verb == "graph" && options.format != Format::TABLE) ||
+        (options.verb == "tree" && options.format == Format::MOF)) {
+        error = "--format " + std::string(options.format == Format::MOF ? "mof" : "json") +
+                " makes no sense for " + options.verb;
         return false;
     }
-    if (name == "--properties")
-        options.properties = split_list(value);
-    else if (name == "--namespace")
-        options.name_space = value;
-    else if (name == "--module")
-        options.module = value;
-    else if (name == "--user")
-        options.user = value;
     return true;
 }
 
 bool check_verb(const Cli_Options& options, std::string& error)
 {
-    if (options.help || options.version)
-        return true;
     auto verb = std::find_if(std::begin(verbs), std::end(verbs),
                              [&](const Verb& candidate) { return options.verb == candidate.name; });
     if (options.verb.empty())
@@ -102,7 +164,8 @@ bool check_verb(const Cli_Options& options, std::string& error)
     else if (verb == std::end(verbs))
         error = "no verb \"" + options.verb + "\"; \"kldrcim --help\" lists them";
     else if (options.arguments.size() < verb->least || options.arguments.size() > verb->most)
-        error = std::string("usage: kldrcim [options] ") + verb->name + " " + verb->arguments;
+        error = std::string("usage: kldrcim [options] ") + verb->name + (*verb->arguments ? " " : "") +
+                verb->arguments;
     return error.empty();
 }
 
@@ -111,6 +174,7 @@ bool check_verb(const Cli_Options& options, std::string& error)
 bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error)
 {
     bool options_end = false;
+    std::vector<const Option*> given;
     for (std::size_t i = 0; i < arguments.size(); ++i) {
         const std::string& argument = arguments[i];
         if (options_end || argument.size() < 2 || argument[0] != '-') {
@@ -125,22 +189,29 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
             continue;
         }
         std::size_t equals = argument.find('=');
-        std::string name = argument.substr(0, equals);
-        if (!takes_value(name)) {
-            if (equals == std::string::npos && set_flag(name, options))
-                continue;
+        const Option* option = find_option(argument.substr(0, equals));
+        if (!option || (option->flag && equals != std::string::npos)) {
             error = "no option \"" + argument + "\"; \"kldrcim --help\" lists them";
             return false;
         }
+        given.push_back(option);
+        if (option->flag) {
+            options.*option->flag = true;
+            continue;
+        }
         if (equals == std::string::npos && i + 1 == arguments.size()) {
-            error = name + " wants a value";
+            error = std::string(option->name) + " wants a value";
             return false;
         }
         std::string value = equals == std::string::npos ? arguments[++i] : argument.substr(equals + 1);
-        if (!set_value_option(name, value, options, error))
+        if (!option->set(options, value)) {
+            error = std::string(option->name) + " takes table, json or mof, not \"" + value + "\"";
             return false;
+        }
     }
-    return check_verb(options, error);
+    if (options.help || options.version)
+        return true;
+    return check_verb(options, error) && check_sense(options, given, error);
 }
 
 bool split_assignment(const std::string& text, std::string& name, std::string& value)

@@ -20,6 +20,13 @@ struct Cli_Options
     /// Empty: look for it.
     std::string module;
     std::optional<std::string> user;
+    /// As the four options give it; references take the association class as their result class.
+    Association_Filter filter;
+    /// What a tree or graph shows besides ports and storage.
+    bool software = false;
+    bool connectors = false;
+    /// Lines of a tree without box-drawing characters.
+    bool ascii = false;
     bool leaks = false;
     bool help = false;
     bool version = false;

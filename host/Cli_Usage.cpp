@@ -3,7 +3,7 @@
 namespace KPRV::host {
 
 const char* const cli_usage =
-    R"(Usage: kldrcim [options] VERB ARGUMENT...
+    R"usage(Usage: kldrcim [options] VERB ARGUMENT...
 
 Calls a CMPI provider module directly, as a CIM server would, without a CIM server.
 
@@ -15,6 +15,12 @@ Verbs
   mi PATH NAME=VALUE...             modify the named properties of an instance
   di PATH                           delete an instance
   cm PATH METHOD [NAME=VALUE...]    call a method; PATH may name a class alone for a static one
+  ai PATH                           instances associated with one (associators)
+  ain PATH                          their names
+  ri PATH                           associations that refer to an instance (references)
+  rin PATH                          their names
+  tree                              the host with its adapters, ports, targets and logical units, as a tree
+  graph                             the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg
   classes [PATTERN]                 list the classes that have a provider; * and ? match as in file names
 
 Options
@@ -24,6 +30,13 @@ Options
   --module FILE             provider library (default: libkldrprovider_Module.so beside this program, then in
                             /usr/lib/cim, then on the library search path)
   --user NAME               authenticated user that the provider sees (default: none)
+  --assoc CLASS             ai, ain, ri, rin: only this association class and its subclasses
+                            (default: every one that can hold the class of PATH)
+  --role ROLE               ai, ain, ri, rin: only where PATH stands in this role
+  --result CLASS            ai, ain: only results of this class or a subclass
+  --result-role ROLE        ai, ain: only results that stand in this role
+  --software, --connectors  tree, graph: also firmware and drivers, cards and transceivers
+  --ascii                   tree: no box-drawing characters (default where the locale is not UTF-8)
   --leaks                   say on standard error which CMPI objects the provider did not release
   --help, --version
 
@@ -34,13 +47,15 @@ Paths and values
   characters of a datetime, a PATH for a reference. An array is {one, two}; NULL gives no value.
 
 Exit status
-  0 success; 1 the provider or the host answered a CIM status, which is named on standard error; 2 usage, or the
-  module could not be loaded.
+  0 success, also if only some of several associations failed (a warning names them); 1 the provider or the host
+  answered a CIM status, which is named on standard error; 2 usage, or the module could not be loaded.
 
 Examples
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
   kldrcim ein KALDERA_FCPort
+  kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" --assoc KALDERA_PortControllerSystemDevice
+  kldrcim tree --software
   kldrcim --format mof gi 'KALDERA_AgentService.Name="agent"'
-)";
+)usage";
 
 } // namespace KPRV::host

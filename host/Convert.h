@@ -25,7 +25,7 @@ CMPIData make_entry(Call_Base& call, Core& core, const std::vector<Named_Value>&
 CMPIData make_entry_at(Call_Base& call, Core& core, const std::vector<Named_Value>& entries, CMPICount index,
                        CMPIString** name);
 
-/// True if a value of that type may become the class's property or key; otherwise a violation, code 13.
+/// True if a value of that type may become the class's property or key; otherwise a violation.
 bool fits_type(Call_Base& call, Core& core, const Class_Info& info, const Feature_Info& feature,
                CMPIType type);
 

@@ -2,6 +2,7 @@
 
 #include "host/Type_Words.h"
 #include "host/Value_Text.h"
+#include "host/Visible_Text.h"
 
 #include <algorithm>
 
@@ -17,24 +18,6 @@ std::size_t display_width(const std::string& text)
 {
     return static_cast<std::size_t>(
         std::count_if(text.begin(), text.end(), [](char c) { return (c & 0xC0) != 0x80; }));
-}
-
-/// Control characters, which could move a terminal's cursor, become visible.
-std::string visible(const std::string& text, bool keep_lines)
-{
-    std::string result;
-    for (char c : text) {
-        bool control = static_cast<unsigned char>(c) < 0x20 || c == 0x7F;
-        if (!control || (keep_lines && (c == '\n' || c == '\t')))
-            result += c;
-        else if (c == '\n')
-            result += "\\n";
-        else if (c == '\t')
-            result += "\\t";
-        else
-            result += '?';
-    }
-    return result;
 }
 
 std::vector<std::string> columns_of(const std::vector<Instance_Value>& instances)
@@ -107,7 +90,7 @@ std::string values_as_block(const std::vector<Named_Value>& values)
     for (const Named_Value& entry : values)
         if (!entry.value.null)
             text += "  " + entry.name + std::string(width - entry.name.size(), ' ') + " = " +
-                    visible(plain_text(entry.value), true) + "\n";
+                    visible_lines(plain_text(entry.value)) + "\n";
     return text;
 }
 
@@ -124,7 +107,7 @@ std::string instances_as_table(const std::vector<Instance_Value>& instances,
         std::vector<std::string>& row = rows.emplace_back();
         for (const std::string& heading : headings) {
             const Value* value = instance.property(heading);
-            row.push_back(value && !value->null ? visible(plain_text(*value), false) : "");
+            row.push_back(value && !value->null ? visible_text(plain_text(*value)) : "");
         }
     }
     std::size_t total = 2 * (headings.size() - 1);

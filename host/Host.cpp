@@ -1,5 +1,6 @@
 #include "host/Host.h"
 
+#include "host/Association_Routing.h"
 #include "host/Registration_Catalogue.h"
 
 namespace KPRV::host {
@@ -57,19 +58,19 @@ bool Host::is_known_class(const std::string& class_name) const
     return false;
 }
 
+/// An association may start at an object that is none of the module's, if its class is named.
+bool Host::may_be_asked(const Request& request) const
+{
+    bool named = is_association_operation(request.operation) && !named_association(request).empty();
+    return named || is_known_class(request.path.class_name);
+}
+
 std::vector<std::string> Host::classes_that_serve(const Request& request) const
 {
     Mi_Kind kind = request.operation == Operation::INVOKE_METHOD ? Mi_Kind::METHOD : Mi_Kind::INSTANCE;
-    std::string class_name = request.path.class_name;
-    if (request.operation >= Operation::ASSOCIATORS) {
-        kind = Mi_Kind::ASSOCIATION;
-        bool references = request.operation >= Operation::REFERENCES;
-        class_name = references ? request.filter.result_class : request.filter.association_class;
-    }
     // The spelling of the schema, which is that of the factories.
-    const Class_Info* info = catalogue_->find(class_name);
-    if (info)
-        class_name = info->name;
+    const Class_Info* info = catalogue_->find(request.path.class_name);
+    const std::string& class_name = info ? info->name : request.path.class_name;
     std::vector<std::string> classes;
     if (!class_name.empty() && providers_->serves(class_name, kind))
         classes.push_back(class_name);
@@ -83,7 +84,7 @@ std::vector<std::string> Host::classes_that_serve(const Request& request) const
     return classes;
 }
 
-Result Host::route(Request& request)
+Result Host::route(const Request& request)
 {
     Result result;
     std::vector<std::string> classes = classes_that_serve(request);
@@ -104,17 +105,35 @@ Result Host::route(Request& request)
     return result;
 }
 
+Result Host::traverse(const Request& request)
+{
+    Association_Merge merge;
+    bool asked = false;
+    for (const std::string& class_name : association_classes(*catalogue_, request))
+        if (providers_->serves(class_name, Mi_Kind::ASSOCIATION)) {
+            merge.add(class_name, call_provider(*broker_, *providers_, class_name, request));
+            asked = true;
+        }
+    Result result = merge.settle();
+    const std::string& named = named_association(request);
+    if (asked || (named.empty() && catalogue_->is_known()))
+        return result;
+    bool unknown = catalogue_->is_known() && !catalogue_->find(named);
+    result.rc = unknown ? CMPI_RC_ERR_INVALID_CLASS : CMPI_RC_ERR_NOT_SUPPORTED;
+    return result;
+}
+
 Result Host::run(Request request)
 {
     if (request.path.name_space.empty())
         request.path.name_space = core_->options.name_space;
     add_context(request);
-    if (request.operation < Operation::ASSOCIATORS && !is_known_class(request.path.class_name)) {
+    if (!may_be_asked(request)) {
         Result result;
         result.rc = CMPI_RC_ERR_INVALID_CLASS;
         return result;
     }
-    return route(request);
+    return is_association_operation(request.operation) ? traverse(request) : route(request);
 }
 
 Result Host::run_at(const std::string& provider_class, Request request)
@@ -131,10 +150,8 @@ Result Host::up_call(const Request& request)
         return store_.run(*catalogue_, request);
     Result result;
     bool own = same_name(request.path.name_space, core_->options.name_space);
-    if (own && (request.operation >= Operation::ASSOCIATORS || is_known_class(request.path.class_name))) {
-        Request copy = request;
-        return route(copy);
-    }
+    if (own && may_be_asked(request))
+        return is_association_operation(request.operation) ? traverse(request) : route(request);
     bool known = own || store_.has_name_space(request.path.name_space);
     result.rc = known ? core_->options.unknown_class_rc : core_->options.unknown_name_space_rc;
     return result;

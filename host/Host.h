@@ -44,7 +44,10 @@ public:
     Result reference_names(const std::string& provider_class, const Path_Value& path,
                            const Association_Filter& filter);
 
-    /// Any request; its context gets the usual entries where it has none.
+    /// Any request; its context gets the usual entries where it has none. An association request goes to the
+    /// providers of the class that its filter names and of the subclasses, or, without such a filter, to
+    /// every association with a role that can hold the path's class; objects that several report come once,
+    /// and it fails only if all fail. Rc 5 if the named class is unknown, 7 if it has no provider.
     Result run(Request request);
     /// The same, at the provider of one class.
     Result run_at(const std::string& provider_class, Request request);
@@ -82,12 +85,17 @@ private:
     Result up_call(const Request& request) override;
     CMPIrc deliver(const std::string& name_space, const Instance_Value& indication) override;
 
-    Result route(Request& request);
+    bool may_be_asked(const Request& request) const;
+    /// To one provider, or to all below a class that is enumerated.
+    Result route(const Request& request);
+    /// To every association that the request concerns.
+    Result traverse(const Request& request);
     std::vector<std::string> classes_that_serve(const Request& request) const;
     bool is_known_class(const std::string& class_name) const;
     void add_context(Request& request) const;
-    template <class Entry>
-    CMPIrc filter_call(const std::string& provider_class, const std::string& name_space, Entry entry);
+    template <class Entry, class... Arguments>
+    CMPIrc filter_call(const std::string& provider_class, const std::string& name_space, Entry entry,
+                       Arguments... arguments);
     template <class Entry>
     CMPIrc switch_call(const std::string& provider_class, Entry entry);
 

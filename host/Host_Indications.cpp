@@ -4,11 +4,12 @@
 namespace KPRV::host {
 
 /// Calls an entry that takes a filter: context, select expression and class path are made for it.
-template <class Entry>
-CMPIrc Host::filter_call(const std::string& provider_class, const std::string& name_space, Entry entry)
+template <class Entry, class... Arguments>
+CMPIrc Host::filter_call(const std::string& provider_class, const std::string& name_space, Entry entry,
+                         Arguments... arguments)
 {
     CMPIIndicationMI* mi = providers_->indication(provider_class);
-    if (!mi)
+    if (!mi || !(mi->ft->*entry))
         return CMPI_RC_ERR_NOT_SUPPORTED;
     Request request;
     request.path = {.name_space = name_space, .class_name = provider_class};
@@ -18,8 +19,8 @@ CMPIrc Host::filter_call(const std::string& provider_class, const std::string& n
     Argument<Path_Object> path(*core_, request.path);
     Result result;
     frame.run(result, [&] {
-        return entry(mi, frame.context(), static_cast<const CMPISelectExp*>(filter.cmpi()),
-                     static_cast<const CMPIObjectPath*>(path.cmpi()));
+        return (mi->ft->*entry)(mi, frame.context(), filter.cmpi(), provider_class.c_str(), path.cmpi(),
+                                arguments...);
     });
     return result.rc;
 }
@@ -41,30 +42,24 @@ CMPIrc Host::switch_call(const std::string& provider_class, Entry entry)
 
 CMPIrc Host::authorize_filter(const std::string& provider_class, const std::string& name_space)
 {
-    return filter_call(provider_class, name_space, [&](auto* mi, auto* context, auto* filter, auto* path) {
-        return mi->ft->authorizeFilter(mi, context, filter, provider_class.c_str(), path, "owner");
-    });
+    return filter_call(provider_class, name_space, &CMPIIndicationMIFT::authorizeFilter, "owner");
 }
 
 CMPIrc Host::must_poll(const std::string& provider_class, const std::string& name_space)
 {
-    return filter_call(provider_class, name_space, [&](auto* mi, auto* context, auto* filter, auto* path) {
-        return mi->ft->mustPoll(mi, context, filter, provider_class.c_str(), path);
-    });
+    return filter_call(provider_class, name_space, &CMPIIndicationMIFT::mustPoll);
 }
 
 CMPIrc Host::activate_filter(const std::string& provider_class, const std::string& name_space, bool first)
 {
-    return filter_call(provider_class, name_space, [&](auto* mi, auto* context, auto* filter, auto* path) {
-        return mi->ft->activateFilter(mi, context, filter, provider_class.c_str(), path, first);
-    });
+    return filter_call(provider_class, name_space, &CMPIIndicationMIFT::activateFilter,
+                       static_cast<CMPIBoolean>(first));
 }
 
 CMPIrc Host::deactivate_filter(const std::string& provider_class, const std::string& name_space, bool last)
 {
-    return filter_call(provider_class, name_space, [&](auto* mi, auto* context, auto* filter, auto* path) {
-        return mi->ft->deActivateFilter(mi, context, filter, provider_class.c_str(), path, last);
-    });
+    return filter_call(provider_class, name_space, &CMPIIndicationMIFT::deActivateFilter,
+                       static_cast<CMPIBoolean>(last));
 }
 
 CMPIrc Host::enable_indications(const std::string& provider_class)

@@ -50,6 +50,14 @@ struct Request
     bool from_client = true;
 };
 
+/// A provider that failed while a request went to several.
+struct Provider_Failure
+{
+    std::string provider_class;
+    CMPIrc rc;
+    std::string message;
+};
+
 /// The answer: plain values, which outlive the call.
 struct Result
 {
@@ -67,6 +75,8 @@ struct Result
     bool done = false;
     /// Text of an exception that left the provider; rc is 1 then.
     std::optional<std::string> exception = {};
+    /// Of an association request: the providers that failed. If others succeeded, rc is 0.
+    std::vector<Provider_Failure> failures = {};
 
     bool ok() const { return rc == CMPI_RC_OK; }
 };

@@ -1,0 +1,232 @@
+#include "host/Node_Label.h"
+
+#include "host/Value_Text.h"
+#include "host/Visible_Text.h"
+
+#include <algorithm>
+#include <cctype>
+#include <cstdio>
+
+namespace KPRV::host {
+
+namespace {
+
+/// By number, as the CIM Schema has them.
+const char* const enabled_states[] = {
+    "unknown", "other",    "enabled",  "disabled", "shutting down", "not applicable", "enabled but offline",
+    "in test", "deferred", "quiesced", "starting",
+};
+
+const char* const operational_states[] = {
+    "unknown",
+    "other",
+    "OK",
+    "degraded",
+    "stressed",
+    "failing soon",
+    "error",
+    "non-recoverable error",
+    "starting",
+    "stopping",
+    "stopped",
+    "in service",
+    "no contact",
+    "lost contact",
+    "aborted",
+    "dormant",
+    "supporting entity in error",
+    "completed",
+    "power mode",
+};
+
+template <std::size_t Count>
+std::string word(const char* const (&words)[Count], std::uint64_t number)
+{
+    return number < Count ? words[number] : "state " + std::to_string(number);
+}
+
+/// The property's text on one line; empty for a null or missing one.
+std::string text(const Instance_Value& instance, const char* property)
+{
+    const Value* value = instance.property(property);
+    return value && !value->null ? visible_text(plain_text(*value)) : "";
+}
+
+/// The number, or the first of an array.
+std::optional<std::uint64_t> number(const Instance_Value& instance, const char* property)
+{
+    const Value* value = instance.property(property);
+    if (value && value->is_array())
+        value = value->elements().empty() ? nullptr : &value->elements().front();
+    if (!value || value->null)
+        return std::nullopt;
+    return value->as_uint();
+}
+
+std::string state(const Instance_Value& instance)
+{
+    if (auto enabled = number(instance, "EnabledState"))
+        return word(enabled_states, *enabled);
+    auto operational = number(instance, "OperationalStatus");
+    return operational ? word(operational_states, *operational) : "";
+}
+
+std::string operational_state(const Instance_Value& instance)
+{
+    auto operational = number(instance, "OperationalStatus");
+    return operational ? word(operational_states, *operational) : state(instance);
+}
+
+Node_Label system_label(const Instance_Value& system)
+{
+    return {"host", text(system, "Name"), {operational_state(system)}};
+}
+
+Node_Label adapter_label(const Instance_Value& adapter)
+{
+    std::string kind = text(adapter, "Caption"), serial = text(adapter, "Name");
+    return {kind.empty() ? "adapter" : kind,
+            serial + (serial.empty() ? "" : " ") + "(" + text(adapter, "DeviceID") + ")",
+            {operational_state(adapter)}};
+}
+
+Node_Label software_label(const Instance_Value& software)
+{
+    std::string version = text(software, "VersionString");
+    switch (number(software, "Classifications").value_or(0)) {
+    case 2:
+        return {"driver", text(software, "InstanceID"), {version}};
+    case 10:
+        return {"firmware", version, {}};
+    case 32770:
+        return {"BIOS", version, {}};
+    default:
+        return {"software", text(software, "InstanceID"), {version}};
+    }
+}
+
+Node_Label card_label(const Instance_Value& card)
+{
+    return {"card", text(card, "Model"), {text(card, "SerialNumber"), text(card, "PartNumber")}};
+}
+
+Node_Label connector_label(const Instance_Value& connector)
+{
+    return {"transceiver",
+            text(connector, "Tag"),
+            {text(connector, "Manufacturer"), text(connector, "PartNumber"), text(connector, "Description")}};
+}
+
+Node_Label port_label(const char* what, const std::string& device, const Instance_Value& port)
+{
+    return {what,
+            colon_form(text(port, "DeviceID")),
+            {device, speed_text(number(port, "Speed").value_or(0)), state(port)}};
+}
+
+/// An endpoint at the far side is named for both sides of the path: near address, "_", far address.
+Node_Label endpoint_label(const char* what, const Instance_Value& endpoint)
+{
+    std::string name = text(endpoint, "Name");
+    return {what, colon_form(name.substr(name.find('_') + 1)), {state(endpoint)}};
+}
+
+/// Vendor and product stand in the unit's identifier, between the two addresses and the element name.
+std::string product_of(const std::string& id, const std::string& element)
+{
+    std::size_t first = id.find('_');
+    std::size_t second = first == std::string::npos ? first : id.find('_', first + 1);
+    if (second == std::string::npos || element.empty() || !id.ends_with("_" + element) ||
+        id.size() < second + element.size() + 2)
+        return "";
+    std::string product = id.substr(second + 1, id.size() - second - element.size() - 2);
+    if (std::size_t between = product.find('_'); between != std::string::npos)
+        product[between] = ' ';
+    return product;
+}
+
+Node_Label unit_label(const Instance_Value& unit)
+{
+    std::string element = text(unit, "ElementName"), id = text(unit, "DeviceID");
+    bool is_tape = same_name(unit.path.class_name, "KALDERA_TapeDrive");
+    return {is_tape ? "tape" : "disk",
+            element.empty() ? id : element,
+            {product_of(id, element), text(unit, "Name")}};
+}
+
+Node_Label label_of(const Topology::Node& node)
+{
+    switch (node.kind) {
+    case Node_Kind::SYSTEM:
+        return system_label(node.instance);
+    case Node_Kind::ADAPTER:
+        return adapter_label(node.instance);
+    case Node_Kind::SOFTWARE:
+        return software_label(node.instance);
+    case Node_Kind::CARD:
+        return card_label(node.instance);
+    case Node_Kind::CONNECTOR:
+        return connector_label(node.instance);
+    case Node_Kind::FC_PORT:
+        return port_label("FC port", "", node.instance);
+    case Node_Kind::ETHERNET_PORT:
+        return port_label("Ethernet port", text(node.instance, "ElementName"), node.instance);
+    case Node_Kind::INITIATOR:
+        return endpoint_label("initiator", node.instance);
+    case Node_Kind::TARGET:
+        return endpoint_label("target", node.instance);
+    default:
+        return unit_label(node.instance);
+    }
+}
+
+} // namespace
+
+Node_Label node_label(const Topology::Node& node)
+{
+    Node_Label label = label_of(node);
+    std::erase(label.facts, "");
+    return label;
+}
+
+std::string label_line(const Node_Label& label)
+{
+    std::string line = label.what + (label.name.empty() ? "" : " ") + label.name;
+    for (std::size_t i = 0; i < label.facts.size(); ++i)
+        line += (i ? ", " : " ") + label.facts[i];
+    return line;
+}
+
+const char* node_kind_name(Node_Kind kind)
+{
+    static const char* const names[] = {"system",  "adapter",       "software",  "card",   "connector",
+                                        "fc_port", "ethernet_port", "initiator", "target", "unit"};
+    return names[static_cast<int>(kind)];
+}
+
+std::string colon_form(const std::string& address)
+{
+    bool is_address = (address.size() == 12 || address.size() == 16) &&
+                      std::all_of(address.begin(), address.end(),
+                                  [](char c) { return std::isxdigit(static_cast<unsigned char>(c)); });
+    if (!is_address)
+        return address;
+    std::string colons;
+    for (std::size_t i = 0; i < address.size(); i += 2)
+        colons += (i ? ":" : "") + address.substr(i, 2);
+    return colons;
+}
+
+std::string speed_text(std::uint64_t bits_per_second)
+{
+    char text[32];
+    if (bits_per_second == 0)
+        return "";
+    if (bits_per_second < 1000000000)
+        std::snprintf(text, sizeof text, "%g Mb/s", static_cast<double>(bits_per_second) / 1e6);
+    else
+        std::snprintf(text, sizeof text, "%g Gb/s", static_cast<double>(bits_per_second) / 1e9);
+    return text;
+}
+
+} // namespace KPRV::host
