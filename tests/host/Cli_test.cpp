@@ -1,40 +1,11 @@
 // The program as users run it.
+#include "Run_Kldrcim.h"
 #include "Toy_Host.h"
 
 #include <json/json.h>
-#include <sys/wait.h>
 
 namespace KPRV::host {
 namespace {
-
-struct Outcome
-{
-    int status;
-    std::string out;
-    std::string error;
-};
-
-std::string read_file(const char* name)
-{
-    std::string text;
-    if (std::FILE* file = std::fopen(name, "r")) {
-        char buffer[4096];
-        while (std::size_t size = std::fread(buffer, 1, sizeof buffer, file))
-            text.append(buffer, size);
-        std::fclose(file);
-    }
-    return text;
-}
-
-/// `arguments` as a shell reads them.
-Outcome kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED)
-{
-    std::string command = std::string(KLDRCIM) + " --module " + library + " --namespace root/toy " +
-                          arguments + " >cli_test.out 2>cli_test.err";
-    int status = std::system(command.c_str());
-    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, read_file("cli_test.out"),
-            read_file("cli_test.err")};
-}
 
 TEST(Cli, EnumeratesNames)
 {

@@ -212,6 +212,16 @@ TEST_F(Host_Test, IndicationsReachTheSink)
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->enable_indications("TOY_Item"));
 }
 
+TEST_F(Host_Test, AnIndicationTableMayHaveNullSlots)
+{
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->authorize_filter("TOY_Silent", "root/toy"));
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->must_poll("TOY_Silent", "root/toy"));
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->activate_filter("TOY_Silent", "root/toy"));
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->deactivate_filter("TOY_Silent", "root/toy"));
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->enable_indications("TOY_Silent"));
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->disable_indications("TOY_Silent"));
+}
+
 TEST_F(Host_Test, AnAttachedThreadFreesItsObjects)
 {
     EXPECT_EQ(CMPI_RC_OK, call(*host, "Worker").rc);

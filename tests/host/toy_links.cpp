@@ -104,6 +104,11 @@ CMPIIndicationMIFT alert_table = {100,       100,          nullptr,      alert_c
                                   must_poll, count_filter, count_filter, enable,        disable};
 CMPIIndicationMI alert_mi = {nullptr, &alert_table};
 
+/// A table in which only the cleanup is filled in.
+CMPIIndicationMIFT silent_table = {100,     100,     nullptr, alert_cleanup, nullptr,
+                                   nullptr, nullptr, nullptr, nullptr,       nullptr};
+CMPIIndicationMI silent_mi = {nullptr, &silent_table};
+
 } // namespace
 } // namespace toy
 
@@ -119,4 +124,11 @@ TOY_EXPORT CMPIIndicationMI* TOY_Alert_Create_IndicationMI(const CMPIBroker* mb,
 {
     toy::broker = mb;
     return &toy::alert_mi;
+}
+
+TOY_EXPORT CMPIIndicationMI* TOY_Silent_Create_IndicationMI(const CMPIBroker* mb, const CMPIContext*,
+                                                            CMPIStatus*)
+{
+    toy::broker = mb;
+    return &toy::silent_mi;
 }
