@@ -23,4 +23,14 @@ inline Array<Instance*> server_instances(classId_t id)
     return ServerManager::getServerManager()->getInstances(id);
 }
 
+inline Array<Instance*> fc_ports_of(const String& adapter_address)
+{
+    return FCHBAManager::getFCHBAManager()->getFCPortInstancesByAdapter(adapter_address);
+}
+
+inline Array<Instance*> ethernet_ports_of(const String& adapter_address)
+{
+    return FCHBAManager::getFCHBAManager()->getEthernetPortInstancesByAdapter(adapter_address);
+}
+
 } // namespace KPRV

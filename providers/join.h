@@ -1,0 +1,126 @@
+#pragma once
+
+#include "providers/deliver.h"
+#include "runtime/Property.h"
+#include "runtime/Ref.h"
+#include "runtime/strutil.h"
+
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace KPRV {
+
+// The frame that the associations share. A provider file says which lists it joins, on what counts it insists
+// and which elements belong together. Pairs are delivered in the order of nested loops, the left list
+// outside.
+
+/// Where the counts have been checked.
+#define TRACE_BUILDING() LOG(DBG, "Building and returning association instances")
+
+/// Puts a clone of an end, whole, into a role, as the class that the role declares.
+template <class A, class Target>
+void set_end(A* association, Target* A::*role, const Instance* end)
+{
+    Ref<Instance> copy(clone(end));
+    if (Target* target = cast<Target>(copy.ptr())) {
+        association->*role = target;
+        copy.steal();
+    }
+}
+
+/// Makes associations of two ends and hands each over.
+template <class A, class First, class Second>
+class Pairs
+{
+public:
+    Pairs(Enum_Instances_Handler<A>* handler, First* A::*first_role, Second* A::*second_role)
+        : _handler(handler), _first_role(first_role), _second_role(second_role)
+    {
+    }
+
+    void operator()(const Instance* first, const Instance* second) const
+    {
+        Ref<A> association(create<A>(true));
+        set_end(association.ptr(), _first_role, first);
+        set_end(association.ptr(), _second_role, second);
+        _handler->handle(association.steal());
+    }
+
+private:
+    Enum_Instances_Handler<A>* _handler;
+    First* A::*_first_role;
+    Second* A::*_second_role;
+};
+
+/// Each element of the left list with each of the right one.
+template <class L, class R, class Pair>
+Enum_Instances_Status join_each(const List<L>& lefts, const List<R>& rights, Pair pair)
+{
+    for (uint32 i = 0; i < lefts.size(); i++) {
+        for (uint32 j = 0; j < rights.size(); j++)
+            pair(lefts[i], rights[j]);
+    }
+    return ENUM_INSTANCES_OK;
+}
+
+/// The first element of the left list, whatever the length of that list, with each of the right one.
+template <class L, class R, class Pair>
+Enum_Instances_Status join_first_with_each(const List<L>& lefts, const List<R>& rights, Pair pair)
+{
+    for (uint32 j = 0; j < rights.size() && !lefts.empty(); j++)
+        pair(lefts[0], rights[j]);
+    return ENUM_INSTANCES_OK;
+}
+
+/// Positions of a list by a text of its elements, case folded: a join looks its partners up instead of
+/// walking the list for each element of the other one.
+class Position_Index
+{
+public:
+    void add(const String& key, uint32 position) { _positions[folded(key)].push_back(position); }
+
+    /// In the order of the list; null if there is none.
+    const std::vector<uint32>* find(const String& key) const
+    {
+        const auto found = _positions.find(folded(key));
+        return found == _positions.end() ? nullptr : &found->second;
+    }
+
+private:
+    static std::string folded(const String& text)
+    {
+        std::string key(text.c_str(), text.size());
+        for (char& c : key)
+            c = static_cast<char>(__lower[static_cast<uint8>(c)]);
+        return key;
+    }
+
+    std::unordered_map<std::string, std::vector<uint32>> _positions;
+};
+
+enum class Matches
+{
+    FIRST,
+    ALL,
+};
+
+/// Pairs the elements of two lists whose texts are equal whatever their case: each outer element with its
+/// first match, or with all of them. A null property counts as its empty text.
+template <class Outer, class Inner, class Pair>
+Enum_Instances_Status join_equal(Matches matches, const List<Outer>& outers,
+                                 Property<String> Outer::*outer_key, const List<Inner>& inners,
+                                 Property<String> Inner::*inner_key, Pair pair)
+{
+    Position_Index index;
+    for (uint32 j = 0; j < inners.size(); j++)
+        index.add((inners[j]->*inner_key).value, j);
+    for (uint32 i = 0; i < outers.size(); i++) {
+        const auto* found = index.find((outers[i]->*outer_key).value);
+        for (size_t n = 0; found && n < found->size() && (n == 0 || matches == Matches::ALL); n++)
+            pair(outers[i], inners[(*found)[n]]);
+    }
+    return ENUM_INSTANCES_OK;
+}
+
+} // namespace KPRV
