@@ -23,7 +23,8 @@ endif()
 # keep the library mapped after its last close.
 add_compile_options(-Wall -Wextra -Wshadow -Wnon-virtual-dtor -Wpedantic -Werror -Wno-invalid-offsetof
                     -fno-strict-aliasing -fno-gnu-unique)
-add_compile_definitions(_GNU_SOURCE)
+# 64-bit offsets and times also where a word is 32 bits: a log grows without limit, and so does time.
+add_compile_definitions(_GNU_SOURCE _FILE_OFFSET_BITS=64 _TIME_BITS=64)
 include_directories(${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR}/generated)
 
 if(KLDR_WORD_SIZE STREQUAL "32")
