@@ -67,11 +67,13 @@ function(kldr_test name)
   set_tests_properties(${name} PROPERTIES TIMEOUT 300 ENVIRONMENT "${ARG_ENV}")
 endfunction()
 
-# GoogleTest comes as source, so that it is built for the word size and the sanitizer in hand.
-if(BUILD_TESTING OR NOT DEFINED BUILD_TESTING)
-  set(gtest_root /usr/src/googletest/googletest)
-  add_library(kldr_gtest STATIC EXCLUDE_FROM_ALL ${gtest_root}/src/gtest-all.cc ${gtest_root}/src/gtest_main.cc)
-  target_include_directories(kldr_gtest SYSTEM PUBLIC ${gtest_root}/include PRIVATE ${gtest_root})
+# GoogleTest comes as source, so that it is built for the word size and the sanitizer in hand. Without its package there are no
+# tests, and all else builds.
+set(KLDR_GTEST_ROOT /usr/src/googletest/googletest)
+if(EXISTS ${KLDR_GTEST_ROOT}/src/gtest-all.cc)
+  add_library(kldr_gtest STATIC EXCLUDE_FROM_ALL
+              ${KLDR_GTEST_ROOT}/src/gtest-all.cc ${KLDR_GTEST_ROOT}/src/gtest_main.cc)
+  target_include_directories(kldr_gtest SYSTEM PUBLIC ${KLDR_GTEST_ROOT}/include PRIVATE ${KLDR_GTEST_ROOT})
   target_compile_options(kldr_gtest PRIVATE -w -O0)
   target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
 endif()
