@@ -8,8 +8,9 @@
 
 namespace KPRV {
 
-/// Bytes of a job's id that are looked at; its form is test name, "-", job number.
-static constexpr uint32 JOB_ID_ROOM = 128;
+/// Room for the bytes of a job's id that are looked at, and a final zero; its form is test name, "-", job
+/// number.
+static constexpr uint32 JOB_ID_ROOM = 128 + 1;
 
 class KALDERA_OwningJobElement_Provider : public KALDERA_OwningJobElement_Skeleton
 {
