@@ -6,11 +6,20 @@ namespace KPRV {
 
 static pthread_key_t _thread_context_key;
 static pthread_once_t _thread_context_key_once = PTHREAD_ONCE_INIT;
+static bool _thread_context_key_made;
 
 static void _make_key()
 {
     // No destructor function: the stack does not own its elements.
-    pthread_key_create(&_thread_context_key, nullptr);
+    _thread_context_key_made = pthread_key_create(&_thread_context_key, nullptr) == 0;
+}
+
+/// A process has about a thousand keys; a server that loads and unloads the module often must not run out of
+/// them.
+[[gnu::destructor(101)]] static void delete_key_at_unload()
+{
+    if (_thread_context_key_made)
+        pthread_key_delete(_thread_context_key);
 }
 
 static pthread_key_t key()

@@ -5,7 +5,11 @@
 
 #include <algorithm>
 #include <array>
+#include <filesystem>
+#include <iterator>
 #include <set>
+
+#include <pthread.h>
 
 namespace KPRV {
 namespace {
@@ -87,6 +91,37 @@ TEST_F(Surface, LastCloseUnmapsTheModule)
     EXPECT_FALSE(is_mapped());
     open();
     EXPECT_TRUE(server->enumerate_instances("KALDERA_PortController").ok());
+}
+
+TEST_F(Surface, GivesItsThreadKeyAndItsDescriptorsBack)
+{
+    const auto descriptors = [] {
+        return std::distance(std::filesystem::directory_iterator("/proc/self/fd"),
+                             std::filesystem::directory_iterator());
+    };
+    open("one_hba.json");
+    close();
+    const auto before = descriptors();
+
+    // All keys of the process but a few are taken: one lost at each load would show.
+    std::vector<pthread_key_t> taken;
+    for (pthread_key_t key; pthread_key_create(&key, nullptr) == 0;)
+        taken.push_back(key);
+    for (int spare = 0; spare < 3 && !taken.empty(); spare++) {
+        pthread_key_delete(taken.back());
+        taken.pop_back();
+    }
+    for (int load = 0; load < 10; load++) {
+        open("one_hba.json");
+        EXPECT_EQ(1u, server->enumerate_instances("KALDERA_Product").instances.size());
+        close();
+    }
+    pthread_key_t still_free;
+    EXPECT_EQ(0, pthread_key_create(&still_free, nullptr));
+    pthread_key_delete(still_free);
+    for (const pthread_key_t key : taken)
+        pthread_key_delete(key);
+    EXPECT_EQ(before, descriptors());
 }
 
 TEST_F(Surface, LoadsWithEverySymbolResolvedAtOnce)
