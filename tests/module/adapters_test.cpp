@@ -1,4 +1,3 @@
-#include "adapter/ProviderUtil.h"
 #include "tests/module/Golden.h"
 #include "tests/module/Module_Fixture.h"
 
@@ -10,12 +9,6 @@ namespace {
 class Adapters : public Module_Fixture
 {
 protected:
-    static std::string host_name()
-    {
-        char name[256] = {};
-        ProviderUtil::getHostInfo(name, sizeof name);
-        return name;
-    }
     host::Result enumerate(const std::string& class_name)
     {
         host::Result result = server->enumerate_instances(class_name);
@@ -37,7 +30,7 @@ using Texts = std::vector<std::string>;
 TEST_F(Adapters, OfTheDemoHostComeWholeAsTheClientSeesThem)
 {
     open();
-    const std::string host = host_name();
+    const std::string host = This_Host::find().name;
     for (const char* name : {"KALDERA_PortController", "KALDERA_PhysicalPackage", "KALDERA_Product",
                              "KALDERA_AdapterSoftwareIdentity"})
         expect_golden(std::string("demo_") + name, golden_text(enumerate(name), host));
