@@ -53,6 +53,15 @@ protected:
         simulator.reset();
     }
 
+    /// All instances of a class, from a call that must succeed.
+    host::Result enumerate(const std::string& class_name)
+    {
+        host::Result result = server->enumerate_instances(class_name);
+        EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
+        EXPECT_EQ(1u, result.done_count);
+        return result;
+    }
+
     /// Forgets what has been logged and called so far.
     void mark()
     {

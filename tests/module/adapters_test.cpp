@@ -9,13 +9,6 @@ namespace {
 class Adapters : public Module_Fixture
 {
 protected:
-    host::Result enumerate(const std::string& class_name)
-    {
-        host::Result result = server->enumerate_instances(class_name);
-        EXPECT_EQ(CMPI_RC_OK, result.rc);
-        EXPECT_EQ(1u, result.done_count);
-        return result;
-    }
     std::vector<std::string> all(const host::Result& result, const char* property)
     {
         std::vector<std::string> values;
