@@ -64,7 +64,7 @@ function(kldr_test name)
     add_dependencies(${name} ${ARG_DEPENDS})
   endif()
   add_test(NAME ${name} COMMAND ${name})
-  set_tests_properties(${name} PROPERTIES TIMEOUT 300 ENVIRONMENT "${ARG_ENV}")
+  set_tests_properties(${name} PROPERTIES TIMEOUT 900 ENVIRONMENT "${ARG_ENV}")
 endfunction()
 
 # GoogleTest comes as source, so that it is built for the word size and the sanitizer in hand. Without its package there are no
