@@ -84,6 +84,8 @@ bool references_handler::_proc(Instance* instance, int, void* client_data)
         results.rc = make_cmpi_object_path(results.broker, instance, results.name_space, path);
         if (results.rc != CMPI_RC_OK)
             return;
+        // Without a list every cell counts as wanted, so that null properties go out as zero or empty text.
+        // Settled.
         filter_properties(instance, results.properties, false);
         CMPIInstance* ci;
         results.rc =
