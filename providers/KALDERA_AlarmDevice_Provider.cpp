@@ -49,6 +49,11 @@ public:
             return_value.set(2);
             return INVOKE_METHOD_OK;
         }
+        // The object path may name another class of the module that has the method; it then names no port.
+        if (!self) {
+            return_value.set(2);
+            return INVOKE_METHOD_OK;
+        }
         const int result = FCHBAManager::getFCHBAManager()->setAlarmState(self->DeviceID.value, state);
         return_value.set(return_value_of(result));
         LOG(DBG, "return value = %d\n", int(return_value.value));

@@ -210,5 +210,20 @@ TEST_F(Alarm, OfAPortThatIsNotThereIsAFailure)
     EXPECT_EQ(Lines{"ERR Current ALARM STATE is not available"}, said("ERR"));
 }
 
+TEST_F(Alarm, OfAnotherClassThatHasTheMethodIsNoPort)
+{
+    open("one_hba.json");
+    mark();
+    host::Request request;
+    request.operation = host::Operation::INVOKE_METHOD;
+    request.path = {{}, "root/kaldera", "CIM_AlarmDevice", {}};
+    request.method = "SetAlarmState";
+    request.in = {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 3)}};
+    const host::Result result = server->run_at("KALDERA_AlarmDevice", request);
+    EXPECT_EQ(CMPI_RC_OK, result.rc);
+    EXPECT_EQ(2u, result.return_value.as_uint());
+    EXPECT_TRUE(simulator.call_names().empty());
+}
+
 } // namespace
 } // namespace KPRV
