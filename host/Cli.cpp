@@ -4,6 +4,7 @@
 #include "host/Cli_Options.h"
 #include "host/Cli_Output.h"
 #include "host/Cli_Topology.h"
+#include "host/Cli_Verbs.h"
 #include "host/Host.h"
 #include "host/Module_Search.h"
 #include "host/Type_Words.h"
@@ -247,7 +248,8 @@ int run_cli(const std::vector<std::string>& arguments)
     if (!host)
         return complain("cannot load the provider module: " + error, USAGE_ERROR);
     warn_without_adapter_library(*host);
-    int status = Cli(options, *host).run();
+    const Verb_Body body = find_verb(options.verb)->body;
+    int status = body ? body(options, *host) : Cli(options, *host).run();
     for (const std::string& violation : host->violations().list())
         complain("warning: the provider broke the CMPI contract: " + violation, 0);
     if (options.leaks)

@@ -1,38 +1,13 @@
 #include "host/Cli_Options.h"
 
+#include "host/Cli_Verbs.h"
+
 #include <algorithm>
 #include <iterator>
 
 namespace KPRV::host {
 
 namespace {
-
-struct Verb
-{
-    const char* name;
-    std::size_t least;
-    std::size_t most;
-    const char* arguments;
-};
-
-constexpr std::size_t any = ~std::size_t(0);
-
-constexpr Verb verbs[] = {
-    {"ei", 1, 1, "CLASS"},
-    {"ein", 1, 1, "CLASS"},
-    {"gi", 1, 1, "PATH"},
-    {"ci", 2, any, "CLASS NAME=VALUE..."},
-    {"mi", 2, any, "PATH NAME=VALUE..."},
-    {"di", 1, 1, "PATH"},
-    {"cm", 2, any, "PATH METHOD [NAME=VALUE...]"},
-    {"ai", 1, 1, "PATH"},
-    {"ain", 1, 1, "PATH"},
-    {"ri", 1, 1, "PATH"},
-    {"rin", 1, 1, "PATH"},
-    {"tree", 0, 0, ""},
-    {"graph", 0, 0, ""},
-    {"classes", 0, 1, "[PATTERN]"},
-};
 
 std::vector<std::string> split_list(const std::string& text)
 {
@@ -157,11 +132,10 @@ bool check_sense(const Cli_Options& options, const std::vector<const Option*>& g
 
 bool check_verb(const Cli_Options& options, std::string& error)
 {
-    auto verb = std::find_if(std::begin(verbs), std::end(verbs),
-                             [&](const Verb& candidate) { return options.verb == candidate.name; });
+    const Cli_Verb* verb = find_verb(options.verb);
     if (options.verb.empty())
         error = "no verb; \"kldrcim --help\" lists them";
-    else if (verb == std::end(verbs))
+    else if (!verb)
         error = "no verb \"" + options.verb + "\"; \"kldrcim --help\" lists them";
     else if (options.arguments.size() < verb->least || options.arguments.size() > verb->most)
         error = std::string("usage: kldrcim [options] ") + verb->name + (*verb->arguments ? " " : "") +
