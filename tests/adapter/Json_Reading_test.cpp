@@ -1,0 +1,113 @@
+#include "adapter/Json_Reading.h"
+#include "tests/support/Fake_Library.h"
+
+#include <gtest/gtest.h>
+#include <pthread.h>
+
+namespace KPRV {
+namespace {
+
+/// What is read, in one line; "refused" if nothing is.
+std::string read(const std::string& text)
+{
+    Json::Value value;
+    std::string errors;
+    if (read_json(text, value, errors))
+        return compact(value);
+    EXPECT_NE("", errors) << text;
+    return "refused";
+}
+
+std::string nested(unsigned levels, const std::string& open = "[", const std::string& close = "]")
+{
+    std::string text;
+    for (unsigned i = 0; i < levels; i++)
+        text += open;
+    for (unsigned i = 0; i < levels; i++)
+        text += close;
+    return text;
+}
+
+TEST(Json_Reading, AnyValueIsARoot)
+{
+    EXPECT_EQ(R"({"a":[1,"two"]})", read(R"({"a": [1, "two"]})"));
+    EXPECT_EQ("[1]", read("[1]"));
+    EXPECT_EQ("42", read("42"));
+    EXPECT_EQ("null", read("null"));
+    EXPECT_EQ(R"("text")", read(R"("text")"));
+}
+
+TEST(Json_Reading, CommentsAreAllowedAndWhatFollowsIsIgnored)
+{
+    Json::Value value;
+    std::string errors;
+    EXPECT_TRUE(read_json("/* one */ { // two\n \"a\": 1 }", value, errors));
+    EXPECT_EQ(1, value["a"].asInt());
+    EXPECT_EQ("1", read("1 and more"));
+}
+
+TEST(Json_Reading, WhatDoesNotParseIsRefused)
+{
+    for (const char* text : {"", " ", "{", "[1", "{\"a\" 1}", "{a: 1}", "nul", "\"open", "'single'",
+                             "/* open", "/", "}", "]]]]"})
+        EXPECT_EQ("refused", read(text)) << text;
+}
+
+TEST(Json_Reading, DeepTextsAreRefusedBeforeTheyAreRead)
+{
+    EXPECT_EQ(nested(256), read(nested(256)));
+    EXPECT_EQ("refused", read(nested(257)));
+    EXPECT_EQ("refused", read(nested(1000000)));
+    EXPECT_EQ("refused", read(nested(1000000, "{\"a\":", "}")));
+    EXPECT_EQ("refused", read(std::string(1000000, '[')));
+}
+
+TEST(Json_Reading, OnlyBracketsOfTheTextCount)
+{
+    const std::string many(300, '[');
+    EXPECT_EQ("\"" + many + "\"", read("\"" + many + "\""));
+    EXPECT_EQ(R"(["\")" + many + "\"]", read(R"(["\")" + many + "\"]"));
+    // Comments stay with the value that they stand at.
+    EXPECT_EQ("/*" + many + "*/1", read("/*" + many + "*/1"));
+    EXPECT_EQ("//" + many + "\n1", read("//" + many + "\n1"));
+}
+
+TEST(Json_Reading, NothingHidesDepth)
+{
+    const std::string deep = nested(100000);
+    // Neither quotes in comments nor closing brackets without an opening one.
+    EXPECT_EQ("refused", read("/* \" */" + deep));
+    EXPECT_EQ("refused", read("// \"\n" + deep));
+    EXPECT_EQ("refused", read("// \"\r" + deep));
+    EXPECT_EQ("refused", read("/\"" + deep));
+    EXPECT_EQ("refused", read(std::string(100000, ']') + deep));
+    EXPECT_EQ("refused", read("[\"\\\\\", " + deep + "]"));
+}
+
+void* read_deepest(void* answer)
+{
+    *static_cast<std::string*>(answer) = read(nested(256, "{\"a\":[", "]}").substr(0, 256 * 3));
+    *static_cast<std::string*>(answer) += read(nested(128, "{\"a\":[", "]}"));
+    return nullptr;
+}
+
+TEST(Json_Reading, TheDeepestTextFitsTheSmallestStack)
+{
+    pthread_attr_t attributes;
+    pthread_attr_init(&attributes);
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+    // Their frames are several times as large.
+    pthread_attr_setstacksize(&attributes, 2048 * 1024);
+#else
+    pthread_attr_setstacksize(&attributes, 256 * 1024);
+#endif
+    std::string answer;
+    pthread_t thread;
+    ASSERT_EQ(0, pthread_create(&thread, &attributes, read_deepest, &answer));
+    pthread_join(thread, nullptr);
+    pthread_attr_destroy(&attributes);
+    EXPECT_EQ("refused" + nested(128, "{\"a\":[", "]}"), answer);
+}
+
+} // namespace
+} // namespace KPRV
