@@ -45,6 +45,15 @@ char escape_of(char c)
     // clang-format on
 }
 
+/// A default at an address of the tables, where texts and datetimes stand as C strings.
+void write_literal(FILE* file, Type type, const void* literal)
+{
+    if (type == STRING || type == DATETIME)
+        fprint_string(file, *static_cast<const char* const*>(literal));
+    else
+        fprint_scalar_value(file, type, literal);
+}
+
 } // namespace
 
 void fprint_string(FILE* file, const char* text)
@@ -77,6 +86,21 @@ void fprint_array_value(FILE* file, Type type, const __Array_Rep* array)
         fprint_scalar_value(file, type, element);
     }
     fputs(array->size ? " }" : "}", file);
+}
+
+void fprint_scalar(FILE* file, const Meta_Value& value, Type type)
+{
+    write_literal(file, type, &value);
+}
+
+void fprint_array(FILE* file, const Meta_Value& value, Type type)
+{
+    const char* element = static_cast<const char*>(value.array_value.elements);
+    for (uint32 i = 0; i < value.array_value.num_elements; i++, element += literal_type_size[type]) {
+        if (i != 0)
+            fputs(", ", file);
+        write_literal(file, type, element);
+    }
 }
 
 } // namespace KPRV

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "runtime/Array.h"
+#include "runtime/Meta_Value.h"
 
 #include <cstdio>
 
@@ -15,5 +16,11 @@ void fprint_scalar_value(FILE* file, Type type, const void* value);
 
 /// Writes "{ ", the elements joined by ", ", " }"; an empty array is "{ }".
 void fprint_array_value(FILE* file, Type type, const __Array_Rep* array);
+
+/// As `fprint_scalar_value`, for the default of a scalar property of that type.
+void fprint_scalar(FILE* file, const Meta_Value& value, Type type);
+
+/// The elements of an array property's default, joined by ", ", without braces.
+void fprint_array(FILE* file, const Meta_Value& value, Type type);
 
 } // namespace KPRV

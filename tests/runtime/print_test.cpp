@@ -103,6 +103,41 @@ TEST(print_value, Arrays)
     EXPECT_EQ("{ \"a\", \"\" }", array(texts));
 }
 
+TEST(print_value, DefaultsOfScalars)
+{
+    const auto literal = [](const Meta_Value& value, Type type) {
+        return written([&](FILE* file) { fprint_scalar(file, value, type); });
+    };
+    EXPECT_EQ("true", literal({.boolean_value = true}, BOOLEAN));
+    EXPECT_EQ("255", literal({.uint8_value = 255}, UINT8));
+    EXPECT_EQ("-128", literal({.sint8_value = -128}, SINT8));
+    EXPECT_EQ("65535", literal({.uint16_value = 65535}, UINT16));
+    EXPECT_EQ("-2", literal({.sint16_value = -2}, SINT16));
+    EXPECT_EQ("4294967295", literal({.uint32_value = 4294967295u}, UINT32));
+    EXPECT_EQ("-3", literal({.sint32_value = -3}, SINT32));
+    EXPECT_EQ("18446744073709551615", literal({.uint64_value = ~uint64(0)}, UINT64));
+    EXPECT_EQ("-4", literal({.sint64_value = -4}, SINT64));
+    EXPECT_EQ("0.500000", literal({.real32_value = 0.5f}, REAL32));
+    EXPECT_EQ("-0.250000", literal({.real64_value = -0.25}, REAL64));
+    EXPECT_EQ("'A'", literal({.char16_value = 'A'}, CHAR16));
+    EXPECT_EQ("\"a\\\"b\"", literal({.string_value = "a\"b"}, STRING));
+    EXPECT_EQ("\"00000000000500.000000:000\"", literal(_Sample_Element_Timeout_MV, DATETIME));
+}
+
+TEST(print_value, DefaultsOfArraysStandWithoutBraces)
+{
+    const auto literal = [](const Meta_Value& value, Type type) {
+        return written([&](FILE* file) { fprint_array(file, value, type); });
+    };
+    EXPECT_EQ("2, 3, 5", literal(_Sample_Element_Codes_MV, UINT32));
+    EXPECT_EQ("\"OK\", \"Up\"", literal(_Sample_Element_Words_MV, STRING));
+    EXPECT_EQ("\"00000000000001.000000:000\", \"00000000000002.000000:000\"",
+              literal(_Sample_Element_Pauses_MV, DATETIME));
+    const boolean flags[] = {true, false};
+    EXPECT_EQ("true, false", literal({.array_value = {flags, 2}}, BOOLEAN));
+    EXPECT_EQ("", literal({.array_value = {flags, 0}}, BOOLEAN));
+}
+
 TEST(Value_print, Scalar)
 {
     Value x;
