@@ -41,8 +41,8 @@ LONGEST = 600
 TRAPS = [
     (r"\.as(String|Int|UInt|Bool|CString|Double|Int64|UInt64)\(\)",
      "Json::Value conversions go through adapter/Json_Access.h", {"adapter/Json_Access.cpp"},
-     {"host", "simulator", "tests"}),
-    (r"\b(system|popen)\s*\(", "no shell: run argument vectors", set(), {"tests"}),
+     {"host", "simulator", "tests", "bench"}),
+    (r"\b(system|popen)\s*\(", "no shell: run argument vectors", set(), {"tests", "bench"}),
     (r"using namespace std;", "no 'using namespace std'", set(), set()),
     # Two debugging aids print by their contract.
     (r"\bstd::cout\b|\bprintf\(", "nothing writes to standard output inside a server",
