@@ -1,5 +1,6 @@
 #include "runtime/Array.h"
 
+#include "runtime/allocated.h"
 #include "runtime/empty_arrays.h"
 
 #include <algorithm>
@@ -33,7 +34,7 @@ size_t block_size(const __Array_Traits* traits, uint32 capacity)
 
 __Array_Rep* allocate(const __Array_Traits* traits, uint32 capacity)
 {
-    return new (malloc(block_size(traits, capacity))) __Array_Rep{traits, 0, capacity};
+    return new (allocated(malloc(block_size(traits, capacity)))) __Array_Rep{traits, 0, capacity};
 }
 
 void construct_elements(const __Array_Traits* traits, void* dest, const void* src, uint32 n)
@@ -86,7 +87,8 @@ void make_room(__Array_Rep*& rep, uint32 n)
     if (is_empty_array(rep)) {
         rep = allocate(rep->traits, std::max(n, rep->capacity));
     } else if (rep->capacity < n) {
-        rep = static_cast<__Array_Rep*>(realloc(static_cast<void*>(rep), block_size(rep->traits, n)));
+        rep = static_cast<__Array_Rep*>(
+            allocated(realloc(static_cast<void*>(rep), block_size(rep->traits, n))));
         rep->capacity = n;
     }
 }

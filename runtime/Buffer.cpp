@@ -1,5 +1,7 @@
 #include "runtime/Buffer.h"
 
+#include "runtime/allocated.h"
+
 #include <algorithm>
 #include <bit>
 #include <cctype>
@@ -50,7 +52,7 @@ void Buffer::reserve(uint32 n)
     n = std::max(n, LEAST_CAPACITY);
     if (n <= _cap)
         return;
-    _data = static_cast<char*>(realloc(_data, size_t(n) + 1));
+    _data = static_cast<char*>(allocated(realloc(_data, size_t(n) + 1)));
     _cap = n;
 }
 

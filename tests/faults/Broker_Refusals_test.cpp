@@ -1,0 +1,104 @@
+#include "tests/faults/Fault_Fixture.h"
+
+namespace KPRV {
+namespace {
+
+class Broker_Refusals : public Fault_Fixture
+{
+protected:
+    void SetUp() override { open("one_cna.json"); }
+
+    /// The names of the calls that an operation makes, each with its number.
+    template <class Operation>
+    std::map<std::string, unsigned> calls_of(Operation&& operation)
+    {
+        server->calls().clear();
+        server->calls().record(true);
+        operation();
+        server->calls().record(false);
+        std::map<std::string, unsigned> counts;
+        for (const std::string& call : server->calls().calls())
+            ++counts[call.substr(0, call.find(' '))];
+        return counts;
+    }
+
+    /// The operation with one call of each name failing, the first, one in the middle and the last, with a
+    /// code or with an exception, as brokers written in C and in C++ do.
+    template <class Operation>
+    void refuse_each(const std::string& what, Operation&& operation)
+    {
+        for (const auto& [name, count] : calls_of(operation)) {
+            refuse(what, name, 1, false, operation);
+            refuse(what, name, 1, true, operation);
+            if (count > 1)
+                refuse(what, name, (count + 2) / 2, false, operation);
+            if (count > 2)
+                refuse(what, name, count, true, operation);
+        }
+    }
+
+    template <class Operation>
+    void refuse(const std::string& what, const std::string& name, unsigned nth, bool throws,
+                Operation&& operation)
+    {
+        SCOPED_TRACE(what + ": " + name + " number " + std::to_string(nth) + (throws ? " throws" : " fails"));
+        if (throws)
+            server->calls().throw_at(name, nth);
+        else
+            server->calls().fail(name, nth, CMPI_RC_ERR_FAILED);
+        operation();
+        server->calls().mend();
+        expect_nothing_left();
+        ++refused;
+    }
+
+    unsigned refused = 0;
+};
+
+TEST_F(Broker_Refusals, OfAnEnumerationOfAnyClass)
+{
+    for (const std::string& name : classes)
+        refuse_each("enumerate " + name, [&] { server->enumerate_instances(name); });
+    EXPECT_LT(500u, refused);
+}
+
+TEST_F(Broker_Refusals, OfTheOtherOperations)
+{
+    const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
+    refuse_each("names", [&] { server->enumerate_instance_names("KALDERA_FCPort"); });
+    refuse_each("get", [&] { server->get_instance(port); });
+    refuse_each("get with a property list", [&] {
+        server->get_instance(port, host::Property_List{{"DeviceID", "Speed"}});
+    });
+    refuse_each("delete", [&] { server->delete_instance(port); });
+    host::Instance_Value changed;
+    changed.path = port;
+    host::set_value(changed.properties, "ElementName", host::Value::text("x"));
+    refuse_each("modify", [&] { server->modify_instance(changed); });
+    refuse_each("create", [&] { server->create_instance(changed); });
+    EXPECT_LT(50u, refused);
+}
+
+TEST_F(Broker_Refusals, OfAssociations)
+{
+    const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
+    const std::string association = "KALDERA_FCPortSystemDevice";
+    refuse_each("associators", [&] { server->associators(association, port, {}); });
+    refuse_each("associator names", [&] { server->associator_names(association, port, {}); });
+    refuse_each("references", [&] { server->references(association, port, {}); });
+    refuse_each("reference names", [&] { server->reference_names(association, port, {}); });
+    EXPECT_LT(50u, refused);
+}
+
+TEST_F(Broker_Refusals, OfAMethod)
+{
+    const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
+    refuse_each("SetAlarmState", [&] {
+        server->invoke_method(alarm, "SetAlarmState",
+                              {{"RequestedState", host::Value::unsigned_number(CMPI_uint16, 2)}});
+    });
+    EXPECT_LT(10u, refused);
+}
+
+} // namespace
+} // namespace KPRV

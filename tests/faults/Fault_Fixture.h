@@ -1,0 +1,115 @@
+#pragma once
+
+#include "host/Host.h"
+#include "host/Value_Text.h"
+#include "simulator/Simulator_Control.h"
+#include "tests/support/Temp_Folder.h"
+
+#include <gtest/gtest.h>
+
+#include <map>
+#include <memory>
+#include <set>
+
+namespace KPRV {
+
+/// Answers of every class, one text an instance, without what differs from one moment to the next.
+using Picture = std::map<std::string, std::vector<std::string>>;
+
+/// The built module without a log, in a server whose calls, and over an adapter library whose answers, are
+/// made to fail. Whatever happened, each test ends with a module that answers as it did at first.
+class Fault_Fixture : public ::testing::Test
+{
+protected:
+    void open(const std::string& inventory)
+    {
+        simulator.load_file(std::string(KLDR_INVENTORIES "/") + inventory);
+        std::string error;
+        server = host::Host::open(KLDR_MODULE, {}, error);
+        ASSERT_TRUE(server) << error;
+        for (const std::string& name : server->catalogue().class_names())
+            if (server->providers().serves(name, host::Mi_Kind::INSTANCE) ||
+                server->providers().serves(name, host::Mi_Kind::ASSOCIATION))
+                classes.push_back(name);
+        healthy = look();
+    }
+
+    void TearDown() override
+    {
+        if (server) {
+            server->calls().mend();
+            simulator.clear_faults();
+            expect_healthy("at the end");
+            server->unload(true);
+            expect_nothing_left();
+            server.reset();
+        }
+        simulator.reset();
+    }
+
+    /// Instances come and go with the second: what tells the time is left out.
+    static std::string lasting_text(const host::Instance_Value& instance)
+    {
+        std::string kept;
+        const std::string text = host::mof_instance(instance);
+        for (std::size_t at = 0, end; at < text.size(); at = end + 1) {
+            end = text.find('\n', at);
+            const std::string line = text.substr(at, end - at);
+            if (line.find("Time") == std::string::npos)
+                kept += line + "\n";
+        }
+        return kept;
+    }
+
+    static std::vector<std::string> texts(const host::Result& result)
+    {
+        std::vector<std::string> all;
+        for (const host::Instance_Value& instance : result.instances)
+            all.push_back(lasting_text(instance));
+        return all;
+    }
+
+    /// Every class enumerated once; `exceptions` gets the texts of what left a provider.
+    Picture look(std::set<std::string>* exceptions = nullptr)
+    {
+        Picture picture;
+        for (const std::string& name : classes) {
+            const host::Result result = server->enumerate_instances(name);
+            if (result.exception && exceptions)
+                exceptions->insert(*result.exception);
+            EXPECT_TRUE(!result.exception || exceptions) << name << ": " << *result.exception;
+            picture[name] = texts(result);
+        }
+        return picture;
+    }
+
+    /// An exception that leaves a provider is what some failures must come to, and a server that refuses a
+    /// result has none; nothing else may be wrong.
+    void expect_nothing_left()
+    {
+        for (const std::string& violation : server->violations().list()) {
+            const bool passed_on = violation.starts_with("MI entry: an exception left the provider: ");
+            EXPECT_TRUE(passed_on || violation.ends_with(", not 0")) << violation;
+        }
+        server->violations().clear();
+        EXPECT_EQ(0u, server->ledger().live());
+    }
+
+    void expect_healthy(const std::string& when)
+    {
+        const Picture now = look();
+        for (const auto& [name, instances] : healthy)
+            EXPECT_EQ(instances, now.at(name)) << name << " " << when;
+    }
+
+    simulator::Simulator_Control simulator{KLDR_SIMULATOR};
+    std::unique_ptr<host::Host> server;
+    std::vector<std::string> classes;
+    Picture healthy;
+
+private:
+    Temp_Folder _home;
+    Environment_Override _home_override{"HOME", _home.path()};
+};
+
+} // namespace KPRV
