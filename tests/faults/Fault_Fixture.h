@@ -1,20 +1,15 @@
 #pragma once
 
-#include "host/Host.h"
-#include "host/Value_Text.h"
 #include "simulator/Simulator_Control.h"
+#include "tests/support/Module_Picture.h"
 #include "tests/support/Temp_Folder.h"
 
 #include <gtest/gtest.h>
 
-#include <map>
 #include <memory>
 #include <set>
 
 namespace KPRV {
-
-/// Answers of every class, one text an instance, without what differs from one moment to the next.
-using Picture = std::map<std::string, std::vector<std::string>>;
 
 /// The built module without a log, in a server whose calls, and over an adapter library whose answers, are
 /// made to fail. Whatever happened, each test ends with a module that answers as it did at first.
@@ -27,10 +22,7 @@ protected:
         std::string error;
         server = host::Host::open(KLDR_MODULE, {}, error);
         ASSERT_TRUE(server) << error;
-        for (const std::string& name : server->catalogue().class_names())
-            if (server->providers().serves(name, host::Mi_Kind::INSTANCE) ||
-                server->providers().serves(name, host::Mi_Kind::ASSOCIATION))
-                classes.push_back(name);
+        classes = enumerable_classes(*server);
         healthy = look();
     }
 
@@ -47,28 +39,6 @@ protected:
         simulator.reset();
     }
 
-    /// Instances come and go with the second: what tells the time is left out.
-    static std::string lasting_text(const host::Instance_Value& instance)
-    {
-        std::string kept;
-        const std::string text = host::mof_instance(instance);
-        for (std::size_t at = 0, end; at < text.size(); at = end + 1) {
-            end = text.find('\n', at);
-            const std::string line = text.substr(at, end - at);
-            if (line.find("Time") == std::string::npos)
-                kept += line + "\n";
-        }
-        return kept;
-    }
-
-    static std::vector<std::string> texts(const host::Result& result)
-    {
-        std::vector<std::string> all;
-        for (const host::Instance_Value& instance : result.instances)
-            all.push_back(lasting_text(instance));
-        return all;
-    }
-
     /// Every class enumerated once; `exceptions` gets the texts of what left a provider.
     Picture look(std::set<std::string>* exceptions = nullptr)
     {
@@ -78,7 +48,7 @@ protected:
             if (result.exception && exceptions)
                 exceptions->insert(*result.exception);
             EXPECT_TRUE(!result.exception || exceptions) << name << ": " << *result.exception;
-            picture[name] = texts(result);
+            picture[name] = lasting_texts(result);
         }
         return picture;
     }

@@ -119,7 +119,7 @@ TEST_F(Library_Answers, TheOtherAdapterStaysWhole)
                 SCOPED_TRACE(std::string(call) + " of " + address + ": " + words);
                 simulator.add_fault(fault(call, std::string(words) + R"(, "address": ")" + address + "\""));
                 for (const char* name : devices) {
-                    const std::vector<std::string> now = texts(server->enumerate_instances(name));
+                    const std::vector<std::string> now = lasting_texts(server->enumerate_instances(name));
                     lost += now != healthy.at(name);
                     for (const std::string& text : healthy.at(name))
                         if (is_of_the_second(text)) {

@@ -1,0 +1,48 @@
+#pragma once
+
+#include "host/Host.h"
+#include "host/Value_Text.h"
+
+#include <map>
+#include <string>
+#include <vector>
+
+namespace KPRV {
+
+/// Answers of several classes, one text an instance.
+using Picture = std::map<std::string, std::vector<std::string>>;
+
+/// An instance as MOF, without the lines that differ from one moment to the next: what tells a time.
+inline std::string lasting_text(const host::Instance_Value& instance)
+{
+    std::string kept;
+    const std::string text = host::mof_instance(instance);
+    for (std::size_t at = 0, end; at < text.size(); at = end + 1) {
+        end = text.find('\n', at);
+        const std::string line = text.substr(at, end - at);
+        if (line.find("Time") == std::string::npos)
+            kept += line + "\n";
+    }
+    return kept;
+}
+
+inline std::vector<std::string> lasting_texts(const host::Result& result)
+{
+    std::vector<std::string> all;
+    for (const host::Instance_Value& instance : result.instances)
+        all.push_back(lasting_text(instance));
+    return all;
+}
+
+/// The classes of a module that have instances or associations to give.
+inline std::vector<std::string> enumerable_classes(host::Host& server)
+{
+    std::vector<std::string> names;
+    for (const std::string& name : server.catalogue().class_names())
+        if (server.providers().serves(name, host::Mi_Kind::INSTANCE) ||
+            server.providers().serves(name, host::Mi_Kind::ASSOCIATION))
+            names.push_back(name);
+    return names;
+}
+
+} // namespace KPRV
