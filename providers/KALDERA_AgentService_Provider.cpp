@@ -1,9 +1,23 @@
+#include "agent/JsonRpcManager.h"
 #include "providers/deliver.h"
 #include "providers/managers.h"
 #include "providers/proc.h"
 #include "schema/KALDERA_AgentService_Skeleton.h"
 
 namespace KPRV {
+
+namespace {
+
+/// A logged text has always been its own format: two percent signs are one in the log. As a format it could
+/// also name arguments that are not there, and a client writes the texts.
+std::string as_logged(std::string text)
+{
+    for (size_t at = text.find("%%"); at != text.npos; at = text.find("%%", at + 1))
+        text.erase(at, 1);
+    return text;
+}
+
+} // namespace
 
 class KALDERA_AgentService_Provider : public KALDERA_AgentService_Skeleton
 {
@@ -13,6 +27,24 @@ public:
     {
         LOG_SCOPE("enum_instances");
         return deliver_all(server_instances(AGENTSERVICE), *handler, SAYING(ERR, "No AgentService Found!"));
+    }
+
+    /// The tunnel of the JSON-RPC protocol. It succeeds whatever comes of the request: the outcome is inside
+    /// the response. What the dispatcher lets out goes on into the server.
+    Invoke_Method_Status executeMethod(const KALDERA_AgentService*, Property<String>& response,
+                                       const Property<String>& request, Property<uint32>& return_value)
+    {
+        LOG_SCOPE("executeMethod");
+        // A null request is an empty text.
+        const std::string text(request.value.c_str(), request.value.size());
+        LOG(DBG, "%s", as_logged(text).c_str());
+        JsonRpcManager::response reply;
+        JsonRpcManager::instance()->process(text, reply);
+        LOG(DBG, "rpcResponse : %s", reply.text.c_str());
+        response.set(reply.text.c_str());
+        LOG(DBG, "%s", as_logged(reply.text.c_str()).c_str());
+        return_value.set(0);
+        return INVOKE_METHOD_OK;
     }
 };
 

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "runtime/Types.h"
+
+#include <json/value.h>
+
+#include <map>
+#include <string>
+#include <vector>
+
+namespace KPRV {
+
+/// The agent's dispatcher: one request text in, one reply text out. It knows the methods by name and nothing
+/// of CIM or of adapters.
+class JsonRpcManager
+{
+public:
+    /// A remote procedure. It takes the request's "params", whatever they are, and writes `result`, which is
+    /// null before. It fails by throwing, or by leaving an object with a member "error" in `result`.
+    using Handler = void (*)(const Json::Value& params, Json::Value& result);
+
+    struct response
+    {
+        std::string text;
+        /// 500 if the request was no JSON text, else 200, also for a reply that tells an error.
+        sint32 status = 0;
+    };
+
+    /// The one dispatcher, with all methods. Made by the first call, gone when the module is unloaded.
+    static JsonRpcManager* instance();
+
+    /// Enters a method; the last one of a name stands.
+    static void registerMethod(const std::string& name, Handler handler);
+    void _registerMethod(const std::string& name, Handler handler);
+
+    /// The names of all methods, in ascending order of their bytes.
+    std::vector<std::string> getMethods() const;
+
+    /// Answers a request: an object with "method", and "params", "id" and "version" as it likes. The reply is
+    ///
+    ///     {"result": ..., "version": "1.1", "id": ...}        "id" if the request has one, whatever it is
+    ///     {"error": {"name": ..., "code": ..., "message": ...}, "version": "1.1", "id": ...}
+    ///
+    /// where an "error" that a method leaves in its result stands in the place of those three. A text that
+    /// does not parse is answered by a plain text and status 500.
+    ///
+    /// A request that is neither an object nor null, and a "method" or "version" that is no text, are
+    /// answered by nothing: they leave as a `std::exception`.
+    void process(const std::string& request, response& out) const;
+
+private:
+    JsonRpcManager() = default;
+
+    void call(const std::string& name, const Json::Value& params, Json::Value& reply) const;
+
+    static JsonRpcManager* s_instance;
+
+    std::map<std::string, Handler> _methods;
+};
+
+} // namespace KPRV
