@@ -1,6 +1,7 @@
 #include "runtime/Registration.h"
 #include "tests/module/Module_Fixture.h"
 
+#include <set>
 #include <thread>
 
 #include <pthread.h>
@@ -16,6 +17,10 @@ protected:
 
 TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
 {
+    const std::set<std::string> with_body = {
+        "KALDERA_AgentService.executeMethod",
+        "KALDERA_AlarmDevice.SetAlarmState",
+    };
     open("empty.json");
     size_t methods = 0;
     for (const Registration* each = server->module().registrations(); each; each = each->next) {
@@ -26,7 +31,7 @@ TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
             if (!(feature->flags & FLAG_METHOD))
                 continue;
             const std::string name = std::string(each->meta_class->name) + "." + feature->name;
-            if (name == "KALDERA_AlarmDevice.SetAlarmState")
+            if (with_body.contains(name))
                 continue;
             SCOPED_TRACE(name);
             const host::Result result =
