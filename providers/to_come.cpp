@@ -1,5 +1,4 @@
 #include "providers/proc.h"
-#include "schema/KALDERA_AlertIndication_Skeleton.h"
 #include "schema/KALDERA_CommMechHostedAccessPoint_Skeleton.h"
 #include "schema/KALDERA_CommMechanismForManager_Skeleton.h"
 #include "schema/KALDERA_ElementConformsToProfile_Skeleton.h"
@@ -9,7 +8,7 @@
 #include "schema/KALDERA_SubProfileRequiresProfile_Skeleton.h"
 
 // Classes that are registered, so that a server finds them, and have no body yet: their associations
-// enumerate nothing, and the indication refuses subscriptions.
+// enumerate nothing.
 
 namespace KPRV {
 
@@ -26,6 +25,5 @@ WITHOUT_BODY(KALDERA_NamespaceInManager)
 WITHOUT_BODY(KALDERA_ObjectManagerHostedService)
 WITHOUT_BODY(KALDERA_ProfileElementSoftwareIdentity)
 WITHOUT_BODY(KALDERA_SubProfileRequiresProfile)
-WITHOUT_BODY(KALDERA_AlertIndication)
 
 } // namespace KPRV
