@@ -6,6 +6,8 @@
 #include "runtime/Mutex.h"
 #include "runtime/Provider_Handle.h"
 
+#include <atomic>
+
 namespace KPRV {
 
 /// One provider as the server sees it: shared by its MIs of all kinds, from the first factory call to the
@@ -50,6 +52,8 @@ public:
     /// The provider's own class.
     const Meta_Class* model_meta_class;
     bool indications_enabled;
+    /// An operation that holds the mutex waits for the provider's worker to end.
+    std::atomic<bool> is_disabling = false;
     /// Recursive. One provider runs one operation at a time; an up-call may come back on the same thread.
     Mutex adapter_mutex;
 };

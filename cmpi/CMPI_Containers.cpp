@@ -1,4 +1,5 @@
 #include "cmpi/CMPI_Containers.h"
+#include "cmpi/Made_Objects.h"
 #include "cmpi/cmpi_text.h"
 #include "cmpi/to_cimple_value.h"
 #include "cmpi/to_cmpi_data.h"
@@ -59,7 +60,9 @@ void CMPI_Container::_relax(Value::Type, Value&) {}
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
     CMPIData data;
-    if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data) != 0) {
+    Made_Objects made;
+    if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr) !=
+        0) {
         LOG_CONVERSION(WARN, "_to_cmpi_data() failed: feature=%s", name);
         return -1;
     }

@@ -17,6 +17,10 @@ public:
     int get_value(uint32 index, Value::Type type, Value& value) override;
     int set_value(const char* name, const Value& value, uint32 flags) override;
 
+    /// From now on the objects that `set_value` makes are given back once they have been set, which copies
+    /// them. For a thread that no request's end cleans up behind.
+    void give_back_what_is_made() { _gives_back = true; }
+
 protected:
     CMPI_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space)
         : Container(repository), _broker(broker), _name_space(name_space)
@@ -34,6 +38,9 @@ protected:
 
     const CMPIBroker* _broker;
     const char* _name_space;
+
+private:
+    bool _gives_back = false;
 };
 
 class CMPIInstance_Container : public CMPI_Container

@@ -1,31 +1,52 @@
 #include "cmpi/Converter.h"
 #include "cmpi/CMPI_Containers.h"
+#include "cmpi/Made_Objects.h"
 #include "cmpi/cmpi_text.h"
 #include "runtime/log.h"
 
 namespace KPRV {
 
-CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                             CMPIObjectPath*& path)
+/// Whether an end of a request frees what is made, or nobody does.
+enum class Afterwards
+{
+    SERVER_FREES,
+    GIVE_BACK,
+};
+
+static CMPIrc make_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
+                        Afterwards afterwards, CMPIObjectPath*& path)
 {
     const Meta_Class* const meta_class = instance->__meta_class;
     path = CMNewObjectPath(broker, name_space, meta_class->name, nullptr);
     if (!path)
         return CMPI_RC_ERR_FAILED;
     CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space, path);
+    if (afterwards == Afterwards::GIVE_BACK)
+        container.give_back_what_is_made();
     return container.convert(instance, FLAG_KEY) == 0 ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
+}
+
+CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
+                             CMPIObjectPath*& path)
+{
+    return make_path(broker, instance, name_space, Afterwards::SERVER_FREES, path);
 }
 
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                           const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci)
 {
     ci = nullptr;
+    // Without the path of a request there is no request: the caller is a thread of the module's own, so that
+    // whatever is made here besides the instance is given back here.
+    const Afterwards afterwards = path ? Afterwards::SERVER_FREES : Afterwards::GIVE_BACK;
+    Made_Objects made;
     if (!path) {
         LOG_CONVERSION(WARN, "No ObjectPath built before call to make_CMPI_instance");
         CMPIObjectPath* built;
-        if (make_cmpi_object_path(broker, instance, name_space, built) != CMPI_RC_OK)
+        const CMPIrc rc = make_path(broker, instance, name_space, afterwards, built);
+        path = made.note(built);
+        if (rc != CMPI_RC_OK)
             return CMPI_RC_ERR_FAILED;
-        path = built;
     }
     ci = CMNewInstance(broker, path, nullptr);
     if (!ci)
@@ -37,6 +58,8 @@ CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, co
             return status.rc;
     }
     CMPIInstance_Container container(instance->__meta_class->meta_repository, broker, name_space, ci);
+    if (afterwards == Afterwards::GIVE_BACK)
+        container.give_back_what_is_made();
     return container.convert(instance, 0) == 0 ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
 }
 

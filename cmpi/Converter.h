@@ -16,7 +16,8 @@ namespace KPRV {
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                              CMPIObjectPath*& path);
 
-/// The instance under a property list (null-terminated; null for all). A null path is built from the keys.
+/// The instance under a property list (null-terminated; null for all). A null path is built from the keys,
+/// for a thread that no end of a request cleans up behind: all that is made but the instance is given back.
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                           const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci);
 

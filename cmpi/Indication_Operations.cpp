@@ -3,6 +3,7 @@
 #include "cmpi/cmpi_text.h"
 #include "cmpi/entries.h"
 #include "cmpi/status_translation.h"
+#include "runtime/Time.h"
 #include "runtime/assert.h"
 
 // Filters are not evaluated: what counts is in which name spaces there are active ones. Filters and enabling
@@ -63,11 +64,52 @@ static CMPIStatus deactivateFilter(CMPIIndicationMI* mi, const CMPIContext*, con
     return trace_ok(LOG_HERE, "deactivateFilter");
 }
 
+namespace {
+
+/// Holds the adapter for one delivery. An operation that disables indications keeps the mutex while it waits
+/// for the worker to end; a worker that waited for the mutex meanwhile would never end. It delivers under the
+/// operation's hold instead: the operation does nothing but wait for it.
+class Delivery_Hold
+{
+public:
+    explicit Delivery_Hold(CMPI_Adapter& adapter) : _mutex(adapter.adapter_mutex)
+    {
+        while (!(_is_own = _mutex.try_lock() == 0) && !adapter.is_disabling)
+            Time::sleep(Time::MSEC);
+    }
+    ~Delivery_Hold()
+    {
+        if (_is_own)
+            _mutex.unlock();
+    }
+    Delivery_Hold(const Delivery_Hold&) = delete;
+    Delivery_Hold& operator=(const Delivery_Hold&) = delete;
+
+private:
+    Mutex& _mutex;
+    bool _is_own;
+};
+
+/// Lets deliveries pass for as long as indications are being disabled.
+class Disabling_Mark
+{
+public:
+    explicit Disabling_Mark(CMPI_Adapter& adapter) : _mark(adapter.is_disabling) { _mark = true; }
+    ~Disabling_Mark() { _mark = false; }
+    Disabling_Mark(const Disabling_Mark&) = delete;
+    Disabling_Mark& operator=(const Disabling_Mark&) = delete;
+
+private:
+    std::atomic<bool>& _mark;
+};
+
+} // namespace
+
 /// What the provider's worker calls with each indication: sends it into every name space with filters.
 static bool _indication_proc(Instance* instance, void* client_data)
 {
     auto* const adapter = static_cast<CMPI_Adapter*>(client_data);
-    const Auto_Mutex lock(adapter->adapter_mutex);
+    const Delivery_Hold hold(*adapter);
     if (!instance)
         return false;
     const Ref<Instance> owner(instance);
@@ -108,6 +150,7 @@ static CMPIStatus disableIndications(CMPIIndicationMI* mi, const CMPIContext* co
     if (!adapter->indications_enabled)
         return {CMPI_RC_OK, nullptr};
 
+    const Disabling_Mark mark(*adapter);
     const int status = adapter->disable_indications();
     adapter->indications_enabled = false;
     return scope.ret(LOG_HERE, translate(Status_Family::DISABLE_INDICATIONS, status));

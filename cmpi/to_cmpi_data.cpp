@@ -1,5 +1,6 @@
 #include "cmpi/to_cmpi_data.h"
 #include "cmpi/CMPI_Containers.h"
+#include "cmpi/Made_Objects.h"
 #include "cmpi/cmpi_types.h"
 #include "runtime/log.h"
 #include "runtime/type_dispatch.h"
@@ -8,32 +9,49 @@
 
 namespace KPRV {
 
+namespace {
+
+/// Where objects come from, and who takes note of them: null if nobody does.
+struct Maker
+{
+    const CMPIBroker* broker;
+    Made_Objects* made;
+
+    template <class T>
+    T* noted(T* object) const
+    {
+        return made ? made->note(object) : object;
+    }
+};
+
+} // namespace
+
 /// One scalar into the union. False if the server does not make the object.
 template <class T>
-static bool store_scalar(const CMPIBroker*, const T& x, CMPIValue& value)
+static bool store_scalar(const Maker&, const T& x, CMPIValue& value)
 {
     store_plain(value, x);
     return true;
 }
 
-static bool store_scalar(const CMPIBroker* broker, const String& x, CMPIValue& value)
+static bool store_scalar(const Maker& maker, const String& x, CMPIValue& value)
 {
-    value.string = CMNewString(broker, x.c_str(), nullptr);
+    value.string = maker.noted(CMNewString(maker.broker, x.c_str(), nullptr));
     return value.string != nullptr;
 }
 
-static bool store_scalar(const CMPIBroker* broker, const Datetime& x, CMPIValue& value)
+static bool store_scalar(const Maker& maker, const Datetime& x, CMPIValue& value)
 {
     char text[32];
     x.ascii(text, false);
-    value.dateTime = CMNewDateTimeFromChars(broker, text, nullptr);
+    value.dateTime = maker.noted(CMNewDateTimeFromChars(maker.broker, text, nullptr));
     return value.dateTime != nullptr;
 }
 
-static CMPIArray* new_array(const CMPIBroker* broker, uint32 count, CMPIType element_word, CMPIData& data)
+static CMPIArray* new_array(const Maker& maker, uint32 count, CMPIType element_word, CMPIData& data)
 {
     data.type = CMPIType(element_word | CMPI_ARRAY);
-    data.value.array = CMNewArray(broker, count, element_word, nullptr);
+    data.value.array = maker.noted(CMNewArray(maker.broker, count, element_word, nullptr));
     return data.value.array;
 }
 
@@ -46,42 +64,42 @@ static int set_element(CMPIArray* array, uint32 index, const CMPIValue& value, C
 }
 
 template <class T>
-static int scalar_to_data(const CMPIBroker* broker, const Value& value, CMPIType word, CMPIData& data)
+static int scalar_to_data(const Maker& maker, const Value& value, CMPIType word, CMPIData& data)
 {
     T x = T();
     value.get_value(x);
     data.type = word;
-    return store_scalar(broker, x, data.value) ? 0 : -1;
+    return store_scalar(maker, x, data.value) ? 0 : -1;
 }
 
 template <class T>
-static int array_to_data(const CMPIBroker* broker, const Value& value, CMPIType element_word, CMPIData& data)
+static int array_to_data(const Maker& maker, const Value& value, CMPIType element_word, CMPIData& data)
 {
     Array<T> elements;
     value.get_value(elements);
-    CMPIArray* const array = new_array(broker, elements.size(), element_word, data);
+    CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
     if (!array)
         return -1;
     for (uint32 i = 0; i < elements.size(); i++) {
         CMPIValue element = {};
-        if (!store_scalar(broker, elements[i], element) || set_element(array, i, element, element_word) != 0)
+        if (!store_scalar(maker, elements[i], element) || set_element(array, i, element, element_word) != 0)
             return -1;
     }
     return 0;
 }
 
-static int instance_array_to_data(const Meta_Repository* repository, const CMPIBroker* broker,
+static int instance_array_to_data(const Meta_Repository* repository, const Maker& maker,
                                   const char* name_space, const Value& value, CMPIType element_word,
                                   CMPIData& data)
 {
     Array<Instance*> elements;
     value.get_value(elements);
-    CMPIArray* const array = new_array(broker, elements.size(), element_word, data);
+    CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
     if (!array)
         return -1;
     for (uint32 i = 0; i < elements.size(); i++) {
         CMPIData element = {};
-        if (to_cmpi_scalar<Instance*>::func(repository, broker, name_space, elements[i], element_word,
+        if (to_cmpi_scalar<Instance*>::func(repository, maker.broker, name_space, elements[i], element_word,
                                             element) != 0) {
             LOG_CONVERSION(WARN, "element conversion failed");
             return -1;
@@ -93,8 +111,9 @@ static int instance_array_to_data(const Meta_Repository* repository, const CMPIB
 }
 
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                  const Value& value, uint32 flags, CMPIData& data)
+                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made)
 {
+    const Maker maker = {broker, made};
     data = CMPIData();
     const CMPIType instance_word =
         flags & (FLAG_EMBEDDED_INSTANCE | FLAG_EMBEDDED_OBJECT) ? CMPI_instance : CMPI_ref;
@@ -109,7 +128,7 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
         return to_cmpi_scalar<Instance*>::func(repository, broker, name_space, instance, instance_word, data);
     }
     if (value.type == Value::INSTANCE_ARRAY)
-        return instance_array_to_data(repository, broker, name_space, value, instance_word, data);
+        return instance_array_to_data(repository, maker, name_space, value, instance_word, data);
 
     const uint32 scalar = uint32(value.type) & ~uint32(Value::ARRAY_BIT);
     if (scalar >= NUM_TYPES) {
@@ -120,8 +139,8 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
     return visit_type(Type(scalar), [&](auto tag) {
         using T = typename decltype(tag)::type;
         return value.type & Value::ARRAY_BIT
-                   ? array_to_data<T>(broker, value, cmpi_type_words[tag.code], data)
-                   : scalar_to_data<T>(broker, value, cmpi_type_words[tag.code], data);
+                   ? array_to_data<T>(maker, value, cmpi_type_words[tag.code], data)
+                   : scalar_to_data<T>(maker, value, cmpi_type_words[tag.code], data);
     });
 }
 

@@ -8,10 +8,13 @@
 
 namespace KPRV {
 
+class Made_Objects;
+
 /// Translates one value for the server. `flags` are the feature's: they tell an embedded instance from a
-/// reference. 0, or -1 with a log line. The objects made belong to the server.
+/// reference. 0, or -1 with a log line. The objects made belong to the server; those of texts, datetimes and
+/// arrays are noted in `made`, if given.
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                  const Value& value, uint32 flags, CMPIData& data);
+                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made = nullptr);
 
 template <class T>
 struct to_cmpi_scalar;

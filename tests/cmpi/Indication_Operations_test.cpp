@@ -1,10 +1,30 @@
 #include "runtime/Thread.h"
+#include "runtime/Time.h"
 #include "tests/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
+
+#include <future>
 
 using namespace KPRV;
 
 namespace {
+
+struct Worker
+{
+    Script::Deliver deliver;
+    Thread thread;
+    /// What it waits for before it delivers, if anything.
+    std::future<void> start;
+
+    static void* run(void* argument)
+    {
+        auto* const self = static_cast<Worker*>(argument);
+        if (self->start.valid())
+            self->start.wait();
+        self->deliver(make_named("from a worker"));
+        return nullptr;
+    }
+};
 
 class Indication_Operations : public testing::Test
 {
@@ -202,7 +222,70 @@ TEST_F(Indication_Operations, an_indication_goes_once_into_each_name_space)
     EXPECT_EQ(text_of_key(server.delivered[0].second.path, "Name"), "alert");
     EXPECT_EQ(server.core->calls.calls("CBDeliverIndication"),
               (Texts{"CBDeliverIndication root/one", "CBDeliverIndication root/two"}));
-    EXPECT_EQ(server.core->calls.calls("CMRelease").size(), 2u);
+}
+
+TEST_F(Indication_Operations, a_delivery_leaves_nothing_behind)
+{
+    // Servers free what is made on an attached thread only when the thread ends.
+    enable();
+    activate("root/one");
+    activate("root/two");
+    host::Mi_Frame frame(server.broker, {});
+    const Context_Scope context(server.broker.cmpi(), frame.context(), provider.adapter());
+    const size_t before = server.core->ledger.live();
+    for (int i = 0; i < 100; i++) {
+        deliver(make_named("alert"));
+        ASSERT_EQ(server.core->ledger.live(), before) << i;
+    }
+    EXPECT_EQ(server.delivered.size(), 200u);
+}
+
+TEST_F(Indication_Operations, a_worker_passes_an_operation_that_waits_for_its_end)
+{
+    Worker worker;
+    std::promise<void> stopping;
+    script.enable_indications = [&](const Script::Deliver& x) {
+        worker.deliver = x;
+        worker.start = stopping.get_future();
+        return Thread::create_joinable(worker.thread, Worker::run, &worker);
+    };
+    script.disable_indications = [&] {
+        // From here on the worker needs the adapter, which this operation holds until the worker has ended.
+        stopping.set_value();
+        void* result;
+        return Thread::join(worker.thread, result);
+    };
+    activate("root/one");
+    enable();
+    EXPECT_EQ(disable(), CMPI_RC_OK);
+    EXPECT_EQ(delivered_to(), Texts{"root/one"});
+    EXPECT_EQ(provider.adapter()->adapter_mutex.try_lock(), 0);
+    provider.adapter()->adapter_mutex.unlock();
+}
+
+TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
+{
+    Worker worker;
+    std::promise<void> go;
+    script.enable_indications = [&](const Script::Deliver& x) {
+        worker.deliver = x;
+        worker.start = go.get_future();
+        return Thread::create_joinable(worker.thread, Worker::run, &worker);
+    };
+    script.disable_indications = [&] {
+        void* result;
+        return Thread::join(worker.thread, result);
+    };
+    activate("root/one");
+    enable();
+    {
+        const Auto_Mutex operation(provider.adapter()->adapter_mutex);
+        go.set_value();
+        Time::sleep(20 * Time::MSEC);
+        EXPECT_TRUE(server.delivered.empty());
+    }
+    disable();
+    EXPECT_EQ(delivered_to(), Texts{"root/one"});
 }
 
 TEST_F(Indication_Operations, without_filters_an_indication_is_dropped)
@@ -250,22 +333,6 @@ TEST_F(Indication_Operations, filters_may_change_during_a_delivery)
     deliver_on_worker("alert");
     EXPECT_EQ(delivered_to(), Texts{"root/one"});
 }
-
-namespace {
-
-struct Worker
-{
-    Script::Deliver deliver;
-    Thread thread;
-
-    static void* run(void* argument)
-    {
-        static_cast<Worker*>(argument)->deliver(make_named("from a worker"));
-        return nullptr;
-    }
-};
-
-} // namespace
 
 TEST_F(Indication_Operations, a_worker_started_in_the_operation_is_attached_to_the_server)
 {
