@@ -2,6 +2,7 @@
 
 #include "simulator/Inventory_Members.h"
 #include "simulator/Port_Reader.h"
+#include "simulator/Settings.h"
 
 #include <algorithm>
 
@@ -36,6 +37,8 @@ public:
         adapter.address = address();
         adapter.answers = parts["answers"];
         check_answers(source_, adapter.answers);
+        adapter.settings = parts["settings"];
+        check_settings(source_, adapter.settings);
         return adapter;
     }
 

@@ -11,8 +11,8 @@ namespace KPRV::simulator {
 namespace {
 
 // The request members that name an adapter or a port.
-constexpr const char* address_members[] = {"indexStr", "wwn",    "mac",      "pwwn",    "pPortWwn",
-                                           "portWwn",  "hbaWwn", "lPortWwn", "rPortWwn"};
+constexpr const char* address_members[] = {"indexStr", "wwn",    "mac",      "pwwn",     "pPortWwn",
+                                           "portWwn",  "hbaWwn", "lPortWwn", "rPortWwn", "Node"};
 
 bool is_address_member(const std::string& name)
 {
@@ -29,18 +29,6 @@ std::string present_member(const Json::Value& request, const std::string& choice
     for (std::string name; std::getline(names, name, '|');)
         if (request.isMember(name))
             return name;
-    return "";
-}
-
-// The first member that the row asks for and the request lacks or has of the wrong type.
-std::string missing_member(const Entry_Row& row, const Json::Value& request)
-{
-    std::istringstream choices(row.request);
-    for (std::string choice; choices >> choice;) {
-        const std::string name = present_member(request, choice);
-        if (name.empty() || (is_address_member(name) && !request[name].isString()))
-            return choice;
-    }
     return "";
 }
 
@@ -68,6 +56,17 @@ const Json::Value* authors_answer(Inventory& inventory, const Entry_Row& row, co
 
 } // namespace
 
+std::string missing_member(const std::string& asked, const Json::Value& request)
+{
+    std::istringstream choices(asked);
+    for (std::string choice; choices >> choice;) {
+        const std::string name = present_member(request, choice);
+        if (name.empty() || (is_address_member(name) && !request[name].isString()))
+            return choice;
+    }
+    return "";
+}
+
 Json::Value error_answer(int code, const std::string& message)
 {
     Json::Value answer;
@@ -92,7 +91,7 @@ Json::Value done_answer()
 Json::Value answer_by_row(State& state, const Entry_Row& row, const Json::Value& request)
 {
     const std::string name = row.symbol;
-    const std::string missing = missing_member(row, request);
+    const std::string missing = missing_member(row.request, request);
     if (!missing.empty())
         return error_answer(Error_Code::REQUEST, name + ": the request must have " + missing);
     const std::string address = call_address(row, request);

@@ -16,6 +16,9 @@ enum class Error_Code
     UNSUPPORTED = 3, // nothing answers this entry point
     INVENTORY = 4,   // the inventory was refused
     EMPTY_SLOT = 5,  // nothing is plugged into the port
+    DUPLICATE = 6,   // what is to be made is there already
+    NOT_FOUND = 7,   // what was once made, or was to be, is not there
+    CONFLICT = 8,    // not in the present state of things
     INJECTED = 99,   // a fault asked for it
 };
 
@@ -25,6 +28,10 @@ Json::Value error_answer(Error_Code code, const std::string& message);
 
 /// The answer to an action that was done: {"status": 0}.
 Json::Value done_answer();
+
+/// The first of the members in `asked` (see Entry_Points.def) that the request lacks, or that is no text
+/// though it names an address; empty if there is none.
+std::string missing_member(const std::string& asked, const Json::Value& request);
 
 /// Answers `request` as the row says, under the simulator's lock: checks the request's members,
 /// then prefers an answer of the inventory's author to the row's behaviour.

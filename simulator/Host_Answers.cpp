@@ -2,6 +2,7 @@
 #include "simulator/Behaviours.h"
 
 #include <algorithm>
+#include <ctime>
 
 namespace KPRV::simulator {
 
@@ -71,6 +72,34 @@ Json::Value global_info(State& state, const Json::Value& request)
     answer["adapter"] = Json::Value(Json::arrayValue);
     for (const Adapter& adapter : state.inventory.adapters)
         answer["adapter"].append(adapter_record(adapter));
+    return answer;
+}
+
+Json::Value server_time(State&, const Json::Value&)
+{
+    const std::time_t now = std::time(nullptr);
+    std::tm local = {};
+    localtime_r(&now, &local);
+    char text[32];
+    std::strftime(text, sizeof text, "%Y/%m/%d %H:%M:%S", &local);
+    Json::Value answer;
+    answer["seconds"] = static_cast<Json::Int64>(now);
+    answer["utcOffsetMinutes"] = static_cast<Json::Int>(local.tm_gmtoff / 60);
+    answer["text"] = text;
+    return answer;
+}
+
+Json::Value driver_log(State& state, const Json::Value&)
+{
+    Json::Value answer;
+    answer["entries"] = Json::Value(Json::arrayValue);
+    for (const Adapter& adapter : state.inventory.adapters) {
+        Json::Value& entry = answer["entries"].append(Json::Value());
+        entry["adapter"] = adapter.address;
+        entry["driver"] = adapter.data["driver"]["storageDriverName"];
+        entry["version"] = adapter.data["driver"]["storageDriverVersion"];
+        entry["status"] = "Up to date";
+    }
     return answer;
 }
 

@@ -44,6 +44,9 @@ Inventory::Inventory(const Json_Text& source)
     answers = parts["answers"];
     check_answers(source, answers);
 
+    check_members(source, parts["postedTests"], simulator::posted_tests_members, "postedTests");
+    posted_tests_members = answered_members(parts["postedTests"], simulator::posted_tests_members);
+
     const Remote_Ports remote_ports = read_remote_ports(source, take_part(parts, "remotePorts"));
     std::size_t eth_ports = 0;
     for (Json::Value& each : parts["adapters"]) {

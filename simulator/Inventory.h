@@ -2,7 +2,10 @@
 
 #include "simulator/Counters.h"
 #include "simulator/Json_Text.h"
+#include "simulator/Port_Additions.h"
+#include "simulator/Posted_Tests.h"
 #include "simulator/Remote_Ports.h"
+#include "simulator/Reset_Marks.h"
 
 #include <cstddef>
 #include <json/json.h>
@@ -37,6 +40,12 @@ struct Port
     Counters counters;         // of an FC port
     Remote_Ports remote_ports; // of an FC port
     Json::Value answers;       // answers of the author's own, by entry point
+    Json::Value settings;      // what was written or set of each, by its name in Settings.h
+    std::vector<Virtual_Port> virtual_ports;
+    std::vector<Virtual_Nic> vnics;
+    Path_Records lun_masks;
+    Path_Records io_profiles;
+    std::optional<std::string> dport; // the request id under which it was enabled as a D-Port
 };
 
 /// An adapter, as the library's answers tell it.
@@ -48,6 +57,7 @@ struct Adapter
     std::vector<Port> fc_ports;
     std::vector<Port> eth_ports;
     Json::Value answers;
+    Json::Value settings; // as of a port
 };
 
 /// A host with its adapters: what an inventory file describes, and what "set" calls change.
@@ -84,6 +94,9 @@ public:
     Json::Value faults;  // as written, for Fault to read
     Json::Value answers; // answers of the author's own that belong to no adapter
     std::vector<Adapter> adapters;
+    Reset_Marks reset_marks;
+    Posted_Tests posted_tests;
+    Json::Value posted_tests_members; // `milliseconds`, `failing`
 
 private:
     // Positions, not pointers: an inventory can be copied and moved.

@@ -26,6 +26,12 @@ inline constexpr Member inventory_members[] = {
     {"adapters",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"faults",                Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"postedTests",           Type::OBJECT,  Presence::OPTIONAL, "{}"},
+};
+
+inline constexpr Member posted_tests_members[] = {
+    {"milliseconds",          Type::COUNT,   Presence::OPTIONAL, "0"},
+    {"failing",               Type::ARRAY,   Presence::OPTIONAL, "[]"},
 };
 
 inline constexpr Member adapter_members[] = {
@@ -37,6 +43,7 @@ inline constexpr Member adapter_members[] = {
     {"fcPorts",               Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"ethPorts",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"settings",              Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member hba_data_members[] = {
@@ -89,6 +96,7 @@ inline constexpr Member fc_port_members[] = {
     {"remotePorts",           Type::ARRAY,   Presence::OPTIONAL},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
+    {"settings",              Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_port_members[] = {
@@ -101,6 +109,7 @@ inline constexpr Member eth_port_members[] = {
     {"optics",                Type::OBJECT,  Presence::NULLABLE},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
+    {"settings",              Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_data_members[] = {

@@ -2,6 +2,7 @@
 #include "simulator/Inventory_Members.h"
 #include "simulator/Lookup.h"
 #include "simulator/Status.h"
+#include "simulator/Target.h"
 
 #include <algorithm>
 
@@ -22,21 +23,36 @@ Json::Value port_addresses(State& state, const Json::Value& request, std::vector
                      });
 }
 
-// The first of the names that cannot be set, in words; empty if all can.
-std::string objection(const Json::Value& names, const Json::Value& values)
+// Null if there is none of that name.
+const Member* find_member(Members members, const Json::Value& name)
+{
+    const auto found =
+        std::find_if(members.begin(), members.end(), [&](const Member& each) { return name == each.name; });
+    return found == members.end() ? nullptr : &*found;
+}
+
+// The first of the names that cannot be set, in words; empty if all can. `strict`: only members can.
+std::string objection(const Json::Value& names, const Json::Value& values, Members members, bool strict)
 {
     if (!names.isArray() || !values.isObject())
         return "port must be an object and propArray an array";
     for (const Json::Value& name : names) {
         if (!name.isString() || !values.isMember(name.asString()))
             return "propArray names what port does not have: " + compact_text(name);
-        const auto known = std::find_if(std::begin(fc_port_members), std::end(fc_port_members),
-                                        [&](const Member& each) { return name == each.name; });
-        if (known != std::end(fc_port_members) && !has_type(values[name.asString()], known->type))
-            return name.asString() + " must be " + type_words(known->type);
+        const Member* member = find_member(members, name);
+        if (member ? !has_type(values[name.asString()], member->type) : strict)
+            return name.asString() +
+                   (member ? std::string(" must be ") + type_words(member->type) : " cannot be set");
     }
     return "";
 }
+
+// What can be set of an Ethernet function: of its link and of its data.
+constexpr Member settable_eth_members[] = {
+    {"portStatus", Type::BOOL, Presence::OPTIONAL},
+    {"beaconState", Type::BOOL, Presence::OPTIONAL},
+    {"mtu", Type::COUNT, Presence::OPTIONAL},
+};
 
 // A port that is enabled or disabled shows it in each member that tells its state.
 void show_status(Port& port, bool enabled)
@@ -80,7 +96,7 @@ Json::Value set_port(State& state, const Json::Value& request)
 {
     const Json::Value& names = request["propArray"];
     const Json::Value& values = request["port"];
-    const std::string refused = objection(names, values);
+    const std::string refused = objection(names, values, fc_port_members, false);
     if (!refused.empty())
         return error_answer(Error_Code::REQUEST, refused);
     return answer_for_port(state, request["indexStr"], [&](Port& port) {
@@ -90,6 +106,37 @@ Json::Value set_port(State& state, const Json::Value& request)
             show_status(port, values["portStatus"].asBool());
         return done_answer();
     });
+}
+
+Json::Value set_eth_port(State& state, const Json::Value& request)
+{
+    const Json::Value& names = request["propArray"];
+    const Json::Value& values = request["ethPort"];
+    const std::string refused = objection(names, values, settable_eth_members, true);
+    if (!refused.empty())
+        return error_answer(Error_Code::REQUEST, refused);
+    return answer_for_target(state, request, Scope::ETH_PORT, [&](const Target& target) {
+        Port& port = *target.port;
+        if (port.eth_data.isNull())
+            return no_such_address(request["mac"]);
+        for (const Json::Value& name : names)
+            (name == "mtu" ? port.eth_data : port.data)[name.asString()] = values[name.asString()];
+        if (std::find(names.begin(), names.end(), "portStatus") != names.end())
+            show_status(port, values["portStatus"].asBool());
+        return done_answer();
+    });
+}
+
+// The logs themselves are nowhere to be read.
+Json::Value clear_logs(State& state, const Json::Value& request)
+{
+    const Json::Value& addresses = request["propArray"];
+    if (!addresses.isArray())
+        return error_answer(Error_Code::REQUEST, "propArray must be an array");
+    for (const Json::Value& address : addresses)
+        if (const Target target = target_at(state.inventory, address, Scope::PORT); !target)
+            return target.refusal;
+    return done_answer();
 }
 
 } // namespace KPRV::simulator

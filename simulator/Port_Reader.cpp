@@ -4,6 +4,7 @@
 #include "simulator/Inventory_Members.h"
 #include "simulator/Optics_Reader.h"
 #include "simulator/Remote_Port_Reader.h"
+#include "simulator/Settings.h"
 #include "simulator/Status.h"
 
 #include <utility>
@@ -59,6 +60,8 @@ Port read_fc_port(const Json_Text& source, Json::Value& written, const Port_Plac
     port.remote_ports = read_remote_ports(source, take_part(written, "remotePorts"), place.known_ports);
     port.data = written;
     port.answers = take_answers(source, port.data);
+    port.settings = take_part(port.data, "settings");
+    check_settings(source, port.settings);
     port.optics = take_optics(source, port.data, place);
     if (!place.node_wwn.isNull())
         set_default(port.data, "nodeWwn", place.node_wwn);
@@ -78,6 +81,8 @@ Port read_eth_port(const Json_Text& source, const Json::Value& written, const Po
     port.address = written["mac"].asString();
     port.data = written;
     port.answers = take_answers(source, port.data);
+    port.settings = take_part(port.data, "settings");
+    check_settings(source, port.settings);
     port.optics = take_optics(source, port.data, place);
     const Json::Value& enabled = written["portStatus"];
     const Json::Value eth = take_part(port.data, "ethData");

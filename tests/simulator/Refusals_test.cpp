@@ -132,6 +132,15 @@ const Refusal refusals[] = {
     {"{\"remotePorts\": [{\"remotePortWwn\": \"" TARGET "\"},\n{\"remotePortWwn\": \"" TARGET "\"}]}",
      "2: duplicate remote port \"" TARGET "\""},
 
+    // Settings and tests.
+    ON_PORT("\"settings\": {\n\"lld\": {}}",             "4: unknown setting \"lld\""),
+    ON_PORT("\"settings\": {\n\"authentication\": 7}",   "4: the setting \"authentication\" must be an object"),
+    {"{\"adapters\": [{\"hbaData\": {\"hbaMAC\": \"02:4b:4c:20:00:00\"},\n\"settings\": {\"x\": {}}}]}",
+     "2: unknown setting \"x\""},
+    {"{\"postedTests\": {\n\"millis\": 1}}",             "2: unknown member \"millis\" in postedTests"},
+    {"{\"postedTests\": {\n\"milliseconds\": -1}}",
+     "2: \"milliseconds\" in postedTests must be an unsigned integer of 32 bits, not -1"},
+
     // Duplicates: of another adapter, in another letter case; of another port; of another adapter's port.
     {"{\"adapters\": [{\"hbaData\": {\"wwn\": \"20:00:02:4b:4c:20:00:00\"}},\n"
      "{\"hbaData\": {\"wwn\": \"20:00:02:4B:4C:20:00:00\"}}]}",
