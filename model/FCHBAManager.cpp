@@ -1,5 +1,6 @@
 #include "model/FCHBAManager.h"
 
+#include "model/AccessPointHelper.h"
 #include "model/AdapterHelper.h"
 #include "model/Class_Dispatch.h"
 #include "model/CommonHelper.h"
@@ -24,6 +25,10 @@ Array<Instance*> by_port_helper(classId_t id)
 {
     return PortHelper::getPortHelperObject()->getInstancesByClass(id);
 }
+Array<Instance*> by_access_point_helper(classId_t id)
+{
+    return AccessPointHelper::getAccessPointHelperInstance()->getInstancesByClass(id);
+}
 Array<Instance*> by_ethernet_port_helper(classId_t id)
 {
     return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(id);
@@ -44,7 +49,7 @@ constexpr Class_Row rows[] = {
     {PHYSICALPACKAGE,                            Needs::DRIVER,   by_adapter_helper},
     {PRODUCT,                                    Needs::DRIVER,   by_adapter_helper},
     {ADAPTERSOFTWAREIDENTITY,                    Needs::DRIVER,   by_adapter_helper},
-    {REMOTESERVICEACCESSPOINT,                   Needs::NOTHING,  nullptr},
+    {REMOTESERVICEACCESSPOINT,                   Needs::NOTHING,  by_access_point_helper},
     {HBASOFTWAREINSTALLATIONSERVICE,             Needs::DRIVER,   nullptr},
     {HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, Needs::DRIVER,   nullptr},
     {ETHERNETPORT,                               Needs::DRIVER,   by_ethernet_port_helper},
@@ -74,6 +79,7 @@ FCHBAManager::FCHBAManager()
     CommonHelper::getCommonHelperObject();
     AdapterHelper::getAdapterHelperInstance();
     PortHelper::getPortHelperObject();
+    AccessPointHelper::getAccessPointHelperInstance();
     EthernetPortHelper::getEthernetPortHelperObject();
     PhysicalAssetHelper::getPhysicalAssetHelperObject();
 }

@@ -1,21 +1,29 @@
 #include "model/ServerManager.h"
 
 #include "model/Class_Dispatch.h"
+#include "model/Registered_Profiles.h"
 
 namespace KPRV {
 
 namespace {
 
+/// The operation of the manager that gives a class.
+template <Array<Instance*> (ServerManager::*OPERATION)() const>
+Array<Instance*> by(classId_t)
+{
+    return (ServerManager::getServerManager()->*OPERATION)();
+}
+
 // clang-format off
 constexpr Class_Row rows[] = {
 //   class                          needs            source
-    {REGISTEREDPROFILE,             Needs::NOTHING,  nullptr},
-    {REGISTEREDSUBPROFILE,          Needs::NOTHING,  nullptr},
-    {NAMESPACE,                     Needs::NOTHING,  nullptr},
-    {OBJECTMANAGER,                 Needs::NOTHING,  nullptr},
-    {CIMXMLCOMMUNICATIONMECHANISM,  Needs::NOTHING,  nullptr},
-    {PROFILESOFTWAREIDENTITY,       Needs::NOTHING,  nullptr},
-    {AGENTSERVICE,                  Needs::NOTHING,  nullptr},
+    {REGISTEREDPROFILE,             Needs::NOTHING,  by<&ServerManager::getRegisteredProfileInstances>},
+    {REGISTEREDSUBPROFILE,          Needs::NOTHING,  by<&ServerManager::getRegisteredSubProfileInstances>},
+    {NAMESPACE,                     Needs::NOTHING,  by<&ServerManager::getNamespaceInstances>},
+    {OBJECTMANAGER,                 Needs::NOTHING,  by<&ServerManager::getObjectManagerInstance>},
+    {CIMXMLCOMMUNICATIONMECHANISM,  Needs::NOTHING,  by<&ServerManager::getCIMXMLCommunicationMechanismInstance>},
+    {PROFILESOFTWAREIDENTITY,       Needs::NOTHING,  by<&ServerManager::getProfileSoftwareIdentityInstances>},
+    {AGENTSERVICE,                  Needs::NOTHING,  by<&ServerManager::getAgentServiceInstances>},
 };
 // clang-format on
 
@@ -31,6 +39,24 @@ Array<Instance*> ServerManager::getInstances(classId_t id) const
 {
     LOG_SCOPE("getInstances");
     return dispatch_class(LOG_HERE, rows, id);
+}
+
+Array<Instance*> ServerManager::getRegisteredProfileInstances() const
+{
+    LOG_SCOPE("getRegisteredProfileInstances");
+    return registered_profiles();
+}
+
+Array<Instance*> ServerManager::getRegisteredSubProfileInstances() const
+{
+    LOG_SCOPE("getRegisteredSubProfileInstances");
+    return registered_subprofiles();
+}
+
+Array<String> ServerManager::getSubProfilesOfProfile(const String& profile) const
+{
+    LOG_SCOPE("getSubProfilesOfProfile");
+    return subprofiles_of(profile);
 }
 
 } // namespace KPRV

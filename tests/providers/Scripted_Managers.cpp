@@ -4,6 +4,7 @@
 #include "model/EthernetPortHelper.h"
 #include "model/FCHBAManager.h"
 #include "model/HDRManager.h"
+#include "model/Registered_Profiles.h"
 #include "model/ServerManager.h"
 
 #include <stdexcept>
@@ -44,6 +45,12 @@ bool is_storage(classId_t id)
     return id == STORAGEEXTENT || id == TAPEDRIVE || id == LOGICALDISK;
 }
 
+/// The server's side likewise.
+bool is_of_server(classId_t id)
+{
+    return (id >= REGISTEREDPROFILE && id <= PROFILESOFTWAREIDENTITY) || id == AGENTSERVICE;
+}
+
 } // namespace
 
 FCHBAManager::FCHBAManager() = default;
@@ -54,7 +61,7 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 }
 Array<Instance*> FCHBAManager::getInstances(classId_t id) const
 {
-    if (is_storage(id))
+    if (is_storage(id) || is_of_server(id))
         throw std::logic_error("not a class of this manager");
     return fetch(id);
 }
@@ -105,9 +112,16 @@ ServerManager* ServerManager::getServerManager()
     static ServerManager manager;
     return &manager;
 }
-Array<Instance*> ServerManager::getInstances(classId_t) const
+Array<Instance*> ServerManager::getInstances(classId_t id) const
 {
-    throw std::logic_error("no association here asks the server side");
+    if (!is_of_server(id))
+        throw std::logic_error("not a class of this manager");
+    return fetch(id);
+}
+Array<String> ServerManager::getSubProfilesOfProfile(const String& profile) const
+{
+    managers_script.fetched.push_back(std::string("subprofiles of ") + profile.c_str());
+    return subprofiles_of(profile);
 }
 
 EthernetPortHelper::EthernetPortHelper() : _life("EthernetPortHelper", LOG_HERE) {}

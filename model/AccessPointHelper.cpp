@@ -1,0 +1,58 @@
+#include "model/AccessPointHelper.h"
+
+#include "model/Instance_Building.h"
+#include "model/Record_Filling.h"
+#include "runtime/log.h"
+
+namespace KPRV {
+
+AccessPointHelper::AccessPointHelper() : _life("AccessPointHelper", LOG_HERE) {}
+
+AccessPointHelper* AccessPointHelper::getAccessPointHelperInstance()
+{
+    static AccessPointHelper helper;
+    return &helper;
+}
+
+Array<Instance*> AccessPointHelper::getInstancesByClass(classId_t) const
+{
+    LOG_SCOPE("getInstancesByClass");
+    char host[255] = {};
+    constexpr int LOCALHOST = 3;
+    if (ProviderUtil::getHostInfo(host, sizeof host) == LOCALHOST) {
+        LOG(WARN, "getHostInfo returned localhost");
+        return {};
+    }
+    _adapterData adapter = {};
+    copy_text(adapter.systemName, host);
+    Instance* point = getRemoteServiceAccessPointInstance(adapter);
+    if (!point)
+        return {};
+    Array<Instance*> instances;
+    instances.append(point);
+    LOG(INFO, "Number of instances: %d", static_cast<int>(instances.size()));
+    return instances;
+}
+
+KALDERA_RemoteServiceAccessPoint*
+AccessPointHelper::getRemoteServiceAccessPointInstance(const _adapterData& adapter) const
+{
+    LOG_SCOPE("getRemoteServiceAccessPointInstance");
+    const int port = ProviderUtil::getAgentPort();
+    if (port == 0) {
+        LOG(WARN, "The QXM Agent is not running so no service available");
+        return nullptr;
+    }
+    const std::string url =
+        std::string("https://") + adapter.systemName + ":" + std::to_string(port) + "/index.html";
+    constexpr uint16 URL = 200;
+    auto* point = create<KALDERA_RemoteServiceAccessPoint>(true);
+    set_system_keys(*point, REMOTESERVICEACCESSPOINT, adapter.systemName);
+    point->Name.set("QXM Service");
+    point->ElementName.set("Quintex Manager Service Access Point");
+    point->AccessInfo.set(to_String(url));
+    point->InfoFormat.set(URL);
+    return point;
+}
+
+} // namespace KPRV
