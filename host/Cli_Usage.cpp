@@ -28,7 +28,7 @@ Options
   --properties A,B,C        ask for these properties only
   --namespace NS            namespace of the classes (default: root/kaldera)
   --module FILE             provider library (default: libkldrprovider_Module.so beside this program, then in
-                            /usr/lib/cim, then on the library search path)
+                            ../lib/cim and /usr/lib/cim, then on the library search path)
   --user NAME               authenticated user that the provider sees (default: none)
   --assoc CLASS             ai, ain, ri, rin: only this association class and its subclasses
                             (default: every one that can hold the class of PATH)

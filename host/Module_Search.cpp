@@ -9,8 +9,8 @@ std::string default_module()
     namespace fs = std::filesystem;
     const fs::path file = "libkldrprovider_Module.so";
     std::error_code error;
-    for (const fs::path& folder :
-         {fs::read_symlink("/proc/self/exe", error).parent_path(), fs::path("/usr/lib/cim")})
+    const fs::path own = fs::read_symlink("/proc/self/exe", error).parent_path();
+    for (const fs::path& folder : {own, own / "../lib/cim", fs::path("/usr/lib/cim")})
         if (!folder.empty() && fs::exists(folder / file, error))
             return folder / file;
     return file;

@@ -3,7 +3,8 @@
 import argparse
 import sys
 
-from . import module, records, skeletons, tables
+from . import loading, module, records, registrations, skeletons, tables
+from .declarations import QualifierType
 from .errors import MofError
 from .flags import ASSOCIATION, INDICATION
 from .output import Output
@@ -38,6 +39,16 @@ def generate(files, prefix, without=()):
     return output
 
 
+def deployment(files, prefix, without, version, word_size):
+    """What servers read, in memory: registrations and MOF."""
+    declarations = parse(files)
+    classes = resolve(declarations)
+    output = Output()
+    registrations.emit(providers_of(classes, prefix, without), output, version, word_size)
+    loading.emit(classes, [each for each in declarations if isinstance(each, QualifierType)], prefix, output)
+    return output
+
+
 def main(arguments=None):
     parser = argparse.ArgumentParser(prog="generate.py", description="Generates the class catalogue from MOF.")
     parser.add_argument("mof", nargs="+", help="MOF files, in order")
@@ -45,11 +56,18 @@ def main(arguments=None):
     parser.add_argument("--list", action="store_true", help="print the names of the generated files, write none")
     parser.add_argument("--provider-prefix", default="KALDERA_", help="prefix of the classes that have a provider")
     parser.add_argument("--without-provider", action="append", default=[], metavar="CLASS")
+    parser.add_argument("--deployment", action="store_true", help="generate what CIM servers read, not C++")
+    parser.add_argument("--module-version", default="0", metavar="TEXT", help="with --deployment")
+    parser.add_argument("--word-size", type=int, choices=(32, 64), default=64, help="with --deployment")
     options = parser.parse_args(arguments)
     if not options.list and not options.output:
         parser.error("--output or --list is needed")
     try:
-        output = generate(options.mof, options.provider_prefix, options.without_provider)
+        catalogue = (options.mof, options.provider_prefix, options.without_provider)
+        if options.deployment:
+            output = deployment(*catalogue, options.module_version, options.word_size)
+        else:
+            output = generate(*catalogue)
     except MofError as error:
         print(error, file=sys.stderr)
         return 1

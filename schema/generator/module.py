@@ -3,6 +3,9 @@ dispatcher, __cimple_<Class>_Provider_proc."""
 
 from . import cpp
 
+#: The library's name as servers know it: libNAME.so.
+MODULE = "kldrprovider_Module"
+
 #: The management interfaces of a kind of provider, each with the letter that asks for it.
 INTERFACES = {
     "instance": [("Instance", "I"), ("Method", "M")],
@@ -31,7 +34,6 @@ FACTORY_MACROS = r"""
 
 # The records, and the one initialiser that fills and links them: each takes the previous head as its next.
 REGISTRATION = r"""
-const char _cimple_module_name[] = "kldrprovider_Module";
 const Registration* _cimple_registration_head;
 static bool link_record(Registration& record, const char* name, Provider_Proc proc, const Meta_Class& meta_class)
 {
@@ -52,6 +54,7 @@ def registration(providers):
     names = [class_.name for class_, _ in providers]
     includes = ["schema/module_registration.h", "runtime/version.h", *(f"schema/{name}.h" for name in names)]
     body = [
+        f'const char _cimple_module_name[] = "{MODULE}";',
         REGISTRATION,
         *(f"PROVIDER({name})" for name in names),
         "[[maybe_unused]] static const bool _cimple_linked =",

@@ -1,0 +1,58 @@
+"""The installed MOF, compiled in the order that a server's compiler is given, is the catalogue of the code."""
+
+import re
+
+from deploy_case import BUILD, SOURCE, DeployCase, instances_of, output_of
+
+from generator.cli import deployment
+from generator.parser import parse
+from generator.resolver import resolve
+
+
+def described(classes):
+    """All that a class has, in words."""
+    return {
+        class_.name: [class_.superclass and class_.superclass.name, class_.flags]
+        + [
+            (f.kind, f.name, f.type, f.target, f.array, f.flags, f.default, [(p.name, p.type) for p in f.parameters])
+            for f in class_.features
+        ]
+        for class_ in classes
+    }
+
+
+class Mof(DeployCase):
+    def loaded(self, *names):
+        return resolve(parse([str(self.share / "mof" / name) for name in names]))
+
+    def test_the_three_files_are_the_catalogue(self):
+        installed = self.loaded("kldr_qualifiers.mof", "kldr_structure.mof", "kldrprovider.mof")
+        sources = resolve(parse([str(SOURCE / "schema" / name) for name in ("cim.mof", "kaldera.mof")]))
+        self.assertEqual(described(installed), described(sources))
+        self.assertEqual(len(installed), 178)
+
+    def test_targets_of_product_associations_stand_before_them(self):
+        seen = set()
+        for class_ in self.loaded("kldr_qualifiers.mof", "kldr_structure.mof", "kldrprovider.mof"):
+            seen.add(class_.name)
+            for feature in class_.own_features:
+                if class_.name.startswith("KALDERA_") and feature.kind == "reference":
+                    self.assertIn(feature.target, seen)
+
+    def test_no_file_includes_another(self):
+        for file in (self.share / "mof").iterdir():
+            self.assertNotIn("#pragma", file.read_text(encoding="utf-8"), file.name)
+
+    def test_profiles_are_those_of_the_module(self):
+        text = (self.share / "mof/kldr_interop.mof").read_text(encoding="utf-8")
+        for class_name in ("KALDERA_RegisteredProfile", "KALDERA_RegisteredSubProfile"):
+            enumerated = output_of(BUILD / "kldrcim", "ei", class_name, "--format", "mof")
+            self.assertEqual(instances_of(text, class_name), instances_of(enumerated, class_name))
+            self.assertEqual(len(re.findall(rf"^class {class_name} :", text, re.M)), 1)
+
+    def test_word_size_changes_the_bitness_alone(self):
+        files = [str(SOURCE / "schema" / name) for name in ("cim.mof", "kaldera.mof")]
+        wide, narrow = (deployment(files, "KALDERA_", ["KALDERA_DiagnosticTest"], "1", size).files for size in (64, 32))
+        self.assertEqual(
+            {name for name in wide if wide[name] != narrow[name]}, {"registration/kldrprovider.pegasus.mof"}
+        )

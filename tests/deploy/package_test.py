@@ -1,0 +1,43 @@
+"""The Debian package of this word size."""
+
+import re
+import shutil
+import tempfile
+import unittest
+from pathlib import Path
+
+from deploy_case import BUILD, WORD_SIZE, output_of
+from install_test import FILES
+
+
+class Package(unittest.TestCase):
+    @classmethod
+    def setUpClass(cls):
+        folder = tempfile.TemporaryDirectory()
+        cls.addClassCleanup(folder.cleanup)
+        output_of(shutil.which("cpack"), "-G", "DEB", "-B", folder.name, cwd=BUILD)
+        packages = list(Path(folder.name).glob("*.deb"))
+        assert len(packages) == 1, packages
+        cls.package = packages[0]
+
+    def test_it_holds_what_is_installed(self):
+        listed = output_of("dpkg-deb", "-c", self.package)
+        files = re.findall(r"^[-l]\S+ .* \./usr/(\S+)(?: -> \S+)?$", listed, re.M)
+        self.assertEqual(sorted(files), FILES)
+        self.assertNotIn("dzntj", listed)
+
+    def test_its_control_file(self):
+        field = lambda name: output_of("dpkg-deb", "-f", self.package, name).strip()
+        self.assertEqual(field("Package"), "kldrprovider")
+        self.assertEqual(field("Architecture"), "i386" if WORD_SIZE == 32 else output_of("dpkg", "--print-architecture").strip())
+        self.assertIn("libjsoncpp", field("Depends"))
+        self.assertIn("procps", field("Depends"))
+
+    def test_it_unregisters_before_it_goes(self):
+        with tempfile.TemporaryDirectory() as folder:
+            output_of("dpkg-deb", "-e", self.package, folder)
+            script = Path(folder) / "prerm"
+            self.assertIn("kldr-register remove", script.read_text(encoding="utf-8"))
+            self.assertTrue(script.stat().st_mode & 0o111)
+            # An upgrade is no removal, and does nothing.
+            self.assertEqual(output_of(script, "upgrade", "2.0"), "")
