@@ -1,5 +1,6 @@
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
+#include "simulator/State_Events.h"
 
 namespace KPRV::simulator {
 
@@ -65,7 +66,11 @@ Json::Value set_adapter_state(State& state, const Json::Value& request)
     if (!enable.isBool())
         return error_answer(Error_Code::REQUEST, "enableState must be true or false");
     return answer_for_adapter(state, request["indexStr"], [&](Adapter& adapter) {
-        adapter.data["hbaData"]["hbaStatus"] = enable;
+        Json::Value& status = adapter.data["hbaData"]["hbaStatus"];
+        if (status != enable)
+            occur(state, enable.asBool() ? Occurrence::FIRMWARE_STARTED : Occurrence::FIRMWARE_STOPPED,
+                  adapter);
+        status = enable;
         return done_answer();
     });
 }

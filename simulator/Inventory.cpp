@@ -2,6 +2,7 @@
 
 #include "simulator/Adapter_Reader.h"
 #include "simulator/Address.h"
+#include "simulator/Event_Reader.h"
 #include "simulator/Inventory_Members.h"
 #include "simulator/Port_Reader.h"
 #include "simulator/Remote_Port_Reader.h"
@@ -41,6 +42,7 @@ Inventory::Inventory(const Json_Text& source)
     version = library.isMember("version") ? library["version"] : Json::Value(default_version);
     init = init_answer(library["init"]);
     faults = parts["faults"];
+    events = read_events(source, parts["events"]);
     answers = parts["answers"];
     check_answers(source, answers);
 

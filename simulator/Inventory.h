@@ -1,6 +1,7 @@
 #pragma once
 
 #include "simulator/Counters.h"
+#include "simulator/Event_Feed.h"
 #include "simulator/Json_Text.h"
 #include "simulator/Port_Additions.h"
 #include "simulator/Posted_Tests.h"
@@ -92,6 +93,7 @@ public:
     Json::Value version; // text, or null
     Json::Value init;    // the answer of init_hba_lib
     Json::Value faults;  // as written, for Fault to read
+    std::vector<Scripted_Event> events;
     Json::Value answers; // answers of the author's own that belong to no adapter
     std::vector<Adapter> adapters;
     Reset_Marks reset_marks;

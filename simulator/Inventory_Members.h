@@ -27,11 +27,20 @@ inline constexpr Member inventory_members[] = {
     {"faults",                Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
     {"postedTests",           Type::OBJECT,  Presence::OPTIONAL, "{}"},
+    {"events",                Type::ARRAY,   Presence::OPTIONAL, "[]"},
 };
 
 inline constexpr Member posted_tests_members[] = {
     {"milliseconds",          Type::COUNT,   Presence::OPTIONAL, "0"},
     {"failing",               Type::ARRAY,   Presence::OPTIONAL, "[]"},
+};
+
+inline constexpr Member event_members[] = {
+    {"after",                 Type::COUNT,   Presence::OPTIONAL, "0"},
+    {"times",                 Type::COUNT,   Presence::OPTIONAL, "1"},
+    {"every",                 Type::COUNT,   Presence::OPTIONAL, "0"},
+    {"event",                 Type::ANY,     Presence::OPTIONAL},
+    {"text",                  Type::TEXT,    Presence::OPTIONAL},
 };
 
 inline constexpr Member adapter_members[] = {

@@ -16,6 +16,7 @@ Json::Value free_hba_lib(State& state, const Json::Value&)
     // The caller is leaving memory, so its callbacks must never be called again. The next caller
     // finds what the environment then names, but keeps an inventory that a test gave.
     state.session = {};
+    state.events.reset();
     state.loaded = !state.from_environment;
     return 0;
 }
@@ -30,15 +31,18 @@ Json::Value accept(State&, const Json::Value&)
     return {};
 }
 
-Json::Value register_for_events(State& state, const Json::Value&)
+Json::Value register_for_events(State& state, const Json::Value& request)
 {
-    state.session.wants_events = true;
+    const Json::Value& drop_old_events = request["dropOldEvents"];
+    if (!drop_old_events.isBool())
+        return error_answer(Error_Code::REQUEST, "dropOldEvents must be true or false");
+    state.events.want(drop_old_events.asBool());
     return done_answer();
 }
 
 Json::Value unregister_for_events(State& state, const Json::Value&)
 {
-    state.session.wants_events = false;
+    state.events.want_no_more();
     return done_answer();
 }
 

@@ -1,6 +1,7 @@
 #include "simulator/Behaviours.h"
 #include "simulator/Inventory_Members.h"
 #include "simulator/Lookup.h"
+#include "simulator/State_Events.h"
 #include "simulator/Status.h"
 #include "simulator/Target.h"
 
@@ -54,13 +55,29 @@ constexpr Member settable_eth_members[] = {
     {"mtu", Type::COUNT, Presence::OPTIONAL},
 };
 
-// A port that is enabled or disabled shows it in each member that tells its state.
-void show_status(Port& port, bool enabled)
+Occurrence switched(const Port& port, bool enabled)
 {
+    if (port.kind == Port_Kind::FC)
+        return enabled ? Occurrence::FC_PORT_ENABLED : Occurrence::FC_PORT_DISABLED;
+    return enabled ? Occurrence::ETHERNET_PORT_ENABLED : Occurrence::ETHERNET_PORT_DISABLED;
+}
+
+// A port that is enabled or disabled shows it in each member that tells its state, and tells it if it is a
+// change.
+void show_status(State& state, Port& port, bool was_enabled)
+{
+    const bool enabled = port.data["portStatus"].asBool();
     const Status status = enabled ? IN_SERVICE : STOPPED;
     port.data["portStatusValue"] = status;
     if (!port.eth_data.isNull())
         port.eth_data["ethPortStateMOFValue"] = status;
+    if (enabled != was_enabled)
+        occur(state, switched(port, enabled), port);
+}
+
+bool has_name(const Json::Value& names, const char* name)
+{
+    return std::find(names.begin(), names.end(), name) != names.end();
 }
 
 } // namespace
@@ -100,10 +117,11 @@ Json::Value set_port(State& state, const Json::Value& request)
     if (!refused.empty())
         return error_answer(Error_Code::REQUEST, refused);
     return answer_for_port(state, request["indexStr"], [&](Port& port) {
+        const bool was_enabled = port.data["portStatus"].asBool();
         for (const Json::Value& name : names)
             port.data[name.asString()] = values[name.asString()];
-        if (std::find(names.begin(), names.end(), "portStatus") != names.end())
-            show_status(port, values["portStatus"].asBool());
+        if (has_name(names, "portStatus"))
+            show_status(state, port, was_enabled);
         return done_answer();
     });
 }
@@ -119,10 +137,11 @@ Json::Value set_eth_port(State& state, const Json::Value& request)
         Port& port = *target.port;
         if (port.eth_data.isNull())
             return no_such_address(request["mac"]);
+        const bool was_enabled = port.data["portStatus"].asBool();
         for (const Json::Value& name : names)
             (name == "mtu" ? port.eth_data : port.data)[name.asString()] = values[name.asString()];
-        if (std::find(names.begin(), names.end(), "portStatus") != names.end())
-            show_status(port, values["portStatus"].asBool());
+        if (has_name(names, "portStatus"))
+            show_status(state, port, was_enabled);
         return done_answer();
     });
 }

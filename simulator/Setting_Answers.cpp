@@ -1,5 +1,6 @@
 #include "simulator/Answers.h"
 #include "simulator/Behaviours.h"
+#include "simulator/State_Events.h"
 
 namespace KPRV::simulator {
 
@@ -19,6 +20,12 @@ Json::Value set_named(State& state, const Json::Value& request, Setting setting,
             kept_setting(setting, target)[name.asString()] = values[name.asString()];
         return done_answer();
     });
+}
+
+// Whether the port of the request asks its fabric for authentication; false if there is no such port.
+bool is_authenticating(State& state, const Target& target)
+{
+    return target && setting_of(state.inventory, Setting::AUTHENTICATION, target)["enabled"] == true;
 }
 
 Json::Value set_alias(State& state, const Json::Value& request, Scope scope)
@@ -68,7 +75,14 @@ Json::Value set_authentication(State& state, const Json::Value& request)
     named["names"] = Json::Value(Json::arrayValue);
     for (const std::string& name : values.getMemberNames())
         named["names"].append(name);
-    return set_named(state, named, Setting::AUTHENTICATION, "portAuth", "names");
+    const Target target = find_target(state.inventory, request, Scope::FC_PORT);
+    const bool was_enabled = is_authenticating(state, target);
+    const Json::Value answer = set_named(state, named, Setting::AUTHENTICATION, "portAuth", "names");
+    const bool is_enabled = is_authenticating(state, target);
+    if (is_enabled != was_enabled)
+        occur(state, is_enabled ? Occurrence::AUTHENTICATION_ENABLED : Occurrence::AUTHENTICATION_DISABLED,
+              *target.port);
+    return answer;
 }
 
 Json::Value reset_authentication(State& state, const Json::Value& request)

@@ -1,6 +1,7 @@
 #include "simulator/Simulator.h"
 
 #include "simulator/Answers.h"
+#include "simulator/Event_Reader.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -11,6 +12,7 @@ namespace KPRV::simulator {
 namespace {
 
 constexpr const char* inventory_variable = "KLDR_SIMULATOR_INVENTORY";
+constexpr const char* events_variable = "KLDR_SIMULATOR_EVENTS";
 
 } // namespace
 
@@ -72,11 +74,14 @@ void Simulator::load_from_environment()
     state_.problem.clear();
     state_.inventory = {};
     faults_.clear();
-    const char* path = std::getenv(inventory_variable);
-    if (!path)
-        return;
+    state_.events.set_script({});
     try {
-        put_in_place(Json_Text::of_file(path));
+        if (const char* path = std::getenv(inventory_variable))
+            put_in_place(Json_Text::of_file(path));
+        if (const char* path = std::getenv(events_variable)) {
+            const Json_Text source = Json_Text::of_file(path);
+            state_.events.set_script(read_events(source, source.parse()));
+        }
     } catch (const Refused& refused) {
         state_.problem = refused.what();
         std::fprintf(stderr, "simulator: %s\n", refused.what());
@@ -87,6 +92,7 @@ void Simulator::put_in_place(const Json_Text& source)
 {
     Inventory inventory(source);
     faults_ = read_faults(source, inventory.faults);
+    state_.events.set_script(std::move(inventory.events));
     state_.inventory = std::move(inventory);
 }
 
@@ -101,6 +107,7 @@ void Simulator::load(const Json_Text& source)
     } catch (const Refused& refused) {
         state_.problem = refused.what();
         state_.inventory = {};
+        state_.events.set_script({});
         faults_.clear();
         throw;
     }
@@ -121,8 +128,8 @@ void Simulator::set_log_callback(Log_Callback callback)
 
 void Simulator::set_event_callback(Event_Callback callback)
 {
-    const std::lock_guard lock(mutex_);
-    state_.session.event_callback = callback;
+    // Not under the lock: this may wait for a receiver that calls the library.
+    state_.events.set_callback(callback);
 }
 
 void Simulator::add_fault(const Json_Text& source)
@@ -173,9 +180,9 @@ Json::Value Simulator::status()
     load_from_environment();
     Json::Value status;
     status["initialised"] = state_.session.initialised;
-    status["wantsEvents"] = state_.session.wants_events;
+    status["wantsEvents"] = state_.events.is_wanted();
     status["logCallback"] = state_.session.log_callback != nullptr;
-    status["eventCallback"] = state_.session.event_callback != nullptr;
+    status["eventCallback"] = state_.events.has_callback();
     status["problem"] = state_.problem;
     return status;
 }
@@ -194,15 +201,12 @@ bool Simulator::log(int level, const char* file, int line, const char* text)
 
 bool Simulator::event(const char* text)
 {
-    Event_Callback callback = nullptr;
-    {
-        const std::lock_guard lock(mutex_);
-        if (state_.session.wants_events)
-            callback = state_.session.event_callback;
-    }
-    if (callback)
-        callback(text);
-    return callback != nullptr;
+    return state_.events.tell_here(text);
+}
+
+void Simulator::queue_event(const char* text)
+{
+    state_.events.occur(text);
 }
 
 } // namespace KPRV::simulator

@@ -56,6 +56,9 @@ public:
     bool log(int level, const char* file, int line, const char* text);
     bool event(const char* text);
 
+    /// An event occurs: it is told on the library's own thread, now or when somebody wants it.
+    void queue_event(const char* text);
+
 private:
     void load_from_environment();
     void put_in_place(const Json_Text& source);

@@ -132,4 +132,9 @@ bool Simulator_Control::event(const std::string& text)
     return CONTROL(simulator_event)(text.c_str());
 }
 
+void Simulator_Control::queue_event(const std::string& text)
+{
+    CONTROL(simulator_queue_event)(text.c_str());
+}
+
 } // namespace KPRV::simulator

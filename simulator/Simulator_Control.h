@@ -60,6 +60,8 @@ public:
     /// Sends a log line, or an event, to the registered callback. False if there is none.
     bool log(int level, const std::string& file, int line, const std::string& text);
     bool event(const std::string& text);
+    /// Makes an event occur, which the library tells on a thread of its own.
+    void queue_event(const std::string& text);
 
     /// An exported function, for example symbol<Json::Value(const Json::Value&)>("getHost").
     template <typename Function>

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "simulator/Event_Feed.h"
 #include "simulator/Inventory.h"
 
 #include <cstdint>
@@ -9,16 +10,11 @@ namespace KPRV::simulator {
 /// Receives the library's log lines: level 1 to 5, file, line, text.
 using Log_Callback = void (*)(int level, const char* file, int line, const char* text);
 
-/// Receives an adapter event as JSON text.
-using Event_Callback = void (*)(const char* text);
-
 /// What a caller has told the library about itself.
 struct Session
 {
     bool initialised = false;
-    bool wants_events = false;
     Log_Callback log_callback = nullptr;
-    Event_Callback event_callback = nullptr;
 };
 
 /// All that answers depend on.
@@ -26,6 +22,7 @@ struct State
 {
     Inventory inventory;
     Session session;
+    Event_Feed events;
     std::string problem;          // why the inventory was refused; empty if it was not
     bool loaded = false;          // the inventory is the one to answer from
     bool from_environment = true; // false once a test has given an inventory of its own

@@ -1,6 +1,7 @@
 #include "simulator/Address.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
+#include "simulator/State_Events.h"
 #include "simulator/Status.h"
 #include "simulator/Target.h"
 
@@ -101,6 +102,7 @@ Json::Value create_virtual_port(State& state, const Json::Value& request)
         target.port->virtual_ports.push_back(new_virtual_port(request));
         state.inventory.reset_marks.start_anew(
             path_below(target.path, lower_case(request["vwwn"].asString())));
+        occur(state, Occurrence::LOGICAL_PORT_CREATED, *target.port, request["vwwn"].asString());
         return done_answer();
     });
 }
@@ -117,8 +119,10 @@ Json::Value delete_virtual_ports(State& state, const Json::Value& request)
             if (!find_target(state.inventory, addressed(request, logical), Scope::VIRTUAL_PORT))
                 return error_answer(Error_Code::NOT_FOUND, "no such virtual port: " + compact_text(each));
         }
-        for (const Json::Value& each : doomed)
+        for (const Json::Value& each : doomed) {
             remove_virtual_port(*target.port, target.path, lower_case(each.asString()));
+            occur(state, Occurrence::LOGICAL_PORT_DELETED, *target.port, each.asString());
+        }
         return done_answer();
     });
 }

@@ -88,3 +88,8 @@ int simulator_event(const char* text)
 {
     return Simulator::instance().event(text);
 }
+
+void simulator_queue_event(const char* text)
+{
+    Simulator::instance().queue_event(text);
+}

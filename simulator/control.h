@@ -48,6 +48,9 @@ SIMULATOR_EXPORT const char* simulator_status(void);
 SIMULATOR_EXPORT int simulator_log(int level, const char* file, int line, const char* text);
 SIMULATOR_EXPORT int simulator_event(const char* text);
 
+/* Makes an event occur: the library's own thread tells it, now or as soon as somebody wants events. */
+SIMULATOR_EXPORT void simulator_queue_event(const char* text);
+
 #ifdef __cplusplus
 }
 #endif

@@ -1,0 +1,83 @@
+#pragma once
+
+#include <chrono>
+#include <condition_variable>
+#include <deque>
+#include <mutex>
+#include <string>
+#include <vector>
+
+namespace KPRV::simulator {
+
+/// Receives an adapter event as JSON text.
+using Event_Callback = void (*)(const char* text);
+
+/// A line of the script of an inventory: what is told to whoever wants events, and when.
+struct Scripted_Event
+{
+    std::chrono::milliseconds after; // since the line before, or since events are wanted
+    unsigned times;
+    std::chrono::milliseconds every;
+    std::string text;
+};
+
+/// The adapters' events on their way to the caller. They are told one at a time on a thread of the library's
+/// own, which begins with the first event and ends with the process. Any thread may call anything.
+class Event_Feed
+{
+public:
+    /// From now on events are told, while there is a callback; the script begins anew. Those that occurred
+    /// before, and that nobody was told, are dropped or told first.
+    void want(bool drop_old_events);
+    /// From now on events are kept, the latest 1,024 of them.
+    void want_no_more();
+
+    /// Waits for a call in progress, unless that is where it is called from: afterwards the callback that was
+    /// there is not called any more.
+    void set_callback(Event_Callback callback);
+
+    /// Forgets the caller, its wishes and all events. Waits for nothing.
+    void reset();
+
+    /// Takes effect the next time that events are wanted.
+    void set_script(std::vector<Scripted_Event> script);
+
+    /// An event occurs: it is told on the library's thread.
+    void occur(std::string text);
+
+    /// Tells an event on the calling thread; false if nobody wants it.
+    bool tell_here(const char* text);
+
+    bool is_wanted();
+    bool has_callback();
+
+private:
+    using Clock = std::chrono::steady_clock;
+    struct Due
+    {
+        Clock::time_point at;
+        std::size_t line;
+        unsigned told;
+    };
+
+    bool is_told() const { return wanted_ && callback_; }
+    void start_thread();
+    void run();
+    bool take_event(std::unique_lock<std::mutex>& lock, std::string& text);
+    bool take_scripted(std::string& text);
+    void schedule(std::size_t line, Clock::time_point from);
+    void call(std::unique_lock<std::mutex>& lock, const char* text);
+
+    std::mutex mutex_;
+    std::condition_variable changed_;
+    Event_Callback callback_ = nullptr;
+    bool wanted_ = false;
+    bool is_script_due_ = false;
+    unsigned calls_ = 0;
+    bool has_thread_ = false;
+    std::deque<std::string> events_;
+    std::vector<Scripted_Event> script_;
+    Due due_ = {};
+};
+
+} // namespace KPRV::simulator
