@@ -18,18 +18,18 @@ struct Occurrence_Row
 
 // clang-format off
 constexpr Occurrence_Row rows[] = {
-//   what                                 category id  severity  symbol                   message
-    {Occurrence::FC_PORT_ENABLED,        2,       7,  4,        "ZNT_PORT_ENABLE",       "Base port enabled: "},
-    {Occurrence::FC_PORT_DISABLED,       2,       8,  3,        "ZNT_PORT_DISABLE",      "Base port disabled: "},
-    {Occurrence::ETHERNET_PORT_ENABLED,  10,      3,  4,        "ZNT_ETH_PORT_ENABLE",   "Ethernet port enabled: "},
-    {Occurrence::ETHERNET_PORT_DISABLED, 10,      4,  3,        "ZNT_ETH_PORT_DISABLE",  "Ethernet port disabled: "},
-    {Occurrence::FIRMWARE_STARTED,       9,       3,  4,        "ZNT_IOC_ENABLE",        "Adapter enabled: "},
-    {Occurrence::FIRMWARE_STOPPED,       9,       4,  3,        "ZNT_IOC_DISABLE",       "Adapter disabled: "},
-    {Occurrence::LOGICAL_PORT_CREATED,   3,        1,  4,        "ZNT_LPORT_CREATE",      "Logical port created: "},
-    {Occurrence::LOGICAL_PORT_DELETED,   3,        2,  4,        "ZNT_LPORT_DELETE",      "Logical port deleted: "},
-    {Occurrence::AUTHENTICATION_ENABLED, 8,        1,  4,        "ZNT_AUTH_ENABLE",       "Authentication enabled: "},
-    {Occurrence::AUTHENTICATION_DISABLED, 8,       2,  4,        "ZNT_AUTH_DISABLE",      "Authentication disabled: "},
-    {Occurrence::FLASH_UPDATED,          8,       4,  4,        "ZNT_FLASH_UPDATE",      "Adapter flash updated: "},
+//   what                                  category  id  severity  symbol                  message
+    {Occurrence::FC_PORT_ENABLED,          2,        7,  4,        "ZNT_PORT_ENABLE",      "Base port enabled: "},
+    {Occurrence::FC_PORT_DISABLED,         2,        8,  3,        "ZNT_PORT_DISABLE",     "Base port disabled: "},
+    {Occurrence::ETHERNET_PORT_ENABLED,    10,       3,  4,        "ZNT_ETH_PORT_ENABLE",  "Ethernet port enabled: "},
+    {Occurrence::ETHERNET_PORT_DISABLED,   10,       4,  3,        "ZNT_ETH_PORT_DISABLE", "Ethernet port disabled: "},
+    {Occurrence::FIRMWARE_STARTED,         9,        3,  4,        "ZNT_IOC_ENABLE",       "Adapter enabled: "},
+    {Occurrence::FIRMWARE_STOPPED,         9,        4,  3,        "ZNT_IOC_DISABLE",      "Adapter disabled: "},
+    {Occurrence::LOGICAL_PORT_CREATED,     3,        1,  4,        "ZNT_LPORT_CREATE",     "Logical port created: "},
+    {Occurrence::LOGICAL_PORT_DELETED,     3,        2,  4,        "ZNT_LPORT_DELETE",     "Logical port deleted: "},
+    {Occurrence::AUTHENTICATION_ENABLED,   8,        1,  4,        "ZNT_AUTH_ENABLE",      "Authentication enabled: "},
+    {Occurrence::AUTHENTICATION_DISABLED,  8,        2,  4,        "ZNT_AUTH_DISABLE",     "Authentication disabled: "},
+    {Occurrence::FLASH_UPDATED,            8,        4,  4,        "ZNT_FLASH_UPDATE",     "Adapter flash updated: "},
 };
 // clang-format on
 
