@@ -34,6 +34,7 @@ public:
         if (parts.isMember("firmware"))
             adapter.data["firmware"] = part(parts["firmware"], firmware_members, "firmware");
         adapter.flash_status = parts["flashStatus"];
+        adapter.flash_update = part(parts["flashUpdate"], flash_update_members, "flashUpdate");
         adapter.address = address();
         adapter.answers = parts["answers"];
         check_answers(source_, adapter.answers);

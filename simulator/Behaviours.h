@@ -35,6 +35,9 @@ Json::Value adapter_data(State& state, const Json::Value& request);
 Json::Value flash_info(State& state, const Json::Value& request);
 Json::Value set_adapter_state(State& state, const Json::Value& request);
 
+// Flash_Answers.cpp
+Json::Value update_flash(State& state, const Json::Value& request);
+
 // Port_Answers.cpp
 Json::Value fc_port_addresses(State& state, const Json::Value& request);
 Json::Value eth_port_addresses(State& state, const Json::Value& request);

@@ -55,6 +55,7 @@ struct Adapter
     std::string address; // what getAllAdaptersIndexString lists
     Json::Value data;    // the answer of getHbaByWwn: `hbaData`, `driver`, `firmware`
     Json::Value flash_status;
+    Json::Value flash_update; // `status` and `message` of an update whose image is good
     std::vector<Port> fc_ports;
     std::vector<Port> eth_ports;
     Json::Value answers;

@@ -49,6 +49,7 @@ inline constexpr Member adapter_members[] = {
     {"driver",                Type::OBJECT,  Presence::NULLABLE, "{}"},
     {"firmware",              Type::OBJECT,  Presence::NULLABLE, "{}"},
     {"flashStatus",           Type::BOOL,    Presence::NULLABLE, "true"},
+    {"flashUpdate",           Type::OBJECT,  Presence::OPTIONAL, "{}"},
     {"fcPorts",               Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"ethPorts",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
@@ -84,6 +85,11 @@ inline constexpr Member firmware_members[] = {
     {"version",               Type::TEXT,    Presence::NULLABLE, "\"3.2.1.0\""},
     {"biosVersion",           Type::TEXT,    Presence::NULLABLE, "\"3.2.1.0\""},
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member flash_update_members[] = {
+    {"status",                Type::COUNT,   Presence::OPTIONAL, "0"},
+    {"message",               Type::TEXT,    Presence::OPTIONAL, "\"Flash update successful\""},
 };
 
 inline constexpr Member fc_port_members[] = {
