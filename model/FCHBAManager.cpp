@@ -8,6 +8,7 @@
 #include "model/Fresh_Instances.h"
 #include "model/PhysicalAssetHelper.h"
 #include "model/PortHelper.h"
+#include "update/SoftwareUpdateHelper.h"
 
 namespace KPRV {
 
@@ -37,6 +38,10 @@ Array<Instance*> by_physical_asset_helper(classId_t id)
 {
     return PhysicalAssetHelper::getPhysicalAssetHelperObject()->getInstancesByClass(id);
 }
+Array<Instance*> by_software_update_helper(classId_t id)
+{
+    return SoftwareUpdateHelper::getSoftwareUpdateHelperInstance()->getInstancesByClass(id);
+}
 
 // clang-format off
 constexpr Class_Row rows[] = {
@@ -50,8 +55,8 @@ constexpr Class_Row rows[] = {
     {PRODUCT,                                    Needs::DRIVER,   by_adapter_helper},
     {ADAPTERSOFTWAREIDENTITY,                    Needs::DRIVER,   by_adapter_helper},
     {REMOTESERVICEACCESSPOINT,                   Needs::NOTHING,  by_access_point_helper},
-    {HBASOFTWAREINSTALLATIONSERVICE,             Needs::DRIVER,   nullptr},
-    {HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, Needs::DRIVER,   nullptr},
+    {HBASOFTWAREINSTALLATIONSERVICE,             Needs::DRIVER,   by_software_update_helper},
+    {HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, Needs::DRIVER,   by_software_update_helper},
     {ETHERNETPORT,                               Needs::DRIVER,   by_ethernet_port_helper},
     {MEMORYDIAGNOSTICTEST,                       Needs::DRIVER,   nullptr},
     {LOOPBACKDIAGNOSTICTEST,                     Needs::DRIVER,   nullptr},
@@ -80,6 +85,7 @@ FCHBAManager::FCHBAManager()
     AdapterHelper::getAdapterHelperInstance();
     PortHelper::getPortHelperObject();
     AccessPointHelper::getAccessPointHelperInstance();
+    SoftwareUpdateHelper::getSoftwareUpdateHelperInstance();
     EthernetPortHelper::getEthernetPortHelperObject();
     PhysicalAssetHelper::getPhysicalAssetHelperObject();
 }

@@ -20,6 +20,7 @@ TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
     const std::set<std::string> with_body = {
         "KALDERA_AgentService.executeMethod",
         "KALDERA_AlarmDevice.SetAlarmState",
+        "KALDERA_HBASoftwareInstallationService.InstallFromURI",
     };
     open("empty.json");
     size_t methods = 0;

@@ -24,8 +24,6 @@ constexpr Row rows[] = {
     {"KALDERA_StorageExtent",                              "ERR No StorageExtents Found!",                                         CMPI_RC_OK},
     {"KALDERA_TapeDrive",                                  "ERR No TapeDrives Found!",                                             CMPI_RC_OK},
     {"KALDERA_RemoteServiceAccessPoint",                   "WARN Warning: No service is available",                                CMPI_RC_OK},
-    {"KALDERA_HBASoftwareInstallationService",             "ERR Error: Invalid mapping information",                               CMPI_RC_OK},
-    {"KALDERA_HBASoftwareInstallationServiceCapabilities", "ERR Error: Invalid mapping information",                               CMPI_RC_OK},
     {"KALDERA_EthernetPort",                               "ERR Error: Invalid mapping information",                               CMPI_RC_OK},
     {"KALDERA_MemoryDiagnosticTest",                       "WARN No memory diagnostic test is available",                          CMPI_RC_OK},
     {"KALDERA_LoopbackDiagnosticTest",                     "WARN No loopback diagnostic test is available",                        CMPI_RC_OK},
@@ -53,6 +51,8 @@ constexpr const char* constants[] = {
     "KALDERA_ProfileSoftwareIdentity",
     "KALDERA_AgentService",
     "KALDERA_ComputerSystem",
+    "KALDERA_HBASoftwareInstallationService",
+    "KALDERA_HBASoftwareInstallationServiceCapabilities",
 };
 static_assert(std::size(rows) + std::size(constants) == 34);
 
