@@ -1,11 +1,11 @@
 #include "runtime/Buffer.h"
 
 #include "runtime/allocated.h"
+#include "runtime/number_text.h"
 
 #include <algorithm>
 #include <bit>
 #include <cctype>
-#include <charconv>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -150,9 +150,10 @@ void Buffer::append_uint32(uint32 x)
 
 void Buffer::append_uint64(uint64 x)
 {
-    char digits[20];
-    const char* end = std::to_chars(digits, digits + sizeof(digits), x).ptr;
-    append(digits, static_cast<uint32>(end - digits));
+    char buffer[NUMBER_TEXT_SIZE];
+    size_t size;
+    const char* digits = uint64_to_str(buffer, x, size);
+    append(digits, static_cast<uint32>(size));
 }
 
 void Buffer::dump() const
