@@ -2,6 +2,7 @@
 
 #include "adapter/Json_Access.h"
 #include "model/Instance_Building.h"
+#include "runtime/Ref.h"
 #include "tests/model/Taken_Instances.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Fixed_Host.h"
