@@ -1,4 +1,5 @@
 #include "adapter/Host_Calls.h"
+#include "adapter/Host_Name.h"
 #include "adapter/ProviderUtil.h"
 #include "adapter/ProviderUtil_Log.h"
 
@@ -19,13 +20,13 @@ struct Out_Text
     char* data;
     size_t size;
 
-    void set(const char* text)
+    void set(const char* text) const
     {
         if (size > 0)
             data[0] = '\0';
         append(text);
     }
-    void append(const char* text)
+    void append(const char* text) const
     {
         const size_t used = strnlen(data, size);
         if (used + 1 < size)
@@ -70,50 +71,87 @@ Lookup look_up(const char* host, Out_Text out)
     return Lookup::LOOPBACK_ONLY;
 }
 
-} // namespace
-
-int ProviderUtil::getHostInfo(char* buffer, int length)
+/// The code of `getHostInfo`, and what its caller is to tell the log; null for nothing.
+struct Outcome
 {
-    UTIL_SCOPE("getHostInfo");
-    Out_Text out = {buffer, length > 0 ? static_cast<size_t>(length) : 0};
+    int code;
+    const char* said;
+};
+
+Outcome ask_for_host(Out_Text out)
+{
+    constexpr Outcome named = {2,
+                               "gethostbyname() FAILED. hostString will have hostname instead of ipAddress"};
     char host[NAME_SIZE] = {};
     if (!ask_name(host_calls.gethostname, host)) {
         out.set("localhost");
-        UTIL_LOG(INFO, "gethostname() FAILED. hostString will be filled with localhost");
-        return 3;
+        return {3, "gethostname() FAILED. hostString will be filled with localhost"};
     }
-
-    const auto use_host_name = [&] {
-        out.set(host);
-        UTIL_LOG(INFO, "gethostbyname() FAILED. hostString will have hostname instead of ipAddress");
-        return 2;
-    };
     switch (look_up(host, out)) {
     case Lookup::NONE:
-        return use_host_name();
+        out.set(host);
+        return named;
     case Lookup::FOUND:
-        return 0;
+        return {0, nullptr};
     case Lookup::LOOPBACK_ONLY:
         break;
     }
 
-    if (!ask_name(host_calls.gethostname, host)) {
-        UTIL_LOG(INFO, "gethostname() failed");
-        return 2;
-    }
+    if (!ask_name(host_calls.gethostname, host))
+        return {2, "gethostname() failed"};
     out.set(host);
     char domain[NAME_SIZE] = {};
-    if (!ask_name(host_calls.getdomainname, domain)) {
-        UTIL_LOG(INFO, "getdomainname() failed");
-        return 2;
-    }
+    if (!ask_name(host_calls.getdomainname, domain))
+        return {2, "getdomainname() failed"};
     // The name with its domain is tested and then dropped: callers have always seen the bare name. The test
     // can only hold where the buffer had no room for the domain.
     out.append(".");
     out.append(domain);
-    if (strncmp(buffer, "localhost", out.size) == 0 && strcmp(domain, "(none)") == 0)
-        return 4;
-    return use_host_name();
+    if (strncmp(out.data, "localhost", out.size) == 0 && strcmp(domain, "(none)") == 0)
+        return {4, nullptr};
+    out.set(host);
+    return named;
+}
+
+int told(Outcome outcome)
+{
+    if (outcome.said)
+        UTIL_LOG(INFO, "%s", outcome.said);
+    return outcome.code;
+}
+
+Out_Text room(char* buffer, int length)
+{
+    return {buffer, length > 0 ? static_cast<size_t>(length) : 0};
+}
+
+constexpr const char* SCOPE = "getHostInfo";
+
+} // namespace
+
+int ProviderUtil::getHostInfo(char* buffer, int length)
+{
+    UTIL_SCOPE(SCOPE);
+    return told(ask_for_host(room(buffer, length)));
+}
+
+int Host_Name::get(char* buffer, int length)
+{
+    UTIL_SCOPE(SCOPE);
+    const Out_Text out = room(buffer, length);
+    // Another length may be another answer.
+    if (_length == length && out.size > 0) {
+        memcpy(buffer, _text, out.size);
+        return told({_code, _said});
+    }
+    const Outcome outcome = ask_for_host(out);
+    if (out.size <= sizeof _text) {
+        memcpy(_text, buffer, out.size);
+        _length = length;
+        _code = outcome.code;
+        _said = outcome.said;
+    }
+    return told(outcome);
 }
 
 String ProviderUtil::getHostName()

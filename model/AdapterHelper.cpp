@@ -15,6 +15,7 @@ struct AdapterHelper::Walk
 {
     classId_t id;
     Fresh_Instances instances = {};
+    Host_Name host = {};
     bool network_driver_done = false;
     bool storage_driver_done = false;
 };
@@ -76,7 +77,7 @@ void AdapterHelper::publish(Walk& walk, const String& index, int number) const
         return;
     }
     _adapterData adapter = {};
-    if (!fill(answer, number, index.c_str(), adapter))
+    if (!fill(answer, number, index.c_str(), walk.host, adapter))
         return;
 
     switch (walk.id) {

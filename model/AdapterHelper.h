@@ -1,5 +1,6 @@
 #pragma once
 
+#include "adapter/Host_Name.h"
 #include "adapter/classId_t.h"
 #include "model/Adapter_Data.h"
 #include "model/Logged_Life.h"
@@ -49,7 +50,8 @@ private:
     AdapterHelper();
 
     /// False if the adapter has no port; `number` and `index` name it in the log. Throws `Not_Convertible`.
-    bool fill(const Json::Value& answer, int number, const char* index, _adapterData& adapter) const;
+    bool fill(const Json::Value& answer, int number, const char* index, Host_Name& host,
+              _adapterData& adapter) const;
     void fill_common(const Json::Value& answer, _adapterData& adapter) const;
     void fill_bios(const Json::Value& answer, _adapterData& adapter) const;
 

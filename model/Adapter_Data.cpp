@@ -49,7 +49,7 @@ void AdapterHelper::fill_common(const Json::Value& answer, _adapterData& adapter
     copy_member(adapter.model, hba_data, "model");
 }
 
-bool AdapterHelper::fill(const Json::Value& answer, int number, const char* index,
+bool AdapterHelper::fill(const Json::Value& answer, int number, const char* index, Host_Name& host,
                          _adapterData& adapter) const
 {
     const Json::Value& hba_data = member(answer, "hbaData");
@@ -61,7 +61,7 @@ bool AdapterHelper::fill(const Json::Value& answer, int number, const char* inde
         LOG(WARN, "There are no ports associated to Adapter id %d - %s", number, index);
         return false;
     }
-    ProviderUtil::getHostInfo(adapter.systemName, sizeof adapter.systemName);
+    host.get(adapter.systemName, sizeof adapter.systemName);
     if (adapter.isCNA)
         copy_flat(adapter.mac, hba_data, "hbaMAC");
 

@@ -20,10 +20,11 @@ EthernetPortHelper* EthernetPortHelper::getEthernetPortHelperObject()
 Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id) const
 {
     LOG_SCOPE("getInstancesByClass");
+    Host_Name host;
     return walk_adapters(LOG_HERE, [&](int adapter_id, const Json::Value& list, Fresh_Instances& instances) {
         const String address = adapter_address(LOG_HERE, list, static_cast<unsigned>(adapter_id - 1));
         if (ProviderUtil::hasEthernetPort(address))
-            walk_adapter(adapter_id, id, instances);
+            walk_adapter(adapter_id, id, host, instances);
         else
             LOG(INFO, "No Ethernet ports found for Adapter - %s", address.c_str());
     });
@@ -31,8 +32,9 @@ Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id) const
 
 Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id) const
 {
+    Host_Name host;
     Fresh_Instances instances;
-    walk_adapter(adapter_id, id, instances);
+    walk_adapter(adapter_id, id, host, instances);
     return instances.release();
 }
 
@@ -62,7 +64,8 @@ Array<Instance*> EthernetPortHelper::getEthernetPortInstancesByAdapter(const Str
     return getInstancesByAdapterId(adapter_id, ETHERNETPORT);
 }
 
-void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, Fresh_Instances& instances) const
+void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, Host_Name& host,
+                                      Fresh_Instances& instances) const
 {
     LOG_SCOPE("getInstancesByAdapterId");
     const String address = ProviderUtil::getAddrByAdapterId(adapter_id);
@@ -80,12 +83,12 @@ void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, Fresh_Instan
     for (const Json::Value& element : answer["indexStrings"]) {
         String mac;
         if (guarded(LOG_HERE, entry, [&] { mac = asString(element).c_str(); }))
-            publish(mac, number, id, instances);
+            publish(mac, number, id, host, instances);
         number++;
     }
 }
 
-void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id,
+void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id, Host_Name& host,
                                  Fresh_Instances& instances) const
 {
     Json::Value answer;
@@ -95,7 +98,7 @@ void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id,
     }
     _ethPortInfo port = {};
     if (!guarded(LOG_HERE, {"libGetEthPortByEthMac", mac.c_str()},
-                 [&] { fill_ethernet_port(mac.c_str(), answer, number, port); }))
+                 [&] { fill_ethernet_port(mac.c_str(), answer, number, host, port); }))
         return;
     switch (id) {
     case ETHERNETPORT:

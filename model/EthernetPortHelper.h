@@ -45,8 +45,9 @@ public:
 private:
     EthernetPortHelper();
 
-    void walk_adapter(int adapter_id, classId_t id, Fresh_Instances& instances) const;
-    void publish(const String& mac, sint32 number, classId_t id, Fresh_Instances& instances) const;
+    void walk_adapter(int adapter_id, classId_t id, Host_Name& host, Fresh_Instances& instances) const;
+    void publish(const String& mac, sint32 number, classId_t id, Host_Name& host,
+                 Fresh_Instances& instances) const;
     sint32 port_type(const String& mac) const;
 
     const Logged_Life _life;

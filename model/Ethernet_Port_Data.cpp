@@ -4,12 +4,13 @@
 
 namespace KPRV {
 
-void fill_ethernet_port(const char* mac, const Json::Value& answer, sint32 port_number, _ethPortInfo& port)
+void fill_ethernet_port(const char* mac, const Json::Value& answer, sint32 port_number, Host_Name& host,
+                        _ethPortInfo& port)
 {
     const Json::Value& data = member(answer, "ethData");
     copy_flat(port.mac, mac);
     copy_text(port.permanentAddress, port.mac);
-    ProviderUtil::getHostInfo(port.systemName, sizeof port.systemName);
+    host.get(port.systemName, sizeof port.systemName);
     port.portNumber = port_number;
     copy_member(port.deviceName, data, "ethDev");
     port.status = asUInt(member(data, "ethPortStateMOFValue"));

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "adapter/Host_Name.h"
 #include "runtime/Types.h"
 
 #include <json/value.h>
@@ -22,6 +23,7 @@ struct _ethPortInfo
 
 /// Fills the record from an answer of `getEthPortByEthMac`; the port type is left alone. Throws
 /// `Not_Convertible` for a member of the wrong type.
-void fill_ethernet_port(const char* mac, const Json::Value& answer, sint32 port_number, _ethPortInfo& port);
+void fill_ethernet_port(const char* mac, const Json::Value& answer, sint32 port_number, Host_Name& host,
+                        _ethPortInfo& port);
 
 } // namespace KPRV

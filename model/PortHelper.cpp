@@ -30,6 +30,15 @@ constinit const PortHelper::Walk_Words PortHelper::by_address_words = {
     "libGetPortByWwn response is null or has error",
 };
 
+/// One walk over ports. The request is made once: only the address in it changes.
+struct PortHelper::Walk
+{
+    classId_t id;
+    const Walk_Words& words;
+    Host_Name host = {};
+    Json::Value request = Json::Value(Json::objectValue);
+};
+
 PortHelper::PortHelper() : _life("PortHelper", LOG_HERE) {}
 
 PortHelper* PortHelper::getPortHelperObject()
@@ -41,8 +50,9 @@ PortHelper* PortHelper::getPortHelperObject()
 Array<Instance*> PortHelper::getInstancesByClass(classId_t id) const
 {
     LOG_SCOPE("getInstancesByClass");
+    Walk walk = {.id = id, .words = by_id_words};
     return walk_adapters(LOG_HERE, [&](int adapter_id, const Json::Value& list, Fresh_Instances& instances) {
-        walk_adapter_by_id(adapter_id, id, list, instances);
+        walk_adapter_by_id(adapter_id, list, walk, instances);
     });
 }
 
@@ -50,16 +60,17 @@ Array<Instance*> PortHelper::getInstancesByAdapterId(int adapter_id, classId_t i
                                                      const Json::Value& adapters) const
 {
     Fresh_Instances instances;
-    walk_adapter_by_id(adapter_id, id, member(adapters, "indexStrings"), instances);
+    Walk walk = {.id = id, .words = by_id_words};
+    walk_adapter_by_id(adapter_id, member(adapters, "indexStrings"), walk, instances);
     return instances.release();
 }
 
-void PortHelper::walk_adapter_by_id(int adapter_id, classId_t id, const Json::Value& list,
+void PortHelper::walk_adapter_by_id(int adapter_id, const Json::Value& list, Walk& walk,
                                     Fresh_Instances& instances) const
 {
     LOG_SCOPE("getInstancesByAdapterId");
     const String index = adapter_address(LOG_HERE, list, static_cast<unsigned>(adapter_id - 1));
-    walk_adapter(index, id, by_id_words, instances);
+    walk_adapter(index, walk, instances);
 }
 
 Array<Instance*> PortHelper::getInstancesByAdapterAddress(const String& address, classId_t id) const
@@ -70,7 +81,8 @@ Array<Instance*> PortHelper::getInstancesByAdapterAddress(const String& address,
                  [&] { index = ProviderUtil::getIndexInColonFormat(address); }))
         return {};
     Fresh_Instances instances;
-    walk_adapter(index, id, by_address_words, instances);
+    Walk walk = {.id = id, .words = by_address_words};
+    walk_adapter(index, walk, instances);
     return instances.release();
 }
 
@@ -81,8 +93,7 @@ Array<Instance*> PortHelper::getFCPortInstancesByAdapter(const String& address) 
     return getInstancesByAdapterAddress(address, FCPORT);
 }
 
-void PortHelper::walk_adapter(const String& index, classId_t id, const Walk_Words& words,
-                              Fresh_Instances& instances) const
+void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& instances) const
 {
     Json::Value request(Json::objectValue), answer;
     request["indexStr"] = index.c_str();
@@ -90,9 +101,9 @@ void PortHelper::walk_adapter(const String& index, classId_t id, const Walk_Word
                       answer))
         return;
     const Json::Value& ports = member(answer, "indexStrings");
-    const char* failure = !ProviderUtil::isValidJsonResponse(answer) ? words.bad_answer
-                          : !hasMember(answer, "indexStrings")       ? words.no_list
-                          : !isArrayOrNull(ports)                    ? words.no_array
+    const char* failure = !ProviderUtil::isValidJsonResponse(answer) ? walk.words.bad_answer
+                          : !hasMember(answer, "indexStrings")       ? walk.words.no_list
+                          : !isArrayOrNull(ports)                    ? walk.words.no_array
                                                                      : nullptr;
     if (failure) {
         LOG(ERR, "%s", failure);
@@ -101,25 +112,26 @@ void PortHelper::walk_adapter(const String& index, classId_t id, const Walk_Word
     LOG(DBG, "numOfPorts = %u", ports.size());
     sint32 number = 0;
     for (const Json::Value& address : ports)
-        walk_port(address, number++, id, words, instances);
+        walk_port(address, number++, walk, instances);
 }
 
-void PortHelper::walk_port(const Json::Value& address, sint32 number, classId_t id, const Walk_Words& words,
+void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk,
                            Fresh_Instances& instances) const
 {
-    Json::Value request(Json::objectValue), answer;
-    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, [&] { request["wwn"] = asString(address); }))
+    Json::Value answer;
+    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"},
+                 [&] { walk.request["wwn"] = asString(address); }))
         return;
-    if (!guarded_call(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, request, answer))
+    if (!guarded_call(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answer))
         return;
     if (!ProviderUtil::isValidJsonResponse(answer)) {
-        if (words.bad_port)
-            LOG(ERR, "%s", words.bad_port);
+        if (walk.words.bad_port)
+            LOG(ERR, "%s", walk.words.bad_port);
         return;
     }
     _hbaPortInfo port = {};
-    if (guarded(LOG_HERE, {"libGetPortByWwn"}, [&] { fill_port(answer, number, port); }))
-        publish(id, answer, port, instances);
+    if (guarded(LOG_HERE, {"libGetPortByWwn"}, [&] { fill_port(answer, number, walk.host, port); }))
+        publish(walk.id, answer, port, instances);
 }
 
 } // namespace KPRV

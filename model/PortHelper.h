@@ -73,12 +73,11 @@ private:
     static const Walk_Words by_id_words;
     static const Walk_Words by_address_words;
 
-    void walk_adapter(const String& index, classId_t id, const Walk_Words& words,
-                      Fresh_Instances& instances) const;
-    void walk_adapter_by_id(int adapter_id, classId_t id, const Json::Value& list,
+    struct Walk;
+    void walk_adapter(const String& index, Walk& walk, Fresh_Instances& instances) const;
+    void walk_adapter_by_id(int adapter_id, const Json::Value& list, Walk& walk,
                             Fresh_Instances& instances) const;
-    void walk_port(const Json::Value& address, sint32 number, classId_t id, const Walk_Words& words,
-                   Fresh_Instances& instances) const;
+    void walk_port(const Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const;
     void publish(classId_t id, const Json::Value& answer, _hbaPortInfo& port,
                  Fresh_Instances& instances) const;
     void publish_endpoints(_hbaPortInfo& port, Fresh_Instances& instances) const;

@@ -18,14 +18,14 @@ sint64 operating_speed(const Json::Value& answer)
 
 } // namespace
 
-void fill_port(const Json::Value& answer, sint32 port_number, _hbaPortInfo& port)
+void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
     copy_flat(port.localWWN, answer, "wwn");
     copy_text(port.portWWN, port.localWWN);
     copy_flat(port.nodeWWN, answer, "nodeWwn");
     copy_member(port.symbolicName, answer, "PortSymbolicName");
     port.status = asInt(member(answer, "portStatusValue"));
-    ProviderUtil::getHostInfo(port.systemName, sizeof port.systemName);
+    host.get(port.systemName, sizeof port.systemName);
     port.portType = asInt(member(answer, "portTypeMOFValue"));
     port.maxFrameSize = asInt(member(answer, "maxFrameSize"));
     port.speed = operating_speed(answer);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "adapter/Host_Name.h"
 #include "runtime/Types.h"
 
 #include <json/value.h>
@@ -26,7 +27,7 @@ struct _hbaPortInfo
 
 /// Fills the record from an answer of `getPortByWwn`. Throws `Not_Convertible` for a member of the wrong
 /// type.
-void fill_port(const Json::Value& answer, sint32 port_number, _hbaPortInfo& port);
+void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port);
 
 /// Makes `portWWN` the name of the remote port with that WWN, in either form, as the local port sees it.
 void name_remote_port(const char* remote_wwn, _hbaPortInfo& port);
