@@ -1,5 +1,6 @@
 #include "adapter/Json_Access.h"
 
+#include <cstring>
 #include <limits>
 
 namespace KPRV {
@@ -49,11 +50,22 @@ bool isObjectOrNull(const Json::Value& value)
     return value.isObject() || value.isNull();
 }
 
+std::string_view asView(const Json::Value& value)
+{
+    const char* begin = nullptr;
+    const char* end = nullptr;
+    if (value.isString())
+        return value.getString(&begin, &end) ? std::string_view(begin, size_t(end - begin)) : "";
+    if (value.isNull())
+        return "";
+    if (value.isBool())
+        return value.asBool() ? "true" : "false";
+    throw Not_Convertible("Type is not convertible to string");
+}
+
 std::string asString(const Json::Value& value)
 {
-    if (value.isNull() || value.isString() || value.isBool())
-        return value.asString();
-    throw Not_Convertible("Type is not convertible to string");
+    return std::string(asView(value));
 }
 
 int asInt(const Json::Value& value)
@@ -82,14 +94,20 @@ bool asBool(const Json::Value& value)
     }
 }
 
+static const Json::Value* find(const Json::Value& object, const char* name)
+{
+    return object.isObject() ? object.find(name, name + strlen(name)) : nullptr;
+}
+
 bool hasMember(const Json::Value& object, const char* name)
 {
-    return object.isObject() && object.isMember(name);
+    return find(object, name) != nullptr;
 }
 
 const Json::Value& member(const Json::Value& object, const char* name)
 {
-    return hasMember(object, name) ? object[name] : Json::Value::nullSingleton();
+    const Json::Value* const found = find(object, name);
+    return found ? *found : Json::Value::nullSingleton();
 }
 
 const Json::Value& element(const Json::Value& array, unsigned index)

@@ -4,6 +4,7 @@
 
 #include <stdexcept>
 #include <string>
+#include <string_view>
 
 namespace KPRV {
 
@@ -26,6 +27,8 @@ bool isObjectOrNull(const Json::Value& value);
 // and a number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
 
 std::string asString(const Json::Value& value);
+/// The same text where it stands, as long as the value stands.
+std::string_view asView(const Json::Value& value);
 /// A fraction is cut off.
 int asInt(const Json::Value& value);
 /// A fraction is cut off.

@@ -1,3 +1,4 @@
+#include "adapter/Class_Names.h"
 #include "adapter/ProviderUtil.h"
 #include "adapter/ProviderUtil_Log.h"
 
@@ -78,6 +79,24 @@ const char* ProviderUtil::getClassName(classId_t id)
         return class_names[id];
     UTIL_LOG(INFO, "ClassId is greater than MAXCLASSID");
     return "INVALID CLASS";
+}
+
+const String& class_name_text(classId_t id)
+{
+    struct Texts
+    {
+        String text[MAXCLASSID];
+        Texts()
+        {
+            for (unsigned i = 0; i < MAXCLASSID; i++)
+                text[i] = class_names[i];
+        }
+    };
+    static const Texts texts;
+    if (id < MAXCLASSID)
+        return texts.text[id];
+    static const String invalid(ProviderUtil::getClassName(id));
+    return invalid;
 }
 
 const char* ProviderUtil::getRecordData(diag_record_msg_t id)

@@ -1,8 +1,9 @@
 #pragma once
 
-#include "adapter/ProviderUtil.h"
+#include "adapter/Class_Names.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
+#include "runtime/Ref.h"
 
 #include <initializer_list>
 #include <string>
@@ -14,9 +15,13 @@ namespace KPRV {
 template <class T>
 T* create_null()
 {
-    T* instance = create<T>(false);
-    clear(instance);
-    return instance;
+    // Cloned from one that is kept: cheaper than to make one and clear it.
+    static const Ref<T> all_null = [] {
+        Ref<T> instance(create<T>(false));
+        clear(instance.ptr());
+        return instance;
+    }();
+    return clone_of<T>(all_null.ptr());
 }
 
 template <class T>
@@ -29,8 +34,8 @@ Array<T> array_of(std::initializer_list<T> elements)
 template <class T>
 void set_system_keys(T& instance, classId_t id, const char* system_name)
 {
-    instance.CreationClassName.set(ProviderUtil::getClassName(id));
-    instance.SystemCreationClassName.set(ProviderUtil::getClassName(COMPUTERSYSTEM));
+    instance.CreationClassName.set(class_name_text(id));
+    instance.SystemCreationClassName.set(class_name_text(COMPUTERSYSTEM));
     instance.SystemName.set(system_name);
 }
 

@@ -3,13 +3,13 @@
 #include "adapter/Json_Access.h"
 #include "adapter/ProviderUtil.h"
 
-#include <string>
 #include <string_view>
 
 namespace KPRV {
 
-// How the fixed-size records are filled: a text is cut to its field and always terminated. What reads an
-// answer throws `Not_Convertible` for a member of the wrong type; a missing one is the empty text.
+// How the fixed-size records are filled: a text is cut to its field and always terminated, and it ends at its
+// first zero byte. What reads an answer throws `Not_Convertible` for a member of the wrong type; a missing
+// one is the empty text.
 
 template <size_t N>
 void copy_text(char (&field)[N], std::string_view text)
@@ -17,30 +17,41 @@ void copy_text(char (&field)[N], std::string_view text)
     field[text.copy(field, N - 1)] = '\0';
 }
 
+/// A text member of an object where it stands, up to its first zero byte.
+inline std::string_view text_member(const Json::Value& object, const char* name)
+{
+    const std::string_view text = asView(member(object, name));
+    return text.substr(0, text.find('\0'));
+}
+
 template <size_t N>
 void copy_member(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_text(field, asString(member(object, name)).c_str());
+    copy_text(field, text_member(object, name));
 }
 
 /// Without blanks around it.
 template <size_t N>
 void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
 {
-    const std::string text = asString(member(object, name));
-    copy_text(field, ProviderUtil::trimmed(text.c_str()));
+    copy_text(field, ProviderUtil::trimmed(text_member(object, name)));
 }
 
 /// Flat form of an address.
 template <size_t N>
-void copy_flat(char (&field)[N], const char* address)
+void copy_flat(char (&field)[N], std::string_view address)
 {
-    copy_text(field, ProviderUtil::eraseColonsFromIndex(address).c_str());
+    size_t size = 0;
+    for (const char c : address) {
+        if (c != ':' && size < N - 1)
+            field[size++] = c;
+    }
+    field[size] = '\0';
 }
 template <size_t N>
 void copy_flat(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_flat(field, asString(member(object, name)).c_str());
+    copy_flat(field, text_member(object, name));
 }
 
 } // namespace KPRV
