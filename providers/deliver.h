@@ -2,6 +2,7 @@
 
 #include "runtime/Array.h"
 #include "runtime/Handler.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 #include "runtime/provider_status.h"
 
@@ -31,7 +32,7 @@ struct Message
 #define SAYING(level, text) (::KPRV::Message{LOG_HERE, ::KPRV::Log_Level::level, text})
 #define SAYING_NOTHING (::KPRV::Message{LOG_HERE, ::KPRV::Log_Level::DBG, nullptr})
 
-/// Owner of the elements that a manager hands out: what was not delivered is destroyed, also when an
+/// Owner of the elements that a manager hands out: what was not delivered is released, also when an
 /// exception passes.
 template <class T>
 class List
@@ -41,7 +42,7 @@ public:
     ~List()
     {
         for (Instance* instance : _instances)
-            destroyer(instance);
+            unref(instance);
     }
     List(const List&) = delete;
     List& operator=(const List&) = delete;
@@ -51,15 +52,15 @@ public:
     /// Null for an element that is no T.
     const T* operator[](uint32 i) const { return cast<T>(const_cast<const Instance*>(_instances[i])); }
 
-    /// Hands a clone of each element to the handler, in order. The element itself outlives the handler's
-    /// call.
+    /// Hands each element over to the handler, in order.
     void deliver(Enum_Instances_Handler<T>& handler)
     {
         for (Instance*& instance : _instances) {
-            if (const T* element = cast<T>(const_cast<const Instance*>(instance)))
-                handler.handle(clone_of(element));
-            destroyer(instance);
-            instance = nullptr;
+            Ref<Instance> owner(std::exchange(instance, nullptr));
+            if (T* element = cast<T>(owner.ptr())) {
+                owner.steal();
+                handler.handle(element);
+            }
         }
     }
 

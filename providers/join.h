@@ -18,14 +18,14 @@ namespace KPRV {
 /// Where the counts have been checked.
 #define TRACE_BUILDING() LOG(DBG, "Building and returning association instances")
 
-/// Puts a clone of an end, whole, into a role, as the class that the role declares.
+/// Puts an end, whole, into a role, as the class that the role declares. All associations of an end share it,
+/// by its count: who receives an association reads its ends and does not write to them.
 template <class A, class Target>
 void set_end(A* association, Target* A::*role, const Instance* end)
 {
-    Ref<Instance> copy(clone(end));
-    if (Target* target = cast<Target>(copy.ptr())) {
+    if (Target* target = cast<Target>(const_cast<Instance*>(end))) {
+        ref(target);
         association->*role = target;
-        copy.steal();
     }
 }
 
