@@ -20,6 +20,9 @@ constinit std::atomic<bool> _log_enabled_state = true;
 static pthread_mutex_t _mutex = PTHREAD_MUTEX_INITIALIZER;
 static bool _initialized;
 static Log_Level _level;
+/// What is above needs neither the mutex nor a look at the rest: the level while the log is open, otherwise
+/// the highest, since each line is then an attempt to open it.
+static constinit std::atomic<Log_Level> _threshold = Log_Level::DBG;
 static FILE* _log_file_handle;
 static File_Lock* _lock;
 
@@ -50,6 +53,7 @@ static void configure()
         _log_file_handle = fopen(configuration.messages, "ae");
     if (_log_file_handle) {
         _initialized = true;
+        _threshold = _level;
     } else {
         delete _lock;
         _lock = nullptr;
@@ -78,6 +82,8 @@ static void write_line(Log_Level level, const char* file, size_t line, const cha
 
 void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
 {
+    if (level > _threshold.load(std::memory_order_relaxed))
+        return;
     const Auto_Log_Mutex guard;
     if (!_initialized)
         configure();
@@ -124,6 +130,8 @@ int log_set_level(const char* name)
         return -1;
     const Auto_Log_Mutex guard;
     _level = level;
+    if (_initialized)
+        _threshold = level;
     return 0;
 }
 
@@ -137,6 +145,7 @@ void close_log()
     fclose(_log_file_handle);
     _log_file_handle = nullptr;
     _initialized = false;
+    _threshold = Log_Level::DBG;
 }
 
 /// A server may load and unload the module many times in one process: the log must not keep a descriptor of
