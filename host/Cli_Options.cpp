@@ -3,6 +3,7 @@
 #include "host/Cli_Verbs.h"
 
 #include <algorithm>
+#include <charconv>
 #include <iterator>
 
 namespace KPRV::host {
@@ -35,7 +36,7 @@ bool set_format(Cli_Options& options, const std::string& value)
     return false;
 }
 
-/// False for a value that is none; only formats have such.
+/// False for a value that is none.
 using Setter = bool (*)(Cli_Options& options, const std::string& value);
 
 /// A text of the options.
@@ -65,6 +66,19 @@ bool set_user(Cli_Options& options, const std::string& value)
     return true;
 }
 
+bool add_filter(Cli_Options& options, const std::string& value)
+{
+    options.filters.push_back(value);
+    return !value.empty();
+}
+
+bool set_count(Cli_Options& options, const std::string& value)
+{
+    const char* end = value.data() + value.size();
+    const auto [at, error] = std::from_chars(value.data(), end, options.count);
+    return error == std::errc() && at == end && options.count != 0;
+}
+
 struct Option
 {
     const char* name;
@@ -89,6 +103,8 @@ constexpr Option option_table[] = {
     {"--result",      set_filter<&Filter::result_class>,       nullptr,                   "ai ain"},
     {"--role",        set_filter<&Filter::role>,               nullptr,                   "ai ain ri rin"},
     {"--result-role", set_filter<&Filter::result_role>,        nullptr,                   "ai ain"},
+    {"--filter",      add_filter,                              nullptr,                   "watch"},
+    {"--count",       set_count,                               nullptr,                   "watch"},
     {"--software",    nullptr,                                 &Cli_Options::software,    "tree graph"},
     {"--connectors",  nullptr,                                 &Cli_Options::connectors,  "tree graph"},
     {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree"},
@@ -104,6 +120,14 @@ const Option* find_option(const std::string& name)
     auto at = std::find_if(std::begin(option_table), std::end(option_table),
                            [&](const Option& option) { return name == option.name; });
     return at == std::end(option_table) ? nullptr : &*at;
+}
+
+/// What the values of an option are, for one that has bad ones.
+const char* words_for(const Option& option)
+{
+    if (option.set == set_count)
+        return "a number above 0";
+    return option.set == add_filter ? "a namespace" : "table, json or mof";
 }
 
 bool contains_word(const std::string& words, const std::string& word)
@@ -179,7 +203,7 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
         }
         std::string value = equals == std::string::npos ? arguments[++i] : argument.substr(equals + 1);
         if (!option->set(options, value)) {
-            error = std::string(option->name) + " takes table, json or mof, not \"" + value + "\"";
+            error = std::string(option->name) + " takes " + words_for(*option) + ", not \"" + value + "\"";
             return false;
         }
     }

@@ -25,6 +25,10 @@ struct Cli_Options
     /// What a tree or graph shows besides ports and storage.
     bool software = false;
     bool connectors = false;
+    /// Name spaces of the filters of a watch; empty: that of the classes.
+    std::vector<std::string> filters;
+    /// Indications after which a watch ends; 0: never.
+    unsigned count = 0;
     /// Lines of a tree without box-drawing characters.
     bool ascii = false;
     bool leaks = false;

@@ -21,6 +21,8 @@ Verbs
   rin PATH                          their names
   tree                              the host with its adapters, ports, targets and logical units, as a tree
   graph                             the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg
+  watch [CLASS]                     subscribe to indications (default: KALDERA_AlertIndication) and write each as it
+                                    comes, until interrupted
   classes [PATTERN]                 list the classes that have a provider; * and ? match as in file names
 
 Options
@@ -35,6 +37,8 @@ Options
   --role ROLE               ai, ain, ri, rin: only where PATH stands in this role
   --result CLASS            ai, ain: only results of this class or a subclass
   --result-role ROLE        ai, ain: only results that stand in this role
+  --filter NS               watch: a filter in this namespace, instead of --namespace; may be given several times
+  --count N                 watch: end after N indications
   --software, --connectors  tree, graph: also firmware and drivers, cards and transceivers
   --ascii                   tree: no box-drawing characters (default where the locale is not UTF-8)
   --leaks                   say on standard error which CMPI objects the provider did not release
@@ -55,6 +59,7 @@ Examples
   kldrcim ein KALDERA_FCPort
   kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" --assoc KALDERA_PortControllerSystemDevice
   kldrcim tree --software
+  kldrcim watch --count 10 --properties Message,PerceivedSeverity,MessageID
   kldrcim --format mof gi 'KALDERA_AgentService.Name="agent"'
 )usage";
 

@@ -1,5 +1,7 @@
 #include "host/Cli_Verbs.h"
 
+#include "host/Cli_Watch.h"
+
 #include <algorithm>
 #include <iterator>
 
@@ -24,6 +26,7 @@ constexpr Cli_Verb verbs[] = {
     {"rin",     1, 1,   "PATH",                       nullptr},
     {"tree",    0, 0,   "",                           nullptr},
     {"graph",   0, 0,   "",                           nullptr},
+    {"watch",   0, 1,   "[CLASS]",                    watch},
     {"classes", 0, 1,   "[PATTERN]",                  nullptr},
 };
 // clang-format on
