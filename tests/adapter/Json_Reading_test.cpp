@@ -1,8 +1,8 @@
 #include "adapter/Json_Reading.h"
 #include "tests/support/Fake_Library.h"
+#include "tests/support/Small_Stack.h"
 
 #include <gtest/gtest.h>
-#include <pthread.h>
 
 namespace KPRV {
 namespace {
@@ -84,28 +84,13 @@ TEST(Json_Reading, NothingHidesDepth)
     EXPECT_EQ("refused", read("[\"\\\\\", " + deep + "]"));
 }
 
-void* read_deepest(void* answer)
-{
-    *static_cast<std::string*>(answer) = read(nested(256, "{\"a\":[", "]}").substr(0, 256 * 3));
-    *static_cast<std::string*>(answer) += read(nested(128, "{\"a\":[", "]}"));
-    return nullptr;
-}
-
 TEST(Json_Reading, TheDeepestTextFitsTheSmallestStack)
 {
-    pthread_attr_t attributes;
-    pthread_attr_init(&attributes);
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-    // Their frames are several times as large.
-    pthread_attr_setstacksize(&attributes, 2048 * 1024);
-#else
-    pthread_attr_setstacksize(&attributes, 256 * 1024);
-#endif
     std::string answer;
-    pthread_t thread;
-    ASSERT_EQ(0, pthread_create(&thread, &attributes, read_deepest, &answer));
-    pthread_join(thread, nullptr);
-    pthread_attr_destroy(&attributes);
+    on_small_stack([&answer] {
+        answer = read(nested(256, "{\"a\":[", "]}").substr(0, 256 * 3));
+        answer += read(nested(128, "{\"a\":[", "]}"));
+    });
     EXPECT_EQ("refused" + nested(128, "{\"a\":[", "]}"), answer);
 }
 

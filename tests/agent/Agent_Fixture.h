@@ -12,10 +12,16 @@ namespace KPRV {
 class Agent_Fixture : public ::testing::Test
 {
 protected:
-    static std::string reply_text(const std::string& request)
+    static JsonRpcManager::response process(const std::string& request)
     {
         JsonRpcManager::response reply;
         JsonRpcManager::instance()->process(request, reply);
+        return reply;
+    }
+    /// The text of a reply that is JSON.
+    static std::string reply_text(const std::string& request)
+    {
+        const JsonRpcManager::response reply = process(request);
         EXPECT_EQ(200, reply.status) << reply.text;
         return reply.text;
     }

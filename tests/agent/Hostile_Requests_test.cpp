@@ -1,6 +1,5 @@
 #include "tests/agent/Agent_Fixture.h"
-
-#include <pthread.h>
+#include "tests/support/Small_Stack.h"
 
 namespace KPRV {
 namespace {
@@ -18,16 +17,7 @@ std::string nested(unsigned levels, const std::string& open, const std::string& 
     return repeated(open, levels) + "1" + repeated(close, levels);
 }
 
-class Hostile_Requests : public Agent_Fixture
-{
-protected:
-    static JsonRpcManager::response process(const std::string& request)
-    {
-        JsonRpcManager::response reply;
-        JsonRpcManager::instance()->process(request, reply);
-        return reply;
-    }
-};
+using Hostile_Requests = Agent_Fixture;
 
 TEST_F(Hostile_Requests, AreReadToA256thLevelAndNotBeyond)
 {
@@ -48,43 +38,21 @@ TEST_F(Hostile_Requests, AreReadToA256thLevelAndNotBeyond)
         EXPECT_EQ(500, process(repeated(open, 100000)).status);
 }
 
-/// On a thread as small as those of one server.
-void* ask_the_deepest(void* good)
-{
-    // Read, handed to the library, answered by it, and written again: once in objects, once in arrays.
-    const std::string objects = nested(254, "{\"a\":", "}"), arrays = nested(254, "[", "]");
-    for (const std::string& deep : {objects, arrays}) {
-        const std::string params = R"({"method": "discovery.getServerTime", "params": [)" + deep + "]}";
-        const std::string id = R"({"method": "none", "id": [)" + deep + "]}";
-        for (const std::string& request : {params, id}) {
-            JsonRpcManager::response reply;
-            JsonRpcManager::instance()->process(request, reply);
-            *static_cast<unsigned*>(good) += reply.status == 200 && reply.text.size() > 254;
-        }
-    }
-    JsonRpcManager::response reply;
-    JsonRpcManager::instance()->process(std::string(4000000, '['), reply);
-    *static_cast<unsigned*>(good) += reply.status == 500;
-    return nullptr;
-}
-
 TEST_F(Hostile_Requests, FitASmallStack)
 {
     library.answers("getServerTime", [](const Json::Value& request) { return request; });
-    pthread_attr_t attributes;
-    pthread_attr_init(&attributes);
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-    // Their frames are several times as large.
-    pthread_attr_setstacksize(&attributes, 2048 * 1024);
-#else
-    pthread_attr_setstacksize(&attributes, 256 * 1024);
-#endif
-    unsigned good = 0;
-    pthread_t thread;
-    ASSERT_EQ(0, pthread_create(&thread, &attributes, ask_the_deepest, &good));
-    pthread_join(thread, nullptr);
-    pthread_attr_destroy(&attributes);
-    EXPECT_EQ(5u, good);
+    on_small_stack([] {
+        // Read, handed to the library, answered by it, and written again: once in objects, once in arrays.
+        for (const std::string& deep : {nested(254, "{\"a\":", "}"), nested(254, "[", "]")}) {
+            for (const char* member : {R"("method": "discovery.getServerTime", "params")", "\"id\""}) {
+                const JsonRpcManager::response reply =
+                    process(std::string("{") + member + ": [" + deep + "]}");
+                EXPECT_EQ(200, reply.status);
+                EXPECT_GT(reply.text.size(), 254u);
+            }
+        }
+        EXPECT_EQ(500, process(std::string(4000000, '[')).status);
+    });
 }
 
 TEST_F(Hostile_Requests, MayBeMegabytesLong)

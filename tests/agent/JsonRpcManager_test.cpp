@@ -10,12 +10,6 @@ namespace {
 class Dispatcher : public Agent_Fixture
 {
 protected:
-    static JsonRpcManager::response process(const std::string& request)
-    {
-        JsonRpcManager::response reply;
-        JsonRpcManager::instance()->process(request, reply);
-        return reply;
-    }
     /// The rest of a text that could not be parsed.
     static std::string why_unparsed(const std::string& request)
     {
