@@ -1,6 +1,7 @@
 #pragma once
 
 #include "adapter/Class_Names.h"
+#include "adapter/ProviderUtil.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
 #include "runtime/Ref.h"
