@@ -1,5 +1,6 @@
 #include "model/FCHBAManager.h"
 
+#include "diagnostics/DiagnosticHelper.h"
 #include "model/AccessPointHelper.h"
 #include "model/AdapterHelper.h"
 #include "model/Class_Dispatch.h"
@@ -34,6 +35,10 @@ Array<Instance*> by_ethernet_port_helper(classId_t id)
 {
     return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(id);
 }
+Array<Instance*> by_diagnostic_helper(classId_t id)
+{
+    return DiagnosticHelper::getDiagnosticHelperObject()->getInstancesByClass(id);
+}
 Array<Instance*> by_physical_asset_helper(classId_t id)
 {
     return PhysicalAssetHelper::getPhysicalAssetHelperObject()->getInstancesByClass(id);
@@ -58,18 +63,18 @@ constexpr Class_Row rows[] = {
     {HBASOFTWAREINSTALLATIONSERVICE,             Needs::DRIVER,   by_software_update_helper},
     {HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, Needs::DRIVER,   by_software_update_helper},
     {ETHERNETPORT,                               Needs::DRIVER,   by_ethernet_port_helper},
-    {MEMORYDIAGNOSTICTEST,                       Needs::DRIVER,   nullptr},
-    {LOOPBACKDIAGNOSTICTEST,                     Needs::DRIVER,   nullptr},
-    {PCILOOPBACKDIAGNOSTICTEST,                  Needs::DRIVER,   nullptr},
-    {ETHLOOPBACKDIAGNOSTICTEST,                  Needs::DRIVER,   nullptr},
-    {DIAGNOSTICSOFTWAREIDENTITY,                 Needs::DRIVER,   nullptr},
-    {CONCRETEJOB,                                Needs::DRIVER,   nullptr},
-    {DIAGNOSTICSERVICERECORD,                    Needs::DRIVER,   nullptr},
-    {DIAGNOSTICCOMPLETIONRECORD,                 Needs::DRIVER,   nullptr},
+    {MEMORYDIAGNOSTICTEST,                       Needs::DRIVER,   by_diagnostic_helper},
+    {LOOPBACKDIAGNOSTICTEST,                     Needs::DRIVER,   by_diagnostic_helper},
+    {PCILOOPBACKDIAGNOSTICTEST,                  Needs::DRIVER,   by_diagnostic_helper},
+    {ETHLOOPBACKDIAGNOSTICTEST,                  Needs::DRIVER,   by_diagnostic_helper},
+    {DIAGNOSTICSOFTWAREIDENTITY,                 Needs::DRIVER,   by_diagnostic_helper},
+    {CONCRETEJOB,                                Needs::DRIVER,   by_diagnostic_helper},
+    {DIAGNOSTICSERVICERECORD,                    Needs::DRIVER,   by_diagnostic_helper},
+    {DIAGNOSTICCOMPLETIONRECORD,                 Needs::DRIVER,   by_diagnostic_helper},
     {LOGICALPORTGROUP,                           Needs::DRIVER,   by_port_helper},
-    {AFFECTEDJOBELEMENT,                         Needs::DRIVER,   nullptr},
-    {SERVICERECORDAPPLIESTOELEMENT,              Needs::DRIVER,   nullptr},
-    {COMPLETIONRECORDAPPLIESTOELEMENT,           Needs::DRIVER,   nullptr},
+    {AFFECTEDJOBELEMENT,                         Needs::DRIVER,   by_diagnostic_helper},
+    {SERVICERECORDAPPLIESTOELEMENT,              Needs::DRIVER,   by_diagnostic_helper},
+    {COMPLETIONRECORDAPPLIESTOELEMENT,           Needs::DRIVER,   by_diagnostic_helper},
     {LANENDPOINT,                                Needs::DRIVER,   by_ethernet_port_helper},
     {PHYSICALCONNECTOR,                          Needs::DRIVER,   by_physical_asset_helper},
     {ALARMDEVICE,                                Needs::DRIVER,   by_port_helper},
@@ -87,6 +92,7 @@ FCHBAManager::FCHBAManager()
     AccessPointHelper::getAccessPointHelperInstance();
     SoftwareUpdateHelper::getSoftwareUpdateHelperInstance();
     EthernetPortHelper::getEthernetPortHelperObject();
+    DiagnosticHelper::getDiagnosticHelperObject();
     PhysicalAssetHelper::getPhysicalAssetHelperObject();
 }
 
@@ -112,6 +118,11 @@ Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& m
 {
     LOG_SCOPE("getEthernetPortInstancesByAdapter");
     return EthernetPortHelper::getEthernetPortHelperObject()->getEthernetPortInstancesByAdapter(mac);
+}
+
+DiagnosticHelper* FCHBAManager::getDiagnosticHelper() const
+{
+    return DiagnosticHelper::getDiagnosticHelperObject();
 }
 
 int FCHBAManager::setAlarmState(const String& port, int state) const
@@ -148,8 +159,7 @@ Array<Instance*> FCHBAManager::getDiagnosticServicesForEthernetPort() const
 Array<Instance*> FCHBAManager::getAllDiagnosticTestInstances() const
 {
     LOG_SCOPE("getAllDiagnosticTestInstances");
-    return joined(
-        {MEMORYDIAGNOSTICTEST, LOOPBACKDIAGNOSTICTEST, ETHLOOPBACKDIAGNOSTICTEST, PCILOOPBACKDIAGNOSTICTEST});
+    return DiagnosticHelper::getDiagnosticHelperObject()->getDiagnosticServices();
 }
 
 } // namespace KPRV

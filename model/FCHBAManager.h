@@ -9,6 +9,8 @@
 
 namespace KPRV {
 
+class DiagnosticHelper;
+
 /// Serves the adapter side and the services: adapters, ports, diagnostics, software update. It only sends a
 /// class id to the helper that owns it. Failures show as an empty array, with the reason in the log.
 class FCHBAManager
@@ -30,6 +32,9 @@ public:
     /// As `PortHelper::setAlarmState`.
     int setAlarmState(const String& port, int state) const;
 
+    /// Runs the tests, see there.
+    DiagnosticHelper* getDiagnosticHelper() const;
+
     // The diagnostic tests that an element can be put to; the caller owns them.
 
     /// The memory test.
@@ -38,7 +43,7 @@ public:
     Array<Instance*> getDiagnosticServicesForFCPort() const;
     /// The Ethernet loopback test, then the PCI loopback test.
     Array<Instance*> getDiagnosticServicesForEthernetPort() const;
-    /// All of them: memory, loopback, Ethernet loopback, PCI loopback.
+    /// All of them, in the order of `DiagnosticHelper::getDiagnosticServices`, without a look at the driver.
     Array<Instance*> getAllDiagnosticTestInstances() const;
 
 private:

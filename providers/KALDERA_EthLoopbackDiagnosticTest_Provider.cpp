@@ -1,11 +1,16 @@
 #include "providers/deliver.h"
 #include "providers/managers.h"
 #include "providers/proc.h"
+#include "providers/run_diagnostic.h"
 #include "schema/KALDERA_EthLoopbackDiagnosticTest_Skeleton.h"
+#include "schema/KALDERA_EthLoopbackDiagnosticTest_methods.h"
+#include "schema/KALDERA_EthernetPort.h"
 
 namespace KPRV {
 
-class KALDERA_EthLoopbackDiagnosticTest_Provider : public KALDERA_EthLoopbackDiagnosticTest_Skeleton
+class KALDERA_EthLoopbackDiagnosticTest_Provider
+    : public Test_Skeleton<KALDERA_EthLoopbackDiagnosticTest_Skeleton,
+                           KALDERA_EthLoopbackDiagnosticTest_RunDiagnostic_method>
 {
 public:
     Enum_Instances_Status enum_instances(const KALDERA_EthLoopbackDiagnosticTest*,
@@ -14,6 +19,21 @@ public:
         LOG_SCOPE("enum_instances");
         return deliver_all(fc_hba_instances(ETHLOOPBACKDIAGNOSTICTEST), *handler,
                            SAYING(WARN, "No ethloopback diagnostic test is available"));
+    }
+
+    Invoke_Method_Status RunDiagnostic(const KALDERA_EthLoopbackDiagnosticTest* self,
+                                       const CIM_ManagedElement* ManagedElement, const CIM_DiagnosticSetting*,
+                                       const CIM_JobSettingData*, CIM_ConcreteJob*& Job,
+                                       Property<uint32>& return_value)
+    {
+        LOG_SCOPE("RunDiagnostic");
+        if (!self)
+            return INVOKE_METHOD_UNSUPPORTED;
+        const Run_Answer answer(LOG_HERE, Job, return_value);
+        const auto* const port = tested_as<KALDERA_EthernetPort>(ManagedElement);
+        if (!port)
+            return answer.wrong_element();
+        return answer.of(diagnostic_helper()->runEthLoopbackTest(port->DeviceID.value, self->Name.value));
     }
 };
 

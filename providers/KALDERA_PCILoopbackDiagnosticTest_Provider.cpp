@@ -1,11 +1,17 @@
 #include "providers/deliver.h"
 #include "providers/managers.h"
 #include "providers/proc.h"
+#include "providers/run_diagnostic.h"
+#include "schema/KALDERA_EthernetPort.h"
+#include "schema/KALDERA_FCPort.h"
 #include "schema/KALDERA_PCILoopbackDiagnosticTest_Skeleton.h"
+#include "schema/KALDERA_PCILoopbackDiagnosticTest_methods.h"
 
 namespace KPRV {
 
-class KALDERA_PCILoopbackDiagnosticTest_Provider : public KALDERA_PCILoopbackDiagnosticTest_Skeleton
+class KALDERA_PCILoopbackDiagnosticTest_Provider
+    : public Test_Skeleton<KALDERA_PCILoopbackDiagnosticTest_Skeleton,
+                           KALDERA_PCILoopbackDiagnosticTest_RunDiagnostic_method>
 {
 public:
     Enum_Instances_Status enum_instances(const KALDERA_PCILoopbackDiagnosticTest*,
@@ -14,6 +20,26 @@ public:
         LOG_SCOPE("enum_instances");
         return deliver_all(fc_hba_instances(PCILOOPBACKDIAGNOSTICTEST), *handler,
                            SAYING(WARN, "No PCI loopback diagnostic test is available"));
+    }
+
+    Invoke_Method_Status RunDiagnostic(const KALDERA_PCILoopbackDiagnosticTest* self,
+                                       const CIM_ManagedElement* ManagedElement, const CIM_DiagnosticSetting*,
+                                       const CIM_JobSettingData*, CIM_ConcreteJob*& Job,
+                                       Property<uint32>& return_value)
+    {
+        LOG_SCOPE("RunDiagnostic");
+        if (!self)
+            return INVOKE_METHOD_UNSUPPORTED;
+        const Run_Answer answer(LOG_HERE, Job, return_value);
+        if (const auto* port = tested_as<KALDERA_FCPort>(ManagedElement)) {
+            LOG(INFO, "PCI Loopback Test is requested for FC Port");
+            return answer.of(diagnostic_helper()->runPCILoopbackTest(port->DeviceID.value));
+        }
+        if (const auto* port = tested_as<KALDERA_EthernetPort>(ManagedElement)) {
+            LOG(INFO, "PCI Loopback Test is requested for Ethernet Port");
+            return answer.of(diagnostic_helper()->runPCILoopbackTest(port->DeviceID.value));
+        }
+        return answer.wrong_element();
     }
 };
 

@@ -102,7 +102,7 @@ TEST_F(FCHBAManager_Classes, is_traced)
 TEST_F(FCHBAManager_Classes, tests_of_an_element_in_order)
 {
     EXPECT_EQ(manager->getDiagnosticServicesForAdapter().size(), 0u);
-    EXPECT_EQ(log.said(), requested(21));
+    EXPECT_EQ(log.said("INFO Requested classId"), Lines{"INFO Requested classId : 21"});
     log.clear();
     manager->getDiagnosticServicesForFCPort();
     EXPECT_EQ(log.said("INFO Requested classId"),
@@ -111,4 +111,18 @@ TEST_F(FCHBAManager_Classes, tests_of_an_element_in_order)
     manager->getDiagnosticServicesForEthernetPort();
     EXPECT_EQ(log.said("INFO Requested classId"),
               (Lines{"INFO Requested classId : 24", "INFO Requested classId : 23"}));
+}
+
+TEST_F(FCHBAManager_Classes, tests_by_their_helper)
+{
+    one_adapter();
+    // Without a model it would count as any model, also as one that withholds tests.
+    library.answers("getHbaByWwn", json("{'hbaData': {'model': '825'}, 'driver': {}}"));
+    EXPECT_EQ(classes(manager, 21), Lines{"KALDERA_MemoryDiagnosticTest"});
+    EXPECT_EQ(classes(manager, 22), Lines(3, "KALDERA_LoopbackDiagnosticTest"));
+    EXPECT_EQ(classes(manager, 23), Lines{"KALDERA_PCILoopbackDiagnosticTest"});
+    EXPECT_EQ(classes(manager, 24), Lines(2, "KALDERA_EthLoopbackDiagnosticTest"));
+    EXPECT_EQ(classes(manager, 25), Lines{"KALDERA_DiagnosticSoftwareIdentity"});
+    for (const uint32 id : {26, 27, 28, 31, 32, 33})
+        EXPECT_EQ(classes(manager, id), Lines()) << id;
 }

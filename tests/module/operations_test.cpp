@@ -20,7 +20,11 @@ TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
     const std::set<std::string> with_body = {
         "KALDERA_AgentService.executeMethod",
         "KALDERA_AlarmDevice.SetAlarmState",
+        "KALDERA_EthLoopbackDiagnosticTest.RunDiagnostic",
         "KALDERA_HBASoftwareInstallationService.InstallFromURI",
+        "KALDERA_LoopbackDiagnosticTest.RunDiagnostic",
+        "KALDERA_MemoryDiagnosticTest.RunDiagnostic",
+        "KALDERA_PCILoopbackDiagnosticTest.RunDiagnostic",
     };
     open("empty.json");
     size_t methods = 0;

@@ -89,6 +89,10 @@ Array<Instance*> FCHBAManager::getAllDiagnosticTestInstances() const
 {
     return fetch("all tests");
 }
+DiagnosticHelper* FCHBAManager::getDiagnosticHelper() const
+{
+    throw std::logic_error("no association runs a test");
+}
 int FCHBAManager::setAlarmState(const String&, int) const
 {
     throw std::logic_error("no association sets an alarm");
@@ -129,6 +133,10 @@ EthernetPortHelper* EthernetPortHelper::getEthernetPortHelperObject()
 {
     static EthernetPortHelper helper;
     return &helper;
+}
+Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t) const
+{
+    throw std::logic_error("no association asks for the element of a run");
 }
 Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id) const
 {

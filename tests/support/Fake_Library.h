@@ -10,6 +10,7 @@
 #include <functional>
 #include <map>
 #include <memory>
+#include <mutex>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -38,7 +39,8 @@ inline std::string compact(const Json::Value& value)
 }
 
 /// Stands behind the entry-point variables for a scope: answers as told, null where nothing was told, and
-/// keeps the calls with their requests in order. Entry points go by their exported names.
+/// keeps the calls with their requests in order. Entry points go by their exported names. Threads of the code
+/// under test may call at once; answers run outside the lock, so that one may wait for another.
 ///
 ///     Fake_Library library;
 ///     library.answers("getFlashInfo", json("{'flashStatus': true}"));
@@ -74,10 +76,12 @@ public:
     /// Every call is answered so.
     void answers(const std::string& symbol, const Json::Value& answer)
     {
+        const std::lock_guard lock(_mutex);
         _answers[symbol] = [answer](const Json::Value&) { return answer; };
     }
     void answers(const std::string& symbol, Answer answer)
     {
+        const std::lock_guard lock(_mutex);
         _answers[symbol] = std::move(answer);
     }
     /// Every call throws so.
@@ -135,9 +139,15 @@ private:
     }
     Json::Value answer(const char* symbol, const Json::Value& request)
     {
-        calls.push_back({symbol, request});
-        const auto found = _answers.find(symbol);
-        return found == _answers.end() ? Json::Value() : found->second(request);
+        Answer answer;
+        {
+            const std::lock_guard lock(_mutex);
+            calls.push_back({symbol, request});
+            const auto found = _answers.find(symbol);
+            if (found != _answers.end())
+                answer = found->second;
+        }
+        return answer ? answer(request) : Json::Value();
     }
     template <class Result>
     static Result plain(const char* symbol, Result Fake_Library::*member)
@@ -181,6 +191,7 @@ private:
         variable = [](log4cxxMsgCB) { current()->calls.push_back({NAME, {}}); };
     }
 
+    std::mutex _mutex;
     std::map<std::string, Answer> _answers;
 };
 
