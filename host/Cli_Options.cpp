@@ -1,5 +1,6 @@
 #include "host/Cli_Options.h"
 
+#include "host/Cli_Rpc.h"
 #include "host/Cli_Verbs.h"
 
 #include <algorithm>
@@ -79,6 +80,12 @@ bool set_count(Cli_Options& options, const std::string& value)
     return error == std::errc() && at == end && options.count != 0;
 }
 
+bool set_raw(Cli_Options& options, const std::string& value)
+{
+    options.raw = value;
+    return true;
+}
+
 struct Option
 {
     const char* name;
@@ -108,6 +115,8 @@ constexpr Option option_table[] = {
     {"--software",    nullptr,                                 &Cli_Options::software,    "tree graph"},
     {"--connectors",  nullptr,                                 &Cli_Options::connectors,  "tree graph"},
     {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree"},
+    {"--raw",         set_raw,                                 nullptr,                   "rpc"},
+    {"--list",        nullptr,                                 &Cli_Options::list_methods, "rpc"},
     {"--leaks",       nullptr,                                 &Cli_Options::leaks,       nullptr},
     {"--help",        nullptr,                                 &Cli_Options::help,        nullptr},
     {"-h",            nullptr,                                 &Cli_Options::help,        nullptr},
@@ -145,13 +154,14 @@ bool check_sense(const Cli_Options& options, const std::vector<const Option*>& g
             return false;
         }
     using Format = Cli_Options::Format;
+    const bool no_mof = options.verb == "tree" || options.verb == "rpc";
     if ((options.verb == "graph" && options.format != Format::TABLE) ||
-        (options.verb == "tree" && options.format == Format::MOF)) {
+        (no_mof && options.format == Format::MOF)) {
         error = "--format " + std::string(options.format == Format::MOF ? "mof" : "json") +
                 " makes no sense for " + options.verb;
         return false;
     }
-    return true;
+    return options.verb != "rpc" || check_rpc(options, error);
 }
 
 bool check_verb(const Cli_Options& options, std::string& error)

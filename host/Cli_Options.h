@@ -31,6 +31,9 @@ struct Cli_Options
     unsigned count = 0;
     /// Lines of a tree without box-drawing characters.
     bool ascii = false;
+    /// rpc: the whole text of a call, or "-" for standard input.
+    std::optional<std::string> raw;
+    bool list_methods = false;
     bool leaks = false;
     bool help = false;
     bool version = false;

@@ -23,6 +23,9 @@ Verbs
   graph                             the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg
   watch [CLASS]                     subscribe to indications (default: KALDERA_AlertIndication) and write each as it
                                     comes, until interrupted
+  rpc METHOD [PARAMETER...]         call a method of the agent's JSON-RPC protocol; "+" stands before a further call
+  rpc --list [PATTERN]              list its methods with their parameters
+  rpc --raw TEXT                    send TEXT, or with "-" standard input, as it is; write the reply as it is
   classes [PATTERN]                 list the classes that have a provider; * and ? match as in file names
 
 Options
@@ -50,9 +53,14 @@ Paths and values
   VALUE is read as the class declares it: text as it stands, numbers in decimal or 0x form, true or false, the 25
   characters of a datetime, a PATH for a reference. An array is {one, two}; NULL gives no value.
 
+Parameters of rpc
+  One word that begins with [ is the JSON array of all parameters. Otherwise each word is one: JSON if it begins with
+  [, { or a quote; a string where --list says so; else a number, true, false or null if it is one, or a string.
+  Before a parameter that begins with a minus sign, "--" ends the options.
+
 Exit status
   0 success, also if only some of several associations failed (a warning names them); 1 the provider or the host
-  answered a CIM status, which is named on standard error; 2 usage, or the module could not be loaded.
+  answered a CIM status, or the agent an error, which is named on standard error; 2 usage, or the module could not be loaded.
 
 Examples
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
@@ -60,6 +68,7 @@ Examples
   kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" --assoc KALDERA_PortControllerSystemDevice
   kldrcim tree --software
   kldrcim watch --count 10 --properties Message,PerceivedSeverity,MessageID
+  kldrcim rpc discovery.getPortByWwn 10:00:02:4b:4c:10:00:00
   kldrcim --format mof gi 'KALDERA_AgentService.Name="agent"'
 )usage";
 

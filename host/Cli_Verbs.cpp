@@ -1,5 +1,6 @@
 #include "host/Cli_Verbs.h"
 
+#include "host/Cli_Rpc.h"
 #include "host/Cli_Watch.h"
 
 #include <algorithm>
@@ -28,6 +29,7 @@ constexpr Cli_Verb verbs[] = {
     {"graph",   0, 0,   "",                           nullptr},
     {"watch",   0, 1,   "[CLASS]",                    watch},
     {"classes", 0, 1,   "[PATTERN]",                  nullptr},
+    {"rpc",     0, any, "METHOD [PARAMETER...]",      run_rpc},
 };
 // clang-format on
 

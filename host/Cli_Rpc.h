@@ -1,0 +1,15 @@
+#pragma once
+
+#include "host/Cli_Options.h"
+#include "host/Host.h"
+
+namespace KPRV::host {
+
+/// The verb `rpc`: the agent's JSON-RPC protocol through the CIM method that carries it. Gives the exit
+/// status: 1 if the agent, or the provider, answered an error.
+int run_rpc(const Cli_Options& options, Host& host);
+
+/// False with a one-line `error` for arguments that make no sense together.
+bool check_rpc(const Cli_Options& options, std::string& error);
+
+} // namespace KPRV::host

@@ -1,0 +1,101 @@
+#include "host/Rpc_Text.h"
+
+#include "host/Rpc_Methods.h"
+
+#include <memory>
+
+namespace KPRV::host {
+
+namespace {
+
+/// False for what is not one JSON value and nothing else.
+bool parse_json(const std::string& text, Json::Value& value)
+{
+    Json::CharReaderBuilder builder;
+    builder["failIfExtra"] = true;
+    builder["allowComments"] = false;
+    const std::unique_ptr<Json::CharReader> reader(builder.newCharReader());
+    try {
+        return reader->parse(text.data(), text.data() + text.size(), &value, nullptr);
+    } catch (const std::exception&) { // nested too deeply for the reader
+        return false;
+    }
+}
+
+std::string json_lines(const Json::Value& value, const char* indentation)
+{
+    Json::StreamWriterBuilder builder;
+    builder["indentation"] = indentation;
+    builder["emitUTF8"] = true;
+    builder["enableYAMLCompatibility"] = true; // no blank before a colon
+    return Json::writeString(builder, value);
+}
+
+bool begins_with_any(const std::string& word, const char* letters)
+{
+    return !word.empty() && std::string(letters).find(word.front()) != std::string::npos;
+}
+
+bool read_word(const std::string& word, bool is_string, Json::Value& value, std::string& error)
+{
+    if (begins_with_any(word, "[{\"")) {
+        if (parse_json(word, value))
+            return true;
+        error = "not JSON: " + word;
+        return false;
+    }
+    if (is_string || !parse_json(word, value))
+        value = word;
+    return true;
+}
+
+bool read_words(const std::string& method, const std::vector<std::string>& words, Json::Value& params,
+                std::string& error)
+{
+    const Rpc_Method* known = find_rpc_method(method);
+    for (std::size_t place = 0; place < words.size(); ++place) {
+        const bool is_string =
+            known && place < known->parameters.size() && known->parameters[place].type == Rpc_Type::STRING;
+        if (!read_word(words[place], is_string, params.append(Json::Value()), error))
+            return false;
+    }
+    return true;
+}
+
+/// The library may have put anything in place of an error object.
+std::string error_text(const Json::Value& error)
+{
+    if (error.isObject() && error["code"].isInt() && error["message"].isString())
+        return std::to_string(error["code"].asInt()) + " " + error["message"].asString();
+    return json_lines(error, "");
+}
+
+} // namespace
+
+std::optional<std::string> rpc_request(const std::string& method, const std::vector<std::string>& words,
+                                       std::string& error)
+{
+    Json::Value request;
+    request["version"] = "1.1";
+    request["id"] = 1;
+    request["method"] = method;
+    Json::Value& params = request["params"] = Json::Value(Json::arrayValue);
+    const bool whole = words.size() == 1 && begins_with_any(words[0], "[");
+    const bool read =
+        whole ? read_word(words[0], false, params, error) : read_words(method, words, params, error);
+    if (!read)
+        return std::nullopt;
+    return json_lines(request, "");
+}
+
+Rpc_Reply read_rpc_reply(const std::string& text)
+{
+    Json::Value reply;
+    if (!parse_json(text, reply) || !reply.isObject())
+        return {"", text.empty() ? "an empty reply" : text};
+    if (reply.isMember("error"))
+        return {"", error_text(reply["error"])};
+    return {json_lines(reply["result"], "  "), ""};
+}
+
+} // namespace KPRV::host
