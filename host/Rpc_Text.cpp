@@ -3,6 +3,7 @@
 #include "host/Rpc_Methods.h"
 
 #include <memory>
+#include <regex>
 
 namespace KPRV::host {
 
@@ -13,7 +14,7 @@ bool parse_json(const std::string& text, Json::Value& value)
 {
     Json::CharReaderBuilder builder;
     builder["failIfExtra"] = true;
-    builder["allowComments"] = false;
+    builder["allowTrailingCommas"] = false;
     const std::unique_ptr<Json::CharReader> reader(builder.newCharReader());
     try {
         return reader->parse(text.data(), text.data() + text.size(), &value, nullptr);
@@ -31,6 +32,13 @@ std::string json_lines(const Json::Value& value, const char* indentation)
     return Json::writeString(builder, value);
 }
 
+/// The reader also takes a minus sign alone for a number.
+bool is_json_literal(const std::string& word)
+{
+    static const std::regex literal(R"(true|false|null|-?(0|[1-9]\d*)(\.\d+)?([eE][-+]?\d+)?)");
+    return std::regex_match(word, literal);
+}
+
 bool begins_with_any(const std::string& word, const char* letters)
 {
     return !word.empty() && std::string(letters).find(word.front()) != std::string::npos;
@@ -44,7 +52,7 @@ bool read_word(const std::string& word, bool is_string, Json::Value& value, std:
         error = "not JSON: " + word;
         return false;
     }
-    if (is_string || !parse_json(word, value))
+    if (is_string || !is_json_literal(word) || !parse_json(word, value))
         value = word;
     return true;
 }
