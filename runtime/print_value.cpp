@@ -103,4 +103,19 @@ void fprint_array(FILE* file, const Meta_Value& value, Type type)
     }
 }
 
+void print_string(const char* text)
+{
+    fprint_string(stdout, text);
+}
+
+void print_scalar(const Meta_Value& value, Type type)
+{
+    fprint_scalar(stdout, value, type);
+}
+
+void print_array(const Meta_Value& value, Type type)
+{
+    fprint_array(stdout, value, type);
+}
+
 } // namespace KPRV

@@ -23,4 +23,9 @@ void fprint_scalar(FILE* file, const Meta_Value& value, Type type);
 /// The elements of an array property's default, joined by ", ", without braces.
 void fprint_array(FILE* file, const Meta_Value& value, Type type);
 
+// The three on standard output.
+void print_string(const char* text);
+void print_scalar(const Meta_Value& value, Type type);
+void print_array(const Meta_Value& value, Type type);
+
 } // namespace KPRV

@@ -226,4 +226,17 @@ TEST(Instance_print, KeysAndEmbeddedObjectsBelow)
               of(x.ptr()));
 }
 
+TEST(print_value, LiteralsOnStandardOutput)
+{
+    const uint16 codes[] = {4, 5};
+    const Meta_Value list = {.array_value = {codes, 2}};
+    const Meta_Value text = {.string_value = "a\tb"};
+    testing::internal::CaptureStdout();
+    print_string("c\"");
+    print_scalar(text, STRING);
+    print_array(list, UINT16);
+    fflush(stdout);
+    EXPECT_EQ("\"c\\\"\"\"a\\tb\"4, 5", testing::internal::GetCapturedStdout());
+}
+
 } // namespace KPRV
