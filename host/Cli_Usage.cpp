@@ -21,6 +21,7 @@ Verbs
   rin PATH                          their names
   tree                              the host with its adapters, ports, targets and logical units, as a tree
   graph                             the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg
+  conform                           what a client of the Storage HBA profile expects, beside what it finds
   watch [CLASS]                     subscribe to indications (default: KALDERA_AlertIndication) and write each as it
                                     comes, until interrupted
   rpc METHOD [PARAMETER...]         call a method of the agent's JSON-RPC protocol; "+" stands before a further call

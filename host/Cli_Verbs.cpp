@@ -1,5 +1,6 @@
 #include "host/Cli_Verbs.h"
 
+#include "host/Cli_Conform.h"
 #include "host/Cli_Rpc.h"
 #include "host/Cli_Watch.h"
 
@@ -27,6 +28,7 @@ constexpr Cli_Verb verbs[] = {
     {"rin",     1, 1,   "PATH",                       nullptr},
     {"tree",    0, 0,   "",                           nullptr},
     {"graph",   0, 0,   "",                           nullptr},
+    {"conform", 0, 0,   "",                           run_conform},
     {"watch",   0, 1,   "[CLASS]",                    watch},
     {"classes", 0, 1,   "[PATTERN]",                  nullptr},
     {"rpc",     0, any, "METHOD [PARAMETER...]",      run_rpc},

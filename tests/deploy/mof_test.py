@@ -45,9 +45,11 @@ class Mof(DeployCase):
 
     def test_profiles_are_those_of_the_module(self):
         text = (self.share / "mof/kldr_interop.mof").read_text(encoding="utf-8")
-        for class_name in ("KALDERA_RegisteredProfile", "KALDERA_RegisteredSubProfile"):
+        for class_name, count in (("KALDERA_RegisteredProfile", 5), ("KALDERA_RegisteredSubProfile", 10)):
             enumerated = output_of(BUILD / "kldrcim", "ei", class_name, "--format", "mof")
             self.assertEqual(instances_of(text, class_name), instances_of(enumerated, class_name))
+            self.assertEqual(len(instances_of(text, class_name)), count)
+            self.assertLess(text.index(f"class {class_name} "), text.index(f"instance of {class_name} "))
             self.assertEqual(len(re.findall(rf"^class {class_name} :", text, re.M)), 1)
 
     def test_word_size_changes_the_bitness_alone(self):
