@@ -92,6 +92,9 @@ public:
     }
 
     std::vector<Call> calls;
+    /// What the library would tell events to, and what happens as soon as that is set.
+    evtProcessCB event_callback = nullptr;
+    std::function<void()> on_event_callback;
     /// What the entry points that speak no JSON answer.
     const char* version = nullptr;
     uint32 number = 0;
@@ -183,7 +186,12 @@ private:
     template <const char* NAME>
     static void stand_in(evtProcessCBRetVoidFP& variable)
     {
-        variable = [](evtProcessCB) { current()->calls.push_back({NAME, {}}); };
+        variable = [](evtProcessCB callback) {
+            current()->calls.push_back({NAME, callback != nullptr});
+            current()->event_callback = callback;
+            if (current()->on_event_callback)
+                current()->on_event_callback();
+        };
     }
     template <const char* NAME>
     static void stand_in(log4cxxMsgRetVoidFP& variable)

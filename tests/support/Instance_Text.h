@@ -1,6 +1,7 @@
 #pragma once
 
 #include "runtime/Array.h"
+#include "runtime/Datetime.h"
 #include "runtime/Instance.h"
 #include "runtime/features.h"
 
@@ -32,6 +33,12 @@ inline std::string scalar(const bool& value)
     return value ? "true" : "false";
 }
 
+template <>
+inline std::string scalar(const Datetime& value)
+{
+    return value.ascii().c_str();
+}
+
 template <class T>
 std::string cell(const void* address, bool array)
 {
@@ -58,6 +65,10 @@ inline std::string cell(uint16 type, const void* address, bool array)
         return cell<sint32>(address, array);
     case UINT64:
         return cell<uint64>(address, array);
+    case SINT64:
+        return cell<sint64>(address, array);
+    case DATETIME:
+        return cell<Datetime>(address, array);
     case STRING:
         return cell<String>(address, array);
     default:
