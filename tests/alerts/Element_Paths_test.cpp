@@ -16,8 +16,8 @@ TEST(Element_Paths, NameTheElementAsAClientOfTheHostSeesIt)
         "//10.0.0.1/root/kaldera:KALDERA_EthernetPort.SystemCreationClassName=\"KALDERA_ComputerSystem\","
         "SystemName=\"10.0.0.1\",CreationClassName=\"KALDERA_EthernetPort\",DeviceID=\"024b4c200000\"",
         getEthernetPortObjectPath("024b4c200000").c_str());
-    EXPECT_STREQ("//10.0.0.1/root/kaldera:KALDERA_ComputerSystem.CreationClassName="
-                 "\"KALDERA_ComputerSystem\",Name=\"10.0.0.1\"",
+    EXPECT_STREQ("//10.0.0.1/root/kaldera:KALDERA_ComputerSystem.Name=\"10.0.0.1\","
+                 "CreationClassName=\"KALDERA_ComputerSystem\"",
                  getComputerSystemObjectPath().c_str());
     EXPECT_STREQ("//10.0.0.1/root/kaldera:KALDERA_AgentService.Name=\"Kaldera Agent Service Provider\"",
                  getAgentServiceObjectPath().c_str());

@@ -151,7 +151,7 @@ TEST_F(Processed_Events, HaveTheseMessageArguments)
     EXPECT_EQ("{, aa}", arguments(2, 6, few + R"(, "pomLevel": null)"));
     EXPECT_EQ("{aa, 20:00}", arguments(2, 13, all));
     EXPECT_EQ("{aa}", arguments(2, 13, few));
-    EXPECT_EQ("{}", arguments(2, 1, "").substr(0, 1) + "}") << "one empty text";
+    EXPECT_EQ(1u, alerts_of(2, 1).at(0)->MessageArguments.value.size()) << "one empty text";
     for (const int id : {1, 2}) {
         EXPECT_EQ("{}", arguments(3, id, all));
         EXPECT_EQ("{aa}", arguments(8, id, all));
@@ -195,7 +195,7 @@ TEST_F(Processed_Events, OfASwitchedEthernetPortFollowTheRegistry)
     const std::string more =
         R"("portIndexString": "024b4c200000", "eventMsg": "as told", "eventSeverity": 1)";
     const std::string system = "//10.0.0.1/root/kaldera:KALDERA_ComputerSystem."
-                               "CreationClassName=\"KALDERA_ComputerSystem\",Name=\"10.0.0.1\"";
+                               "Name=\"10.0.0.1\",CreationClassName=\"KALDERA_ComputerSystem\"";
     for (const auto& [id, word] : {std::pair{3, "enabled"}, {4, "disabled"}}) {
         library.calls.clear();
         const std::vector<Alert> alerts = alerts_of(10, id, more);
