@@ -7,6 +7,7 @@
 #include "host/Cli_Verbs.h"
 #include "host/Host.h"
 #include "host/Module_Search.h"
+#include "host/Server_Instances_File.h"
 #include "host/Type_Words.h"
 #include "host/Typed_Input.h"
 
@@ -247,6 +248,9 @@ int run_cli(const std::vector<std::string>& arguments)
     auto host = Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
     if (!host)
         return complain("cannot load the provider module: " + error, USAGE_ERROR);
+    if (!options.server_instances.empty() &&
+        !read_server_instances(options.server_instances, host->catalogue(), host->store(), error))
+        return complain(error, USAGE_ERROR);
     warn_without_adapter_library(*host);
     const Verb_Body body = find_verb(options.verb)->body;
     int status = body ? body(options, *host) : Cli(options, *host).run();

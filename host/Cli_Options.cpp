@@ -106,6 +106,7 @@ constexpr Option option_table[] = {
     {"--namespace",   set_text<&Cli_Options::name_space>,      nullptr,                   nullptr},
     {"--module",      set_text<&Cli_Options::module>,          nullptr,                   nullptr},
     {"--user",        set_user,                                nullptr,                   nullptr},
+    {"--server-instances", set_text<&Cli_Options::server_instances>, nullptr,             nullptr},
     {"--assoc",       set_filter<&Filter::association_class>,  nullptr,                   "ai ain ri rin"},
     {"--result",      set_filter<&Filter::result_class>,       nullptr,                   "ai ain"},
     {"--role",        set_filter<&Filter::role>,               nullptr,                   "ai ain ri rin"},

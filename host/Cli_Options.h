@@ -20,6 +20,8 @@ struct Cli_Options
     /// Empty: look for it.
     std::string module;
     std::optional<std::string> user;
+    /// File of what the server's own name spaces hold; empty for none.
+    std::string server_instances;
     /// As the four options give it; references take the association class as their result class.
     Association_Filter filter;
     /// What a tree or graph shows besides ports and storage.

@@ -36,6 +36,8 @@ Options
   --module FILE             provider library (default: libkldrprovider_Module.so beside this program, then in
                             ../lib/cim and /usr/lib/cim, then on the library search path)
   --user NAME               authenticated user that the provider sees (default: none)
+  --server-instances FILE   JSON of what the server's own name spaces hold, for providers that ask the server
+                            (default: it has none besides --namespace)
   --assoc CLASS             ai, ain, ri, rin: only this association class and its subclasses
                             (default: every one that can hold the class of PATH)
   --role ROLE               ai, ain, ri, rin: only where PATH stands in this role

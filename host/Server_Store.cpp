@@ -36,6 +36,35 @@ void Server_Store::add(const std::string& name_space, Instance_Value instance)
     spaces_[lower_name(name_space)].instances.push_back(std::move(instance));
 }
 
+void Server_Store::add_class(const std::string& name_space, const std::string& class_name,
+                             const std::string& superclass)
+{
+    std::lock_guard lock(mutex_);
+    std::string& known = spaces_[lower_name(name_space)].classes[lower_name(class_name)];
+    if (!superclass.empty())
+        known = lower_name(superclass);
+}
+
+void Server_Store::refuse(const std::string& name_space, CMPIrc rc)
+{
+    std::lock_guard lock(mutex_);
+    spaces_[lower_name(name_space)].refusal = rc;
+}
+
+bool Server_Store::Name_Space::is_a(const Class_Catalogue& catalogue, const std::string& class_name,
+                                    const std::string& ancestor) const
+{
+    std::string name = class_name;
+    // Whoever names a class as its own ancestor should not be waited for.
+    for (std::size_t step = 0; step <= classes.size() && !name.empty(); ++step) {
+        if (catalogue.is_a(name, ancestor))
+            return true;
+        auto at = classes.find(lower_name(name));
+        name = at == classes.end() ? "" : at->second;
+    }
+    return false;
+}
+
 void Server_Store::on_method(const std::string& name_space, const std::string& class_name,
                              const std::string& method, Method answer)
 {
@@ -52,17 +81,23 @@ bool Server_Store::has_name_space(const std::string& name_space) const
 bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& path) const
 {
     std::lock_guard lock(mutex_);
-    auto space = spaces_.find(lower_name(path.name_space));
-    if (space == spaces_.end())
+    auto found = spaces_.find(lower_name(path.name_space));
+    if (found == spaces_.end())
         return false;
-    std::string prefix = lower_name(path.class_name) + ".";
-    auto method = space->second.methods.lower_bound(prefix);
-    if (method != space->second.methods.end() && method->first.starts_with(prefix))
+    const Name_Space& space = found->second;
+    if (space.refusal)
         return true;
-    const auto& instances = space->second.instances;
-    return std::any_of(instances.begin(), instances.end(), [&](const Instance_Value& instance) {
-        return catalogue.is_a(instance.path.class_name, path.class_name);
-    });
+    std::string prefix = lower_name(path.class_name) + ".";
+    auto method = space.methods.lower_bound(prefix);
+    if (method != space.methods.end() && method->first.starts_with(prefix))
+        return true;
+    auto fits = [&](const std::string& class_name) {
+        return space.is_a(catalogue, class_name, path.class_name);
+    };
+    return std::any_of(space.instances.begin(), space.instances.end(),
+                       [&](const Instance_Value& instance) { return fits(instance.path.class_name); }) ||
+           std::any_of(space.classes.begin(), space.classes.end(),
+                       [&](const auto& known) { return fits(known.first); });
 }
 
 std::vector<Instance_Value> Server_Store::instances(const std::string& name_space) const
@@ -82,6 +117,8 @@ Result Server_Store::run(const Class_Catalogue& catalogue, const Request& reques
 {
     std::unique_lock lock(mutex_);
     Name_Space& space = spaces_[lower_name(request.path.name_space)];
+    if (space.refusal)
+        return failed(*space.refusal);
     switch (request.operation) {
     case Operation::ENUMERATE_INSTANCES:
     case Operation::ENUMERATE_INSTANCE_NAMES:
@@ -109,7 +146,7 @@ Result Server_Store::enumerate(const Class_Catalogue& catalogue, const Name_Spac
 {
     Result result;
     for (const Instance_Value& instance : space.instances) {
-        if (!catalogue.is_a(instance.path.class_name, request.path.class_name))
+        if (!space.is_a(catalogue, instance.path.class_name, request.path.class_name))
             continue;
         if (request.operation == Operation::ENUMERATE_INSTANCES)
             result.instances.push_back(instance);

@@ -119,4 +119,11 @@ const char* status_name(int rc)
     return at == std::end(statuses) ? "unknown status" : at->name;
 }
 
+int status_of_name(const std::string& name)
+{
+    auto at = std::find_if(std::begin(statuses), std::end(statuses),
+                           [&](const Status& status) { return name == status.name; });
+    return at == std::end(statuses) ? -1 : at->rc;
+}
+
 } // namespace KPRV::host
