@@ -1,6 +1,7 @@
 #include "host/Cli.h"
 
 #include "host/Association_Routing.h"
+#include "host/Cli_Complaints.h"
 #include "host/Cli_Options.h"
 #include "host/Cli_Output.h"
 #include "host/Cli_Topology.h"
@@ -8,7 +9,6 @@
 #include "host/Host.h"
 #include "host/Module_Search.h"
 #include "host/Server_Instances_File.h"
-#include "host/Type_Words.h"
 #include "host/Typed_Input.h"
 
 #include <dlfcn.h>
@@ -16,15 +16,6 @@
 namespace KPRV::host {
 
 namespace {
-
-constexpr int USAGE_ERROR = 2;
-
-/// One line on standard error.
-int complain(const std::string& text, int status)
-{
-    std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
-    return status;
-}
 
 /// Runs one verb on an open module.
 class Cli
@@ -139,11 +130,6 @@ private:
         return true;
     }
 
-    static std::string code_text(CMPIrc rc)
-    {
-        return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
-    }
-
     std::string status_text(const Request& request, const Result& result) const
     {
         std::string text = code_text(result.rc);
@@ -163,15 +149,6 @@ private:
     {
         bool named = is_association_operation(request.operation) && !named_association(request).empty();
         return named ? named_association(request) : request.path.class_name;
-    }
-
-    /// What is missing from an answer should not look as if it were not there.
-    static void warn_of(const std::vector<Provider_Failure>& failures)
-    {
-        for (const Provider_Failure& failure : failures)
-            complain("warning: no answer from " + failure.provider_class + ": " + code_text(failure.rc) +
-                         (failure.message.empty() ? "" : ": " + failure.message),
-                     0);
     }
 
     int draw()

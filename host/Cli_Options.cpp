@@ -115,7 +115,7 @@ constexpr Option option_table[] = {
     {"--count",       set_count,                               nullptr,                   "watch"},
     {"--software",    nullptr,                                 &Cli_Options::software,    "tree graph"},
     {"--connectors",  nullptr,                                 &Cli_Options::connectors,  "tree graph"},
-    {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree"},
+    {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree profiles"},
     {"--raw",         set_raw,                                 nullptr,                   "rpc"},
     {"--list",        nullptr,                                 &Cli_Options::list_methods, "rpc"},
     {"--leaks",       nullptr,                                 &Cli_Options::leaks,       nullptr},
@@ -155,7 +155,7 @@ bool check_sense(const Cli_Options& options, const std::vector<const Option*>& g
             return false;
         }
     using Format = Cli_Options::Format;
-    const bool no_mof = options.verb == "tree" || options.verb == "rpc";
+    const bool no_mof = options.verb == "tree" || options.verb == "profiles" || options.verb == "rpc";
     if ((options.verb == "graph" && options.format != Format::TABLE) ||
         (no_mof && options.format == Format::MOF)) {
         error = "--format " + std::string(options.format == Format::MOF ? "mof" : "json") +

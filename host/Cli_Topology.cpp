@@ -1,28 +1,11 @@
 #include "host/Cli_Topology.h"
 
+#include "host/Branch_Text.h"
 #include "host/Topology_Text.h"
 
-#include <clocale>
-#include <cstring>
-#include <langinfo.h>
-#include <locale.h>
+#include <cstdio>
 
 namespace KPRV::host {
-
-namespace {
-
-/// Asked of the environment's locale without making it the process's: the module should not notice.
-bool locale_is_utf8()
-{
-    locale_t locale = newlocale(LC_CTYPE_MASK, "", nullptr);
-    if (!locale)
-        return false;
-    bool utf8 = std::strcmp(nl_langinfo_l(CODESET, locale), "UTF-8") == 0;
-    freelocale(locale);
-    return utf8;
-}
-
-} // namespace
 
 bool write_topology(const Cli_Options& options, Host& host, std::vector<Provider_Failure>& failures)
 {

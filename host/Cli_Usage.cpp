@@ -21,6 +21,7 @@ Verbs
   rin PATH                          their names
   tree                              the host with its adapters, ports, targets and logical units, as a tree
   graph                             the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg
+  profiles                          the registered profiles and what conforms to each, as a tree
   conform                           what a client of the Storage HBA profile expects, beside what it finds
   watch [CLASS]                     subscribe to indications (default: KALDERA_AlertIndication) and write each as it
                                     comes, until interrupted
@@ -46,7 +47,7 @@ Options
   --filter NS               watch: a filter in this namespace, instead of --namespace; may be given several times
   --count N                 watch: end after N indications
   --software, --connectors  tree, graph: also firmware and drivers, cards and transceivers
-  --ascii                   tree: no box-drawing characters (default where the locale is not UTF-8)
+  --ascii                   tree, profiles: no box-drawing characters (default where the locale is not UTF-8)
   --leaks                   say on standard error which CMPI objects the provider did not release
   --help, --version
 

@@ -40,6 +40,21 @@ std::string json_object(const std::vector<std::pair<std::string, std::string>>& 
     return between("{}", lines, indent);
 }
 
+std::string json_branch(const Json_Branch& branch, unsigned indent)
+{
+    std::vector<std::string> facts;
+    for (const std::string& fact : branch.facts)
+        facts.push_back(json_string(fact));
+    std::vector<std::pair<std::string, std::string>> members = {
+        {"kind", json_string(branch.kind)}, {"what", json_string(branch.what)},
+        {"name", json_string(branch.name)}, {"facts", json_array(facts, indent + 2)},
+        {"path", json_string(branch.path)},
+    };
+    if (!branch.children.empty())
+        members.emplace_back("children", json_array(branch.children, indent + 2));
+    return json_object(members, indent);
+}
+
 std::string json_values(const std::vector<Named_Value>& values, unsigned indent)
 {
     std::vector<std::pair<std::string, std::string>> members;

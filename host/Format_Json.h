@@ -17,6 +17,19 @@ std::string json_string(const std::string& text);
 std::string json_array(const std::vector<std::string>& elements, unsigned indent = 0);
 std::string json_object(const std::vector<std::pair<std::string, std::string>>& members, unsigned indent = 0);
 
+/// One object of a tree, as `tree` and `profiles` write it.
+struct Json_Branch
+{
+    std::string kind;
+    std::string what;
+    std::string name;
+    std::vector<std::string> facts;
+    std::string path;
+    /// Composed objects.
+    std::vector<std::string> children;
+};
+std::string json_branch(const Json_Branch& branch, unsigned indent = 0);
+
 /// The values as members of an object.
 std::string json_values(const std::vector<Named_Value>& values, unsigned indent = 0);
 

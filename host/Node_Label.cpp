@@ -45,13 +45,6 @@ std::string word(const char* const (&words)[Count], std::uint64_t number)
     return number < Count ? words[number] : "state " + std::to_string(number);
 }
 
-/// The property's text on one line; empty for a null or missing one.
-std::string text(const Instance_Value& instance, const char* property)
-{
-    const Value* value = instance.property(property);
-    return value && !value->null ? visible_text(plain_text(*value)) : "";
-}
-
 /// The number, or the first of an array.
 std::optional<std::uint64_t> number(const Instance_Value& instance, const char* property)
 {
@@ -79,55 +72,56 @@ std::string operational_state(const Instance_Value& instance)
 
 Node_Label system_label(const Instance_Value& system)
 {
-    return {"host", text(system, "Name"), {operational_state(system)}};
+    return {"host", line_of(system, "Name"), {operational_state(system)}};
 }
 
 Node_Label adapter_label(const Instance_Value& adapter)
 {
-    std::string kind = text(adapter, "Caption"), serial = text(adapter, "Name");
+    std::string kind = line_of(adapter, "Caption"), serial = line_of(adapter, "Name");
     return {kind.empty() ? "adapter" : kind,
-            serial + (serial.empty() ? "" : " ") + "(" + text(adapter, "DeviceID") + ")",
+            serial + (serial.empty() ? "" : " ") + "(" + line_of(adapter, "DeviceID") + ")",
             {operational_state(adapter)}};
 }
 
 Node_Label software_label(const Instance_Value& software)
 {
-    std::string version = text(software, "VersionString");
+    std::string version = line_of(software, "VersionString");
     switch (number(software, "Classifications").value_or(0)) {
     case 2:
-        return {"driver", text(software, "InstanceID"), {version}};
+        return {"driver", line_of(software, "InstanceID"), {version}};
     case 10:
         return {"firmware", version, {}};
     case 32770:
         return {"BIOS", version, {}};
     default:
-        return {"software", text(software, "InstanceID"), {version}};
+        return {"software", line_of(software, "InstanceID"), {version}};
     }
 }
 
 Node_Label card_label(const Instance_Value& card)
 {
-    return {"card", text(card, "Model"), {text(card, "SerialNumber"), text(card, "PartNumber")}};
+    return {"card", line_of(card, "Model"), {line_of(card, "SerialNumber"), line_of(card, "PartNumber")}};
 }
 
 Node_Label connector_label(const Instance_Value& connector)
 {
     return {"transceiver",
-            text(connector, "Tag"),
-            {text(connector, "Manufacturer"), text(connector, "PartNumber"), text(connector, "Description")}};
+            line_of(connector, "Tag"),
+            {line_of(connector, "Manufacturer"), line_of(connector, "PartNumber"),
+             line_of(connector, "Description")}};
 }
 
 Node_Label port_label(const char* what, const std::string& device, const Instance_Value& port)
 {
     return {what,
-            colon_form(text(port, "DeviceID")),
+            colon_form(line_of(port, "DeviceID")),
             {device, speed_text(number(port, "Speed").value_or(0)), state(port)}};
 }
 
 /// An endpoint at the far side is named for both sides of the path: near address, "_", far address.
 Node_Label endpoint_label(const char* what, const Instance_Value& endpoint)
 {
-    std::string name = text(endpoint, "Name");
+    std::string name = line_of(endpoint, "Name");
     return {what, colon_form(name.substr(name.find('_') + 1)), {state(endpoint)}};
 }
 
@@ -147,11 +141,11 @@ std::string product_of(const std::string& id, const std::string& element)
 
 Node_Label unit_label(const Instance_Value& unit)
 {
-    std::string element = text(unit, "ElementName"), id = text(unit, "DeviceID");
+    std::string element = line_of(unit, "ElementName"), id = line_of(unit, "DeviceID");
     bool is_tape = same_name(unit.path.class_name, "KALDERA_TapeDrive");
     return {is_tape ? "tape" : "disk",
             element.empty() ? id : element,
-            {product_of(id, element), text(unit, "Name")}};
+            {product_of(id, element), line_of(unit, "Name")}};
 }
 
 Node_Label label_of(const Topology::Node& node)
@@ -170,7 +164,7 @@ Node_Label label_of(const Topology::Node& node)
     case Node_Kind::FC_PORT:
         return port_label("FC port", "", node.instance);
     case Node_Kind::ETHERNET_PORT:
-        return port_label("Ethernet port", text(node.instance, "ElementName"), node.instance);
+        return port_label("Ethernet port", line_of(node.instance, "ElementName"), node.instance);
     case Node_Kind::INITIATOR:
         return endpoint_label("initiator", node.instance);
     case Node_Kind::TARGET:
@@ -181,6 +175,12 @@ Node_Label label_of(const Topology::Node& node)
 }
 
 } // namespace
+
+std::string line_of(const Instance_Value& instance, const char* property)
+{
+    const Value* value = instance.property(property);
+    return value && !value->null ? visible_text(plain_text(*value)) : "";
+}
 
 Node_Label node_label(const Topology::Node& node)
 {

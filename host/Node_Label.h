@@ -17,6 +17,9 @@ struct Node_Label
 
 Node_Label node_label(const Topology::Node& node);
 
+/// A property's text on one line; empty for a null or missing one.
+std::string line_of(const Instance_Value& instance, const char* property);
+
 /// "WHAT NAME FACT, FACT".
 std::string label_line(const Node_Label& label);
 

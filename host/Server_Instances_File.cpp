@@ -150,10 +150,12 @@ private:
             Value value = feature ? typed(written, feature->type, class_name + "." + name)
                                   : guessed(written, class_name + "." + name);
             const std::string& spelled = feature ? feature->name : name;
-            if (feature && feature->key && !value.null)
-                set_value(instance.path.keys, spelled, value);
             set_value(instance.properties, spelled, std::move(value));
         }
+        // In the order of the class: members of JSON have none.
+        for (const Feature_Info& feature : info ? info->properties : std::vector<Feature_Info>())
+            if (const Value* value = instance.property(feature.name); feature.key && value && !value->null)
+                set_value(instance.path.keys, feature.name, *value);
         return instance;
     }
 

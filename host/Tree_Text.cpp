@@ -1,4 +1,5 @@
 // The tree of a topology, for people and as JSON.
+#include "host/Branch_Text.h"
 #include "host/Format_Json.h"
 #include "host/Node_Label.h"
 #include "host/Topology_Text.h"
@@ -9,18 +10,6 @@ namespace KPRV::host {
 namespace {
 
 using Branch = Topology::Branch;
-
-/// What stands before a line: the last child of its parent ends the parent's line of descent.
-struct Twigs
-{
-    const char* child;
-    const char* last_child;
-    const char* passing;
-    const char* nothing;
-};
-
-constexpr Twigs boxes = {"├─ ", "└─ ", "│  ", "   "};
-constexpr Twigs plain = {"|- ", "`- ", "|  ", "   "};
 
 /// The branches that have a line, those of initiators in the place of the initiators.
 std::vector<const Branch*> shown(const Topology& topology, const std::vector<Branch>& branches)
@@ -37,61 +26,32 @@ std::vector<const Branch*> shown(const Topology& topology, const std::vector<Bra
     return result;
 }
 
-class Tree_Text
+std::vector<Text_Branch> lines_of(const Topology& topology, const std::vector<Branch>& branches)
 {
-public:
-    Tree_Text(const Topology& topology, const Twigs& twigs) : topology_(topology), twigs_(twigs) {}
-
-    std::string draw()
-    {
-        for (const Branch* root : shown(topology_, topology_.roots))
-            add(*root, "", "");
-        return std::move(text_);
-    }
-
-private:
-    void add(const Branch& branch, const std::string& before, const std::string& before_children)
-    {
-        text_ += before + label_line(node_label(topology_.nodes[branch.node])) + "\n";
-        std::vector<const Branch*> children = shown(topology_, branch.children);
-        for (const Branch* child : children) {
-            bool last = child == children.back();
-            add(*child, before_children + (last ? twigs_.last_child : twigs_.child),
-                before_children + (last ? twigs_.nothing : twigs_.passing));
-        }
-    }
-
-    const Topology& topology_;
-    const Twigs& twigs_;
-    std::string text_;
-};
+    std::vector<Text_Branch> lines;
+    for (const Branch* branch : shown(topology, branches))
+        lines.push_back(
+            {label_line(node_label(topology.nodes[branch->node])), lines_of(topology, branch->children)});
+    return lines;
+}
 
 std::string json_of(const Topology& topology, const Branch& branch, unsigned indent)
 {
     const Topology::Node& node = topology.nodes[branch.node];
     Node_Label label = node_label(node);
-    std::vector<std::string> facts, children;
-    for (const std::string& fact : label.facts)
-        facts.push_back(json_string(fact));
+    std::vector<std::string> children;
     for (const Branch* child : shown(topology, branch.children))
         children.push_back(json_of(topology, *child, indent + 4));
-    std::vector<std::pair<std::string, std::string>> members = {
-        {"kind", json_string(node_kind_name(node.kind))},
-        {"what", json_string(label.what)},
-        {"name", json_string(label.name)},
-        {"facts", json_array(facts, indent + 2)},
-        {"path", json_string(path_text(node.instance.path))},
-    };
-    if (!children.empty())
-        members.emplace_back("children", json_array(children, indent + 2));
-    return json_object(members, indent);
+    return json_branch({node_kind_name(node.kind), label.what, label.name, label.facts,
+                        path_text(node.instance.path), std::move(children)},
+                       indent);
 }
 
 } // namespace
 
 std::string tree_text(const Topology& topology, bool ascii)
 {
-    return Tree_Text(topology, ascii ? plain : boxes).draw();
+    return branch_text(lines_of(topology, topology.roots), ascii);
 }
 
 std::string tree_json(const Topology& topology)

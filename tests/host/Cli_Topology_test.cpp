@@ -198,7 +198,7 @@ TEST(Cli_Topology, OptionsThatMakeNoSense)
         {"rin x --result-role R", "--result-role makes no sense for rin; it is for ai ain"},
         {"ei x --assoc C", "--assoc makes no sense for ei; it is for ai ain ri rin"},
         {"gi x --role=R", "--role makes no sense for gi; it is for ai ain ri rin"},
-        {"ain x --ascii", "--ascii makes no sense for ain; it is for tree"},
+        {"ain x --ascii", "--ascii makes no sense for ain; it is for tree profiles"},
         {"ei x --software", "--software makes no sense for ei; it is for tree graph"},
         {"tree --format mof", "--format mof makes no sense for tree"},
         {"graph --format json", "--format json makes no sense for graph"},

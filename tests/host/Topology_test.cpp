@@ -1,4 +1,5 @@
 // The walk over the small host: what it finds, and what it asks.
+#include "host/Profile_Tree.h"
 #include "host/Topology_Text.h"
 
 #include "Toy_Host.h"
@@ -30,8 +31,21 @@ TEST_F(Topology_Test, AsksEachClassOnce)
     walk_topology(index, {.software = true, .connectors = true, .cross_links = true});
     EXPECT_TRUE(index.failures().empty());
     for (const std::string& name : host->catalogue().class_names()) {
-        bool of_the_plan = name.starts_with("KALDERA_");
+        // Profiles have a tree of their own.
+        bool of_the_plan = name.starts_with("KALDERA_") && name.find("Profile") == name.npos;
         EXPECT_EQ(of_the_plan ? 1u : 0u, count(name)) << name;
+    }
+}
+
+TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
+{
+    Association_Index index(*host);
+    walk_profiles(index, host->catalogue());
+    EXPECT_TRUE(index.failures().empty());
+    for (const std::string& name : host->catalogue().class_names()) {
+        bool asked =
+            name == "TOY_Service" || (name.starts_with("KALDERA_") && name.find("Profile") != name.npos);
+        EXPECT_EQ(asked ? 1u : 0u, count(name)) << name;
     }
 }
 

@@ -31,6 +31,16 @@ const std::vector<Fabric_Class> fabric_classes = {
     {"KALDERA_HostedDependency",                   nullptr,         nullptr, "Antecedent:KALDERA_EthernetPort Dependent:KALDERA_FCPort", true},
     {"KALDERA_DeviceSAPImplementation",            nullptr,         nullptr, "Antecedent:KALDERA_FCPort Dependent:KALDERA_SCSIProtocolEndpoint", true},
     {"KALDERA_SCSIInitiatorTargetLogicalUnitPath", nullptr,         nullptr, "Initiator:KALDERA_SCSIProtocolEndpoint Target:KALDERA_SCSIProtocolEndpoint LogicalUnit:TOY_Element", true},
+    {"TOY_Profiled",                   "TOY_Element", "",             nullptr, false},
+    {"TOY_Service",                    "TOY_Profiled", "Name",        nullptr, true},
+    {"CIM_RegisteredProfile",          "TOY_Profiled", "",            nullptr, false},
+    {"CIM_RegisteredSubProfile",       "CIM_RegisteredProfile", "",   nullptr, false},
+    {"KALDERA_RegisteredProfile",      "CIM_RegisteredProfile", "InstanceID", nullptr, true},
+    {"KALDERA_RegisteredSubProfile",   "CIM_RegisteredSubProfile", "InstanceID", nullptr, true},
+    {"KALDERA_ProfileSoftwareIdentity", "TOY_Element", "InstanceID",  nullptr, true},
+    {"KALDERA_ElementConformsToProfile",           nullptr,         nullptr, "ConformantStandard:CIM_RegisteredProfile ManagedElement:TOY_Profiled", true},
+    {"KALDERA_SubProfileRequiresProfile",          nullptr,         nullptr, "Antecedent:CIM_RegisteredProfile Dependent:CIM_RegisteredSubProfile", true},
+    {"KALDERA_ProfileElementSoftwareIdentity",     nullptr,         nullptr, "Antecedent:KALDERA_ProfileSoftwareIdentity Dependent:CIM_RegisteredProfile", true},
     // Fails whenever it is asked.
     {"TOY_Broken",                                 nullptr,         nullptr, "Antecedent:KALDERA_TapeDrive Dependent:KALDERA_TapeDrive", true},
 };
@@ -39,6 +49,7 @@ const std::vector<Fabric_Property> fabric_properties = {
     {"Name", 's'}, {"DeviceID", 's'}, {"Tag", 's'}, {"InstanceID", 's'}, {"Caption", 's'}, {"ElementName", 's'},
     {"Model", 's'}, {"SerialNumber", 's'}, {"PartNumber", 's'}, {"Manufacturer", 's'}, {"Description", 's'},
     {"VersionString", 's'}, {"EnabledState", 'n'}, {"Speed", 'N'}, {"OperationalStatus", 'a'}, {"Classifications", 'a'},
+    {"RegisteredName", 's'}, {"RegisteredVersion", 's'}, {"RegisteredOrganization", 'n'},
 };
 
 const std::vector<Fabric_Object> fabric_objects = {
@@ -63,6 +74,17 @@ const std::vector<Fabric_Object> fabric_objects = {
     {"KALDERA_StorageExtent",           "DeviceID=1000024b4c100000_2000006016000001_ACME_Disk Array_LUN_0;ElementName=LUN_0;Name=naa.6001\\x"},
     {"KALDERA_StorageExtent",           "DeviceID=shared-unit;ElementName=LUN_1;Name=two\nlines"},
     {"KALDERA_TapeDrive",               "DeviceID=tape_only"},
+    // A standard, two profiles that conform to each other, and one that stands alone.
+    {"KALDERA_RegisteredProfile",       "InstanceID=round;RegisteredName=Round"},
+    {"KALDERA_RegisteredProfile",       "InstanceID=std;RegisteredName=Standard;RegisteredVersion=1.0;RegisteredOrganization=11"},
+    {"KALDERA_RegisteredProfile",       "InstanceID=p;RegisteredName=Profile P;RegisteredVersion=2.0;RegisteredOrganization=2"},
+    {"KALDERA_RegisteredProfile",       "InstanceID=alone;RegisteredName=Alone;RegisteredOrganization=7"},
+    {"KALDERA_RegisteredSubProfile",    "InstanceID=orphan;RegisteredName=Orphan"},
+    {"KALDERA_RegisteredSubProfile",    "InstanceID=sub;RegisteredName=Sub;RegisteredVersion=3.0"},
+    {"KALDERA_RegisteredSubProfile",    "InstanceID=other;RegisteredName=Other"},
+    {"TOY_Service",                     "Name=manager"},
+    {"KALDERA_ProfileSoftwareIdentity", "InstanceID=sw1;ElementName=Software 1;VersionString=3.2.3.0;Manufacturer=KLDR"},
+    {"KALDERA_ProfileSoftwareIdentity", "InstanceID=sw2;ElementName=Software\n2"},
 };
 
 const std::vector<Fabric_Link> fabric_links = {
@@ -91,6 +113,20 @@ const std::vector<Fabric_Link> fabric_links = {
     {"KALDERA_SCSIInitiatorTargetLogicalUnitPath", {"1000024b4c100000", "1000024b4c100000_2000006016000001", "shared-unit"}},
     {"KALDERA_SCSIInitiatorTargetLogicalUnitPath", {"1000024b4c100000", "shared_2000006016000002", "tape_only"}},
     {"KALDERA_SCSIInitiatorTargetLogicalUnitPath", {"1000024b4c100001", "shared_2000006016000002", "shared-unit"}},
+    {"KALDERA_ElementConformsToProfile",           {"p", "manager"}},
+    {"KALDERA_ElementConformsToProfile",           {"std", "p"}},
+    {"KALDERA_ElementConformsToProfile",           {"p", "round"}},
+    {"KALDERA_ElementConformsToProfile",           {"round", "p"}},
+    {"KALDERA_ElementConformsToProfile",           {"std", "orphan"}},
+    {"KALDERA_ElementConformsToProfile",           {"std", "sub"}},
+    {"KALDERA_ElementConformsToProfile",           {"std", "other"}},
+    {"KALDERA_SubProfileRequiresProfile",          {"p", "sub"}},
+    {"KALDERA_SubProfileRequiresProfile",          {"p", "other"}},
+    {"KALDERA_ProfileElementSoftwareIdentity",     {"sw1", "std"}},
+    {"KALDERA_ProfileElementSoftwareIdentity",     {"sw1", "p"}},
+    {"KALDERA_ProfileElementSoftwareIdentity",     {"sw1", "sub"}},
+    {"KALDERA_ProfileElementSoftwareIdentity",     {"sw2", "other"}},
+    {"KALDERA_ProfileElementSoftwareIdentity",     {"sw1", "orphan"}},
 };
 // clang-format on
 

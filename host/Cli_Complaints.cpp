@@ -1,0 +1,28 @@
+#include "host/Cli_Complaints.h"
+
+#include "host/Type_Words.h"
+
+#include <cstdio>
+
+namespace KPRV::host {
+
+int complain(const std::string& text, int status)
+{
+    std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
+    return status;
+}
+
+std::string code_text(CMPIrc rc)
+{
+    return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
+}
+
+void warn_of(const std::vector<Provider_Failure>& failures)
+{
+    for (const Provider_Failure& failure : failures)
+        complain("warning: no answer from " + failure.provider_class + ": " + code_text(failure.rc) +
+                     (failure.message.empty() ? "" : ": " + failure.message),
+                 0);
+}
+
+} // namespace KPRV::host

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "host/Request.h"
+
+#include <string>
+#include <vector>
+
+namespace KPRV::host {
+
+// What kldrcim says on standard error, one line each.
+
+/// Exit status of wrong usage.
+inline constexpr int USAGE_ERROR = 2;
+
+/// "kldrcim: TEXT"; gives the status back.
+int complain(const std::string& text, int status);
+
+/// "CIM_ERR_NOT_FOUND (6)".
+std::string code_text(CMPIrc rc);
+
+/// A warning for each: what is missing from an answer should not look as if it were not there.
+void warn_of(const std::vector<Provider_Failure>& failures);
+
+} // namespace KPRV::host

@@ -1,0 +1,27 @@
+#include "host/Cli_Profiles.h"
+
+#include "host/Branch_Text.h"
+#include "host/Cli_Complaints.h"
+#include "host/Profile_Text.h"
+
+#include <cstdio>
+
+namespace KPRV::host {
+
+int write_profiles(const Cli_Options& options, Host& host)
+{
+    Association_Index index(host);
+    const std::vector<Profile_Branch> roots = walk_profiles(index, host.catalogue());
+    const std::vector<Provider_Failure>& failures = index.failures();
+    if (!failures.empty() && same_name(failures.front().provider_class, profile_root_class))
+        return complain(
+            code_text(failures.front().rc) + ": no answer from " + failures.front().provider_class, 1);
+    const std::string text = options.format == Cli_Options::Format::JSON
+                                 ? profile_json(roots)
+                                 : profile_text(roots, options.ascii || !locale_is_utf8());
+    std::fwrite(text.data(), 1, text.size(), stdout);
+    warn_of(failures);
+    return 0;
+}
+
+} // namespace KPRV::host

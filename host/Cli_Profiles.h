@@ -1,0 +1,12 @@
+#pragma once
+
+#include "host/Cli_Options.h"
+#include "host/Host.h"
+
+namespace KPRV::host {
+
+/// The verb `profiles`: the registered profiles with what conforms to each. Exit status 1 with a complaint if
+/// the profiles cannot be enumerated; what else cannot be asked is left out with a warning.
+int write_profiles(const Cli_Options& options, Host& host);
+
+} // namespace KPRV::host
