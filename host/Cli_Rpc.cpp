@@ -1,10 +1,10 @@
 #include "host/Cli_Rpc.h"
 
+#include "host/Cli_Complaints.h"
 #include "host/Format_Json.h"
 #include "host/Format_Table.h"
 #include "host/Rpc_Methods.h"
 #include "host/Rpc_Text.h"
-#include "host/Type_Words.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -21,12 +21,6 @@ constexpr const char* agent_name = "Kaldera Agent Service Provider";
 /// Stands between two calls of one command line.
 constexpr const char* next_call = "+";
 
-int complain(const std::string& text, int status)
-{
-    std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
-    return status;
-}
-
 void put_line(const std::string& text)
 {
     std::fwrite(text.data(), 1, text.size(), stdout);
@@ -36,7 +30,7 @@ void put_line(const std::string& text)
 
 std::string failure_text(const Result& result)
 {
-    std::string text = std::string(status_name(result.rc)) + " (" + std::to_string(result.rc) + ")";
+    std::string text = code_text(result.rc);
     if (result.exception)
         return text + ": an exception left the provider: " + *result.exception;
     return result.message.empty() ? text : text + ": " + result.message;
@@ -164,7 +158,6 @@ bool check_rpc(const Cli_Options& options, std::string& error)
 
 int run_rpc(const Cli_Options& options, Host& host)
 {
-    constexpr int USAGE_ERROR = 2;
     if (options.list_methods)
         return list_methods(options);
     Agent agent(host);

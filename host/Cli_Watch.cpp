@@ -1,9 +1,9 @@
 #include "host/Cli_Watch.h"
 
+#include "host/Cli_Complaints.h"
 #include "host/Cli_Output.h"
 #include "host/Convert.h"
 #include "host/Subscription.h"
-#include "host/Type_Words.h"
 
 #include <atomic>
 #include <csignal>
@@ -122,11 +122,9 @@ bool write(const Cli_Options& options, Instance_Value& indication)
     return std::fflush(stdout) == 0;
 }
 
-int complain(const std::string& name_space, const std::string& provider_class, CMPIrc rc)
+int refused(const std::string& name_space, const std::string& provider_class, CMPIrc rc)
 {
-    std::fprintf(stderr, "kldrcim: %s (%d): %s takes no subscription for %s\n", status_name(rc), int(rc),
-                 provider_class.c_str(), name_space.c_str());
-    return 1;
+    return complain(code_text(rc) + ": " + provider_class + " takes no subscription for " + name_space, 1);
 }
 
 } // namespace
@@ -146,7 +144,7 @@ int watch(const Cli_Options& options, Host& host)
     const Interruption interruption;
     for (const std::string& name_space : name_spaces)
         if (const CMPIrc rc = subscription.add(name_space); rc != CMPI_RC_OK)
-            return complain(name_space, provider_class, rc);
+            return refused(name_space, provider_class, rc);
     Instance_Value indication;
     unsigned written = 0;
     while ((options.count == 0 || written < options.count) && inbox.take(indication)) {

@@ -11,7 +11,7 @@ using Verdict = Conformance_Finding::Verdict;
 
 TEST(Conformance, AModuleWithoutProfilesMissesTheThreeAndReachesNothing)
 {
-    auto host = open_toy(TOY_FABRIC);
+    auto host = open_toy(TOY_DESCRIBED);
     std::vector<Conformance_Finding> findings = check_conformance(*host);
     EXPECT_TRUE(misses_something(findings));
     for (const Conformance_Finding& finding : findings) {
@@ -44,11 +44,11 @@ TEST(Conformance, ThePlanStartsEachStepAtAnEarlierOne)
 
 TEST(Conformance, TheProgramSaysSoAndFails)
 {
-    Outcome run = kldrcim("conform", TOY_FABRIC);
+    Outcome run = kldrcim("conform", TOY_DESCRIBED);
     EXPECT_EQ(1, run.status);
     EXPECT_NE(std::string::npos, run.out.find("missing: CIM_ERR_INVALID_CLASS, none\n")) << run.out;
     EXPECT_NE(std::string::npos, run.out.find("\nelements with something missing: 3\n")) << run.out;
-    EXPECT_EQ(2, kldrcim("conform now", TOY_FABRIC).status);
+    EXPECT_EQ(2, kldrcim("conform now", TOY_DESCRIBED).status);
 }
 
 } // namespace
