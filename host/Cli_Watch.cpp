@@ -6,7 +6,9 @@
 #include "host/Subscription.h"
 
 #include <atomic>
+#include <cerrno>
 #include <csignal>
+#include <cstring>
 #include <deque>
 #include <semaphore.h>
 
@@ -109,8 +111,8 @@ struct Sink_Scope
     Host& host;
 };
 
-/// False if nobody reads any more.
-bool write(const Cli_Options& options, Instance_Value& indication)
+/// 0, or the error that the output has.
+int write(const Cli_Options& options, Instance_Value& indication)
 {
     if (options.properties)
         std::erase_if(indication.properties, [&](const Named_Value& property) {
@@ -119,7 +121,7 @@ bool write(const Cli_Options& options, Instance_Value& indication)
     write_instance(options, {indication});
     if (options.format == Cli_Options::Format::TABLE)
         std::putchar('\n');
-    return std::fflush(stdout) == 0;
+    return std::fflush(stdout) == 0 ? 0 : errno;
 }
 
 int refused(const std::string& name_space, const std::string& provider_class, CMPIrc rc)
@@ -146,11 +148,16 @@ int watch(const Cli_Options& options, Host& host)
         if (const CMPIrc rc = subscription.add(name_space); rc != CMPI_RC_OK)
             return refused(name_space, provider_class, rc);
     Instance_Value indication;
-    unsigned written = 0;
-    while ((options.count == 0 || written < options.count) && inbox.take(indication)) {
-        if (!write(options, indication))
+    for (unsigned written = 0; options.count == 0 || written < options.count; ++written) {
+        if (!inbox.take(indication))
             break;
-        ++written;
+        const int error = write(options, indication);
+        if (error == EPIPE)
+            break;
+        if (error != 0) {
+            std::fprintf(stderr, "kldrcim: cannot write: %s\n", std::strerror(error));
+            return 1;
+        }
     }
     return 0;
 }

@@ -6,7 +6,8 @@
 namespace KPRV::host {
 
 /// The verb `watch`: subscribes, writes each indication as it comes, one block each, and unsubscribes when it
-/// is interrupted, when the count is reached or when nobody reads any more. 0, or 1 if the provider refuses.
+/// is interrupted, when the count is reached or when nobody reads any more. 0, or 1 if the provider refuses
+/// or the output cannot be written.
 int watch(const Cli_Options& options, Host& host);
 
 } // namespace KPRV::host

@@ -1,0 +1,281 @@
+// Events of the adapter library on their way through the built module to the subscribers of a server.
+#include "host/Path_Parser.h"
+#include "host/Subscription.h"
+#include "tests/module/Module_Fixture.h"
+
+#include <condition_variable>
+#include <dlfcn.h>
+#include <mutex>
+#include <thread>
+
+namespace KPRV {
+namespace {
+
+const char* const CLASS = "KALDERA_AlertIndication";
+const char* const PORT = "1000024b4c100000";
+
+/// What came in, as "name space text".
+using Texts = std::vector<std::string>;
+
+class Alert_Indications : public Module_Fixture
+{
+protected:
+    void SetUp() override
+    {
+        Module_Fixture::SetUp();
+        open();
+#ifdef __SANITIZE_ADDRESS__
+        // Alerts stay allocated; the leak checker can tell them only while the module is mapped.
+        static void* const pinned = dlopen(KLDR_MODULE, RTLD_NOW);
+        ASSERT_TRUE(pinned);
+#endif
+        server->set_sink([this](const std::string& name_space, const host::Instance_Value& alert) {
+            const std::lock_guard lock(_mutex);
+            _alerts.emplace_back(name_space, alert);
+            _came.notify_all();
+            return CMPI_RC_OK;
+        });
+    }
+
+    static std::string event(int category, int id, const std::string& more = "")
+    {
+        return R"({"eventSeverity": 2, "eventCategory": )" + std::to_string(category) + R"(, "eventId": )" +
+               std::to_string(id) + R"(, "portIndexString": ")" + PORT + "\"" + more + "}";
+    }
+    bool wait_for(size_t count)
+    {
+        std::unique_lock lock(_mutex);
+        return _came.wait_for(lock, std::chrono::seconds(30), [&] { return _alerts.size() >= count; });
+    }
+    std::vector<host::Instance_Value> alerts()
+    {
+        const std::lock_guard lock(_mutex);
+        std::vector<host::Instance_Value> list;
+        for (const auto& [name_space, alert] : _alerts)
+            list.push_back(alert);
+        return list;
+    }
+    /// "name space MessageID" of each, in order.
+    Texts came()
+    {
+        const std::lock_guard lock(_mutex);
+        Texts texts;
+        for (const auto& [name_space, alert] : _alerts)
+            texts.push_back(name_space + " " + text_of(alert, "MessageID"));
+        return texts;
+    }
+    /// Waits for as long as the delivery thread needs for some passes.
+    static void let_pass()
+    {
+        std::this_thread::sleep_for(std::chrono::milliseconds(60));
+    }
+    std::vector<std::string> subscription_calls()
+    {
+        std::vector<std::string> names = simulator.call_names();
+        std::erase_if(names, [](const std::string& name) { return name.find("vent") == std::string::npos; });
+        return names;
+    }
+
+    std::mutex _mutex;
+    std::condition_variable _came;
+    std::vector<std::pair<std::string, host::Instance_Value>> _alerts;
+};
+
+TEST_F(Alert_Indications, ReachASubscriberAsStandardAndProprietaryAlert)
+{
+    host::Subscription subscription(*server, CLASS);
+    mark();
+    ASSERT_EQ(CMPI_RC_OK, subscription.add("root/kaldera"));
+    EXPECT_EQ((Texts{"register_for_events", "registerEventProcessingCb"}), subscription_calls());
+    EXPECT_TRUE(simulator.requests("register_for_events").at(0)["dropOldEvents"].asBool());
+    ASSERT_TRUE(
+        simulator.event(event(2, 11, R"(, "eventMsg": "Link lost", "eventIdValue": "ZNT_PORT_DISCONNECT")")));
+    ASSERT_TRUE(wait_for(2));
+    EXPECT_EQ((Texts{"root/kaldera KLDR131083", "root/kaldera PROPKLDR131083"}), came());
+    const std::vector<host::Instance_Value> both = alerts();
+    for (const host::Instance_Value& alert : both) {
+        EXPECT_EQ(CLASS, alert.path.class_name);
+        EXPECT_EQ("Link lost", text_of(alert, "Message"));
+        EXPECT_EQ("ZNT_PORT_DISCONNECT", text_of(alert, "EventID"));
+        EXPECT_EQ("Base port lost connection with fabric.", text_of(alert, "Description"));
+        EXPECT_EQ("Check switch and HBA configuration. Also, check SFP and cable connection.",
+                  alert.property("RecommendedActions")->elements().at(0).as_text());
+        EXPECT_EQ(PORT, alert.property("MessageArguments")->elements().at(0).as_text());
+    }
+    EXPECT_EQ(6u, both[0].property("PerceivedSeverity")->as_uint());
+    EXPECT_EQ(5u, both[1].property("PerceivedSeverity")->as_uint());
+    EXPECT_EQ(both[0].property("SequenceNumber")->as_sint() + 1,
+              both[1].property("SequenceNumber")->as_sint());
+}
+
+TEST_F(Alert_Indications, NameAnInstanceThatAClientCanGet)
+{
+    host::Subscription subscription(*server, CLASS);
+    subscription.add("root/kaldera");
+    simulator.event(event(2, 1));
+    ASSERT_TRUE(wait_for(1));
+    const std::string path = text_of(alerts()[0], "AlertingManagedElement");
+    const host::Result ports = enumerate("KALDERA_FCPort");
+    const auto is_named = [&](const host::Instance_Value& port) {
+        return path.find("/root/kaldera:KALDERA_FCPort.") != std::string::npos &&
+               path.find("DeviceID=\"" + text_of(port, "DeviceID") + "\"") != std::string::npos &&
+               path.find("SystemName=\"" + text_of(port, "SystemName") + "\"") != std::string::npos;
+    };
+    EXPECT_EQ(1, std::count_if(ports.instances.begin(), ports.instances.end(), is_named)) << path;
+}
+
+TEST_F(Alert_Indications, GoIntoEachNameSpaceWithAFilter)
+{
+    host::Subscription subscription(*server, CLASS);
+    for (const char* name_space : {"root/one", "root/two", "root/one"})
+        ASSERT_EQ(CMPI_RC_OK, subscription.add(name_space));
+    EXPECT_EQ(2u, subscription.count("root/one"));
+    simulator.event(event(4, 1));
+    ASSERT_TRUE(wait_for(2));
+    let_pass();
+    EXPECT_EQ((Texts{"root/one PROPKLDR262145", "root/two PROPKLDR262145"}), came());
+
+    EXPECT_EQ(CMPI_RC_OK, subscription.remove("root/one"));
+    simulator.event(event(4, 2));
+    ASSERT_TRUE(wait_for(4));
+    EXPECT_EQ(CMPI_RC_OK, subscription.remove("root/one"));
+    simulator.event(event(4, 3));
+    ASSERT_TRUE(wait_for(5));
+    let_pass();
+    EXPECT_EQ((Texts{"root/one PROPKLDR262145", "root/two PROPKLDR262145", "root/one PROPKLDR262146",
+                     "root/two PROPKLDR262146", "root/two PROPKLDR262147"}),
+              came());
+    EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, subscription.remove("root/one"));
+    EXPECT_EQ(CMPI_RC_OK, server->deactivate_filter(CLASS, "root/nowhere"));
+}
+
+TEST_F(Alert_Indications, WithoutAFilterAreDropped)
+{
+    ASSERT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+    EXPECT_TRUE(simulator.event(event(2, 1)));
+    let_pass();
+    ASSERT_EQ(CMPI_RC_OK, server->activate_filter(CLASS, "root/kaldera"));
+    EXPECT_TRUE(simulator.event(event(4, 1)));
+    ASSERT_TRUE(wait_for(1));
+    EXPECT_EQ(Texts{"root/kaldera PROPKLDR262145"}, came());
+    EXPECT_EQ(CMPI_RC_OK, server->deactivate_filter(CLASS, "root/kaldera"));
+    EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+}
+
+TEST_F(Alert_Indications, AreEnabledAndDisabledOnce)
+{
+    EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+    mark();
+    for (int i = 0; i < 2; i++)
+        EXPECT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+    EXPECT_EQ(2u, subscription_calls().size());
+    for (int i = 0; i < 2; i++)
+        EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+    EXPECT_EQ((Texts{"register_for_events", "registerEventProcessingCb", "registerEventProcessingCb",
+                     "unregister_for_events"}),
+              subscription_calls());
+    EXPECT_FALSE(simulator.event(event(2, 1)));
+}
+
+TEST_F(Alert_Indications, ThatTheLibraryRefusesFailOnceUntilTheyAreDisabled)
+{
+    simulator.add_fault(R"({"call": "register_for_events", "do": "error", "times": 1})");
+    mark();
+    EXPECT_EQ(CMPI_RC_ERR_FAILED, server->enable_indications(CLASS));
+    EXPECT_FALSE(simulator.status()["eventCallback"].asBool());
+    EXPECT_EQ(CMPI_RC_OK, server->enable_indications(CLASS)) << "and does nothing";
+    EXPECT_EQ(Texts{"register_for_events"}, subscription_calls());
+    EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+    EXPECT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+    EXPECT_TRUE(simulator.status()["eventCallback"].asBool());
+    EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+}
+
+TEST_F(Alert_Indications, EndAlsoWhereTheLibraryRefusesTheEnd)
+{
+    simulator.add_fault(R"({"call": "unregister_for_events", "do": "throw"})");
+    EXPECT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+    EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+    EXPECT_FALSE(simulator.status()["eventCallback"].asBool());
+}
+
+TEST_F(Alert_Indications, StopWhenTheModuleIsUnloadedWithoutDisabling)
+{
+    server->activate_filter(CLASS, "root/kaldera");
+    server->enable_indications(CLASS);
+    simulator.event(event(2, 1));
+    ASSERT_TRUE(wait_for(1));
+    // One server shuts down so. The library must not call into what is gone.
+    server->unload(true);
+    EXPECT_FALSE(simulator.status()["eventCallback"].asBool());
+    EXPECT_FALSE(simulator.status()["wantsEvents"].asBool());
+    EXPECT_FALSE(simulator.event(event(2, 1)));
+}
+
+TEST_F(Alert_Indications, LeftInTheQueueComeWithTheNextSubscription)
+{
+    server->activate_filter(CLASS, "root/kaldera");
+    server->enable_indications(CLASS);
+    for (int id = 1; id <= 5; id++)
+        simulator.event(event(9, id));
+    server->disable_indications(CLASS);
+    const size_t before = came().size();
+    EXPECT_LT(before, 5u);
+    let_pass();
+    EXPECT_EQ(before, came().size());
+    server->enable_indications(CLASS);
+    ASSERT_TRUE(wait_for(5));
+    Texts expected;
+    for (int id = 1; id <= 5; id++)
+        expected.push_back("root/kaldera PROPKLDR" + std::to_string(9 * 65536 + id));
+    EXPECT_EQ(expected, came());
+    server->disable_indications(CLASS);
+}
+
+TEST_F(Alert_Indications, FollowWhatChangesInTheAdapters)
+{
+    host::Subscription subscription(*server, CLASS);
+    subscription.add("root/kaldera");
+    Json::Value request;
+    request["indexStr"] = "10:00:02:4b:4c:10:00:00";
+    request["port"]["portStatus"] = false;
+    request["propArray"].append("portStatus");
+    simulator.symbol<Json::Value(const Json::Value&)>("setPortByWwn")(request);
+    ASSERT_TRUE(wait_for(2));
+    EXPECT_EQ((Texts{"root/kaldera KLDR131080", "root/kaldera PROPKLDR131080"}), came());
+    EXPECT_EQ("Base port disabled by user command.", text_of(alerts()[0], "Description"));
+}
+
+TEST_F(Alert_Indications, OfManyThreadsComeCompleteAndInOrder)
+{
+    host::Subscription subscription(*server, CLASS);
+    subscription.add("root/kaldera");
+    std::vector<std::thread> threads;
+    for (int t = 0; t < 4; t++)
+        threads.emplace_back([&] {
+            for (int i = 0; i < 6; i++)
+                simulator.event(event(5, 1));
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+    ASSERT_TRUE(wait_for(24));
+    const std::vector<host::Instance_Value> list = alerts();
+    for (size_t i = 1; i < list.size(); i++)
+        EXPECT_EQ(list[0].property("SequenceNumber")->as_sint() + std::int64_t(i),
+                  list[i].property("SequenceNumber")->as_sint());
+}
+
+TEST_F(Alert_Indications, OfWrongTypesAreAnExceptionInTheLibrary)
+{
+    host::Subscription subscription(*server, CLASS);
+    subscription.add("root/kaldera");
+    EXPECT_THROW(simulator.event(R"({"eventCategory": "2", "eventId": 1})"), std::runtime_error);
+    for (const char* text : {"", "no json", "{}", "[]", R"({"eventCategory": 2, "eventId": 3})"})
+        EXPECT_TRUE(simulator.event(text)) << "taken, and dropped";
+    simulator.event(event(4, 5));
+    ASSERT_TRUE(wait_for(1));
+    EXPECT_EQ(Texts{"root/kaldera PROPKLDR262149"}, came());
+}
+
+} // namespace
+} // namespace KPRV
