@@ -20,6 +20,17 @@ const CMPIBrokerFT broker_ft = [] {
     CMPIBrokerFT ft = {};
     ft.brokerVersion = 200;
     ft.brokerName = "lean";
+    ft.prepareAttachThread = [](const CMPIBroker*, const CMPIContext* context) {
+        return const_cast<CMPIContext*>(context);
+    };
+    ft.attachThread = [](const CMPIBroker*, const CMPIContext*) { return okay(); };
+    ft.detachThread = [](const CMPIBroker*, const CMPIContext*) { return okay(); };
+    ft.deliverIndication = [](const CMPIBroker* broker, const CMPIContext*, const char*,
+                              const CMPIInstance*) {
+        if (const auto on_indication = self(broker).on_indication)
+            on_indication();
+        return okay();
+    };
     return ft;
 }();
 
@@ -41,6 +52,10 @@ const CMPIBrokerEncFT objects_ft = [] {
     ft.newString = [](const CMPIBroker* broker, const char* text, CMPIStatus* status) {
         set_okay(status);
         return new_string(self(broker), text);
+    };
+    ft.newDateTimeFromChars = [](const CMPIBroker* broker, const char* text, CMPIStatus* status) {
+        set_okay(status);
+        return new_datetime(self(broker), text);
     };
     ft.newArray = [](const CMPIBroker* broker, CMPICount count, CMPIType type, CMPIStatus* status) {
         set_okay(status);
@@ -98,6 +113,7 @@ void Lean_Broker::begin_call(bool keep)
     _delivered = 0;
     _instances.clear();
     _paths.clear();
+    _texts.clear();
     if (_blocks.empty())
         _blocks.emplace_back(new char[BLOCK_SIZE]);
     _blocks.resize(1);
@@ -131,9 +147,16 @@ void Lean_Broker::deliver(const CMPIObjectPath* path)
         _paths.push_back(path);
 }
 
+void Lean_Broker::deliver(const char* text)
+{
+    _delivered++;
+    if (_keep)
+        _texts.push_back(text);
+}
+
 std::vector<std::string> Lean_Broker::texts() const
 {
-    std::vector<std::string> texts;
+    std::vector<std::string> texts = _texts;
     for (const CMPIInstance* instance : _instances)
         texts.push_back(text_of(*object_of<Lean_Instance>(instance)));
     for (const CMPIObjectPath* path : _paths)

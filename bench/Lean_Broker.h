@@ -25,6 +25,9 @@ public:
     Lean_Broker(const Lean_Broker&) = delete;
     Lean_Broker& operator=(const Lean_Broker&) = delete;
 
+    /// Called with each delivered indication, on the thread that delivers it.
+    void (*on_indication)() = nullptr;
+
     const CMPIBroker* broker() const { return &_broker; }
     const CMPIContext* context() const { return &_context; }
     const CMPIResult* result() const { return &_result; }
@@ -33,6 +36,8 @@ public:
     void begin_call(bool keep = false);
     /// Objects returned since then.
     size_t delivered() const { return _delivered; }
+    /// A result that is no CIM object.
+    void deliver(const char* text);
     /// The kept results in order: class, keys and properties with their types, sorted by name.
     std::vector<std::string> texts() const;
 
@@ -67,6 +72,7 @@ private:
     size_t _delivered = 0;
     std::vector<const CMPIInstance*> _instances;
     std::vector<const CMPIObjectPath*> _paths;
+    std::vector<std::string> _texts;
 };
 
 } // namespace KPRV::bench

@@ -146,6 +146,13 @@ const CMPIArgsFT args_ft = [] {
     return ft;
 }();
 
+const CMPIDateTimeFT datetime_ft = [] {
+    CMPIDateTimeFT ft = {};
+    ft.ftVersion = 200;
+    ft.release = release_nothing;
+    return ft;
+}();
+
 const CMPIArrayFT array_ft = [] {
     CMPIArrayFT ft = {};
     ft.ftVersion = 200;
@@ -193,6 +200,14 @@ CMPIArgs* new_args(Lean_Broker& broker)
     args->handle = {&broker, &args_ft};
     clear(args->arguments);
     return &args->handle;
+}
+
+CMPIDateTime* new_datetime(Lean_Broker& broker, const char* text)
+{
+    auto* datetime = make<Lean_Datetime>(broker);
+    datetime->handle = {&broker, &datetime_ft};
+    datetime->text = new_string(broker, text);
+    return &datetime->handle;
 }
 
 CMPIArray* new_array(Lean_Broker& broker, CMPICount count, CMPIType type)

@@ -30,6 +30,12 @@ struct Lean_String
     const char* text;
 };
 
+struct Lean_Datetime
+{
+    CMPIDateTime handle;
+    CMPIString* text;
+};
+
 struct Lean_Path
 {
     CMPIObjectPath handle;
@@ -87,6 +93,7 @@ CMPIString* new_string(Lean_Broker& broker, const char* text);
 CMPIObjectPath* new_path(Lean_Broker& broker, const char* name_space, const char* class_name);
 CMPIInstance* new_instance(Lean_Broker& broker, const CMPIObjectPath* path);
 CMPIArgs* new_args(Lean_Broker& broker);
+CMPIDateTime* new_datetime(Lean_Broker& broker, const char* text);
 CMPIArray* new_array(Lean_Broker& broker, CMPICount count, CMPIType type);
 
 } // namespace KPRV::bench

@@ -54,7 +54,10 @@ Fast_Library::Fast_Library(void* library)
       get_fc_ports(function<JsonReqFP>(library, "getFcPhyPortIndicesByAdapter")),
       get_port(function<JsonReqFP>(library, "getPortByWwn")),
       get_remote_ports(function<JsonReqFP>(library, "getAllRemotePorts")),
-      get_remote_port(function<JsonReqFP>(library, "getCompleteRemotePort"))
+      get_remote_port(function<JsonReqFP>(library, "getCompleteRemotePort")),
+      get_server_time(function<JsonReqFP>(library, "getServerTime")),
+      get_fc(function<JsonReqFP>(library, "getFcByFcWwn")),
+      _send_event(function<evtProcessCB>(library, "send_event"))
 {
 }
 
@@ -93,6 +96,16 @@ CMPIInstanceMI* Module::instances(const char* class_name) const
 CMPIAssociationMI* Module::associations(const char* class_name) const
 {
     return create<CMPIAssociationMI>(class_name, "Association");
+}
+
+CMPIIndicationMI* Module::indications(const char* class_name) const
+{
+    return create<CMPIIndicationMI>(class_name, "Indication");
+}
+
+void Fast_Library::send_event(const char* text) const
+{
+    _send_event(text);
 }
 
 CMPIMethodMI* Module::methods(const char* class_name) const

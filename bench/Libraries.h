@@ -17,6 +17,9 @@ class Fast_Library
 public:
     static Fast_Library& get();
 
+    /// Tells the module of an event, as the library does.
+    void send_event(const char* text) const;
+
     /// What the calls to come answer.
     const Prepare_Storage prepare;
 
@@ -26,10 +29,14 @@ public:
     const JsonReqFP get_port;
     const JsonReqFP get_remote_ports;
     const JsonReqFP get_remote_port;
+    const JsonReqFP get_server_time;
+    const JsonReqFP get_fc;
 
 private:
     Fast_Library();
     explicit Fast_Library(void* library);
+
+    const evtProcessCB _send_event;
 };
 
 /// The built module, opened as a server opens it, with the prepared library below it.
@@ -42,6 +49,7 @@ public:
     CMPIInstanceMI* instances(const char* class_name) const;
     CMPIAssociationMI* associations(const char* class_name) const;
     CMPIMethodMI* methods(const char* class_name) const;
+    CMPIIndicationMI* indications(const char* class_name) const;
 
 private:
     Module();

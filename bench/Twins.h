@@ -37,6 +37,7 @@ void add(const Twins& twins);
 
 void add_fc_ports(bool tiny);
 void add_paths(bool tiny);
+void add_tunnel(bool tiny);
 void add_agent_detection(bool tiny);
 
 } // namespace KPRV::bench

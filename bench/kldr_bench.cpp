@@ -16,6 +16,7 @@ int main(int argc, char** argv)
     benchmark::Initialize(&argc, argv);
     add_fc_ports(tiny);
     add_paths(tiny);
+    add_tunnel(tiny);
     add_agent_detection(tiny);
     benchmark::RunSpecifiedBenchmarks();
     benchmark::Shutdown();

@@ -9,6 +9,21 @@ using namespace KPRV;
 using namespace KPRV::bench;
 
 static const Storage* storage;
+static evtProcessCB event_callback;
+
+/// Texts and numbers by turns, as the library's larger answers have them.
+static Json::Value members(int count)
+{
+    Json::Value answer;
+    for (int i = 0; i < count; i++) {
+        Json::Value& member = answer["member" + std::to_string(i)];
+        if (i % 2)
+            member = i * 1000003;
+        else
+            member = "text of member " + std::to_string(i);
+    }
+    return answer;
+}
 
 #pragma GCC visibility push(default)
 extern "C" {
@@ -29,6 +44,44 @@ Json::Value init_hba_lib(const Json::Value&)
 uint32 getNumberOfAdapters()
 {
     return 1;
+}
+
+Json::Value getServerTime(const Json::Value&)
+{
+    return Json::Value(Json::objectValue);
+}
+
+/// An object of the size that the request names.
+Json::Value getFcByFcWwn(const Json::Value& request)
+{
+    static const std::map<std::string, Json::Value>& answers = *new std::map<std::string, Json::Value>{
+        {"25 members", members(25)},
+        {"30 KB", members(750)},
+    };
+    return answers.at(request["wwn"].asString());
+}
+
+void registerEventProcessingCb(evtProcessCB callback)
+{
+    event_callback = callback;
+}
+
+Json::Value register_for_events(const Json::Value&)
+{
+    Json::Value answer;
+    answer["result"] = 0;
+    return answer;
+}
+
+Json::Value unregister_for_events(const Json::Value&)
+{
+    return register_for_events({});
+}
+
+void send_event(const char* text)
+{
+    if (event_callback)
+        event_callback(text);
 }
 
 Json::Value getAllAdaptersIndexString(const Json::Value&)
