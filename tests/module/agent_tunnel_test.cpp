@@ -25,6 +25,17 @@ TEST_F(Agent_Tunnel, SucceedsWhateverTheOutcome)
               response_of(execute("{")));
 }
 
+TEST_F(Agent_Tunnel, IsFoundByEnumeration)
+{
+    open("empty.json");
+    const host::Result services = server->enumerate_instance_names("KALDERA_AgentService");
+    ASSERT_EQ(1u, services.paths.size());
+    EXPECT_TRUE(same_object(SERVICE, services.paths[0]));
+    const host::Result result =
+        server->invoke_method(services.paths[0], "executeMethod", {{"request", host::Value::text("{}")}});
+    EXPECT_EQ(105, json(response_of(result))["error"]["code"].asInt());
+}
+
 TEST_F(Agent_Tunnel, TakesANullRequestForAnEmptyText)
 {
     open("empty.json");
