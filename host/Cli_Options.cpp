@@ -118,6 +118,7 @@ constexpr Option option_table[] = {
     {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree profiles"},
     {"--raw",         set_raw,                                 nullptr,                   "rpc"},
     {"--list",        nullptr,                                 &Cli_Options::list_methods, "rpc"},
+    {"--wait",        nullptr,                                 &Cli_Options::wait,        "diag"},
     {"--leaks",       nullptr,                                 &Cli_Options::leaks,       nullptr},
     {"--help",        nullptr,                                 &Cli_Options::help,        nullptr},
     {"-h",            nullptr,                                 &Cli_Options::help,        nullptr},

@@ -36,6 +36,8 @@ struct Cli_Options
     /// rpc: the whole text of a call, or "-" for standard input.
     std::optional<std::string> raw;
     bool list_methods = false;
+    /// Follow the job of a test that was started.
+    bool wait = false;
     bool leaks = false;
     bool help = false;
     bool version = false;

@@ -25,6 +25,9 @@ Verbs
   conform                           what a client of the Storage HBA profile expects, beside what it finds
   watch [CLASS]                     subscribe to indications (default: KALDERA_AlertIndication) and write each as it
                                     comes, until interrupted
+  diag list                         the hardware tests, and the ports and adapters that they can be run on
+  diag run TEST ELEMENT             run a test, by its name, on a port or adapter, by its address or PATH; the test
+                                    takes the element out of service while it runs
   rpc METHOD [PARAMETER...]         call a method of the agent's JSON-RPC protocol; "+" stands before a further call
   rpc --list [PATTERN]              list its methods with their parameters
   rpc --raw TEXT                    send TEXT, or with "-" standard input, as it is; write the reply as it is
@@ -48,6 +51,7 @@ Options
   --count N                 watch: end after N indications
   --software, --connectors  tree, graph: also firmware and drivers, cards and transceivers
   --ascii                   tree, profiles: no box-drawing characters (default where the locale is not UTF-8)
+  --wait                    diag run: show the job while it runs, then its records
   --leaks                   say on standard error which CMPI objects the provider did not release
   --help, --version
 
@@ -64,13 +68,15 @@ Parameters of rpc
 
 Exit status
   0 success, also if only some of several associations failed (a warning names them); 1 the provider or the host
-  answered a CIM status, or the agent an error, which is named on standard error; 2 usage, or the module could not be loaded.
+  answered a CIM status, or the agent an error, which is named on standard error; 2 usage, or the module could not be
+  loaded. diag run --wait: 0 the test passed, 1 it failed; diag run: 3 the test was refused.
 
 Examples
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
   kldrcim ein KALDERA_FCPort
   kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" --assoc KALDERA_PortControllerSystemDevice
   kldrcim tree --software
+  kldrcim diag run SerdesLoopbackTest 10:00:02:4b:4c:10:00:00 --wait
   kldrcim watch --count 10 --properties Message,PerceivedSeverity,MessageID
   kldrcim rpc discovery.getPortByWwn 10:00:02:4b:4c:10:00:00
   kldrcim --format mof gi 'KALDERA_AgentService.Name="agent"'

@@ -1,6 +1,7 @@
 #include "host/Cli_Verbs.h"
 
 #include "host/Cli_Conform.h"
+#include "host/Cli_Diag.h"
 #include "host/Cli_Profiles.h"
 #include "host/Cli_Rpc.h"
 #include "host/Cli_Watch.h"
@@ -32,6 +33,7 @@ constexpr Cli_Verb verbs[] = {
     {"conform", 0, 0,   "",                           run_conform},
     {"watch",   0, 1,   "[CLASS]",                    watch},
     {"profiles",0, 0,   "",                           write_profiles},
+    {"diag",    1, 3,   "list | run TEST ELEMENT",    diag},
     {"classes", 0, 1,   "[PATTERN]",                  nullptr},
     {"rpc",     0, any, "METHOD [PARAMETER...]",      run_rpc},
 };

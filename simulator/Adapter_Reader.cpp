@@ -1,5 +1,6 @@
 #include "simulator/Adapter_Reader.h"
 
+#include "simulator/Hardware_Tests.h"
 #include "simulator/Inventory_Members.h"
 #include "simulator/Port_Reader.h"
 #include "simulator/Settings.h"
@@ -40,6 +41,8 @@ public:
         check_answers(source_, adapter.answers);
         adapter.settings = parts["settings"];
         check_settings(source_, adapter.settings);
+        adapter.tests = parts["diagnostics"];
+        check_hardware_tests(source_, adapter.tests);
         return adapter;
     }
 

@@ -105,6 +105,12 @@ Json::Value create_vnic(State& state, const Json::Value& request);
 Json::Value delete_vnics(State& state, const Json::Value& request);
 Json::Value modify_vnics(State& state, const Json::Value& request);
 
+// Hardware_Tests.cpp
+Json::Value memory_test(State& state, const Json::Value& request);
+Json::Value pci_loopback_test(State& state, const Json::Value& request);
+Json::Value loopback_test(State& state, const Json::Value& request);
+Json::Value eth_loopback_test(State& state, const Json::Value& request);
+
 // Path_Record_Answers.cpp
 Json::Value lun_masks(State& state, const Json::Value& request);
 Json::Value set_lun_masks(State& state, const Json::Value& request);

@@ -42,6 +42,7 @@ struct Port
     Remote_Ports remote_ports; // of an FC port
     Json::Value answers;       // answers of the author's own, by entry point
     Json::Value settings;      // what was written or set of each, by its name in Settings.h
+    Json::Value tests;         // outcomes of hardware tests, by entry point
     std::vector<Virtual_Port> virtual_ports;
     std::vector<Virtual_Nic> vnics;
     Path_Records lun_masks;
@@ -55,6 +56,7 @@ struct Adapter
     std::string address; // what getAllAdaptersIndexString lists
     Json::Value data;    // the answer of getHbaByWwn: `hbaData`, `driver`, `firmware`
     Json::Value flash_status;
+    Json::Value tests;        // outcomes of hardware tests, by entry point
     Json::Value flash_update; // `status` and `message` of an update whose image is good
     std::vector<Port> fc_ports;
     std::vector<Port> eth_ports;

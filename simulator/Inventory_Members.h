@@ -54,6 +54,7 @@ inline constexpr Member adapter_members[] = {
     {"ethPorts",              Type::ARRAY,   Presence::OPTIONAL, "[]"},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL, "{}"},
     {"settings",              Type::OBJECT,  Presence::OPTIONAL},
+    {"diagnostics",           Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member hba_data_members[] = {
@@ -112,6 +113,7 @@ inline constexpr Member fc_port_members[] = {
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
     {"settings",              Type::OBJECT,  Presence::OPTIONAL},
+    {"diagnostics",           Type::OBJECT,  Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_port_members[] = {
@@ -125,6 +127,33 @@ inline constexpr Member eth_port_members[] = {
     {"extra",                 Type::OBJECT,  Presence::OPTIONAL},
     {"answers",               Type::OBJECT,  Presence::OPTIONAL},
     {"settings",              Type::OBJECT,  Presence::OPTIONAL},
+    {"diagnostics",           Type::OBJECT,  Presence::OPTIONAL},
+};
+
+inline constexpr Member test_outcome_members[] = {
+    {"milliseconds",          Type::COUNT,   Presence::OPTIONAL, "0"},
+    {"outcome",               Type::TEXT,    Presence::OPTIONAL, "\"pass\""},
+    {"output",                Type::TEXT,    Presence::OPTIONAL},
+    {"code",                  Type::INTEGER, Presence::OPTIONAL, "99"},
+    {"message",               Type::TEXT,    Presence::OPTIONAL, "\"injected\""},
+};
+
+inline constexpr Member frame_counter_members[] = {
+    {"transmitFrames",        Type::COUNT,   Presence::OPTIONAL},
+    {"GoodFrameRcv",          Type::COUNT,   Presence::OPTIONAL},
+    {"outstandingFrames",     Type::COUNT,   Presence::OPTIONAL},
+    {"BadFrameNo",            Type::COUNT,   Presence::OPTIONAL},
+    {"BadFrameInfo",          Type::COUNT,   Presence::OPTIONAL},
+};
+
+inline constexpr Member memory_failure_members[] = {
+    {"status",                Type::COUNT,   Presence::OPTIONAL},
+    {"address",               Type::COUNT,   Presence::OPTIONAL},
+    {"expected value",        Type::COUNT,   Presence::OPTIONAL},
+    {"actual value",          Type::COUNT,   Presence::OPTIONAL},
+    {"error status",          Type::COUNT,   Presence::OPTIONAL},
+    {"error address",         Type::COUNT,   Presence::OPTIONAL},
+    {"type",                  Type::TEXT,    Presence::OPTIONAL},
 };
 
 inline constexpr Member eth_data_members[] = {

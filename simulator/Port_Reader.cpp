@@ -1,6 +1,7 @@
 #include "simulator/Port_Reader.h"
 
 #include "simulator/Entry_Points.h"
+#include "simulator/Hardware_Tests.h"
 #include "simulator/Inventory_Members.h"
 #include "simulator/Optics_Reader.h"
 #include "simulator/Remote_Port_Reader.h"
@@ -62,11 +63,15 @@ Port read_fc_port(const Json_Text& source, Json::Value& written, const Port_Plac
     port.answers = take_answers(source, port.data);
     port.settings = take_part(port.data, "settings");
     check_settings(source, port.settings);
+    port.tests = take_part(port.data, "diagnostics");
+    check_hardware_tests(source, port.tests);
     port.optics = take_optics(source, port.data, place);
     if (!place.node_wwn.isNull())
         set_default(port.data, "nodeWwn", place.node_wwn);
     set_default(port.data, "PortSymbolicName", "KLDR port " + std::to_string(place.index));
-    set_default(port.data, "isFCoE", place.converged);
+    // A port that does not speak FCoE says nothing of it.
+    if (place.converged)
+        set_default(port.data, "isFCoE", true);
     default_status(port.data, "portStatusValue", std::as_const(port.data)["portStatus"]);
     port.counters = take_counters(source, port.data);
     port.data = answered_members(std::move(port.data), fc_port_members);
@@ -83,6 +88,8 @@ Port read_eth_port(const Json_Text& source, const Json::Value& written, const Po
     port.answers = take_answers(source, port.data);
     port.settings = take_part(port.data, "settings");
     check_settings(source, port.settings);
+    port.tests = take_part(port.data, "diagnostics");
+    check_hardware_tests(source, port.tests);
     port.optics = take_optics(source, port.data, place);
     const Json::Value& enabled = written["portStatus"];
     const Json::Value eth = take_part(port.data, "ethData");

@@ -2,6 +2,7 @@
 
 #include "simulator/Answers.h"
 #include "simulator/Event_Reader.h"
+#include "simulator/Hardware_Tests.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -30,6 +31,7 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
     for (const Fault& fault : strike.faults)
         if (replaces_answer(fault.kind))
             return replaced_answer(fault);
+    run_hardware_test(row, request);
     Json::Value answer;
     {
         const std::lock_guard lock(mutex_);
@@ -64,6 +66,16 @@ void Simulator::wait_out(const Strike& strike)
         std::unique_lock lock(mutex_);
         released_.wait(lock, [&] { return releases_ != strike.releases; });
     }
+}
+
+void Simulator::run_hardware_test(const Entry_Row& row, const Json::Value& request)
+{
+    std::chrono::milliseconds duration;
+    {
+        const std::lock_guard lock(mutex_);
+        duration = hardware_test_duration(state_, row, request);
+    }
+    std::this_thread::sleep_for(duration);
 }
 
 void Simulator::load_from_environment()

@@ -72,6 +72,9 @@ private:
     Strike record(const Entry_Row& row, const Json::Value& request);
     void wait_out(const Strike& strike);
 
+    /// Takes the time of a hardware test; other calls go on.
+    void run_hardware_test(const Entry_Row& row, const Json::Value& request);
+
     std::mutex mutex_;
     std::condition_variable called_;
     std::condition_variable released_;

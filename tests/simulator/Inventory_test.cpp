@@ -21,7 +21,7 @@ TEST_F(Inventory_test, an_fc_hba_needs_no_more_than_addresses)
     EXPECT_EQ(call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:10:00:00'}"), json(R"({
         'wwn': '10:00:02:4b:4c:10:00:00', 'nodeWwn': '20:00:02:4b:4c:10:00:00', 'PortSymbolicName': 'KLDR port 0',
         'operatingSpeed': 8, 'supportedPortSpeeds': [8, 4, 2], 'portTypeMOFValue': 10, 'maxFrameSize': 2112,
-        'portStatus': true, 'portStatusValue': 11, 'isFCoE': false, 'isMezz': false, 'beaconState': false})"));
+        'portStatus': true, 'portStatusValue': 11, 'isMezz': false, 'beaconState': false})"));
 }
 
 TEST_F(Inventory_test, a_mac_makes_a_converged_adapter)
