@@ -1,10 +1,10 @@
 #include "host/Cli_Diag.h"
 
+#include "host/Cli_Complaints.h"
 #include "host/Cli_Output.h"
 #include "host/Diag_Job.h"
 #include "host/Diag_Names.h"
 #include "host/Format_Table.h"
-#include "host/Type_Words.h"
 #include "host/Value_Text.h"
 
 #include <algorithm>
@@ -15,19 +15,12 @@ namespace KPRV::host {
 namespace {
 
 constexpr int CIM_STATUS = 1;
-constexpr int USAGE = 2;
 constexpr int REFUSED = 3;
 constexpr std::uint64_t JOB_STARTED = 4096;
 
-int complain(const std::string& text, int status)
-{
-    std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
-    return status;
-}
-
 int complain_of(const Result& result)
 {
-    return complain(std::string(status_name(result.rc)) + " (" + std::to_string(result.rc) + ")", CIM_STATUS);
+    return complain(code_text(result.rc), CIM_STATUS);
 }
 
 void put(const std::string& text)
@@ -107,7 +100,7 @@ int run(const Cli_Options& options, Host& host)
     std::string error;
     if (!find_test(host, options.arguments[1], test, error) ||
         !find_element(host, test.class_name, options.arguments[2], element, error))
-        return complain(error, USAGE);
+        return complain(error, USAGE_ERROR);
     const Result started =
         host.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
     if (!started.ok())
@@ -143,7 +136,7 @@ int diag(const Cli_Options& options, Host& host)
         return list(options, host);
     if (words[0] == "run" && words.size() == 3)
         return run(options, host);
-    return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE);
+    return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE_ERROR);
 }
 
 } // namespace KPRV::host
