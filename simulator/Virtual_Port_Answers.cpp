@@ -6,6 +6,7 @@
 #include "simulator/Target.h"
 
 #include <algorithm>
+#include <set>
 
 namespace KPRV::simulator {
 
@@ -114,9 +115,11 @@ Json::Value delete_virtual_ports(State& state, const Json::Value& request)
         return error_answer(Error_Code::REQUEST, "vportArray must be an array");
     const Json::Value port = addressed(request, Json::Value());
     return answer_for_target(state, port, Scope::FC_PORT, [&](const Target& target) {
+        std::set<std::string> seen;
         for (const Json::Value& each : doomed) {
             const Json::Value logical = each.isString() ? each : Json::Value("");
-            if (!find_target(state.inventory, addressed(request, logical), Scope::VIRTUAL_PORT))
+            if (!find_target(state.inventory, addressed(request, logical), Scope::VIRTUAL_PORT) ||
+                !seen.insert(lower_case(logical.asString())).second)
                 return error_answer(Error_Code::NOT_FOUND, "no such virtual port: " + compact_text(each));
         }
         for (const Json::Value& each : doomed) {

@@ -69,6 +69,7 @@ TEST_F(Virtual_Port_Answers_test, deleting_is_all_or_nothing)
 {
     done("createVport", new_vport());
     for (const char* doomed : {"['10:01:02:4b:4c:10:00:00', '10:01:02:4b:4c:10:00:01']",
+                               "['10:01:02:4b:4c:10:00:00', '10:01:02:4B:4C:10:00:00']",
                                "['10:00:02:4b:4c:10:00:00']", "[7]", "[null]"})
         EXPECT_EQ(refused("deleteVport", vports(doomed)), NOT_FOUND) << doomed;
     EXPECT_EQ(list().size(), 1u);
