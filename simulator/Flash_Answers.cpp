@@ -1,5 +1,6 @@
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
+#include "simulator/State_Events.h"
 
 #include <cerrno>
 #include <cstring>
@@ -82,8 +83,11 @@ Json::Value update_flash(State& state, const Json::Value& request)
             const Json::Value& outcome = place.adapter->flash_update;
             const std::string version = version_of(image);
             Json::Value& firmware = place.adapter->data["firmware"];
-            if (outcome["status"].asUInt() == 0 && firmware.isObject() && !version.empty())
+            const bool is_done = outcome["status"].asUInt() == 0;
+            if (is_done && firmware.isObject() && !version.empty())
                 firmware["version"] = version;
+            if (is_done)
+                occur(state, Occurrence::FLASH_UPDATED, *place.adapter);
             return update_answer(outcome["status"], outcome["message"].asString());
         });
 }

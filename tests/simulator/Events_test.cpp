@@ -268,5 +268,42 @@ TEST_F(State_Events, of_ports_and_adapters_are_told_when_they_change)
     EXPECT_EQ(told_by("setAdapterState", stop, 0), Texts{});
 }
 
+TEST_F(State_Events, of_logical_ports_are_told)
+{
+    const std::string port = "'pwwn': '10:00:02:4b:4c:20:00:00', 'vfId': 0, ";
+    EXPECT_EQ(told_by("createVport", ("{" + port +
+                                      "'vwwn': '10:00:02:4b:4c:20:01:00', 'nwwn': '20:00:02:4b:4c:20:01:00', "
+                                      "'symbolicName': 'guest'}")
+                                         .c_str()),
+              Texts{"3/1 1000024b4c200000 ZNT_LPORT_CREATE"});
+    EXPECT_EQ(told_by("deleteVport", ("{" + port + "'vportArray': ['10:00:02:4b:4c:20:01:00']}").c_str()),
+              Texts{"3/2 1000024b4c200000 ZNT_LPORT_DELETE"});
+}
+
+TEST_F(State_Events, of_authentication_are_told)
+{
+    const auto request = [](const char* enabled) {
+        return std::string("{'pPortWwn': '10:00:02:4b:4c:20:00:00', 'portAuth': {'enabled': ") + enabled +
+               "}}";
+    };
+    EXPECT_EQ(told_by("setPortAuthentication", request("true").c_str()),
+              Texts{"8/1 1000024b4c200000 ZNT_AUTH_ENABLE"});
+    EXPECT_EQ(told_by("setPortAuthentication", request("true").c_str(), 0), Texts{});
+    EXPECT_EQ(told_by("setPortAuthentication", request("false").c_str()),
+              Texts{"8/2 1000024b4c200000 ZNT_AUTH_DISABLE"});
+}
+
+TEST_F(State_Events, of_firmware_are_told_when_it_is_written)
+{
+    const Temp_Folder folder;
+    folder.write("image", "firmware-version=9.9.9.9\n");
+    const auto request = [&](const char* file) {
+        return "{'indexStr': '20:00:02:4b:4c:20:00:00', 'file': '" + folder.path(file) + "'}";
+    };
+    EXPECT_EQ(told_by("adapterUpdateFlash", request("image").c_str()),
+              Texts{"8/4 1000024b4c200000 ZNT_FLASH_UPDATE"});
+    EXPECT_EQ(told_by("adapterUpdateFlash", request("none").c_str(), 0), Texts{});
+}
+
 } // namespace
 } // namespace KPRV::simulator
