@@ -132,12 +132,10 @@ private:
 
     std::string status_text(const Request& request, const Result& result) const
     {
-        std::string text = code_text(result.rc);
-        if (result.exception)
-            text += ": an exception left the provider: " + *result.exception;
-        else if (!result.message.empty())
-            text += ": " + result.message;
-        else if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
+        std::string text = failure_text(result);
+        if (result.exception || !result.message.empty())
+            return text;
+        if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
             text +=
                 ": the module has no class " + unknown_class(request) + "; \"kldrcim classes\" lists them";
         else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)

@@ -17,6 +17,14 @@ std::string code_text(CMPIrc rc)
     return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
 }
 
+std::string failure_text(const Result& result)
+{
+    const std::string text = code_text(result.rc);
+    if (result.exception)
+        return text + ": an exception left the provider: " + *result.exception;
+    return result.message.empty() ? text : text + ": " + result.message;
+}
+
 void warn_of(const std::vector<Provider_Failure>& failures)
 {
     for (const Provider_Failure& failure : failures)

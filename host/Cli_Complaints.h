@@ -18,6 +18,9 @@ int complain(const std::string& text, int status);
 /// "CIM_ERR_NOT_FOUND (6)".
 std::string code_text(CMPIrc rc);
 
+/// The code of an answer that failed, then the exception or the message, if there is one.
+std::string failure_text(const Result& result);
+
 /// A warning for each: what is missing from an answer should not look as if it were not there.
 void warn_of(const std::vector<Provider_Failure>& failures);
 

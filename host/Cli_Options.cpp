@@ -156,7 +156,7 @@ bool check_sense(const Cli_Options& options, const std::vector<const Option*>& g
             return false;
         }
     using Format = Cli_Options::Format;
-    const bool no_mof = options.verb == "tree" || options.verb == "profiles" || options.verb == "rpc";
+    const bool no_mof = contains_word("tree profiles rpc flash", options.verb);
     if ((options.verb == "graph" && options.format != Format::TABLE) ||
         (no_mof && options.format == Format::MOF)) {
         error = "--format " + std::string(options.format == Format::MOF ? "mof" : "json") +

@@ -28,14 +28,6 @@ void put_line(const std::string& text)
         std::fputc('\n', stdout);
 }
 
-std::string failure_text(const Result& result)
-{
-    std::string text = code_text(result.rc);
-    if (result.exception)
-        return text + ": an exception left the provider: " + *result.exception;
-    return result.message.empty() ? text : text + ": " + result.message;
-}
-
 std::string read_all(std::FILE* file)
 {
     std::string text;

@@ -31,6 +31,8 @@ Verbs
   rpc METHOD [PARAMETER...]         call a method of the agent's JSON-RPC protocol; "+" stands before a further call
   rpc --list [PATTERN]              list its methods with their parameters
   rpc --raw TEXT                    send TEXT, or with "-" standard input, as it is; write the reply as it is
+  flash ADAPTER URI                 update an adapter's firmware from file://PATH or tftp://HOST/FILE, through the module's
+                                    installation service; ADAPTER is its DeviceID, with or without colons, or a PATH
   classes [PATTERN]                 list the classes that have a provider; * and ? match as in file names
 
 Options
@@ -68,8 +70,9 @@ Parameters of rpc
 
 Exit status
   0 success, also if only some of several associations failed (a warning names them); 1 the provider or the host
-  answered a CIM status, or the agent an error, which is named on standard error; 2 usage, or the module could not be
-  loaded. diag run --wait: 0 the test passed, 1 it failed; diag run: 3 the test was refused.
+  answered a CIM status, the agent an error, or an update failed, which is named on standard error; 2 usage, no such adapter
+  to update, or the module could not be loaded. diag run --wait: 0 the test passed, 1 it failed; diag run: 3 the test was
+  refused.
 
 Examples
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
@@ -79,6 +82,7 @@ Examples
   kldrcim diag run SerdesLoopbackTest 10:00:02:4b:4c:10:00:00 --wait
   kldrcim watch --count 10 --properties Message,PerceivedSeverity,MessageID
   kldrcim rpc discovery.getPortByWwn 10:00:02:4b:4c:10:00:00
+  kldrcim flash 20:00:02:4b:4c:10:00:00 file:///var/tmp/firmware.bin
   kldrcim --format mof gi 'KALDERA_AgentService.Name="agent"'
 )usage";
 

@@ -2,6 +2,7 @@
 
 #include "host/Cli_Conform.h"
 #include "host/Cli_Diag.h"
+#include "host/Cli_Flash.h"
 #include "host/Cli_Profiles.h"
 #include "host/Cli_Rpc.h"
 #include "host/Cli_Watch.h"
@@ -34,6 +35,7 @@ constexpr Cli_Verb verbs[] = {
     {"watch",   0, 1,   "[CLASS]",                    watch},
     {"profiles",0, 0,   "",                           write_profiles},
     {"diag",    1, 3,   "list | run TEST ELEMENT",    diag},
+    {"flash",   2, 2,   "ADAPTER URI",                flash},
     {"classes", 0, 1,   "[PATTERN]",                  nullptr},
     {"rpc",     0, any, "METHOD [PARAMETER...]",      run_rpc},
 };
