@@ -2,8 +2,9 @@
 
 #include "host/Rpc_Methods.h"
 
+#include <algorithm>
 #include <memory>
-#include <regex>
+#include <string_view>
 
 namespace KPRV::host {
 
@@ -32,11 +33,41 @@ std::string json_lines(const Json::Value& value, const char* indentation)
     return Json::writeString(builder, value);
 }
 
+/// Takes the digits at the front of the text; false if there are none.
+bool take_digits(std::string_view& text)
+{
+    const std::size_t size = std::min(text.find_first_not_of("0123456789"), text.size());
+    text.remove_prefix(size);
+    return size > 0;
+}
+
+/// Takes one of the letters from the front of the text, if one stands there.
+bool take_letter(std::string_view& text, std::string_view letters)
+{
+    const bool takes = !text.empty() && letters.find(text.front()) != std::string_view::npos;
+    text.remove_prefix(takes);
+    return takes;
+}
+
 /// The reader also takes a minus sign alone for a number.
+bool is_json_number(std::string_view text)
+{
+    take_letter(text, "-");
+    if (!take_letter(text, "0") && !take_digits(text))
+        return false;
+    if (take_letter(text, ".") && !take_digits(text))
+        return false;
+    if (take_letter(text, "eE")) {
+        take_letter(text, "+-");
+        if (!take_digits(text))
+            return false;
+    }
+    return text.empty();
+}
+
 bool is_json_literal(const std::string& word)
 {
-    static const std::regex literal(R"(true|false|null|-?(0|[1-9]\d*)(\.\d+)?([eE][-+]?\d+)?)");
-    return std::regex_match(word, literal);
+    return word == "true" || word == "false" || word == "null" || is_json_number(word);
 }
 
 bool begins_with_any(const std::string& word, const char* letters)

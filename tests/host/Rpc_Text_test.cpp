@@ -40,6 +40,8 @@ TEST(Rpc_Text, PlainWordsAreStrings)
     EXPECT_EQ("[\"10:00\",\"two words\"]", params(unknown, {"10:00", "two words"}));
     EXPECT_EQ("[\"\",\"NULL\",\"-\",\"+1\",\"0x1f\",\"01\"]",
               params(unknown, {"", "NULL", "-", "+1", "0x1f", "01"}));
+    EXPECT_EQ("[\"1.\",\".5\",\"1e\",\"1e+\",\"1e5x\",\"--1\",\"truest\"]",
+              params(unknown, {"1.", ".5", "1e", "1e+", "1e5x", "--1", "truest"}));
 }
 
 TEST(Rpc_Text, ValuesOfJsonAreValues)
