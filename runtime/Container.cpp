@@ -38,6 +38,35 @@ int Container::convert(const Instance* instance, uint32 mask)
     return 0;
 }
 
+/// The instances that a reference of either kind points to.
+static Array<Instance*> targets_of(const Instance* instance, const Meta_Feature* feature)
+{
+    return visit_feature(feature, Overloaded{
+                                      [=](Reference_Feature f) {
+                                          Array<Instance*> targets;
+                                          if (f.target(instance))
+                                              targets.append(f.target(instance));
+                                          return targets;
+                                      },
+                                      [=](Reference_Array_Feature f) { return f.targets(instance); },
+                                      [](auto) { return Array<Instance*>(); },
+                                  });
+}
+
+/// As `Value::get`, for a cell that may be taken already: a server may name a reference twice, and then the
+/// instance that came first is given back.
+static int replace(Instance* instance, const Meta_Feature* feature, const Value& value)
+{
+    if (!(feature->flags & FLAG_REFERENCE))
+        return value.get(instance, feature);
+    const Array<Instance*> earlier = targets_of(instance, feature);
+    const int status = value.get(instance, feature);
+    if (status == 0 || !(targets_of(instance, feature) == earlier))
+        for (Instance* target : earlier)
+            unref(target);
+    return status;
+}
+
 int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& instance)
 {
     if (!instance)
@@ -64,7 +93,7 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& ins
             continue;
         }
         Value value;
-        if (get_value(i, type, value) != 0 || value.get(instance, feature) != 0)
+        if (get_value(i, type, value) != 0 || replace(instance, feature, value) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
     }
     return 0;

@@ -245,6 +245,24 @@ TEST(Container_import, TakesNullValues)
     EXPECT_EQ(1, port->Name.null);
 }
 
+// A server may name a property twice: the last one stands, and nothing is lost.
+TEST(Container_import, GivesBackWhatAReferenceHeldBefore)
+{
+    const Ref<Sample_Group> first = make_group("a");
+    const Ref<Sample_Group> second = make_group("b");
+    {
+        Bag bag;
+        EXPECT_EQ(0, bag.convert(first.ptr(), 0));
+        EXPECT_EQ(0, bag.convert(second.ptr(), 0));
+        const Ref<Sample_Group> group = import <Sample_Group>(bag, 0);
+        EXPECT_EQ(second->Leader, group->Leader);
+    }
+    for (const Ref<Sample_Group>& group : {first, second}) {
+        EXPECT_EQ(1, group->Leader->__refs);
+        EXPECT_EQ(1, group->Members.value[0]->__refs);
+    }
+}
+
 TEST(Container, RoundTripOfEveryType)
 {
     const Ref<Sample_Types> from = make_types(1);
