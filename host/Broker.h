@@ -29,7 +29,7 @@ private:
     Up_Calls& up_calls_;
     CMPIBroker level_100_ = {};
     /// Where a provider of level 2.0 looks for the memory table.
-    const void* no_memory_table_ = nullptr;
+    [[maybe_unused]] const void* no_memory_table_ = nullptr;
 };
 
 /// One call through a broker table: like `Call`, but the object is the broker. Up-calls ask for a context

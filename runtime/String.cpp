@@ -34,16 +34,22 @@ String_Rep* allocate(uint32 n)
     return new (block) String_Rep{1, 0, cap, {}};
 }
 
+/// The characters, which go on behind the four that the record declares.
+char* characters(String_Rep* rep)
+{
+    return rep->data;
+}
+
 void finish(String_Rep* rep, uint32 size)
 {
     rep->size = size;
-    rep->data[size] = '\0';
+    characters(rep)[size] = '\0';
 }
 
 String_Rep* make(const char* text, uint32 n, uint32 room)
 {
     String_Rep* rep = allocate(room);
-    memcpy(rep->data, text, n);
+    memcpy(characters(rep), text, n);
     finish(rep, n);
     return rep;
 }
@@ -93,7 +99,7 @@ String::String(const char* a, const char* b, const char* c) : _rep(&_empty)
         return;
     _rep = allocate(total);
     for (int i = 0; i < 3; i++) {
-        memcpy(_rep->data + _rep->size, parts[i] ? parts[i] : "", lengths[i]);
+        memcpy(characters(_rep) + _rep->size, parts[i] ? parts[i] : "", lengths[i]);
         _rep->size += lengths[i];
     }
     finish(_rep, total);
@@ -135,7 +141,7 @@ void String::assign(const char* text, uint32 n)
 {
     if (n <= _rep->cap && is_unique(_rep)) {
         // The text may be a stretch of this very string.
-        memmove(_rep->data, text ? text : "", n);
+        memmove(characters(_rep), text ? text : "", n);
         finish(_rep, n);
         return;
     }
@@ -149,10 +155,10 @@ void String::append(char c)
     if (_rep->size >= _rep->cap || !is_unique(_rep)) {
         // Doubles even when only the sharing forbids to write in place.
         String_Rep* old = _rep;
-        _rep = make(old->data, old->size, old->cap == 0 ? 0 : 2 * old->cap);
+        _rep = make(characters(old), old->size, old->cap == 0 ? 0 : 2 * old->cap);
         release(old);
     }
-    _rep->data[_rep->size] = c;
+    characters(_rep)[_rep->size] = c;
     finish(_rep, _rep->size + 1);
 }
 
@@ -171,8 +177,8 @@ void String::append(const char* text, uint32 n)
     String_Rep* old = _rep;
     const bool in_place = old->cap >= room && is_unique(old);
     if (!in_place)
-        _rep = make(old->data, old->size, room);
-    memmove(_rep->data + old->size, text, n);
+        _rep = make(characters(old), old->size, room);
+    memmove(characters(_rep) + old->size, text, n);
     if (!in_place)
         release(old);
     finish(_rep, size);
@@ -188,7 +194,7 @@ void String::reserve(uint32 n)
     if (_rep->cap >= n && is_unique(_rep))
         return;
     String_Rep* old = _rep;
-    _rep = make(old->data, old->size, std::max(n, old->size));
+    _rep = make(characters(old), old->size, std::max(n, old->size));
     release(old);
 }
 
@@ -211,21 +217,21 @@ void String::remove(uint32 pos, uint32 n)
     reserve(_rep->size);
     const uint32 tail = _rep->size - pos;
     n = std::min(n, tail);
-    memmove(_rep->data + pos, _rep->data + pos + n, tail - n);
+    memmove(characters(_rep) + pos, characters(_rep) + pos + n, tail - n);
     finish(_rep, _rep->size - n);
 }
 
 void String::set(uint32 index, char c)
 {
     reserve(_rep->size);
-    _rep->data[index] = c;
+    characters(_rep)[index] = c;
 }
 
 String String::substr(uint32 pos, uint32 n) const
 {
     if (pos >= _rep->size)
         return String();
-    return String(_rep->data + pos, std::min(n, _rep->size - pos));
+    return String(characters(_rep) + pos, std::min(n, _rep->size - pos));
 }
 
 static uint32 index_of(const String_Rep* rep, const char* found)
@@ -235,22 +241,22 @@ static uint32 index_of(const String_Rep* rep, const char* found)
 
 uint32 String::find(char c) const
 {
-    return index_of(_rep, strchr(_rep->data, c));
+    return index_of(_rep, strchr(characters(_rep), c));
 }
 
 uint32 String::find(char c, uint32 pos) const
 {
-    return pos > _rep->size ? NPOS : index_of(_rep, strchr(_rep->data + pos, c));
+    return pos > _rep->size ? NPOS : index_of(_rep, strchr(characters(_rep) + pos, c));
 }
 
 uint32 String::find(const char* text) const
 {
-    return index_of(_rep, strstr(_rep->data, text));
+    return index_of(_rep, strstr(characters(_rep), text));
 }
 
 bool String::equal(const String& x) const
 {
-    return _rep == x._rep || equal(x._rep->data, x._rep->size);
+    return _rep == x._rep || equal(characters(x._rep), x._rep->size);
 }
 
 bool String::equal(const char* text) const
@@ -260,22 +266,22 @@ bool String::equal(const char* text) const
 
 bool String::equal(const char* text, uint32 n) const
 {
-    return _rep->size == n && (n == 0 || memcmp(_rep->data, text, n) == 0);
+    return _rep->size == n && (n == 0 || memcmp(characters(_rep), text, n) == 0);
 }
 
 bool String::equal(uint32 pos, const char* text, uint32 n) const
 {
-    return pos <= _rep->size && n <= _rep->size - pos && memcmp(_rep->data + pos, text, n) == 0;
+    return pos <= _rep->size && n <= _rep->size - pos && memcmp(characters(_rep) + pos, text, n) == 0;
 }
 
 bool String::equali(const String& x) const
 {
-    return _rep->size == x._rep->size && folded_eq(_rep->data, x._rep->data, _rep->size);
+    return _rep->size == x._rep->size && folded_eq(characters(_rep), characters(x._rep), _rep->size);
 }
 
 bool String::equali(const char* text) const
 {
-    return _rep->size == length_of(text) && (!text || folded_eq(_rep->data, text, _rep->size));
+    return _rep->size == length_of(text) && (!text || folded_eq(characters(_rep), text, _rep->size));
 }
 
 String operator+(const String& a, const String& b)

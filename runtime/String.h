@@ -70,7 +70,7 @@ public:
     uint32 size() const { return _rep->size; }
     uint32 capacity() const { return _rep->cap; }
     bool empty() const { return _rep->size == 0; }
-    char operator[](uint32 index) const { return _rep->data[index]; }
+    char operator[](uint32 index) const { return c_str()[index]; }
 
 private:
     String_Rep* _rep;
