@@ -44,12 +44,12 @@ LONGEST = 600
 TRAPS = [
     (r"\.as(String|Int|UInt|Bool|CString|Double|Int64|UInt64)\(\)",
      "Json::Value conversions go through adapter/Json_Access.h", {"adapter/Json_Access.cpp"},
-     {"host", "simulator", "tests", "bench"}),
+     {"host", "simulator", "tests", "bench", "fuzz"}),
     (r"\b(system|popen)\s*\(", "no shell: run argument vectors", set(), {"tests", "bench"}),
     (r"using namespace std;", "no 'using namespace std'", set(), set()),
     # Two debugging aids print by their contract.
     (r"\bstd::cout\b|\bprintf\(", "nothing writes to standard output inside a server",
-     {"runtime/Buffer.cpp", "runtime/cimom.cpp"}, {"host", "tests", "simulator", "bench"}),
+     {"runtime/Buffer.cpp", "runtime/cimom.cpp"}, {"host", "tests", "simulator", "bench", "fuzz"}),
     (r"^\s*#\s*include\s*<iostream>", "iostream brings static constructors and compile time", set(), {"tests"}),
 ]
 
