@@ -47,6 +47,9 @@ TEST(Rpc_Text, PlainWordsAreStrings)
 TEST(Rpc_Text, ValuesOfJsonAreValues)
 {
     EXPECT_EQ("[7,-7,0.5,true,null,\"7\"]", params(unknown, {"7", "-7", "5e-1", "true", "null", "\"7\""}));
+    EXPECT_EQ("[1.5,12000.0]", params(unknown, {"1.5", "12e3"}));
+    EXPECT_EQ("[\"1.\",\".5\",\"1e\",\"1e+\",\"-a\",\"1x\"]",
+              params(unknown, {"1.", ".5", "1e", "1e+", "-a", "1x"}));
     EXPECT_EQ("[{\"a\":[1]},[]]", params(unknown, {"{\"a\": [1]}", "[]"}));
 }
 
