@@ -66,17 +66,14 @@ static int set_element(CMPIArray* array, uint32 index, const CMPIValue& value, C
 template <class T>
 static int scalar_to_data(const Maker& maker, const Value& value, CMPIType word, CMPIData& data)
 {
-    T x = T();
-    value.get_value(x);
     data.type = word;
-    return store_scalar(maker, x, data.value) ? 0 : -1;
+    return store_scalar(maker, *value.peek<T>(), data.value) ? 0 : -1;
 }
 
 template <class T>
 static int array_to_data(const Maker& maker, const Value& value, CMPIType element_word, CMPIData& data)
 {
-    Array<T> elements;
-    value.get_value(elements);
+    const Array<T>& elements = *value.peek<Array<T>>();
     CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
     if (!array)
         return -1;
@@ -92,8 +89,7 @@ static int instance_array_to_data(const Meta_Repository* repository, const Maker
                                   const char* name_space, const Value& value, CMPIType element_word,
                                   CMPIData& data)
 {
-    Array<Instance*> elements;
-    value.get_value(elements);
+    const Array<Instance*>& elements = *value.peek<Array<Instance*>>();
     CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
     if (!array)
         return -1;

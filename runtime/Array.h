@@ -2,6 +2,8 @@
 
 #include "runtime/Array_Traits.h"
 
+#include <utility>
+
 namespace KPRV {
 
 /// Head of an array block. The elements follow at `__ARRAY_HEAD`.
@@ -61,12 +63,18 @@ class Array
 public:
     Array() { __construct(_rep, __Array_Traits_Factory<T>::traits()); }
     Array(const Array& x) : _rep(_clone(x._rep)) {}
+    Array(Array&& x) : Array() { std::swap(_rep, x._rep); }
     Array(const T* data, uint32 n) { __construct(_rep, __Array_Traits_Factory<T>::traits(), data, n); }
     ~Array() { __destruct(_rep); }
 
     Array& operator=(const Array& x)
     {
         __assign(_rep, x._rep);
+        return *this;
+    }
+    Array& operator=(Array&& x) noexcept
+    {
+        std::swap(_rep, x._rep);
         return *this;
     }
     void assign(const T* data, uint32 n) { __assign(_rep, data, n); }

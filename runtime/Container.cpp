@@ -27,12 +27,8 @@ int Container::convert(const Instance* instance, uint32 mask)
     for (const Meta_Feature* feature : features_of(meta_class)) {
         if ((mask && !(feature->flags & mask)) || !has_value(instance, feature))
             continue;
-        Value value;
-        if (value.set(instance, feature) != 0) {
-            LOG_CONVERSION(WARN, "unexpected failure: %s.%s", meta_class->name, feature->name);
-            continue;
-        }
-        if (set_value(feature->name, value, feature->flags) != 0)
+        const Lent_Value value(instance, feature);
+        if (set_value(feature->name, *value, feature->flags) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
     }
     return 0;

@@ -2,6 +2,8 @@
 
 #include "runtime/Types.h"
 
+#include <utility>
+
 namespace KPRV {
 
 /// Cell of a property in a generated class: the value, then the null byte right behind it.
@@ -15,6 +17,11 @@ struct Property
     void set(const T& x)
     {
         value = x;
+        null = 0;
+    }
+    void set(T&& x)
+    {
+        value = std::move(x);
         null = 0;
     }
 };

@@ -1,6 +1,5 @@
 #include "runtime/String.h"
 
-#include "runtime/Atomic.h"
 #include "runtime/strutil.h"
 
 #include <algorithm>
@@ -59,18 +58,6 @@ String_Rep* make(const char* text, uint32 n)
     return n == 0 ? &String::_empty : make(text, n, n);
 }
 
-void acquire(String_Rep* rep)
-{
-    if (rep != &String::_empty)
-        atomic_inc(rep->refs);
-}
-
-void release(String_Rep* rep)
-{
-    if (rep != &String::_empty && atomic_dec_and_test(rep->refs))
-        ::operator delete(rep);
-}
-
 /// Never true of `_empty`.
 bool is_unique(const String_Rep* rep)
 {
@@ -78,11 +65,6 @@ bool is_unique(const String_Rep* rep)
 }
 
 } // namespace
-
-String::String(const String& x) : _rep(x._rep)
-{
-    acquire(_rep);
-}
 
 String::String(const char* text) : _rep(make(text, length_of(text))) {}
 
@@ -105,15 +87,10 @@ String::String(const char* a, const char* b, const char* c) : _rep(&_empty)
     finish(_rep, total);
 }
 
-String::~String()
+void String::_release(String_Rep* rep)
 {
-    release(_rep);
-}
-
-String& String::operator=(const String& x)
-{
-    assign(x);
-    return *this;
+    if (rep != &_empty && atomic_dec_and_test(rep->refs))
+        ::operator delete(rep);
 }
 
 String& String::operator=(const char* text)
@@ -124,12 +101,8 @@ String& String::operator=(const char* text)
 
 void String::assign(const String& x)
 {
-    String_Rep* old = _rep;
-    if (old == x._rep)
-        return;
-    acquire(x._rep);
-    _rep = x._rep;
-    release(old);
+    if (_rep != x._rep)
+        *this = String(x);
 }
 
 void String::assign(const char* text)
@@ -147,7 +120,7 @@ void String::assign(const char* text, uint32 n)
     }
     String_Rep* old = _rep;
     _rep = make(text, n);
-    release(old);
+    _release(old);
 }
 
 void String::append(char c)
@@ -156,7 +129,7 @@ void String::append(char c)
         // Doubles even when only the sharing forbids to write in place.
         String_Rep* old = _rep;
         _rep = make(characters(old), old->size, old->cap == 0 ? 0 : 2 * old->cap);
-        release(old);
+        _release(old);
     }
     characters(_rep)[_rep->size] = c;
     finish(_rep, _rep->size + 1);
@@ -180,7 +153,7 @@ void String::append(const char* text, uint32 n)
         _rep = make(characters(old), old->size, room);
     memmove(characters(_rep) + old->size, text, n);
     if (!in_place)
-        release(old);
+        _release(old);
     finish(_rep, size);
 }
 
@@ -195,7 +168,7 @@ void String::reserve(uint32 n)
         return;
     String_Rep* old = _rep;
     _rep = make(characters(old), old->size, std::max(n, old->size));
-    release(old);
+    _release(old);
 }
 
 void String::clear()
@@ -206,7 +179,7 @@ void String::clear()
         finish(_rep, 0);
         return;
     }
-    release(_rep);
+    _release(_rep);
     _rep = &_empty;
 }
 

@@ -1,6 +1,9 @@
 #pragma once
 
+#include "runtime/Atomic.h"
 #include "runtime/Types.h"
+
+#include <utility>
 
 namespace KPRV {
 
@@ -25,14 +28,32 @@ public:
     static String_Rep _empty;
 
     constexpr String() : _rep(&_empty) {}
-    String(const String& x);
+    String(const String& x) : _rep(x._rep)
+    {
+        if (_rep != &_empty)
+            atomic_inc(_rep->refs);
+    }
+    String(String&& x) noexcept : _rep(std::exchange(x._rep, &_empty)) {}
     String(const char* text);
     String(const char* text, uint32 n);
     String(const char* a, const char* b);
     String(const char* a, const char* b, const char* c);
-    ~String();
+    ~String()
+    {
+        if (_rep != &_empty)
+            _release(_rep);
+    }
 
-    String& operator=(const String& x);
+    String& operator=(const String& x)
+    {
+        assign(x);
+        return *this;
+    }
+    String& operator=(String&& x) noexcept
+    {
+        std::swap(_rep, x._rep);
+        return *this;
+    }
     String& operator=(const char* text);
 
     void assign(const String& x);
@@ -73,6 +94,9 @@ public:
     char operator[](uint32 index) const { return c_str()[index]; }
 
 private:
+    /// Gives back one reference.
+    static void _release(String_Rep* rep);
+
     String_Rep* _rep;
 };
 

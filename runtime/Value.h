@@ -85,6 +85,12 @@ public:
     }
     /// Hands the pointer out without raising the count.
     int get_value(Instance*& x) const;
+    /// What is held, where it stands; null if the type is another one. T may be an array.
+    template <class T>
+    const T* peek() const
+    {
+        return type == type_code(static_cast<const T*>(nullptr)) ? &_as<T>() : nullptr;
+    }
 
     /// Loads this value from a cell. -1 for a method feature.
     int set(const Instance* instance, const Meta_Feature* feature);
@@ -99,6 +105,20 @@ public:
     bool null = false;
 
 private:
+    friend class Lent_Value;
+
+    template <class T>
+    static constexpr Type type_code(const T*)
+    {
+        return static_cast<Type>(Type_Code<T>::value);
+    }
+    template <class T>
+    static constexpr Type type_code(const Array<T>*)
+    {
+        return array_type<T>;
+    }
+    static constexpr Type type_code(const Array<Instance*>*) { return INSTANCE_ARRAY; }
+
     template <class T>
     static constexpr Type array_type = static_cast<Type>(ARRAY_BIT |
                                                          static_cast<sint32>(Type_Code<T>::value));
@@ -135,6 +155,23 @@ private:
 
     /// Any scalar, a `String` or `Datetime` handle, an `Instance*`, an array handle.
     alignas(8) unsigned char _bytes[8] = {};
+};
+
+/// What a cell holds, as a value that neither copies nor counts it: for readers that are done before the
+/// instance changes.
+class Lent_Value
+{
+public:
+    /// Type NONE for a method feature.
+    Lent_Value(const Instance* instance, const Meta_Feature* feature);
+    ~Lent_Value() { _value.type = Value::NONE; }
+    Lent_Value(const Lent_Value&) = delete;
+    Lent_Value& operator=(const Lent_Value&) = delete;
+
+    const Value& operator*() const { return _value; }
+
+private:
+    Value _value;
 };
 
 /// Upper-case name for printing, such as "UINT8_ARRAY".
