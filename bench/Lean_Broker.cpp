@@ -10,6 +10,8 @@ namespace {
 
 // Larger than what any provider here keeps a handle across, and small enough to stay near the processor.
 constexpr size_t BLOCK_SIZE = 16 << 20;
+// The beginning is not used again during a call: the objects of the request lie there.
+constexpr size_t REQUEST_SIZE = 64 << 10;
 
 Lean_Broker& self(const CMPIBroker* broker)
 {
@@ -127,8 +129,8 @@ void* Lean_Broker::allocate(size_t size)
     if (_next + size > _end) {
         if (_keep)
             _blocks.emplace_back(new char[BLOCK_SIZE]);
-        _next = _blocks.back().get();
-        _end = _next + BLOCK_SIZE;
+        _next = _blocks.back().get() + REQUEST_SIZE;
+        _end = _blocks.back().get() + BLOCK_SIZE;
     }
     return std::exchange(_next, _next + size);
 }
