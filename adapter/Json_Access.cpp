@@ -1,5 +1,6 @@
 #include "adapter/Json_Access.h"
 
+#include <algorithm>
 #include <cstring>
 #include <limits>
 
@@ -68,6 +69,11 @@ std::string asString(const Json::Value& value)
     return std::string(asView(value));
 }
 
+Json::Value text_value(const Json::Value& value)
+{
+    return value.isString() ? value : Json::Value(asString(value));
+}
+
 int asInt(const Json::Value& value)
 {
     return number<int>(value, "Type is not convertible to int");
@@ -108,6 +114,26 @@ const Json::Value& member(const Json::Value& object, const char* name)
 {
     const Json::Value* const found = find(object, name);
     return found ? *found : Json::Value::nullSingleton();
+}
+
+void find_members(const Json::Value& object, std::span<const std::string_view> names,
+                  const Json::Value** found)
+{
+    std::fill_n(found, names.size(), nullptr);
+    if (!object.isObject())
+        return;
+    // An object keeps its members in the same order.
+    size_t place = 0;
+    const auto last = object.end();
+    for (auto member = object.begin(); member != last && place < names.size(); ++member) {
+        const char* name_end = nullptr;
+        const char* const name_begin = member.memberName(&name_end);
+        const std::string_view name(name_begin, size_t(name_end - name_begin));
+        while (place < names.size() && names[place] < name)
+            place++;
+        if (place < names.size() && names[place] == name)
+            found[place++] = &*member;
+    }
 }
 
 const Json::Value& element(const Json::Value& array, unsigned index)

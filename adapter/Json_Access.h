@@ -2,6 +2,8 @@
 
 #include <json/value.h>
 
+#include <array>
+#include <span>
 #include <stdexcept>
 #include <string>
 #include <string_view>
@@ -27,6 +29,8 @@ bool isObjectOrNull(const Json::Value& value);
 // and a number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
 
 std::string asString(const Json::Value& value);
+/// The same text as a value.
+Json::Value text_value(const Json::Value& value);
 /// The same text where it stands, as long as the value stands.
 std::string_view asView(const Json::Value& value);
 /// A fraction is cut off.
@@ -40,6 +44,32 @@ bool asBool(const Json::Value& value);
 bool hasMember(const Json::Value& object, const char* name);
 /// The member, or null if it is absent or the value is no object. Never adds a member.
 const Json::Value& member(const Json::Value& object, const char* name);
+/// Several members of one object in one pass over it, which is cheaper than to look each of them up. `names`
+/// are in ascending order of their bytes; a null pointer in `found` stands for an absent member.
+void find_members(const Json::Value& object, std::span<const std::string_view> names,
+                  const Json::Value** found);
+
+/// What is read of one kind of object, by the places of the names.
+template <size_t N>
+class Members
+{
+public:
+    using Names = std::array<std::string_view, N>;
+
+    /// The names are a constant: they must be in ascending order.
+    Members(const Json::Value& object, const Names& names) { find_members(object, names, _found); }
+
+    /// The member, or null if it is absent.
+    const Json::Value& operator[](size_t place) const
+    {
+        return _found[place] ? *_found[place] : Json::Value::nullSingleton();
+    }
+    bool has(size_t place) const { return _found[place] != nullptr; }
+
+private:
+    const Json::Value* _found[N];
+};
+
 /// Element of an array, or null beyond its end.
 const Json::Value& element(const Json::Value& array, unsigned index);
 

@@ -22,7 +22,8 @@ T* create_null()
         clear(instance.ptr());
         return instance;
     }();
-    return clone_of<T>(all_null.ptr());
+    static const bool is_blank = holds_nothing(all_null.ptr());
+    return is_blank ? static_cast<T*>(clone_of_blank(all_null.ptr())) : clone_of<T>(all_null.ptr());
 }
 
 template <class T>

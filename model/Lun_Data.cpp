@@ -2,34 +2,54 @@
 
 #include "model/Record_Filling.h"
 
+#include <algorithm>
+
 namespace KPRV {
 
-bool is_lun(const Json::Value& element)
-{
-    return hasMember(element, "vendor") && hasMember(element, "number") && hasMember(element, "productID");
-}
+namespace {
 
-void fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen, _hbaLunInfo& lun)
+// What is read of an element, in the order of its members.
+enum : size_t
+{
+    ID_TYPE,
+    DESCRIPTION,
+    NUMBER,
+    PRODUCT_ID,
+    SERIAL_NUMBER,
+    VENDOR,
+    NUM_NAMES
+};
+constexpr std::array<std::string_view, NUM_NAMES> names = {
+    "lunDescIdType", "lunDescription", "number", "productID", "productSerialNumber", "vendor",
+};
+static_assert(std::ranges::is_sorted(names));
+
+} // namespace
+
+bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen, _hbaLunInfo& lun)
 {
     constexpr uint32 BY_PRODUCT = 0, UNKNOWN = 10;
+    const Members<NUM_NAMES> members(element, names);
+    if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
+        return false;
     copy_flat(lun.remoteWWN, remote_wwn);
-    lun.number = asUInt(member(element, "number"));
-    copy_member(lun.vendor, element, "vendor");
-    copy_member(lun.productID, element, "productID");
-    lun.idType = asUInt(member(element, "lunDescIdType"));
+    lun.number = asUInt(members[NUMBER]);
+    copy_text(lun.vendor, text_of(members[VENDOR]));
+    copy_text(lun.productID, text_of(members[PRODUCT_ID]));
+    lun.idType = asUInt(members[ID_TYPE]);
 
-    if (hasMember(element, "lunDescription"))
-        copy_member(lun.description, element, "lunDescription");
+    if (members.has(DESCRIPTION))
+        copy_text(lun.description, text_of(members[DESCRIPTION]));
     else
         no_description_seen = true;
     // One LUN without a description puts all that follow in the same walk under these rules, those with a
     // description, too: the names of LUNs that clients already keep depend on it.
     if (no_description_seen) {
-        const bool has_serial = hasMember(element, "productSerialNumber");
-        if (has_serial)
-            copy_member(lun.serialNumber, element, "productSerialNumber");
-        lun.idType = has_serial ? BY_PRODUCT : UNKNOWN;
+        if (members.has(SERIAL_NUMBER))
+            copy_text(lun.serialNumber, text_of(members[SERIAL_NUMBER]));
+        lun.idType = members.has(SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
     }
+    return true;
 }
 
 } // namespace KPRV

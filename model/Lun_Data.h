@@ -20,13 +20,10 @@ struct _hbaLunInfo
     uint32 idType; ///< What identifies the LUN; decides on the form of its name.
 };
 
-/// The element has all that a LUN must have.
-bool is_lun(const Json::Value& element);
-
-/// Fills the record from such an element of `lunList`. `no_description_seen` is the walk's: it is set by the
-/// first LUN without a description and from then on decides for all. Throws `Not_Convertible` for a member
-/// of the wrong type.
-void fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen,
+/// Fills the record from an element of `lunList`; false if it lacks what a LUN must have.
+/// `no_description_seen` is the walk's: it is set by the first LUN without a description and from then on
+/// decides for all. Throws `Not_Convertible` for a member of the wrong type.
+bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen,
               _hbaLunInfo& lun);
 
 } // namespace KPRV

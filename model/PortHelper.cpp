@@ -120,7 +120,7 @@ void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk
 {
     Json::Value answer;
     if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"},
-                 [&] { walk.request["wwn"] = asString(address); }))
+                 [&] { walk.request["wwn"] = text_value(address); }))
         return;
     if (!guarded_call(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answer))
         return;

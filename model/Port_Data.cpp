@@ -2,34 +2,59 @@
 
 #include "model/Record_Filling.h"
 
+#include <algorithm>
+
 namespace KPRV {
 
 namespace {
 
-constexpr sint64 GIGABIT = 1000000000;
+// What is read of an answer, in the order of its members.
+enum : size_t
+{
+    SYMBOLIC_NAME,
+    MAX_FRAME_SIZE,
+    NODE_WWN,
+    OPERATING_SPEED,
+    STATUS,
+    PORT_TYPE,
+    SUPPORTED_SPEEDS,
+    WWN,
+    NUM_NAMES
+};
+constexpr std::array<std::string_view, NUM_NAMES> names = {
+    "PortSymbolicName", "maxFrameSize",        "nodeWwn", "operatingSpeed", "portStatusValue",
+    "portTypeMOFValue", "supportedPortSpeeds", "wwn",
+};
+static_assert(std::ranges::is_sorted(names));
 
-sint64 operating_speed(const Json::Value& answer)
+sint64 bits_per_second(const Json::Value& gigabits)
+{
+    constexpr sint64 GIGABIT = 1000000000;
+    return asInt(gigabits) * GIGABIT;
+}
+
+sint64 operating_speed(const Json::Value& gigabits)
 {
     // What a port without a link says.
     constexpr int UNKNOWN_SPEED = 99999;
-    const int speed = asInt(member(answer, "operatingSpeed"));
-    return speed == UNKNOWN_SPEED ? 0 : speed * GIGABIT;
+    return asInt(gigabits) == UNKNOWN_SPEED ? 0 : bits_per_second(gigabits);
 }
 
 } // namespace
 
 void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
-    copy_flat(port.localWWN, answer, "wwn");
+    const Members<NUM_NAMES> members(answer, names);
+    copy_flat(port.localWWN, text_of(members[WWN]));
     copy_text(port.portWWN, port.localWWN);
-    copy_flat(port.nodeWWN, answer, "nodeWwn");
-    copy_member(port.symbolicName, answer, "PortSymbolicName");
-    port.status = asInt(member(answer, "portStatusValue"));
+    copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
+    copy_text(port.symbolicName, text_of(members[SYMBOLIC_NAME]));
+    port.status = asInt(members[STATUS]);
     host.get(port.systemName, sizeof port.systemName);
-    port.portType = asInt(member(answer, "portTypeMOFValue"));
-    port.maxFrameSize = asInt(member(answer, "maxFrameSize"));
-    port.speed = operating_speed(answer);
-    port.maxSpeed = asInt(element(member(answer, "supportedPortSpeeds"), 0)) * GIGABIT;
+    port.portType = asInt(members[PORT_TYPE]);
+    port.maxFrameSize = asInt(members[MAX_FRAME_SIZE]);
+    port.speed = operating_speed(members[OPERATING_SPEED]);
+    port.maxSpeed = bits_per_second(element(members[SUPPORTED_SPEEDS], 0));
     port.portNumber = port_number;
 }
 

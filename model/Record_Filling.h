@@ -17,24 +17,24 @@ void copy_text(char (&field)[N], std::string_view text)
     field[text.copy(field, N - 1)] = '\0';
 }
 
-/// A text member of an object where it stands, up to its first zero byte.
-inline std::string_view text_member(const Json::Value& object, const char* name)
+/// A text where it stands, up to its first zero byte.
+inline std::string_view text_of(const Json::Value& value)
 {
-    const std::string_view text = asView(member(object, name));
+    const std::string_view text = asView(value);
     return text.substr(0, text.find('\0'));
 }
 
 template <size_t N>
 void copy_member(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_text(field, text_member(object, name));
+    copy_text(field, text_of(member(object, name)));
 }
 
 /// Without blanks around it.
 template <size_t N>
 void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_text(field, ProviderUtil::trimmed(text_member(object, name)));
+    copy_text(field, ProviderUtil::trimmed(text_of(member(object, name))));
 }
 
 /// Flat form of an address.
@@ -51,7 +51,7 @@ void copy_flat(char (&field)[N], std::string_view address)
 template <size_t N>
 void copy_flat(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_flat(field, text_member(object, name));
+    copy_flat(field, text_of(member(object, name)));
 }
 
 } // namespace KPRV

@@ -85,12 +85,11 @@ void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
 
 void TargetHelper::publish_lun(Walk& walk, const char* wwn, const Json::Value& element) const
 {
-    if (!is_lun(element)) {
+    _hbaLunInfo lun = {};
+    if (!fill_lun(element, wwn, walk.no_description_seen, lun)) {
         LOG(ERR, "LUN info is NOT available");
         return;
     }
-    _hbaLunInfo lun = {};
-    fill_lun(element, wwn, walk.no_description_seen, lun);
     switch (walk.id) {
     case TAPEDRIVE:
         walk.instances.append(getTapeDriveInstance(walk.port, lun));

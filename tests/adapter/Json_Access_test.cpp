@@ -85,3 +85,33 @@ TEST(Json_Access, reading_adds_nothing_and_never_throws)
     EXPECT_TRUE(element(json("[3, 4]"), 2).isNull());
     EXPECT_TRUE(element(json("{}"), 0).isNull());
 }
+
+TEST(Json_Access, members_in_one_pass)
+{
+    const Members<4>::Names names = {"B", "a", "aa", "c"};
+    const Json::Value object = json("{'c': 3, 'B': 'x', 'aa': null, 'ab': 4, 'A': 5}");
+    const Members<4> members(object, names);
+    EXPECT_EQ(asView(members[0]), "x");
+    EXPECT_FALSE(members.has(1));
+    EXPECT_TRUE(members[1].isNull());
+    EXPECT_TRUE(members.has(2));
+    EXPECT_TRUE(members[2].isNull());
+    EXPECT_EQ(asInt(members[3]), 3);
+    for (const char* text : {"null", "[1]", "5", "{}"}) {
+        const Json::Value other = json(text);
+        const Members<4> none(other, names);
+        for (size_t i = 0; i < names.size(); i++)
+            EXPECT_FALSE(none.has(i)) << text;
+    }
+}
+
+TEST(Json_Access, texts_where_they_stand)
+{
+    EXPECT_EQ(asView(json("''")), "");
+    EXPECT_EQ(asView(json("null")), "");
+    EXPECT_EQ(asView(json("true")), "true");
+    EXPECT_THROW(asView(json("5")), Not_Convertible);
+    EXPECT_EQ(text_value(json("'x'")), Json::Value("x"));
+    EXPECT_EQ(text_value(json("null")), Json::Value(""));
+    EXPECT_THROW(text_value(json("[]")), Not_Convertible);
+}

@@ -1,6 +1,7 @@
 #include "adapter/ProviderUtil.h"
 
 #include "adapter/Host_Calls.h"
+#include "adapter/Host_Name.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
@@ -119,6 +120,32 @@ TEST_F(ProviderUtil_Host, with_loopback_addresses_alone_it_is_the_bare_name)
     domain = "(none)";
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
     EXPECT_STREQ(buffer, "localhost");
+}
+
+TEST_F(ProviderUtil_Host, one_walk_asks_once_and_tells_each_time)
+{
+    resolves = false;
+    names_left = 1;
+    Host_Name host;
+    for (int i = 0; i < 3; i++) {
+        char again[64] = "left over";
+        EXPECT_EQ(host.get(again, sizeof again), 2);
+        EXPECT_STREQ(again, "alpha");
+    }
+    EXPECT_EQ(log.said(), Lines(3, BY_NAME));
+    EXPECT_EQ(log.traces().size(), 6u);
+    EXPECT_EQ(log.traces()[4], "DBG Entering: getHostInfo");
+}
+
+TEST_F(ProviderUtil_Host, room_of_another_size_is_another_question)
+{
+    has({"10.1.2.3"});
+    Host_Name host;
+    char small[5] = "";
+    EXPECT_EQ(host.get(small, sizeof small), 0);
+    EXPECT_STREQ(small, "10.1");
+    EXPECT_EQ(host.get(buffer, sizeof buffer), 0);
+    EXPECT_STREQ(buffer, "10.1.2.3");
 }
 
 TEST_F(ProviderUtil_Host, a_name_that_is_lost_in_between)
