@@ -1,6 +1,7 @@
 #include "cmpi/CMPI_Containers.h"
 #include "cmpi/Made_Objects.h"
 #include "cmpi/cmpi_text.h"
+#include "cmpi/cmpi_types.h"
 #include "cmpi/to_cimple_value.h"
 #include "cmpi/to_cmpi_data.h"
 #include "runtime/log.h"
@@ -59,7 +60,13 @@ void CMPI_Container::_relax(Value::Type, Value&) {}
 
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
-    CMPIData data;
+    CMPIData data = {};
+    // Most properties: nothing is made for them, and nothing can fail.
+    if (const void* const bytes = value.plain_bytes()) {
+        data.type = cmpi_type_words[value.type];
+        memcpy(&data.value, bytes, sizeof data.value);
+        return _set(name, data);
+    }
     Made_Objects made;
     if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr) !=
         0) {

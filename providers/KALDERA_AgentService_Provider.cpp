@@ -17,6 +17,13 @@ std::string as_logged(std::string text)
     return text;
 }
 
+void log_text(Call_Site site, const char* text)
+{
+    // Texts are long, and most logs do not want them.
+    if (log_uses(Log_Level::DBG))
+        log(Log_Level::DBG, site.file, site.line, "%s", as_logged(text).c_str());
+}
+
 } // namespace
 
 class KALDERA_AgentService_Provider : public KALDERA_AgentService_Skeleton
@@ -37,12 +44,12 @@ public:
         LOG_SCOPE("executeMethod");
         // A null request is an empty text.
         const std::string text(request.value.c_str(), request.value.size());
-        LOG(DBG, "%s", as_logged(text).c_str());
+        log_text(LOG_HERE, text.c_str());
         JsonRpcManager::response reply;
         JsonRpcManager::instance()->process(text, reply);
         LOG(DBG, "rpcResponse : %s", reply.text.c_str());
         response.set(reply.text.c_str());
-        LOG(DBG, "%s", as_logged(reply.text.c_str()).c_str());
+        log_text(LOG_HERE, reply.text.c_str());
         return_value.set(0);
         return INVOKE_METHOD_OK;
     }

@@ -44,6 +44,11 @@ void destroyer(Instance* instance);
 
 /// A deep copy with a count of 1, owned by the caller.
 Instance* clone(const Instance* instance);
+/// True if no cell holds a text, a moment, an element or an instance: such a record can be copied by its
+/// bytes.
+bool holds_nothing(const Instance* instance);
+/// A clone of an instance that holds nothing.
+Instance* clone_of_blank(const Instance* instance);
 /// A new instance that holds only the keys, owned by the caller.
 Instance* key_clone(const Instance* instance);
 

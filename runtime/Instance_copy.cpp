@@ -1,8 +1,10 @@
 #include "runtime/Instance.h"
 
+#include "runtime/empty_arrays.h"
 #include "runtime/features.h"
 #include "runtime/type_dispatch.h"
 
+#include <algorithm>
 #include <cstring>
 #include <new>
 
@@ -39,7 +41,11 @@ struct Unsharer
             f.type(), [&] { new (f.value(dest)) String(*static_cast<const String*>(value)); },
             [&] { new (f.value(dest)) Datetime(*static_cast<const Datetime*>(value)); }, [] {});
     }
-    void operator()(Array_Feature f) const { f.array(dest) = _clone(f.array(src)); }
+    void operator()(Array_Feature f) const
+    {
+        if (!is_empty_array(f.array(src)))
+            f.array(dest) = _clone(f.array(src));
+    }
     void operator()(Reference_Feature f) const { f.target(dest) = clone(f.target(src)); }
     void operator()(Reference_Array_Feature f) const
     {
@@ -133,18 +139,55 @@ struct Clearer
     void operator()(Method_Feature) const {}
 };
 
+/// The count of the class is not raised, though the destructor lowers it: it only matters to classes built at
+/// run time, which no request clones.
+Instance* copy_of_bytes(const Instance* instance)
+{
+    const uint32 size = instance->__meta_class->size;
+    Instance* copy = static_cast<Instance*>(::operator new(size));
+    memcpy(static_cast<void*>(copy), static_cast<const void*>(instance), size);
+    copy->__refs = 1;
+    return copy;
+}
+
 } // namespace
+
+bool holds_nothing(const Instance* instance)
+{
+    const Datetime none;
+    const auto is_blank = [&](const Meta_Feature* feature) {
+        return visit_feature(
+            feature,
+            Overloaded{
+                [&](Scalar_Feature f) {
+                    const void* value = f.value(instance);
+                    return visit_storage(
+                        f.type(),
+                        [=] { return static_cast<const String*>(value)->c_str() == String::_empty.data; },
+                        [&] { return memcmp(value, static_cast<const void*>(&none), sizeof none) == 0; },
+                        [] { return true; });
+                },
+                [&](Array_Feature f) { return is_empty_array(f.array(instance)); },
+                [&](Reference_Feature f) { return f.target(instance) == nullptr; },
+                [](Reference_Array_Feature) { return false; },
+                [](Method_Feature) { return true; },
+            });
+    };
+    return instance->__name_space.empty() &&
+           std::ranges::all_of(features_of(instance->__meta_class), is_blank);
+}
+
+Instance* clone_of_blank(const Instance* instance)
+{
+    return copy_of_bytes(instance);
+}
 
 Instance* clone(const Instance* instance)
 {
     if (!instance)
         return nullptr;
     const Meta_Class* meta_class = instance->__meta_class;
-    // The count of the class is not raised, though the destructor lowers it: it only matters to classes built
-    // at run time, which no request clones.
-    Instance* copy = static_cast<Instance*>(::operator new(meta_class->size));
-    memcpy(static_cast<void*>(copy), static_cast<const void*>(instance), meta_class->size);
-    copy->__refs = 1;
+    Instance* copy = copy_of_bytes(instance);
     new (&copy->__name_space) String(instance->__name_space);
     for (const Meta_Feature* feature : features_of(meta_class))
         visit_feature(feature, Unsharer{copy, instance});

@@ -80,9 +80,14 @@ static void write_line(Log_Level level, const char* file, size_t line, const cha
     _lock->unlock();
 }
 
+bool log_uses(Log_Level level)
+{
+    return level <= _threshold.load(std::memory_order_relaxed);
+}
+
 void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
 {
-    if (level > _threshold.load(std::memory_order_relaxed))
+    if (!log_uses(level))
         return;
     const Auto_Log_Mutex guard;
     if (!_initialized)
@@ -93,6 +98,8 @@ void vlog(Log_Level level, const char* file, size_t line, const char* format, va
 
 void log(Log_Level level, const char* file, size_t line, const char* format, ...)
 {
+    if (!log_uses(level))
+        return;
     va_list arguments;
     va_start(arguments, format);
     vlog(level, file, line, format, arguments);

@@ -32,6 +32,9 @@ int log_enable(bool flag);
 /// Read by call sites before they build a `Log_Call_Frame`.
 extern std::atomic<bool> _log_enabled_state;
 
+/// False if a line of that level would be dropped: for callers whose arguments are dear. An attempt to open
+/// the log counts as a use of the line.
+bool log_uses(Log_Level level);
 /// Sets the level in memory only: the configuration file overrides it. -1 for an unknown name.
 int log_set_level(const char* name);
 int _validate_log_level(const char* name, Log_Level& level);

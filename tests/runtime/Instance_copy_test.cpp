@@ -40,6 +40,22 @@ TEST(Instance_clone, SharesNothingThatCanBeWritten)
     EXPECT_TRUE(identical(x.ptr(), untouched.ptr()));
 }
 
+TEST(Instance_clone, OfABlankRecordNeedsOnlyItsBytes)
+{
+    const Ref<Sample_Types> blank(create<Sample_Types>(false));
+    clear(blank.ptr());
+    ASSERT_TRUE(holds_nothing(blank.ptr()));
+    const Ref<Instance> copy(clone_of_blank(blank.ptr()));
+    EXPECT_TRUE(identical(blank.ptr(), copy.ptr()));
+    EXPECT_EQ(1, copy->__refs);
+    EXPECT_FALSE(holds_nothing(make_types(0).ptr()));
+    // A list of references has a block of its own, and a text may be the only thing that is held.
+    EXPECT_FALSE(holds_nothing(make_group("g").ptr()));
+    const Ref<Sample_Types> text(create<Sample_Types>(false));
+    text->Scalar_STRING.set("x");
+    EXPECT_FALSE(holds_nothing(text.ptr()));
+}
+
 TEST(Instance_clone, ClonesWhatIsReferredTo)
 {
     const Ref<Sample_Group> x = make_group("g");

@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
+
 namespace KPRV {
 
 namespace {
@@ -432,6 +434,43 @@ TEST(Value_get, AnElementThatDoesNotFitLeavesTheArrayAssignedAndCounted)
     // They outlive the value: the instance releases each of them.
     for (Instance* member : group->Members.value)
         EXPECT_EQ(1, member->__refs);
+}
+
+TEST(Lent_Value_Test, ShowsTheCellWithoutHoldingIt)
+{
+    const Ref<Sample_Group> group = make_group("g");
+    {
+        const Lent_Value leader(group.ptr(), LEADER);
+        Instance* target = nullptr;
+        EXPECT_EQ(0, (*leader).get_value(target));
+        EXPECT_EQ(group->Leader, target);
+        EXPECT_EQ(1, target->__refs);
+
+        const Lent_Value members(group.ptr(), MEMBERS);
+        ASSERT_NE(nullptr, (*members).peek<Array<Instance*>>());
+        EXPECT_EQ(group->Members.value.data(), (*members).peek<Array<Instance*>>()->data());
+        // A copy of it is a value like any other.
+        const Value copy(*members);
+        EXPECT_EQ(2, group->Members.value[0]->__refs);
+    }
+    EXPECT_EQ(1, group->Leader->__refs);
+    EXPECT_EQ(1, group->Members.value[0]->__refs);
+    EXPECT_EQ(Value::NONE, (*Lent_Value(group.ptr(), RESET)).type);
+}
+
+TEST(Value_Test, PeekKnowsItsType)
+{
+    Value x;
+    EXPECT_EQ(nullptr, x.plain_bytes());
+    x.set_value("text");
+    ASSERT_NE(nullptr, x.peek<String>());
+    EXPECT_STREQ("text", x.peek<String>()->c_str());
+    EXPECT_EQ(nullptr, x.peek<uint8>());
+    EXPECT_EQ(nullptr, x.plain_bytes());
+    x.set_value(uint16(7));
+    const uint64 wide = 7;
+    ASSERT_NE(nullptr, x.plain_bytes());
+    EXPECT_EQ(0, memcmp(&wide, x.plain_bytes(), sizeof wide));
 }
 
 } // namespace KPRV
