@@ -3,6 +3,8 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <fcntl.h>
+#include <unistd.h>
 
 namespace KPRV {
 
@@ -59,8 +61,15 @@ static bool read_level(FILE* file, Log_Level& level)
 /// False if the path does not fit: a shortened path would name another file.
 static bool make_path(char (&path)[LOG_PATH_SIZE], const char* folder, const char* name, const char* suffix)
 {
-    const int n = snprintf(path, sizeof(path), "%s/%s%s", folder, name, suffix);
-    return n >= 0 && size_t(n) < sizeof(path);
+    char* end = path;
+    for (const char* const part : {folder, "/", name, suffix}) {
+        const size_t size = strlen(part);
+        if (size >= size_t(path + sizeof(path) - end))
+            return false;
+        end = static_cast<char*>(memcpy(end, part, size)) + size;
+    }
+    *end = '\0';
+    return true;
 }
 
 bool read_log_configuration(Log_Configuration& configuration)
@@ -70,9 +79,15 @@ bool read_log_configuration(Log_Configuration& configuration)
     if (!home || !make_path(rc_path, home, FOLDER, "rc"))
         return false;
 
-    FILE* const file = fopen(rc_path, "re");
-    if (!file)
+    // Most accounts have none, and each line comes here: no stream is made before there is something to read.
+    const int descriptor = open(rc_path, O_RDONLY | O_CLOEXEC);
+    if (descriptor < 0)
         return false;
+    FILE* const file = fdopen(descriptor, "r");
+    if (!file) {
+        close(descriptor);
+        return false;
+    }
     const bool found = read_level(file, configuration.level);
     fclose(file);
 
