@@ -5,8 +5,8 @@
 #include <cerrno>
 #include <cstring>
 #include <fstream>
-#include <regex>
 #include <sstream>
+#include <string_view>
 #include <sys/stat.h>
 
 namespace KPRV::simulator {
@@ -57,12 +57,23 @@ Image read_image(const std::string& file)
     return {head, {}};
 }
 
-/// The version that the image names, or "".
+/// The version that a whole line of the image names, or "".
 std::string version_of(const Image& image)
 {
-    static const std::regex line("(^|\n)firmware-version=([0-9A-Za-z._-]{1,32})\r?(\n|$)");
-    std::smatch match;
-    return std::regex_search(image.head, match, line) ? match[2].str() : "";
+    constexpr std::string_view name = "firmware-version=";
+    constexpr std::string_view characters =
+        "0123456789abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ._-";
+    std::istringstream lines(image.head);
+    for (std::string line; std::getline(lines, line);) {
+        if (line.ends_with('\r'))
+            line.pop_back();
+        if (!line.starts_with(name))
+            continue;
+        const std::string version = line.substr(name.size());
+        if (!version.empty() && version.size() <= 32 && version.find_first_not_of(characters) == version.npos)
+            return version;
+    }
+    return "";
 }
 
 } // namespace
