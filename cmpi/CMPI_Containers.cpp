@@ -61,10 +61,10 @@ void CMPI_Container::_relax(Value::Type, Value&) {}
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
     CMPIData data = {};
-    // Most properties: nothing is made for them, and nothing can fail.
+    // Most properties: nothing is made for them, and nothing can fail. The widest has 64 bits.
     if (const void* const bytes = value.plain_bytes()) {
         data.type = cmpi_type_words[value.type];
-        memcpy(&data.value, bytes, sizeof data.value);
+        memcpy(&data.value, bytes, sizeof(uint64));
         return _set(name, data);
     }
     Made_Objects made;
