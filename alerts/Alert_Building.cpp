@@ -4,6 +4,7 @@
 #include "alerts/Element_Paths.h"
 #include "alerts/Event_Categories.h"
 #include "alerts/Perceived_Severity.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <cstdio>
@@ -37,7 +38,7 @@ void follow_registry(KALDERA_AlertIndication& alert, const char* port_state)
 
 KALDERA_AlertIndication* new_alert(const Adapter_Event& event)
 {
-    auto* const alert = create<KALDERA_AlertIndication>(true);
+    Ref<KALDERA_AlertIndication> alert(create<KALDERA_AlertIndication>(true));
     alert->AlertingElementFormat.set(FORMAT_OBJECT_PATH);
     alert->SystemCreationClassName.set(ProviderUtil::getClassName(COMPUTERSYSTEM));
     alert->SystemName.set(host_name_of_alerts());
@@ -52,7 +53,7 @@ KALDERA_AlertIndication* new_alert(const Adapter_Event& event)
     alert->PerceivedSeverity.set(getPerceivedSeverity(event.severity));
     alert->Message.set(event.message);
     alert->MessageArguments.set({});
-    return alert;
+    return alert.steal();
 }
 
 void set_category(KALDERA_AlertIndication& alert, const Adapter_Event& event, const Category_Row& category)

@@ -16,20 +16,20 @@ T* make_test(diag_test_id_t id, classId_t class_id)
     char system_name[256] = "";
     ProviderUtil::getHostInfo(system_name, sizeof system_name);
     const Diagnostic_Test* const test = find_diagnostic_test(id);
-    T* const instance = create<T>(true);
+    Ref<T> instance(create<T>(true));
     set_system_keys(*instance, class_id, system_name);
     instance->Name.set(ProviderUtil::getDiagTestName(id));
     instance->ElementName.set(test ? test->element_name : "");
     instance->Characteristics.set(getDiagCharacteristics(id));
     instance->OtherCharacteristicDescription.set("");
-    return instance;
+    return instance.steal();
 }
 
 template <class T>
 T* make_record(const DiagnosticRecord& record, const char* caption, const char* description,
                const String& element_name)
 {
-    T* const instance = create<T>(true);
+    Ref<T> instance(create<T>(true));
     instance->Caption.set(caption);
     instance->ElementName.set(caption);
     instance->Description.set(description);
@@ -40,7 +40,7 @@ T* make_record(const DiagnosticRecord& record, const char* caption, const char* 
     instance->ManagedElementName.set(element_name);
     instance->RecordType.set(record.record_type);
     instance->RecordFormat.set("");
-    return instance;
+    return instance.steal();
 }
 
 } // namespace
@@ -91,7 +91,7 @@ KALDERA_DiagnosticSoftwareIdentity* DiagnosticHelper::getDiagnosticSoftwareIdent
 {
     LOG_SCOPE("getDiagnosticSoftwareIdentityInstance");
     const String version = ProviderUtil::getDriverVersion();
-    auto* const identity = create<KALDERA_DiagnosticSoftwareIdentity>(true);
+    Ref<KALDERA_DiagnosticSoftwareIdentity> identity(create<KALDERA_DiagnosticSoftwareIdentity>(true));
     identity->InstanceID.set("Kaldera:Diagnostic");
     identity->Caption.set("Diagnostic Software");
     identity->Description.set("Diagnostic Software");
@@ -106,21 +106,21 @@ KALDERA_DiagnosticSoftwareIdentity* DiagnosticHelper::getDiagnosticSoftwareIdent
     identity->BuildNumber.set(0);
     identity->IdentityInfoType.set(array_of<String>({"SoftwareID", "SoftwareStatus"}));
     identity->IdentityInfoValue.set(array_of<String>({"Diagnostic Software for Kaldera Adapter", "Primary"}));
-    return identity;
+    return identity.steal();
 }
 
 KALDERA_ConcreteJob* DiagnosticHelper::getConcreteJobInstance(const DiagnosticJob& job) const
 {
     LOG_SCOPE("getConcreteJobInstance");
     // `TimeBeforeRemoval` stays at its default, on which nothing acts: the next job removes this one.
-    auto* const instance = create<KALDERA_ConcreteJob>(true);
+    Ref<KALDERA_ConcreteJob> instance(create<KALDERA_ConcreteJob>(true));
     instance->InstanceID.set(job.instance_id);
     instance->Name.set(job.instance_id);
     instance->JobState.set(job.job_state);
     instance->StartTime.set(job.start_time);
     instance->ElapsedTime.set(job.elapsed_time);
     instance->PercentComplete.set(job.percent_complete);
-    return instance;
+    return instance.steal();
 }
 
 Instance* DiagnosticHelper::getManagedElementInstance(const DiagnosticRecord& record) const

@@ -2,6 +2,7 @@
 
 #include "model/Instance_Building.h"
 #include "model/Record_Filling.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 namespace KPRV {
@@ -46,13 +47,13 @@ AccessPointHelper::getRemoteServiceAccessPointInstance(const _adapterData& adapt
     const std::string url =
         std::string("https://") + adapter.systemName + ":" + std::to_string(port) + "/index.html";
     constexpr uint16 URL = 200;
-    auto* point = create<KALDERA_RemoteServiceAccessPoint>(true);
+    Ref<KALDERA_RemoteServiceAccessPoint> point(create<KALDERA_RemoteServiceAccessPoint>(true));
     set_system_keys(*point, REMOTESERVICEACCESSPOINT, adapter.systemName);
     point->Name.set("QXM Service");
     point->ElementName.set("Quintex Manager Service Access Point");
     point->AccessInfo.set(to_String(url));
     point->InfoFormat.set(URL);
-    return point;
+    return point.steal();
 }
 
 } // namespace KPRV

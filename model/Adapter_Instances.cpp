@@ -1,6 +1,7 @@
 #include "adapter/ProviderUtil.h"
 #include "model/AdapterHelper.h"
 #include "model/Instance_Building.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 namespace KPRV {
@@ -84,7 +85,7 @@ KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterD
 {
     LOG_SCOPE("getPortControllerInstance");
     const bool stopped = adapter.status == 10;
-    auto* controller = create_null<KALDERA_PortController>();
+    Ref<KALDERA_PortController> controller(create_null<KALDERA_PortController>());
     set_system_keys(*controller, PORTCONTROLLER, adapter.systemName);
     controller->Name.set(adapter.serialNumber);
     controller->DeviceID.set(adapter.address());
@@ -98,14 +99,14 @@ KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterD
     controller->ControllerType.set(adapter.isCNA ? 1 : 4);
     if (adapter.isCNA)
         controller->OtherControllerType.set("CNA - FC and Ethernet types");
-    return controller;
+    return controller.steal();
 }
 
 KALDERA_PhysicalPackage* AdapterHelper::getPhysicalPackageInstance(const _adapterData& adapter) const
 {
     LOG_SCOPE("getPhysicalPackageInstance");
     const std::string serial = *adapter.serialNumber ? std::string(" ") + adapter.serialNumber : "";
-    auto* package = create_null<KALDERA_PhysicalPackage>();
+    Ref<KALDERA_PhysicalPackage> package(create_null<KALDERA_PhysicalPackage>());
     package->CreationClassName.set(ProviderUtil::getClassName(PHYSICALPACKAGE));
     package->Tag.set(to_String(tag(adapter)));
     package->Manufacturer.set(adapter.vendor);
@@ -116,19 +117,19 @@ KALDERA_PhysicalPackage* AdapterHelper::getPhysicalPackageInstance(const _adapte
     package->SKU.set(adapter.fruNumber);
     package->Name.set(to_String(card(adapter) + serial));
     package->PackageType.set(9);
-    return package;
+    return package.steal();
 }
 
 KALDERA_Product* AdapterHelper::getProductInstance(const _adapterData& adapter) const
 {
     LOG_SCOPE("getProductInstance");
-    auto* product = create_null<KALDERA_Product>();
+    Ref<KALDERA_Product> product(create_null<KALDERA_Product>());
     describe(*product, kind(adapter));
     product->Version.set(adapter.firmwareVersion);
     product->Name.set("KALDERA CIM Provider");
     product->Vendor.set(adapter.vendor);
     product->IdentifyingNumber.set(adapter.serialNumber);
-    return product;
+    return product.steal();
 }
 
 KALDERA_AdapterSoftwareIdentity*
@@ -137,7 +138,7 @@ AdapterHelper::getAdapterSoftwareIdentityInstance(const _adapterData& adapter, s
 {
     LOG_SCOPE("getAdapterSoftwareIdentityInstance");
     const Software texts = software(adapter, type, network);
-    auto* identity = create_null<KALDERA_AdapterSoftwareIdentity>();
+    Ref<KALDERA_AdapterSoftwareIdentity> identity(create_null<KALDERA_AdapterSoftwareIdentity>());
     identity->InstanceID.set(to_String(texts.id));
     identity->VersionString.set(to_String(texts.version));
     identity->Classifications.set(array_of({static_cast<uint16>(type)}));
@@ -146,7 +147,7 @@ AdapterHelper::getAdapterSoftwareIdentityInstance(const _adapterData& adapter, s
     identity->Manufacturer.set(adapter.vendor);
     identity->IdentityInfoType.set(array_of<String>({"SoftwareID", "SoftwareStatus"}));
     identity->IdentityInfoValue.set(array_of<String>({to_String(texts.identity), "Primary"}));
-    return identity;
+    return identity.steal();
 }
 
 } // namespace KPRV

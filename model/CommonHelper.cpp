@@ -3,6 +3,7 @@
 #include "adapter/ProviderUtil.h"
 #include "model/Fresh_Instances.h"
 #include "model/Instance_Building.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <algorithm>
@@ -67,7 +68,7 @@ KALDERA_ComputerSystem* CommonHelper::getComputerSystemInstance(classId_t id, in
     if (row.warning)
         LOG(WARN, "%s", row.warning);
     const String description = "The host with Kaldera's adapters installed.";
-    auto* system = create_null<KALDERA_ComputerSystem>();
+    Ref<KALDERA_ComputerSystem> system(create_null<KALDERA_ComputerSystem>());
     system->CreationClassName.set(ProviderUtil::getClassName(id));
     system->Name.set(host);
     if (row.name_format)
@@ -80,7 +81,7 @@ KALDERA_ComputerSystem* CommonHelper::getComputerSystemInstance(classId_t id, in
     system->Dedicated.set(array_of<uint16>({0, 14}));
     system->OperationalStatus.set(array_of<uint16>({2}));
     system->StatusDescriptions.set(array_of<String>({"The System is in service"}));
-    return system;
+    return system.steal();
 }
 
 } // namespace KPRV

@@ -2,6 +2,7 @@
 #include "model/EthernetPortHelper.h"
 #include "model/Instance_Building.h"
 #include "model/Port_Status.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <string_view>
@@ -18,7 +19,7 @@ sint32 EthernetPortHelper::getPortType(const char* transceiver) const
 KALDERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(const _ethPortInfo& port) const
 {
     LOG_SCOPE("getEthernetPortInstance");
-    auto* instance = create_null<KALDERA_EthernetPort>();
+    Ref<KALDERA_EthernetPort> instance(create_null<KALDERA_EthernetPort>());
     set_system_keys(*instance, ETHERNETPORT, port.systemName);
     instance->DeviceID.set(port.mac);
     instance->PermanentAddress.set(port.permanentAddress);
@@ -30,14 +31,14 @@ KALDERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(const _ethPort
     instance->PortType.set(static_cast<uint16>(port.portType));
     instance->ElementName.set(port.deviceName);
     instance->PortNumber.set(static_cast<uint16>(port.portNumber));
-    return instance;
+    return instance.steal();
 }
 
 KALDERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(const _ethPortInfo& port) const
 {
     LOG_SCOPE("getLANEndpointInstance");
     const sint32 status = static_cast<sint32>(port.status);
-    auto* instance = create_null<KALDERA_LANEndpoint>();
+    Ref<KALDERA_LANEndpoint> instance(create_null<KALDERA_LANEndpoint>());
     set_system_keys(*instance, LANENDPOINT, port.systemName);
     instance->Name.set(port.deviceName);
     instance->ElementName.set(port.deviceName);
@@ -49,7 +50,7 @@ KALDERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(const _ethPortIn
     instance->MaxDataSize.set(port.mtu);
     instance->HealthState.set(health_state(status));
     instance->EnabledState.set(enabled_state(status));
-    return instance;
+    return instance.steal();
 }
 
 } // namespace KPRV

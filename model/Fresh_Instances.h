@@ -2,6 +2,7 @@
 
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
+#include "runtime/Ref.h"
 
 #include <vector>
 
@@ -22,9 +23,15 @@ public:
     Fresh_Instances& operator=(const Fresh_Instances&) = delete;
 
     /// Takes the instance over.
-    void append(Instance* instance) { _instances.push_back(instance); }
+    void append(Instance* instance)
+    {
+        Ref<Instance> held(instance);
+        _instances.push_back(instance);
+        held.steal();
+    }
     void append(const Array<Instance*>& instances)
     {
+        _instances.reserve(_instances.size() + instances.size());
         _instances.insert(_instances.end(), instances.begin(), instances.end());
     }
     uint32 size() const { return static_cast<uint32>(_instances.size()); }

@@ -1,6 +1,7 @@
 #include "adapter/ProviderUtil.h"
 #include "model/Instance_Building.h"
 #include "model/TargetHelper.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <algorithm>
@@ -71,14 +72,14 @@ T* create_lun(classId_t id, const char* identification, const _hbaPortInfo& port
     const std::string element = "LUN_" + std::to_string(static_cast<sint32>(lun.number));
     const String device_id = to_String(std::string(port.portWWN) + "_" + lun.remoteWWN + "_" +
                                        trimmed(lun.vendor) + "_" + trimmed(lun.productID) + "_" + element);
-    T* instance = create_null<T>();
+    Ref<T> instance(create_null<T>());
     set_system_keys(*instance, id, port.systemName);
     instance->ElementName.set(to_String(element));
     instance->DeviceID.set(device_id);
     instance->OtherIdentifyingInfo.set(array_of({device_id}));
     instance->IdentifyingDescriptions.set(array_of<String>({identification}));
     instance->OperationalStatus.set(array_of<uint16>({2}));
-    return instance;
+    return instance.steal();
 }
 
 } // namespace

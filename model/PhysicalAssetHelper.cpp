@@ -7,6 +7,7 @@
 #include "model/Fresh_Instances.h"
 #include "model/Instance_Building.h"
 #include "model/PortHelper.h"
+#include "runtime/Ref.h"
 
 namespace KPRV {
 
@@ -85,7 +86,7 @@ KALDERA_PhysicalConnector* PhysicalAssetHelper::getPhysicalConnectorInstance(con
     LOG_SCOPE("getPhysicalConnectorInstance");
     constexpr uint16 SFP_CONNECTOR = 118;
     const char* class_name = ProviderUtil::getClassName(PHYSICALCONNECTOR);
-    auto* connector = create_null<KALDERA_PhysicalConnector>();
+    Ref<KALDERA_PhysicalConnector> connector(create_null<KALDERA_PhysicalConnector>());
     connector->CreationClassName.set(class_name);
     connector->Caption.set(class_name);
     connector->ElementName.set(class_name);
@@ -102,7 +103,7 @@ KALDERA_PhysicalConnector* PhysicalAssetHelper::getPhysicalConnectorInstance(con
     connector->ConnectorPinout.set("0");
     connector->NumPhysicalPins.set(0);
     connector->ConnectorLayout.set(1);
-    return connector;
+    return connector.steal();
 }
 
 } // namespace KPRV

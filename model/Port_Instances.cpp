@@ -2,6 +2,7 @@
 #include "model/Instance_Building.h"
 #include "model/PortHelper.h"
 #include "model/Port_Status.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 namespace KPRV {
@@ -18,7 +19,7 @@ String pair_of_names(const _hbaPortInfo& port)
 KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port) const
 {
     LOG_SCOPE("getFCPortInstance");
-    auto* instance = create_null<KALDERA_FCPort>();
+    Ref<KALDERA_FCPort> instance(create_null<KALDERA_FCPort>());
     set_system_keys(*instance, FCPORT, port.systemName);
     const String address = port.portWWN, names = pair_of_names(port);
     instance->DeviceID.set(address);
@@ -36,7 +37,7 @@ KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port) const
     instance->PortNumber.set(static_cast<uint16>(port.portNumber));
     instance->EnabledState.set(enabled_state(port.status));
     instance->EnabledDefault.set(2);
-    return instance;
+    return instance.steal();
 }
 
 KALDERA_FCPortStatistics* PortHelper::getFCPortStatisticsInstance(const _hbaPortInfo& port,
@@ -44,18 +45,18 @@ KALDERA_FCPortStatistics* PortHelper::getFCPortStatisticsInstance(const _hbaPort
                                                                   bool fcoe) const
 {
     LOG_SCOPE("getFCPortStatisticsInstance");
-    auto* instance = create_null<KALDERA_FCPortStatistics>();
+    Ref<KALDERA_FCPortStatistics> instance(create_null<KALDERA_FCPortStatistics>());
     instance->InstanceID.set(port.portWWN);
     instance->ElementName.set("FC Port Statistics");
     set_counters(statistics, fcoe, *instance);
-    return instance;
+    return instance.steal();
 }
 
 KALDERA_SCSIProtocolEndpoint* PortHelper::getSCSIProtocolEndpointInstance(const _hbaPortInfo& port,
                                                                           bool initiator) const
 {
     LOG_SCOPE("getSCSIProtocolEndpointInstance");
-    auto* instance = create_null<KALDERA_SCSIProtocolEndpoint>();
+    Ref<KALDERA_SCSIProtocolEndpoint> instance(create_null<KALDERA_SCSIProtocolEndpoint>());
     set_system_keys(*instance, SCSIPROTOCOLENDPOINT, port.systemName);
     const String address = port.portWWN;
     instance->Name.set(address);
@@ -66,26 +67,26 @@ KALDERA_SCSIProtocolEndpoint* PortHelper::getSCSIProtocolEndpointInstance(const 
     instance->ConnectionType.set(2);
     instance->Role.set(initiator ? 2 : 3);
     instance->EnabledState.set(enabled_state(port.status));
-    return instance;
+    return instance.steal();
 }
 
 KALDERA_LogicalPortGroup* PortHelper::getLogicalPortGroupInstance(const _hbaPortInfo& port) const
 {
     LOG_SCOPE("getLogicalPortGroupInstance");
-    auto* instance = create_null<KALDERA_LogicalPortGroup>();
+    Ref<KALDERA_LogicalPortGroup> instance(create_null<KALDERA_LogicalPortGroup>());
     instance->InstanceID.set(port.nodeWWN);
     instance->Name.set(port.portWWN);
     instance->NameFormat.set("WWN");
     instance->ElementName.set(pair_of_names(port));
     instance->Caption.set(port.systemName);
     instance->Description.set(port.systemName);
-    return instance;
+    return instance.steal();
 }
 
 KALDERA_AlarmDevice* PortHelper::getAlarmDeviceInstance(const _hbaPortInfo& port, bool beacon_on) const
 {
     LOG_SCOPE("getAlarmDeviceInstance");
-    auto* instance = create_null<KALDERA_AlarmDevice>();
+    Ref<KALDERA_AlarmDevice> instance(create_null<KALDERA_AlarmDevice>());
     set_system_keys(*instance, ALARMDEVICE, port.systemName);
     instance->Description.set(port.systemName);
     const String address = port.portWWN;
@@ -95,7 +96,7 @@ KALDERA_AlarmDevice* PortHelper::getAlarmDeviceInstance(const _hbaPortInfo& port
     instance->Urgency.set(3);
     instance->VisibleAlarm.set(true);
     instance->AlarmState.set(beacon_on ? 3 : 1);
-    return instance;
+    return instance.steal();
 }
 
 } // namespace KPRV

@@ -1,6 +1,8 @@
 #include "model/Registered_Profiles.h"
 
+#include "model/Fresh_Instances.h"
 #include "model/Instance_Building.h"
+#include "runtime/Ref.h"
 #include "schema/KALDERA_RegisteredProfile.h"
 #include "schema/KALDERA_RegisteredSubProfile.h"
 
@@ -80,7 +82,7 @@ constexpr uint16 ADVERTISED_BY_SLP = 3;
 template <class T>
 T* instance_of(const Profile& profile)
 {
-    T* instance = create<T>(true);
+    Ref<T> instance(create<T>(true));
     instance->InstanceID.set(profile.name);
     instance->RegisteredName.set(profile.name);
     instance->Caption.set(profile.title);
@@ -89,16 +91,16 @@ T* instance_of(const Profile& profile)
     instance->RegisteredOrganization.set(profile.organization);
     instance->RegisteredVersion.set(profile.version);
     instance->AdvertiseTypes.set(array_of<uint16>({ADVERTISED_BY_SLP}));
-    return instance;
+    return instance.steal();
 }
 
 template <class T>
 Array<Instance*> instances_of(std::span<const Profile> table)
 {
-    Array<Instance*> instances;
+    Fresh_Instances instances;
     for (const Profile& row : table)
         instances.append(instance_of<T>(row));
-    return instances;
+    return instances.release();
 }
 
 } // namespace

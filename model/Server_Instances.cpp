@@ -1,5 +1,6 @@
 #include "model/Instance_Building.h"
 #include "model/ServerManager.h"
+#include "runtime/Ref.h"
 #include "runtime/cimom.h"
 #include "runtime/log.h"
 #include "schema/CIM_ObjectManager.h"
@@ -62,7 +63,7 @@ Array<Instance*> ServerManager::getObjectManagerInstance() const
 {
     LOG_SCOPE("getObjectManagerInstance");
     const Ref<CIM_ObjectManager> of_server = object_manager_of_server();
-    auto* manager = create<KALDERA_ObjectManager>(true);
+    Ref<KALDERA_ObjectManager> manager(create<KALDERA_ObjectManager>(true));
     set_system_keys(*manager, OBJECTMANAGER, host_text().c_str());
     manager->Name = of_server->Name;
     // What the server shows of its own stands in the caption; the element's name is ours.
@@ -71,14 +72,14 @@ Array<Instance*> ServerManager::getObjectManagerInstance() const
     manager->ElementName.set("CIM Server");
     manager->OperationalStatus.set(array_of<uint16>({OPERATIONAL_STATUS_OK}));
     manager->Started.set(true);
-    return only(manager);
+    return only(manager.steal());
 }
 
 Array<Instance*> ServerManager::getNamespaceInstances() const
 {
     LOG_SCOPE("getNamespaceInstances");
     const Ref<CIM_ObjectManager> of_server = object_manager_of_server();
-    auto* name_space = create<KALDERA_Namespace>(true);
+    Ref<KALDERA_Namespace> name_space(create<KALDERA_Namespace>(true));
     set_system_keys(*name_space, NAMESPACE, host_text().c_str());
     name_space->ObjectManagerCreationClassName.set(ProviderUtil::getClassName(OBJECTMANAGER));
     name_space->ObjectManagerName = of_server->Name;
@@ -86,13 +87,13 @@ Array<Instance*> ServerManager::getNamespaceInstances() const
     name_space->ClassType.set(2);
     name_space->ClassInfo.set(11);
     name_space->ClassTypeVersion.set("2.26.0");
-    return only(name_space);
+    return only(name_space.steal());
 }
 
 Array<Instance*> ServerManager::getCIMXMLCommunicationMechanismInstance() const
 {
     LOG_SCOPE("getCIMXMLCommunicationMechanismInstance");
-    auto* mechanism = create<KALDERA_CIMXMLCommunicationMechanism>(true);
+    Ref<KALDERA_CIMXMLCommunicationMechanism> mechanism(create<KALDERA_CIMXMLCommunicationMechanism>(true));
     set_system_keys(*mechanism, CIMXMLCOMMUNICATIONMECHANISM, host_text().c_str());
     mechanism->Name.set("CIM-XML");
     mechanism->ElementName.set("CIM-XML Communication Mechanism");
@@ -103,7 +104,7 @@ Array<Instance*> ServerManager::getCIMXMLCommunicationMechanismInstance() const
     mechanism->FunctionalProfilesSupported.set(array_of<uint16>({2, 3, 4, 5, 6, 8, 9}));
     mechanism->AuthenticationMechanismsSupported.set(array_of<uint16>({3}));
     mechanism->OperationalStatus.set(array_of<uint16>({OPERATIONAL_STATUS_OK}));
-    return only(mechanism);
+    return only(mechanism.steal());
 }
 
 Array<Instance*> ServerManager::getProfileSoftwareIdentityInstances() const
@@ -112,7 +113,7 @@ Array<Instance*> ServerManager::getProfileSoftwareIdentityInstances() const
     const String title = "Kaldera Adapter CIM Provider";
     int major = 0, minor = 0, revision = 0;
     sscanf(prov_build_version, "%d.%d.%d", &major, &minor, &revision);
-    auto* software = create<KALDERA_ProfileSoftwareIdentity>(true);
+    Ref<KALDERA_ProfileSoftwareIdentity> software(create<KALDERA_ProfileSoftwareIdentity>(true));
     software->InstanceID.set(title);
     software->Caption.set(title);
     software->ElementName.set(title);
@@ -126,15 +127,15 @@ Array<Instance*> ServerManager::getProfileSoftwareIdentityInstances() const
     software->RevisionNumber.set(static_cast<uint16>(revision));
     software->IdentityInfoType.set(array_of<String>({"SoftwareID", "SoftwareStatus"}));
     software->IdentityInfoValue.set(array_of<String>({title, "Primary"}));
-    return only(software);
+    return only(software.steal());
 }
 
 Array<Instance*> ServerManager::getAgentServiceInstances() const
 {
     LOG_SCOPE("getAgentServiceInstances");
-    auto* service = create<KALDERA_AgentService>(true);
+    Ref<KALDERA_AgentService> service(create<KALDERA_AgentService>(true));
     service->Name.set("Kaldera Agent Service Provider");
-    return only(service);
+    return only(service.steal());
 }
 
 } // namespace KPRV

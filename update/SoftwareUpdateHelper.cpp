@@ -5,6 +5,7 @@
 #include "adapter/ProviderUtil.h"
 #include "model/Fresh_Instances.h"
 #include "model/Instance_Building.h"
+#include "runtime/Ref.h"
 
 namespace KPRV {
 
@@ -49,22 +50,24 @@ KALDERA_HBASoftwareInstallationService*
 SoftwareUpdateHelper::getHBASoftwareInstallationServiceInstance(const char* system_name) const
 {
     LOG_SCOPE("getHBASoftwareInstallationServiceInstance");
-    auto* service = create_null<KALDERA_HBASoftwareInstallationService>();
+    Ref<KALDERA_HBASoftwareInstallationService> service(
+        create_null<KALDERA_HBASoftwareInstallationService>());
     set_system_keys(*service, HBASOFTWAREINSTALLATIONSERVICE, system_name);
     service->Name.set(SERVICE_NAME);
-    return service;
+    return service.steal();
 }
 
 KALDERA_HBASoftwareInstallationServiceCapabilities*
 SoftwareUpdateHelper::getHBASoftwareInstallationServiceCapabilitiesInstance() const
 {
     LOG_SCOPE("getHBASoftwareInstallationServiceCapabilitiesInstance");
-    auto* capabilities = create_null<KALDERA_HBASoftwareInstallationServiceCapabilities>();
+    Ref<KALDERA_HBASoftwareInstallationServiceCapabilities> capabilities(
+        create_null<KALDERA_HBASoftwareInstallationServiceCapabilities>());
     capabilities->InstanceID.set(SERVICE_NAME);
     capabilities->SupportedInstallOptions.set(array_of({OPTION_INSTALL, OPTION_UPDATE}));
     capabilities->SupportedURISchemes.set(array_of({SCHEME_FILE, SCHEME_TFTP}));
     capabilities->SupportedSynchronousActions.set(array_of({ACTION_INSTALL_FROM_URI}));
-    return capabilities;
+    return capabilities.steal();
 }
 
 uint32 SoftwareUpdateHelper::UpdatePortControllerSoftware(const KALDERA_PortController* controller,
