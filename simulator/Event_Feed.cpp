@@ -1,6 +1,7 @@
 #include "simulator/Event_Feed.h"
 
 #include <cstdio>
+#include <cstdlib>
 #include <exception>
 #include <thread>
 
@@ -98,14 +99,30 @@ void Event_Feed::start_thread()
     if (has_thread_)
         return;
     has_thread_ = true;
-    // The library is never unloaded, and neither it nor its thread is ever told that the process ends.
-    std::thread([this] { run(); }).detach();
+    thread_ = std::thread([this] { run(); });
+    // The library is never unloaded; its thread ends with the process, before what watches over that looks
+    // for threads.
+    static Event_Feed* feed;
+    feed = this;
+    std::atexit([] { feed->end_thread(); });
+}
+
+void Event_Feed::end_thread()
+{
+    if (std::this_thread::get_id() == thread_.get_id())
+        return;
+    {
+        const std::lock_guard lock(mutex_);
+        ends_ = true;
+    }
+    changed_.notify_all();
+    thread_.join();
 }
 
 void Event_Feed::run()
 {
     std::unique_lock lock(mutex_);
-    for (;;) {
+    while (!ends_) {
         std::string text;
         if (!take_event(lock, text))
             continue;

@@ -5,6 +5,7 @@
 #include <deque>
 #include <mutex>
 #include <string>
+#include <thread>
 #include <vector>
 
 namespace KPRV::simulator {
@@ -62,6 +63,7 @@ private:
 
     bool is_told() const { return wanted_ && callback_; }
     void start_thread();
+    void end_thread();
     void run();
     bool take_event(std::unique_lock<std::mutex>& lock, std::string& text);
     bool take_scripted(std::string& text);
@@ -75,6 +77,8 @@ private:
     bool is_script_due_ = false;
     unsigned calls_ = 0;
     bool has_thread_ = false;
+    bool ends_ = false;
+    std::thread thread_;
     std::deque<std::string> events_;
     std::vector<Scripted_Event> script_;
     Due due_ = {};
