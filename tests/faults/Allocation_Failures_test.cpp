@@ -1,6 +1,8 @@
 #include "tests/faults/Failing_Allocator.h"
 #include "tests/faults/Fault_Fixture.h"
 
+#include <dlfcn.h>
+
 namespace KPRV {
 namespace {
 
@@ -9,8 +11,18 @@ class Allocation_Failures : public Fault_Fixture
 protected:
     void SetUp() override
     {
+        // Kept in memory, so that a report of what was lost can name its places.
+        ASSERT_TRUE(dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NODELETE));
         open("one_cna.json");
         watch_library("libkldrprovider_Module");
+    }
+
+    /// Where the module guards a call of the adapter library, the failure costs no more than the element at
+    /// hand.
+    static bool is_less(const host::Result& result, const host::Result& whole)
+    {
+        return result.instances.size() < whole.instances.size() ||
+               !(result.return_value == whole.return_value);
     }
 
     /// The operation with each allocation of the module failing in turn, where they are few, or with a spread
@@ -19,7 +31,7 @@ protected:
     void starve(const std::string& what, Operation&& operation)
     {
         fail_allocation(~0ul);
-        operation();
+        const host::Result whole = operation();
         const unsigned long count = mend_memory();
         ASSERT_LT(0u, count) << what;
         const unsigned long step = 1 + count / 400;
@@ -29,7 +41,7 @@ protected:
             const host::Result result = operation();
             const unsigned long asked = mend_memory();
             EXPECT_LE(nth, asked);
-            EXPECT_FALSE(result.ok());
+            EXPECT_TRUE(!result.ok() || is_less(result, whole));
             expect_nothing_left();
         }
         const host::Result after = operation();

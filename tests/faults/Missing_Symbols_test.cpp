@@ -5,7 +5,9 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
 #include <dlfcn.h>
+#include <link.h>
 
 namespace KPRV {
 namespace {
@@ -22,15 +24,32 @@ std::string read_file(const std::string& path)
     return {std::istreambuf_iterator<char>(file), {}};
 }
 
+/// Where the names of the exported symbols stand in a shared library.
+std::pair<std::size_t, std::size_t> symbol_names(const std::string& bytes)
+{
+    ElfW(Ehdr) head;
+    std::memcpy(&head, bytes.data(), sizeof head);
+    std::vector<ElfW(Shdr)> sections(head.e_shnum);
+    std::memcpy(sections.data(), bytes.data() + head.e_shoff, sections.size() * sizeof sections[0]);
+    for (const ElfW(Shdr) & section : sections)
+        if (section.sh_type == SHT_DYNSYM) {
+            const ElfW(Shdr)& names = sections[section.sh_link];
+            return {names.sh_offset, names.sh_offset + names.sh_size};
+        }
+    return {};
+}
+
 /// The simulator, with one of its exported names spoiled.
 std::string library_without(const std::string& symbol)
 {
     std::string bytes = read_file(KLDR_SIMULATOR);
-    const std::string end(1, '\0');
-    const std::size_t whole = bytes.find(end + symbol + end);
+    const auto [begin, end] = symbol_names(bytes);
+    const std::string nul(1, '\0');
+    const std::size_t whole = bytes.find(nul + symbol + nul, begin);
     // The linker keeps a name that ends another one within it: then both go.
-    const std::size_t at = whole != std::string::npos ? whole + 1 : bytes.find(symbol + end);
-    if (at != std::string::npos)
+    const std::size_t at = whole < end ? whole + 1 : bytes.find(symbol + nul, begin);
+    EXPECT_LT(at, end) << symbol;
+    if (at < end)
         bytes[at] = '?';
     return bytes;
 }
