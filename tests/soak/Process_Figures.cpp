@@ -4,6 +4,7 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <malloc.h>
 
 #include <unistd.h>
 
@@ -59,9 +60,8 @@ std::string line_of(const std::vector<Process_Figures>& samples, const Figure_Se
 } // namespace
 
 const std::vector<Figure_Series> figure_series = {
-    {"resident KiB", &Process_Figures::resident_kib},
-    {"descriptors", &Process_Figures::descriptors},
-    {"threads", &Process_Figures::threads},
+    {"resident KiB", &Process_Figures::resident_kib},      {"heap KiB", &Process_Figures::heap_kib},
+    {"descriptors", &Process_Figures::descriptors},        {"threads", &Process_Figures::threads},
     {"live CMPI objects", &Process_Figures::live_objects},
 };
 
@@ -72,6 +72,8 @@ Process_Figures process_figures()
     double resident_pages = 0;
     std::ifstream("/proc/self/statm") >> pages >> resident_pages;
     figures.resident_kib = resident_pages * static_cast<double>(sysconf(_SC_PAGESIZE)) / 1024;
+    const struct mallinfo2 heap = mallinfo2();
+    figures.heap_kib = static_cast<double>(heap.uordblks + heap.hblkhd) / 1024;
     figures.descriptors = entries_of("/proc/self/fd");
     figures.threads = entries_of("/proc/self/task");
     return figures;

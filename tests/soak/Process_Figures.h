@@ -11,12 +11,14 @@ struct Process_Figures
 {
     double seconds = 0;
     double resident_kib = 0;
+    /// In use, as the main arena of the allocator counts it.
+    double heap_kib = 0;
     double descriptors = 0;
     double threads = 0;
     double live_objects = 0;
 };
 
-/// The first three from /proc; the others are left to the caller.
+/// All that the process itself can tell; the time and the objects are left to the caller.
 Process_Figures process_figures();
 
 /// One line of a plot.
