@@ -68,20 +68,20 @@ KALDERA_ComputerSystem* CommonHelper::getComputerSystemInstance(classId_t id, in
     if (row.warning)
         LOG(WARN, "%s", row.warning);
     const String description = "The host with Kaldera's adapters installed.";
-    Ref<KALDERA_ComputerSystem> system(create_null<KALDERA_ComputerSystem>());
-    system->CreationClassName.set(ProviderUtil::getClassName(id));
-    system->Name.set(host);
+    Ref<KALDERA_ComputerSystem> computer(create_null<KALDERA_ComputerSystem>());
+    computer->CreationClassName.set(ProviderUtil::getClassName(id));
+    computer->Name.set(host);
     if (row.name_format)
-        system->NameFormat.set(row.name_format);
-    system->OtherIdentifyingInfo.set(array_of<String>({host}));
-    system->IdentifyingDescriptions.set(array_of<String>({row.description}));
-    system->ElementName.set(description);
-    system->Description.set(description);
-    system->Caption.set(description);
-    system->Dedicated.set(array_of<uint16>({0, 14}));
-    system->OperationalStatus.set(array_of<uint16>({2}));
-    system->StatusDescriptions.set(array_of<String>({"The System is in service"}));
-    return system.steal();
+        computer->NameFormat.set(row.name_format);
+    computer->OtherIdentifyingInfo.set(array_of<String>({host}));
+    computer->IdentifyingDescriptions.set(array_of<String>({row.description}));
+    computer->ElementName.set(description);
+    computer->Description.set(description);
+    computer->Caption.set(description);
+    computer->Dedicated.set(array_of<uint16>({0, 14}));
+    computer->OperationalStatus.set(array_of<uint16>({2}));
+    computer->StatusDescriptions.set(array_of<String>({"The System is in service"}));
+    return computer.steal();
 }
 
 } // namespace KPRV
