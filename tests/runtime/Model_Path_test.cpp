@@ -369,4 +369,18 @@ TEST(Model_Path, ATextWithAQuoteDoesNotComeBackButANestedNameDoes)
     EXPECT_EQ(nested, path(read<Sample_Link>(nested).ptr()));
 }
 
+// The backslashes of the inner name get none of their own.
+TEST(Model_Path, NamesNestedTwiceAreWrittenAndDoNotComeBack)
+{
+    const Ref<Sample_Link> outer(create<Sample_Link>(false));
+    outer->Antecedent = make_link("a", "b").steal();
+    outer->Dependent = make_port("c", 9);
+    const std::string text = path(outer.ptr());
+    EXPECT_EQ(R"(Sample_Link.Antecedent="Sample_Link.Antecedent=\"Sample_Element.Name=\\"a\\"\",)"
+              R"(Dependent=\"Sample_Port.Name=\\"b\\",Number=7\"",)"
+              R"(Dependent="Sample_Port.Name=\"c\",Number=9")",
+              text);
+    EXPECT_FALSE(read<Sample_Link>(text));
+}
+
 } // namespace KPRV
