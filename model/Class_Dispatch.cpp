@@ -21,7 +21,7 @@ Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows,
             "Driver is not installed or there is a zntl mismatch hence no instances returned");
         return {};
     }
-    return row->source ? row->source(id) : Array<Instance*>();
+    return row->source(id);
 }
 
 } // namespace KPRV

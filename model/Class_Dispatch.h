@@ -25,7 +25,6 @@ struct Class_Row
 {
     classId_t id;
     Needs needs;
-    /// Null while the house has no helper for the class: it then has no instances.
     Instances_Source source;
 };
 
