@@ -70,9 +70,9 @@ Parameters of rpc
 
 Exit status
   0 success, also if only some of several associations failed (a warning names them); 1 the provider or the host
-  answered a CIM status, the agent an error, or an update failed, which is named on standard error; 2 usage, no such adapter
-  to update, or the module could not be loaded. diag run --wait: 0 the test passed, 1 it failed; diag run: 3 the test was
-  refused.
+  answered a CIM status, the agent an error, or an update failed, which is named on standard error; 2 usage, no such test,
+  element or adapter, or the module could not be loaded. conform: 1 something mandatory is missing. diag run --wait: 0 the
+  test passed, 1 it failed; diag run: 3 the test was refused.
 
 Examples
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
