@@ -202,7 +202,7 @@ void warn_without_adapter_library(const Host& host)
     if (void* library = dlopen("libdzntj.so", RTLD_NOW | RTLD_NOLOAD))
         dlclose(library);
     else
-        complain("warning: the adapter library libdzntj.so is not loaded; enumerations will be empty", 0);
+        complain("warning: the adapter library libdzntj.so is not loaded; no adapters will be seen", 0);
 }
 
 } // namespace

@@ -8,7 +8,7 @@ namespace KPRV::host {
 namespace {
 
 const char* const no_library =
-    "kldrcim: warning: the adapter library libdzntj.so is not loaded; enumerations will be empty\n";
+    "kldrcim: warning: the adapter library libdzntj.so is not loaded; no adapters will be seen\n";
 
 Outcome on_fabric(const std::string& arguments, const char* environment = "LC_ALL=C.UTF-8")
 {

@@ -8,7 +8,7 @@ namespace KPRV::host {
 namespace {
 
 const char* const no_library =
-    "kldrcim: warning: the adapter library libdzntj.so is not loaded; enumerations will be empty\n";
+    "kldrcim: warning: the adapter library libdzntj.so is not loaded; no adapters will be seen\n";
 const std::string the_system = "'KALDERA_ComputerSystem.Name=\"10.0.0.5\"' ";
 const std::string tape = "'KALDERA_TapeDrive.DeviceID=\"tape_only\"' ";
 
