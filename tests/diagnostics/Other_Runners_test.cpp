@@ -85,6 +85,25 @@ TEST_F(PCI_Runner, TellsWhatTheLibrarySaysThenThatItFailed)
               records());
 }
 
+TEST_F(PCI_Runner, PushesOutAsManyOldRecordsAsItAdds)
+{
+    // Of no element, so that reading them looks none up.
+    DiagnosticTestInput earlier;
+    earlier.test_id = MEMORY_TEST;
+    for (int i = 1; i <= 100; i++)
+        for (const bool is_service : {true, false})
+            helper.generateDiagnosticRecord(std::to_string(i).c_str(), is_service, &earlier,
+                                            COMPLETION_FAILED);
+    run();
+    const Lines all = records();
+    ASSERT_EQ(200u, all.size());
+    EXPECT_EQ("3", all[0]) << "two service records came";
+    EXPECT_EQ("Running PCI Loopback test for the port", all[98]);
+    EXPECT_EQ("5 2", all[100]) << "one completion record came";
+    EXPECT_EQ("5 100", all[198]);
+    EXPECT_EQ("2 PCI Loopback test run is successful", all[199]);
+}
+
 TEST_F(PCI_Runner, TakesABadAnswerForAPassedTest)
 {
     for (const Bad_Answer& bad : bad_answers("diagPCILoopbackTest", "libDiagPCILoopbackTest")) {
