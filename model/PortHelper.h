@@ -54,7 +54,7 @@ public:
     /// 0 and the answer of `getPortByWwn` in `out`, or -1. An address of 12 characters is taken for a MAC.
     /// Throws nothing.
     int getPortDetails(const String& address, Json::Value& out) const;
-    /// `portStatus` is false; false for a port that cannot be read.
+    /// `portStatus` is false; false, told at ERR, for a port that cannot be read or does not tell.
     bool isPortDisabled(const String& address) const;
     /// Number of ports of an adapter, and the library's answer in `out`, whose `indexStrings` lists their
     /// addresses; or -1. Exceptions of `libGetFcPhyPortIndicesByAdapter` pass.

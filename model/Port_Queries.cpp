@@ -32,9 +32,7 @@ bool PortHelper::isPortDisabled(const String& address) const
 {
     LOG_SCOPE("isPortDisabled");
     Json::Value port;
-    if (getPortDetails(address, port) != 0)
-        return false;
-    if (!hasMember(port, "portStatus")) {
+    if (getPortDetails(address, port) != 0 || !hasMember(port, "portStatus")) {
         LOG(ERR, "Unable to get port status");
         return false;
     }

@@ -144,7 +144,7 @@ TEST_P(Loopback_Runner, TakesAPortThatTellsNothingForAnEnabledOne)
     EXPECT_EQ(all({asked, disable(), test(), enable(), close(), passed()}), run());
     restart();
     answer("getPortByWwn", Json::Value());
-    asked = {asked[0], asked[1], "ERR Port Info is NOT available"};
+    asked = {asked[0], asked[1], "ERR Port Info is NOT available", "ERR Unable to get port status"};
     EXPECT_EQ(all({asked, disable(), test(), enable(), close(), passed()}), run());
 }
 
@@ -153,6 +153,7 @@ TEST_P(Loopback_Runner, TakesAPortThatCannotBeAskedForAnEnabledOne)
     throws("getPortByWwn", HbaAgentError{7, "busy"});
     Lines asked = ask_port();
     asked[2] = std::string("ERR ") + words.flat + " - libGetPortByWwn got User exception 7: busy";
+    asked.push_back("ERR Unable to get port status");
     EXPECT_EQ(all({asked, disable(), test(), enable(), close(), passed()}), run());
 }
 

@@ -53,10 +53,13 @@ TEST_F(Port_Queries, disabled)
     library.answers("getPortByWwn", without(fc_port(), "portStatus"));
     EXPECT_FALSE(helper->isPortDisabled("AABB"));
     EXPECT_EQ(log.said(), (Lines{"INFO getPortDetails success - AABB", "ERR Unable to get port status"}));
+    log.clear();
     library.answers("getPortByWwn", Json::Value());
     EXPECT_FALSE(helper->isPortDisabled(PORT));
+    EXPECT_EQ(log.said("ERR"), (Lines{"ERR Port Info is NOT available", "ERR Unable to get port status"}));
     library.throws("getPortByWwn", 5);
     EXPECT_FALSE(helper->isPortDisabled(PORT));
+    EXPECT_EQ(log.said().back(), "ERR Unable to get port status");
 }
 
 TEST_F(Port_Queries, number_of_ports)
