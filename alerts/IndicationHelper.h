@@ -47,7 +47,8 @@ public:
     void initEventDetailsMaps();
     /// The message ids stay.
     void clearEventDetailsMaps();
-    // Of an event key; "Unknown" for one that is not known, or while there is no subscription.
+    // Of an event key; "Unknown" for one that is not known. Causes and actions are known during a
+    // subscription, message ids from the first one on.
     String getEventCauseById(sint32 key) const { return _causes.find(key); }
     String getEventActionById(sint32 key) const { return _actions.find(key); }
     String getMessageIDById(sint32 key) const { return _message_ids.find(key); }

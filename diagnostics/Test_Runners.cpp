@@ -59,8 +59,8 @@ private:
     }
 };
 
-/// The members of a test's answer. One that is absent or of the wrong type reads as 0 or the empty text; the
-/// latter is told as the entry point's failure.
+/// The members of a test's answer. An absent one reads as 0 or the empty text; so does one of the wrong type,
+/// which is told as the entry point's failure, too.
 class Test_Answer
 {
 public:
