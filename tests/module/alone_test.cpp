@@ -58,5 +58,33 @@ TEST_F(Alone, EnumeratesNothingAndFailsNobody)
     EXPECT_EQ("", server->violations().text());
 }
 
+// What the module says of itself and of the server are constants of the program.
+TEST_F(Alone, TellsOfItsProfilesAllTheSame)
+{
+    const std::pair<const char*, size_t> counts[] = {
+        {"KALDERA_RegisteredProfile", 5},
+        {"KALDERA_RegisteredSubProfile", 10},
+        {"KALDERA_Namespace", 1},
+        {"KALDERA_ObjectManager", 1},
+        {"KALDERA_CIMXMLCommunicationMechanism", 1},
+        {"KALDERA_ProfileSoftwareIdentity", 1},
+        {"KALDERA_AgentService", 1},
+        {"KALDERA_ComputerSystem", 1},
+        {"KALDERA_ElementConformsToProfile", 18},
+        {"KALDERA_SubProfileRequiresProfile", 10},
+        {"KALDERA_ProfileElementSoftwareIdentity", 15},
+        {"KALDERA_NamespaceInManager", 1},
+        {"KALDERA_CommMechanismForManager", 1},
+        {"KALDERA_CommMechHostedAccessPoint", 1},
+        {"KALDERA_ObjectManagerHostedService", 1},
+    };
+    for (const auto& [name, count] : counts) {
+        const host::Result result = server->enumerate_instances(name);
+        EXPECT_EQ(CMPI_RC_OK, result.rc) << name;
+        EXPECT_EQ(count, result.instances.size()) << name;
+    }
+    EXPECT_EQ("", server->violations().text());
+}
+
 } // namespace
 } // namespace KPRV
