@@ -108,7 +108,7 @@ public:
     static String getHostName();
     /// An object path as a client of this host sees it.
     static String updateNamespacePath(const String& path);
-    /// Port of the management agent, 34568, while a process of its name runs; 0 otherwise.
+    /// Port of the management agent, 34568, while a process runs whose name ends in its; 0 otherwise.
     static int getAgentPort();
     /// Removes the file from the working folder, then fetches it from the host with the tftp client. Waits;
     /// the result is the client's wait status, or -1.
