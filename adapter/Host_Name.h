@@ -1,5 +1,7 @@
 #pragma once
 
+#include "runtime/String.h"
+
 namespace KPRV {
 
 /// The host's name for one walk over adapters or ports: the resolver, which reads files and may ask the
@@ -8,14 +10,17 @@ namespace KPRV {
 class Host_Name
 {
 public:
-    /// As `ProviderUtil::getHostInfo`.
-    int get(char* buffer, int length);
+    /// The name is cut to what fits into `room` characters with its terminator; at most 256.
+    explicit Host_Name(int room) : _room(room) {}
+
+    /// The text of `ProviderUtil::getHostInfo`, which all instances of the walk share.
+    const String& get();
 
 private:
-    int _length = 0;
-    int _code = 0;
+    const int _room;
+    bool _asked = false;
     const char* _said = nullptr;
-    char _text[256] = {};
+    String _text;
 };
 
 } // namespace KPRV

@@ -129,9 +129,10 @@ void find_members(const Json::Value& object, std::span<const std::string_view> n
         const char* name_end = nullptr;
         const char* const name_begin = member.memberName(&name_end);
         const std::string_view name(name_begin, size_t(name_end - name_begin));
-        while (place < names.size() && names[place] < name)
+        int order = -1;
+        while (place < names.size() && (order = names[place].compare(name)) < 0)
             place++;
-        if (place < names.size() && names[place] == name)
+        if (order == 0)
             found[place++] = &*member;
     }
 }

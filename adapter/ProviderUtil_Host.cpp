@@ -5,6 +5,7 @@
 
 #include <arpa/inet.h>
 
+#include <algorithm>
 #include <cstring>
 #include <mutex>
 
@@ -113,11 +114,10 @@ Outcome ask_for_host(Out_Text out)
     return named;
 }
 
-int told(Outcome outcome)
+void tell(const char* said)
 {
-    if (outcome.said)
-        UTIL_LOG(INFO, "%s", outcome.said);
-    return outcome.code;
+    if (said)
+        UTIL_LOG(INFO, "%s", said);
 }
 
 Out_Text room(char* buffer, int length)
@@ -132,26 +132,22 @@ constexpr const char* SCOPE = "getHostInfo";
 int ProviderUtil::getHostInfo(char* buffer, int length)
 {
     UTIL_SCOPE(SCOPE);
-    return told(ask_for_host(room(buffer, length)));
+    const Outcome outcome = ask_for_host(room(buffer, length));
+    tell(outcome.said);
+    return outcome.code;
 }
 
-int Host_Name::get(char* buffer, int length)
+const String& Host_Name::get()
 {
     UTIL_SCOPE(SCOPE);
-    const Out_Text out = room(buffer, length);
-    // Another length may be another answer.
-    if (_length == length && out.size > 0) {
-        memcpy(buffer, _text, out.size);
-        return told({_code, _said});
+    if (!_asked) {
+        char text[256] = {};
+        _said = ask_for_host(room(text, std::min(_room, int(sizeof text)))).said;
+        _text = text;
+        _asked = true;
     }
-    const Outcome outcome = ask_for_host(out);
-    if (out.size <= sizeof _text) {
-        memcpy(_text, buffer, out.size);
-        _length = length;
-        _code = outcome.code;
-        _said = outcome.said;
-    }
-    return told(outcome);
+    tell(_said);
+    return _text;
 }
 
 String ProviderUtil::getHostName()

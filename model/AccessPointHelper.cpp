@@ -25,7 +25,7 @@ Array<Instance*> AccessPointHelper::getInstancesByClass(classId_t) const
         return {};
     }
     _adapterData adapter = {};
-    copy_text(adapter.systemName, host);
+    adapter.systemName = host;
     Instance* point = getRemoteServiceAccessPointInstance(adapter);
     if (!point)
         return {};
@@ -45,7 +45,7 @@ AccessPointHelper::getRemoteServiceAccessPointInstance(const _adapterData& adapt
         return nullptr;
     }
     const std::string url =
-        std::string("https://") + adapter.systemName + ":" + std::to_string(port) + "/index.html";
+        std::string("https://") + adapter.systemName.c_str() + ":" + std::to_string(port) + "/index.html";
     constexpr uint16 URL = 200;
     Ref<KALDERA_RemoteServiceAccessPoint> point(create<KALDERA_RemoteServiceAccessPoint>(true));
     set_system_keys(*point, REMOTESERVICEACCESSPOINT, adapter.systemName);

@@ -15,7 +15,7 @@ struct AdapterHelper::Walk
 {
     classId_t id;
     Fresh_Instances instances = {};
-    Host_Name host = {};
+    Host_Name host = Host_Name(256);
     bool network_driver_done = false;
     bool storage_driver_done = false;
 };

@@ -61,7 +61,7 @@ bool AdapterHelper::fill(const Json::Value& answer, int number, const char* inde
         LOG(WARN, "There are no ports associated to Adapter id %d - %s", number, index);
         return false;
     }
-    host.get(adapter.systemName, sizeof adapter.systemName);
+    adapter.systemName = host.get();
     if (adapter.isCNA)
         copy_flat(adapter.mac, hba_data, "hbaMAC");
 

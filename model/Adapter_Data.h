@@ -1,6 +1,6 @@
 #pragma once
 
-#include "runtime/Types.h"
+#include "runtime/String.h"
 
 namespace KPRV {
 
@@ -8,10 +8,10 @@ namespace KPRV {
 /// is empty. An adapter is either an FC HBA, which goes by its node WWN, or a CNA, which goes by its MAC.
 struct _adapterData
 {
-    char nodeWWN[24]; ///< Flat form; only with a storage driver.
-    char mac[18];     ///< Flat form; CNA only.
-    sint32 status;    ///< 11 in service, 10 stopped; only for controllers.
-    char systemName[256];
+    char nodeWWN[24];  ///< Flat form; only with a storage driver.
+    char mac[18];      ///< Flat form; CNA only.
+    sint32 status;     ///< 11 in service, 10 stopped; only for controllers.
+    String systemName; ///< At most 255 characters.
     char model[16];
     char serialNumber[64];
     char vendor[16];

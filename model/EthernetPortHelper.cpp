@@ -20,7 +20,7 @@ EthernetPortHelper* EthernetPortHelper::getEthernetPortHelperObject()
 Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id) const
 {
     LOG_SCOPE("getInstancesByClass");
-    Host_Name host;
+    Host_Name host(64);
     return walk_adapters(LOG_HERE, [&](int adapter_id, const Json::Value& list, Fresh_Instances& instances) {
         const String address = adapter_address(LOG_HERE, list, static_cast<unsigned>(adapter_id - 1));
         if (ProviderUtil::hasEthernetPort(address))
@@ -32,7 +32,7 @@ Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id) const
 
 Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id) const
 {
-    Host_Name host;
+    Host_Name host(64);
     Fresh_Instances instances;
     walk_adapter(adapter_id, id, host, instances);
     return instances.release();

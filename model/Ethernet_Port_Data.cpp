@@ -10,7 +10,7 @@ void fill_ethernet_port(const char* mac, const Json::Value& answer, sint32 port_
     const Json::Value& data = member(answer, "ethData");
     copy_flat(port.mac, mac);
     copy_text(port.permanentAddress, port.mac);
-    host.get(port.systemName, sizeof port.systemName);
+    port.systemName = host.get();
     port.portNumber = port_number;
     copy_member(port.deviceName, data, "ethDev");
     port.status = asUInt(member(data, "ethPortStateMOFValue"));

@@ -14,7 +14,7 @@ struct _ethPortInfo
     char mac[36];          ///< Flat form.
     char deviceName[1028]; ///< The operating system's name of the interface.
     uint32 status;
-    char systemName[64];
+    String systemName;         ///< At most 63 characters.
     char permanentAddress[24]; ///< Flat form.
     sint32 portType;           ///< As CIM numbers it; only for ports, not for endpoints.
     sint32 portNumber;         ///< Place in the adapter's list, from 0.

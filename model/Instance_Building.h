@@ -34,7 +34,7 @@ Array<T> array_of(std::initializer_list<T> elements)
 
 /// The keys that all that belongs to the host has: its own class, and the host's class and name.
 template <class T>
-void set_system_keys(T& instance, classId_t id, const char* system_name)
+void set_system_keys(T& instance, classId_t id, const String& system_name)
 {
     instance.CreationClassName.set(class_name_text(id));
     instance.SystemCreationClassName.set(class_name_text(COMPUTERSYSTEM));

@@ -35,8 +35,9 @@ struct PortHelper::Walk
 {
     classId_t id;
     const Walk_Words& words;
-    Host_Name host = {};
+    Host_Name host = Host_Name(256);
     Json::Value request = Json::Value(Json::objectValue);
+    Json::Value& address = request["wwn"];
 };
 
 PortHelper::PortHelper() : _life("PortHelper", LOG_HERE) {}
@@ -119,8 +120,7 @@ void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk
                            Fresh_Instances& instances) const
 {
     Json::Value answer;
-    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"},
-                 [&] { walk.request["wwn"] = text_value(address); }))
+    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, [&] { walk.address = text_value(address); }))
         return;
     if (!guarded_call(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answer))
         return;
@@ -129,7 +129,7 @@ void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk
             LOG(ERR, "%s", walk.words.bad_port);
         return;
     }
-    _hbaPortInfo port = {};
+    _hbaPortInfo port;
     if (guarded(LOG_HERE, {"libGetPortByWwn"}, [&] { fill_port(answer, number, walk.host, port); }))
         publish(walk.id, answer, port, instances);
 }

@@ -50,7 +50,7 @@ void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _
     copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
     copy_text(port.symbolicName, text_of(members[SYMBOLIC_NAME]));
     port.status = asInt(members[STATUS]);
-    host.get(port.systemName, sizeof port.systemName);
+    port.systemName = host.get();
     port.portType = asInt(members[PORT_TYPE]);
     port.maxFrameSize = asInt(members[MAX_FRAME_SIZE]);
     port.speed = operating_speed(members[OPERATING_SPEED]);

@@ -16,7 +16,7 @@ struct _hbaPortInfo
     char nodeWWN[24]; ///< Flat form.
     char symbolicName[1028];
     sint32 status;
-    char systemName[256];
+    String systemName;   ///< At most 255 characters.
     char localWWN[24];   ///< The port's own WWN, whatever `portWWN` becomes.
     sint32 portType;     ///< As CIM numbers it.
     sint64 maxFrameSize; ///< Bytes.

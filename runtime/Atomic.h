@@ -22,4 +22,11 @@ inline sint32 atomic_get(const sint32& count)
     return __atomic_load_n(&count, __ATOMIC_ACQUIRE);
 }
 
+/// As `atomic_dec_and_test`, for what nobody can find but through a counted handle: whoever holds the only
+/// one need not lock the bus to give it up.
+inline bool atomic_release(sint32& count)
+{
+    return atomic_get(count) == 1 || atomic_dec_and_test(count);
+}
+
 } // namespace KPRV

@@ -1,20 +1,18 @@
 #include "runtime/Container.h"
 
-#include "runtime/features.h"
+#include "runtime/Lent_Value.h"
 #include "runtime/log.h"
 
 namespace KPRV {
 
 Container::~Container() = default;
 
-/// Nulls never leave the instance, and methods have no value.
-static bool has_value(const Instance* instance, const Meta_Feature* feature)
+/// How many features with the mask a class can have: behind the last key, no feature need be looked at for
+/// one. The record of a method does not count its keys.
+static uint32 most_features(const Meta_Class* meta_class, uint32 mask)
 {
-    return visit_feature(feature, Overloaded{
-                                      [=](Reference_Feature f) { return f.target(instance) != nullptr; },
-                                      [](Method_Feature) { return false; },
-                                      [=](auto f) { return f.null(instance) == 0; },
-                                  });
+    return mask == FLAG_KEY && !(meta_class->flags & FLAG_METHOD) ? meta_class->num_keys
+                                                                  : meta_class->num_meta_features;
 }
 
 int Container::convert(const Instance* instance, uint32 mask)
@@ -24,12 +22,16 @@ int Container::convert(const Instance* instance, uint32 mask)
         return -1;
     }
     const Meta_Class* meta_class = instance->__meta_class;
+    Lent_Value value;
+    uint32 left = most_features(meta_class, mask);
     for (const Meta_Feature* feature : features_of(meta_class)) {
-        if ((mask && !(feature->flags & mask)) || !has_value(instance, feature))
+        if (mask && !(feature->flags & mask))
             continue;
-        const Lent_Value value(instance, feature);
-        if (set_value(feature->name, *value, feature->flags) != 0)
+        // Nulls never leave the instance.
+        if (value.show(instance, feature) && set_value(feature->name, *value, feature->flags) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
+        if (--left == 0)
+            break;
     }
     return 0;
 }

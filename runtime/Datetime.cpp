@@ -38,7 +38,7 @@ Datetime_Rep* share(Datetime_Rep* rep)
 
 void release(Datetime_Rep* rep)
 {
-    if (rep != &zero_interval && atomic_dec_and_test(rep->refs))
+    if (rep != &zero_interval && atomic_release(rep->refs))
         delete rep;
 }
 

@@ -144,7 +144,7 @@ void ref(const Instance* instance)
 
 void unref(const Instance* instance)
 {
-    if (instance && atomic_dec_and_test(const_cast<Instance*>(instance)->__refs))
+    if (instance && atomic_release(const_cast<Instance*>(instance)->__refs))
         destroy(const_cast<Instance*>(instance));
 }
 

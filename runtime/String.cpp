@@ -89,7 +89,7 @@ String::String(const char* a, const char* b, const char* c) : _rep(&_empty)
 
 void String::_release(String_Rep* rep)
 {
-    if (rep != &_empty && atomic_dec_and_test(rep->refs))
+    if (rep != &_empty && atomic_release(rep->refs))
         ::operator delete(rep);
 }
 

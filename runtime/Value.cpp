@@ -110,11 +110,6 @@ Value& Value::operator=(const Value& x)
     return *this;
 }
 
-Value::~Value()
-{
-    _release();
-}
-
 void Value::clear()
 {
     _release();
@@ -242,32 +237,6 @@ int Value::set(const Instance* instance, const Meta_Feature* feature)
                                       },
                                       [](Method_Feature) { return -1; },
                                   });
-}
-
-Lent_Value::Lent_Value(const Instance* instance, const Meta_Feature* feature)
-{
-    const auto lend = [this](Value::Type type, const void* bytes, size_t size, bool null) {
-        memcpy(_value._bytes, bytes, size);
-        _value.type = type;
-        _value.null = null;
-    };
-    visit_feature(
-        feature, Overloaded{
-                     [&](Scalar_Feature f) {
-                         lend(Value::Type(f.type()), f.value(instance), type_size[f.type()],
-                              f.null(instance));
-                     },
-                     [&](Array_Feature f) {
-                         lend(array_of(f.type()), &f.array(instance), sizeof(__Array_Rep*), f.null(instance));
-                     },
-                     [&](Reference_Feature f) {
-                         lend(Value::INSTANCE, &f.target(instance), sizeof(Instance*), !f.target(instance));
-                     },
-                     [&](Reference_Array_Feature f) {
-                         lend(Value::INSTANCE_ARRAY, &f.targets(instance), sizeof(Targets), f.null(instance));
-                     },
-                     [](Method_Feature) {},
-                 });
 }
 
 /// Whether a reference may point to the instance; null always fits.

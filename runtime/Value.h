@@ -27,7 +27,11 @@ public:
     Value() = default;
     Value(const Value& x);
     Value& operator=(const Value& x);
-    ~Value();
+    ~Value()
+    {
+        if (type != NONE)
+            _release();
+    }
 
     /// Releases what is held; type NONE and null.
     void clear();
@@ -157,23 +161,6 @@ private:
 
     /// Any scalar, a `String` or `Datetime` handle, an `Instance*`, an array handle.
     alignas(8) unsigned char _bytes[8] = {};
-};
-
-/// What a cell holds, as a value that neither copies nor counts it: for readers that are done before the
-/// instance changes.
-class Lent_Value
-{
-public:
-    /// Type NONE for a method feature.
-    Lent_Value(const Instance* instance, const Meta_Feature* feature);
-    ~Lent_Value() { _value.type = Value::NONE; }
-    Lent_Value(const Lent_Value&) = delete;
-    Lent_Value& operator=(const Lent_Value&) = delete;
-
-    const Value& operator*() const { return _value; }
-
-private:
-    Value _value;
 };
 
 /// Upper-case name for printing, such as "UINT8_ARRAY".

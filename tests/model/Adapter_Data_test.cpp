@@ -37,7 +37,6 @@ TEST(Adapter_Data, widths)
 {
     EXPECT_EQ(sizeof _adapterData::nodeWWN, 24u);
     EXPECT_EQ(sizeof _adapterData::mac, 18u);
-    EXPECT_EQ(sizeof _adapterData::systemName, 256u);
     EXPECT_EQ(sizeof _adapterData::model, 16u);
     EXPECT_EQ(sizeof _adapterData::serialNumber, 64u);
     EXPECT_EQ(sizeof _adapterData::vendor, 16u);

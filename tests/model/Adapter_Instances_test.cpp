@@ -21,7 +21,7 @@ _adapterData hba()
 {
     _adapterData adapter = {};
     copy_text(adapter.nodeWWN, "20008c7cff000001");
-    copy_text(adapter.systemName, "10.0.0.1");
+    adapter.systemName = "10.0.0.1";
     copy_text(adapter.model, "825");
     copy_text(adapter.serialNumber, "S1");
     copy_text(adapter.vendor, "KLDR");

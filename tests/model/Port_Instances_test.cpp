@@ -14,7 +14,7 @@ struct Port_Instances : Port_Fixture
     {
         copy_text(port.portWWN, "W");
         copy_text(port.nodeWWN, "N");
-        copy_text(port.systemName, "host");
+        port.systemName = "host";
     }
 };
 

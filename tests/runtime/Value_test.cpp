@@ -1,11 +1,13 @@
 #include "runtime/Value.h"
 
+#include "runtime/Lent_Value.h"
 #include "tests/runtime/sample_values.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <utility>
 
 namespace KPRV {
 
@@ -440,13 +442,15 @@ TEST(Lent_Value_Test, ShowsTheCellWithoutHoldingIt)
 {
     const Ref<Sample_Group> group = make_group("g");
     {
-        const Lent_Value leader(group.ptr(), LEADER);
+        Lent_Value leader;
+        ASSERT_TRUE(leader.show(group.ptr(), LEADER));
         Instance* target = nullptr;
         EXPECT_EQ(0, (*leader).get_value(target));
         EXPECT_EQ(group->Leader, target);
         EXPECT_EQ(1, target->__refs);
 
-        const Lent_Value members(group.ptr(), MEMBERS);
+        Lent_Value members;
+        ASSERT_TRUE(members.show(group.ptr(), MEMBERS));
         ASSERT_NE(nullptr, (*members).peek<Array<Instance*>>());
         EXPECT_EQ(group->Members.value.data(), (*members).peek<Array<Instance*>>()->data());
         // A copy of it is a value like any other.
@@ -455,7 +459,13 @@ TEST(Lent_Value_Test, ShowsTheCellWithoutHoldingIt)
     }
     EXPECT_EQ(1, group->Leader->__refs);
     EXPECT_EQ(1, group->Members.value[0]->__refs);
-    EXPECT_EQ(Value::NONE, (*Lent_Value(group.ptr(), RESET)).type);
+    Lent_Value nothing;
+    EXPECT_FALSE(nothing.show(group.ptr(), RESET));
+    group->Members.null = 1;
+    EXPECT_FALSE(nothing.show(group.ptr(), MEMBERS));
+    unref(std::exchange(group->Leader, nullptr));
+    EXPECT_FALSE(nothing.show(group.ptr(), LEADER));
+    EXPECT_EQ(Value::NONE, (*nothing).type);
 }
 
 TEST(Value_Test, PeekKnowsItsType)
