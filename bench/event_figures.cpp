@@ -4,6 +4,7 @@
 #include "bench/Stop_Watch.h"
 
 #include <atomic>
+#include <cmath>
 #include <cstdio>
 #include <cstdlib>
 #include <unistd.h>
@@ -78,6 +79,10 @@ void print_burst(int events)
     const double passed = arrivals[before + events - 1] - arrivals[before];
     printf("B6 burst of %d, rate\t%.2f\tevents/s\n", events, (events - 1) / (passed / 1e9));
     printf("B6 burst, added to each period\t%.3f\tms\n", (passed / (events - 1) - PERIOD) / 1e6);
+    double worst = 0;
+    for (int i = 1; i < events; i++)
+        worst = std::max(worst, std::abs(arrivals[before + i] - arrivals[before] - i * PERIOD));
+    printf("B6 burst, furthest from the beat\t%.3f\tms\n", worst / 1e6);
 }
 
 } // namespace

@@ -85,6 +85,7 @@ private:
         LOG_SCOPE("deliverIndications");
         auto* const self = static_cast<KALDERA_AlertIndication_Provider*>(provider);
         IndicationManager* const manager = IndicationManager::getIndicationManager();
+        Delivery_Passes passes;
         while (self->_continue != 0) {
             KALDERA_AlertIndication* alert = nullptr;
             if (manager->getIndicationObject(&alert)) {
@@ -95,7 +96,7 @@ private:
                 if (guarded(LOG_HERE, {"deliverIndications"}, [&] { self->_handler->handle(clone); }))
                     LOG(INFO, "Delivered indication to the CIM server");
             }
-            delivery_pace.sleep(20 * Time::MSEC);
+            passes.sleep_to_end();
         }
         return nullptr;
     }

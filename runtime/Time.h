@@ -12,4 +12,9 @@ inline constexpr uint64 SEC = 1000000;
 uint64 now();
 void sleep(uint64 microseconds);
 
+/// Microseconds of a clock that nobody sets: good for spans, and for `sleep_until` alone.
+uint64 monotonic();
+/// Sleeps until `monotonic()` has come to the moment, signals or not; returns at once if it has.
+void sleep_until(uint64 moment);
+
 } // namespace KPRV::Time

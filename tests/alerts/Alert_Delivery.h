@@ -16,7 +16,28 @@ inline const Registration* alert_registration()
     return each;
 }
 
-/// The delivery thread's waiting, for a scope: as short as can be, and counted.
+/// The delivery thread's clock, for a scope: it stands still but for its sleeps, so that each should be a
+/// whole period.
+class Pace_Override
+{
+public:
+    /// What a sleep does in the place of sleeping.
+    explicit Pace_Override(void (*sleep)(uint64 moment)) : _product(delivery_pace)
+    {
+        clock = 1;
+        delivery_pace = {[]() -> uint64 { return clock; }, sleep};
+    }
+    ~Pace_Override() { delivery_pace = _product; }
+    Pace_Override(const Pace_Override&) = delete;
+    Pace_Override& operator=(const Pace_Override&) = delete;
+
+    static inline std::atomic<uint64> clock;
+
+private:
+    const Delivery_Pace _product;
+};
+
+/// Sleeps as short as can be, and counted.
 class Short_Pace
 {
 public:
@@ -24,19 +45,18 @@ public:
     {
         passes = 0;
         strange = 0;
-        delivery_pace.sleep = [](uint64 microseconds) {
-            passes++;
-            strange += microseconds != 20000;
-            Time::sleep(50);
-        };
     }
-    ~Short_Pace() { delivery_pace.sleep = Time::sleep; }
-    Short_Pace(const Short_Pace&) = delete;
-    Short_Pace& operator=(const Short_Pace&) = delete;
 
     static inline std::atomic<int> passes;
     /// Sleeps of another length than the product's.
     static inline std::atomic<int> strange;
+
+private:
+    const Pace_Override _pace{[](uint64 moment) {
+        passes++;
+        strange += moment - Pace_Override::clock.exchange(moment) != 20000;
+        Time::sleep(50);
+    }};
 };
 
 } // namespace KPRV

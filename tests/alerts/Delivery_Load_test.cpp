@@ -80,7 +80,7 @@ TEST(Delivery_Load, TenThousandEventsOfFourThreadsReachTheServerAndLeaveNothingB
     Fake_Library library;
     library.answers("register_for_events", json("{}"));
     library.answers("unregister_for_events", json("{}"));
-    delivery_pace.sleep = [](uint64) {};
+    const Pace_Override pace([](uint64) {});
 
     constexpr int THREADS = 4;
     constexpr int EVENTS = 2500;
@@ -110,7 +110,6 @@ TEST(Delivery_Load, TenThousandEventsOfFourThreadsReachTheServerAndLeaveNothingB
     while (count < THREADS * EVENTS)
         std::this_thread::sleep_for(std::chrono::milliseconds(1));
     EXPECT_EQ(CMPI_RC_OK, server.disable());
-    delivery_pace.sleep = Time::sleep;
 
     ASSERT_EQ(size_t(THREADS * EVENTS), numbers.size());
     for (size_t i = 1; i < numbers.size(); i++)
@@ -131,7 +130,7 @@ TEST(Delivery_Load, EndsInTheMiddleOfAStorm)
         std::this_thread::sleep_for(std::chrono::milliseconds(2));
         return json("{}");
     });
-    delivery_pace.sleep = [](uint64) { std::this_thread::yield(); };
+    const Pace_Override pace([](uint64) { std::this_thread::yield(); });
     std::atomic<int> count = 0;
     {
         Alert_Server server([&](const std::string&, const host::Instance_Value&) { ++count; });
@@ -149,7 +148,6 @@ TEST(Delivery_Load, EndsInTheMiddleOfAStorm)
             std::this_thread::sleep_for(std::chrono::milliseconds(1));
         // No disabling: the cleanup ends it.
     }
-    delivery_pace.sleep = Time::sleep;
     EXPECT_EQ(2000, count);
     EXPECT_EQ(nullptr, library.event_callback);
 }
