@@ -69,7 +69,8 @@ ProviderInit::ProviderInit()
 ProviderInit::~ProviderInit()
 {
     LOG(DBG, "Inside ProviderInit Destructor.");
-    libFreeHbaLib();
+    // Nobody stands above a destructor: what left it would end the server.
+    guarded(LOG_HERE, {"libFreeHbaLib"}, [] { libFreeHbaLib(); });
 }
 
 } // namespace KPRV

@@ -168,7 +168,7 @@ TEST_P(Agent_Answers, ReachTheClientAndNobodyElse)
     const std::vector<std::string> neighbours = lasting_texts(server->enumerate_instances(neighbour));
     EXPECT_FALSE(neighbours.empty());
     const std::vector<Bad_Answer> kinds = std::string(way.entry_point) == "getRequestID"
-                                              ? bad_integers()
+                                              ? bad_answers_of(INTEGER)
                                               : bad_json_answers(true_answer(way.entry_point, request));
     for (const Bad_Answer& bad : kinds) {
         SCOPED_TRACE(bad.name);

@@ -62,7 +62,7 @@ TEST_F(Allocation_Failures, OfAMethod)
     const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
     starve("SetAlarmState", [&] {
         return server->invoke_method(alarm, "SetAlarmState",
-                                     {{"RequestedState", host::Value::unsigned_number(CMPI_uint16, 2)}});
+                                     {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 2)}});
     });
 }
 

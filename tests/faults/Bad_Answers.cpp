@@ -156,27 +156,25 @@ std::vector<Bad_Answer> bad_json_answers(const Json::Value& good)
     });
 }
 
-std::vector<Bad_Answer> bad_texts()
+std::vector<Bad_Answer> bad_answers_of(Answer_Kind kind)
 {
-    return with_exceptions({{"null", {}},
-                            {"an empty text", ""},
-                            {"a short text", "3.2"},
-                            {"a long text", std::string(LONG_TEXT, '9')}});
-}
-
-std::vector<Bad_Answer> bad_counts()
-{
-    return with_exceptions({{"65535", 65535u}, {"none", 0u}, {"2^32 - 1", 4294967295u}});
-}
-
-std::vector<Bad_Answer> bad_integers()
-{
-    return with_exceptions({{"-1", -1}, {"the least", -2147483647 - 1}, {"the greatest", 2147483647}});
-}
-
-std::vector<Bad_Answer> exceptions()
-{
-    return with_exceptions({});
+    Json::Value good;
+    good["result"] = 0;
+    switch (kind) {
+    case JSON:
+        return bad_json_answers(good);
+    case TEXT:
+        return with_exceptions({{"null", {}},
+                                {"an empty text", ""},
+                                {"a short text", "3.2"},
+                                {"a long text", std::string(LONG_TEXT, '9')}});
+    case COUNT:
+        return with_exceptions({{"65535", 65535u}, {"none", 0u}, {"2^32 - 1", 4294967295u}});
+    case INTEGER:
+        return with_exceptions({{"-1", -1}, {"the least", -2147483647 - 1}, {"the greatest", 2147483647}});
+    default:
+        return with_exceptions({});
+    }
 }
 
 } // namespace KPRV

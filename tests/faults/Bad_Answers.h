@@ -23,6 +23,12 @@ struct Bad_Answer
     Json::Value answer = {};
     Thrown thrown = NOTHING;
 
+    /// True for what nobody takes for an answer: null, an "error", an exception.
+    bool is_failure() const
+    {
+        return thrown || answer.isNull() || (answer.isObject() && answer.isMember("error"));
+    }
+
     /// The fault that makes the simulator answer so, to each request or only to those that hold the address.
     std::string fault(const std::string& entry_point, const std::string& address = "") const;
 };
@@ -39,10 +45,17 @@ inline constexpr std::size_t LONG_TEXT = 70 * 1024;
 /// it has none, such a value is the whole answer.
 std::vector<Bad_Answer> bad_json_answers(const Json::Value& good);
 
-/// Those that a function can give whose result is a text, a count, an integer, or nothing.
-std::vector<Bad_Answer> bad_texts();
-std::vector<Bad_Answer> bad_counts();
-std::vector<Bad_Answer> bad_integers();
-std::vector<Bad_Answer> exceptions();
+/// What a function of the library has for a result.
+enum Answer_Kind
+{
+    JSON,
+    TEXT,
+    COUNT,
+    INTEGER,
+    NONE,
+};
+
+/// The kinds that such a function can give, a JSON one with a status as its good answer.
+std::vector<Bad_Answer> bad_answers_of(Answer_Kind kind);
 
 } // namespace KPRV
