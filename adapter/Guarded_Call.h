@@ -42,13 +42,30 @@ bool guarded(Call_Site site, const Guarded_Entry& entry, Body&& body)
     }
 }
 
-/// Calls an entry point whose failure must not reach the caller. `response` is its answer; false and null if
-/// it threw. An answer may still be a bad one: see `ProviderUtil::isValidJsonResponse`.
+/// Calls an entry point whose failure must not reach the caller: the answer, or null and not `answered` if it
+/// threw. An answer may still be a bad one: see `ProviderUtil::isValidJsonResponse`.
+inline Json::Value guarded_answer(Call_Site site, const Guarded_Entry& entry, JsonReqFP call,
+                                  const Json::Value& request, bool& answered)
+{
+    answered = true;
+    try {
+        return call(request);
+    } catch (...) {
+        if (!abi::__cxa_current_exception_type())
+            throw;
+        log_caught(entry, site);
+        answered = false;
+        return Json::Value();
+    }
+}
+
+/// The same into `response`; false if it threw.
 inline bool guarded_call(Call_Site site, const Guarded_Entry& entry, JsonReqFP call,
                          const Json::Value& request, Json::Value& response)
 {
-    response = Json::Value();
-    return guarded(site, entry, [&] { response = call(request); });
+    bool answered;
+    response = guarded_answer(site, entry, call, request, answered);
+    return answered;
 }
 
 } // namespace KPRV

@@ -18,7 +18,7 @@ T number(const Json::Value& value, const char* failure)
     case Json::booleanValue:
         return value.asBool() ? 1 : 0;
     case Json::intValue: {
-        const Json::LargestInt n = value.asLargestInt();
+        const Json::Int64 n = value.asInt64();
         if (n >= std::numeric_limits<T>::min() && n <= std::numeric_limits<T>::max())
             return static_cast<T>(n);
         break;

@@ -64,7 +64,7 @@ bool is_nested_too_deep(std::string_view text)
 
 bool read_json(std::string_view text, Json::Value& value, std::string& errors)
 {
-    if (is_nested_too_deep(text)) {
+    if (text.size() > MOST_NESTED && is_nested_too_deep(text)) {
         errors = "nested deeper than " + std::to_string(MOST_NESTED) + " levels";
         return false;
     }

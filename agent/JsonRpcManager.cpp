@@ -33,13 +33,25 @@ void fail(Json::Value& reply, const char* name, int code, const std::string& mes
 }
 
 /// A failure that the adapter library told in its answer becomes the reply's own.
-void lift_error(Json::Value& reply)
+void lift_error(Json::Value& reply, const Json::Value& result)
 {
-    if (!hasMember(reply["result"], "error"))
+    if (!hasMember(result, "error"))
         return;
-    Json::Value error = reply["result"]["error"];
+    Json::Value error = result["error"];
     reply.removeMember("result");
     reply["error"].swap(error);
+}
+
+/// A member of the request; null if it is absent. Throws in the JSON library's words if the request is
+/// neither an object nor null.
+const Json::Value* find(const Json::Value& root, std::string_view name)
+{
+    return root.find(name.data(), name.data() + name.size());
+}
+
+const Json::Value& value_of(const Json::Value* found)
+{
+    return found ? *found : Json::Value::nullSingleton();
 }
 
 } // namespace
@@ -80,35 +92,45 @@ std::vector<std::string> JsonRpcManager::getMethods() const
 
 void JsonRpcManager::process(const std::string& request, response& out) const
 {
+    String text;
+    out.status = answer(request, text);
+    out.text = text.c_str();
+}
+
+sint32 JsonRpcManager::answer(std::string_view request, String& text) const
+{
     Json::Value parsed;
     std::string errors;
     if (!read_json(request, parsed, errors)) {
-        out.status = 500;
-        out.text = "There was an error parsing the JSON text comprising the Procedure Call:\n" + errors;
-        return;
+        text = String("There was an error parsing the JSON text comprising the Procedure Call:\n",
+                      errors.c_str());
+        return 500;
     }
     const Json::Value& root = parsed;
     Json::Value reply;
     // Clients of all versions are served alike, but a version must be a text.
-    if (root.isMember("version"))
-        asString(root["version"]);
-    if (root.isMember("id"))
-        reply["id"] = root["id"];
+    if (const Json::Value* const version = find(root, "version"))
+        asView(*version);
+    if (const Json::Value* const id = find(root, "id"))
+        reply["id"] = *id;
     reply["version"] = "1.1";
-    call(asString(root["method"]), root["params"], reply);
+    call(asView(value_of(find(root, "method"))), value_of(find(root, "params")), reply);
 
-    out.status = 200;
-    out.text = Json::StyledWriter().write(reply);
+    // The text is copied while the values stand: once they are gone, the allocator sorts what they leave
+    // before it finds room for a long text, and that takes longer than the copy.
+    text = Json::StyledWriter().write(reply).c_str();
+    return 200;
 }
 
-void JsonRpcManager::call(const std::string& name, const Json::Value& params, Json::Value& reply) const
+void JsonRpcManager::call(std::string_view name, const Json::Value& params, Json::Value& reply) const
 {
     const auto method = _methods.find(name);
     if (method == _methods.end())
         return fail(reply, "JSONRPCError", 105, "Procedure not found");
     try {
-        method->second(params, reply["result"]);
-        lift_error(reply);
+        Json::Value& result = reply["result"];
+        method->second(params, result);
+        lift_error(reply, result);
     } catch (const HbaAgentError& error) {
         fail(reply, "USERDEFINEDError", error.code, error.message);
     } catch (const std::exception& error) {

@@ -1,11 +1,12 @@
 #pragma once
 
-#include "runtime/Types.h"
+#include "runtime/String.h"
 
 #include <json/value.h>
 
 #include <map>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace KPRV {
@@ -47,15 +48,17 @@ public:
     /// A request that is neither an object nor null, and a "method" or "version" that is no text, are
     /// answered by nothing: they leave as a `std::exception`.
     void process(const std::string& request, response& out) const;
+    /// The same; the text goes where a property takes it over without a copy. Returns the status.
+    sint32 answer(std::string_view request, String& text) const;
 
 private:
     JsonRpcManager() = default;
 
-    void call(const std::string& name, const Json::Value& params, Json::Value& reply) const;
+    void call(std::string_view name, const Json::Value& params, Json::Value& reply) const;
 
     static JsonRpcManager* s_instance;
 
-    std::map<std::string, Handler> _methods;
+    std::map<std::string, Handler, std::less<>> _methods;
 };
 
 } // namespace KPRV

@@ -16,9 +16,9 @@ GOALS = [
     (r"B1 ", "time", 1.25),
     (r"B1 ", "allocations", 1.3),
     (r"B3 enumerate", "time", 1.0),
-    (r"B4 .*no-op", "time", 1.15),
-    (r"B4 .*25 members", "time", 1.05),
-    (r"B4 .*30 KB", "time", 1.02),
+    (r"B4 executeMethod/no-op", "time", 1.15),
+    (r"B4 executeMethod/25 members", "time", 1.05),
+    (r"B4 executeMethod/30 KB", "time", 1.02),
     (r"B5 find", "time", 1 / 15),
 ]
 NANOSECONDS = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}

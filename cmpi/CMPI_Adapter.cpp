@@ -3,6 +3,8 @@
 #include "cmpi/rc_to_str.h"
 #include "runtime/log.h"
 
+#include <cstring>
+
 namespace KPRV {
 
 namespace {
@@ -66,6 +68,9 @@ const Meta_Class* CMPI_Adapter::find_meta_class(const char* name) const
 
 const Meta_Class* CMPI_Adapter::find_model_meta_class(const char* name) const
 {
+    // Nearly always it is the provider's own, whose name no other class of the repository bears.
+    if (model_meta_class && strcmp(model_meta_class->name, name) == 0)
+        return model_meta_class;
     const Meta_Class* const found = find_meta_class(name);
     // The test of a class against itself always holds. It is not to be narrowed to the provider's own class:
     // the reach into the whole repository is used.

@@ -58,21 +58,31 @@ int CMPI_Container::get_value(uint32 index, Value::Type type, Value& value)
 
 void CMPI_Container::_relax(Value::Type, Value&) {}
 
+int CMPI_Container::_not_made(const char* name)
+{
+    LOG_CONVERSION(WARN, "_to_cmpi_data() failed: feature=%s", name);
+    return -1;
+}
+
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
     CMPIData data = {};
-    // Most properties: nothing is made for them, and nothing can fail. The widest has 64 bits.
+    // The short ways, which nearly all properties go. Nothing is made for a plain one; the widest has 64
+    // bits.
     if (const void* const bytes = value.plain_bytes()) {
         data.type = cmpi_type_words[value.type];
         memcpy(&data.value, bytes, sizeof(uint64));
         return _set(name, data);
     }
+    if (const String* const text = value.peek<String>(); text && !_gives_back) {
+        data.type = CMPI_string;
+        data.value.string = CMNewString(_broker, text->c_str(), nullptr);
+        return data.value.string ? _set(name, data) : _not_made(name);
+    }
     Made_Objects made;
     if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr) !=
-        0) {
-        LOG_CONVERSION(WARN, "_to_cmpi_data() failed: feature=%s", name);
-        return -1;
-    }
+        0)
+        return _not_made(name);
     return _set(name, data);
 }
 

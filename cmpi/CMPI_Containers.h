@@ -35,6 +35,8 @@ protected:
     virtual void _relax(Value::Type type, Value& value);
 
     bool _in_bounds(uint32 index);
+    /// -1, with a log line.
+    static int _not_made(const char* name);
 
     const CMPIBroker* _broker;
     const char* _name_space;

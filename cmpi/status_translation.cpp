@@ -55,6 +55,9 @@ static constexpr Row rows[] = {
 
 CMPIrc translate(Status_Family family, int status)
 {
+    // Success is 0 in every family.
+    if (status == 0)
+        return CMPI_RC_OK;
     for (const Row& row : rows) {
         if (row.family == family && row.status == status)
             return row.rc;

@@ -223,7 +223,7 @@ int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* br
         T x = T();
         if (load_scalar(data.value, x) != 0)
             return -1;
-        value.set_value(x);
+        value.set_value(std::move(x));
         return 0;
     });
 }

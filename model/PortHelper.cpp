@@ -119,10 +119,12 @@ void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& 
 void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk,
                            Fresh_Instances& instances) const
 {
-    Json::Value answer;
     if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, [&] { walk.address = text_value(address); }))
         return;
-    if (!guarded_call(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answer))
+    bool answered;
+    const Json::Value answer =
+        guarded_answer(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answered);
+    if (!answered)
         return;
     if (!ProviderUtil::isValidJsonResponse(answer)) {
         if (walk.words.bad_port)

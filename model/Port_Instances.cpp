@@ -21,11 +21,11 @@ KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port) const
     LOG_SCOPE("getFCPortInstance");
     Ref<KALDERA_FCPort> instance(create_null<KALDERA_FCPort>());
     set_system_keys(*instance, FCPORT, port.systemName);
-    const String address = port.portWWN, names = pair_of_names(port);
+    String address = port.portWWN, names = pair_of_names(port);
     instance->DeviceID.set(address);
-    instance->PermanentAddress.set(address);
+    instance->PermanentAddress.set(std::move(address));
     instance->ElementName.set(names);
-    instance->Name.set(names);
+    instance->Name.set(std::move(names));
     instance->Caption.set(port.symbolicName);
     instance->OperationalStatus.set(array_of({static_cast<uint16>(port.status)}));
     instance->UsageRestriction.set(3);

@@ -43,8 +43,11 @@ void copy_flat(char (&field)[N], std::string_view address)
 {
     size_t size = 0;
     for (const char c : address) {
-        if (c != ':' && size < N - 1)
-            field[size++] = c;
+        if (size == N - 1)
+            break;
+        // No branch on the colons: addresses are read for every port and target.
+        field[size] = c;
+        size += c != ':';
     }
     field[size] = '\0';
 }

@@ -43,13 +43,12 @@ public:
     {
         LOG_SCOPE("executeMethod");
         // A null request is an empty text.
-        const std::string text(request.value.c_str(), request.value.size());
-        log_text(LOG_HERE, text.c_str());
-        JsonRpcManager::response reply;
-        JsonRpcManager::instance()->process(text, reply);
-        LOG(DBG, "rpcResponse : %s", reply.text.c_str());
-        response.set(reply.text.c_str());
-        log_text(LOG_HERE, reply.text.c_str());
+        log_text(LOG_HERE, request.value.c_str());
+        String reply;
+        JsonRpcManager::instance()->answer({request.value.c_str(), request.value.size()}, reply);
+        LOG(DBG, "rpcResponse : %s", reply.c_str());
+        log_text(LOG_HERE, reply.c_str());
+        response.set(std::move(reply));
         return_value.set(0);
         return INVOKE_METHOD_OK;
     }

@@ -7,14 +7,6 @@ namespace KPRV {
 
 Container::~Container() = default;
 
-/// How many features with the mask a class can have: behind the last key, no feature need be looked at for
-/// one. The record of a method does not count its keys.
-static uint32 most_features(const Meta_Class* meta_class, uint32 mask)
-{
-    return mask == FLAG_KEY && !(meta_class->flags & FLAG_METHOD) ? meta_class->num_keys
-                                                                  : meta_class->num_meta_features;
-}
-
 int Container::convert(const Instance* instance, uint32 mask)
 {
     if (!instance) {
@@ -23,16 +15,19 @@ int Container::convert(const Instance* instance, uint32 mask)
     }
     const Meta_Class* meta_class = instance->__meta_class;
     Lent_Value value;
-    uint32 left = most_features(meta_class, mask);
-    for (const Meta_Feature* feature : features_of(meta_class)) {
+    const auto put = [&](const Cell& cell) {
+        const Meta_Feature* const feature = cell.feature;
         if (mask && !(feature->flags & mask))
-            continue;
-        // Nulls never leave the instance.
-        if (value.show(instance, feature) && set_value(feature->name, *value, feature->flags) != 0)
+            return;
+        value.show(instance, cell);
+        if (set_value(feature->name, *value, feature->flags) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
-        if (--left == 0)
-            break;
-    }
+    };
+    // Most cells are null, and nulls never leave the instance.
+    visit_cells(meta_class, mask == FLAG_KEY ? Cells::KEYS : Cells::ALL, [&](const Cell& cell) INLINE {
+        if (!cell.is_null(instance))
+            put(cell);
+    });
     return 0;
 }
 
@@ -72,8 +67,8 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& ins
     __set_null_flags(instance, true, true, 1);
 
     const uint32 size = get_size();
+    String name;
     for (uint32 i = 0; i < size; i++) {
-        String name;
         if (get_name(i, name) != 0) {
             LOG_CONVERSION(WARN, "get_name() failed: class=%s, index=%u", meta_class->name, i);
             continue;

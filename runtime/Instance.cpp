@@ -1,6 +1,7 @@
 #include "runtime/Instance.h"
 
 #include "runtime/Atomic.h"
+#include "runtime/Class_Plan.h"
 #include "runtime/features.h"
 #include "runtime/type_dispatch.h"
 
@@ -78,28 +79,29 @@ struct Constructor
     void operator()(Method_Feature) const {}
 };
 
-/// Releases what the cell of one feature holds.
-struct Destructor
+/// Releases what a cell holds that is no text.
+void release(Instance* instance, const Cell& cell)
 {
-    Instance* instance;
-
-    void operator()(Scalar_Feature f) const
-    {
-        void* value = f.value(instance);
-        visit_storage(
-            f.type(), [=] { static_cast<String*>(value)->~String(); },
-            [=] { static_cast<Datetime*>(value)->~Datetime(); }, [] {});
-    }
-    void operator()(Array_Feature f) const { __destruct(f.array(instance)); }
-    void operator()(Reference_Feature f) const { unref(f.target(instance)); }
-    void operator()(Reference_Array_Feature f) const
-    {
-        for (Instance* target : f.targets(instance))
+    using Targets = Array<Instance*>;
+    switch (cell.kind) {
+    case Cell_Kind::MOMENT:
+        cell.in<Datetime>(instance).~Datetime();
+        break;
+    case Cell_Kind::ARRAY:
+        __destruct(cell.in<__Array_Rep*>(instance));
+        break;
+    case Cell_Kind::REFERENCE:
+        unref(cell.in<Instance*>(instance));
+        break;
+    case Cell_Kind::REFERENCE_ARRAY:
+        for (const Instance* target : cell.in<Targets>(instance))
             unref(target);
-        f.targets(instance).~Array();
+        cell.in<Targets>(instance).~Targets();
+        break;
+    default:
+        break;
     }
-    void operator()(Method_Feature) const {}
-};
+}
 
 } // namespace
 
@@ -130,8 +132,12 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
 
 void __destruct(Instance* instance)
 {
-    for (const Meta_Feature* feature : features_of(instance->__meta_class))
-        visit_feature(feature, Destructor{instance});
+    visit_cells(instance->__meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
+        if (cell.kind == Cell_Kind::TEXT)
+            cell.in<String>(instance).~String();
+        else
+            release(instance, cell);
+    });
     unref(instance->__meta_class);
     instance->__name_space.~String();
 }

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "runtime/Class_Plan.h"
 #include "runtime/Value.h"
-#include "runtime/features.h"
 
 #include <cstring>
 
@@ -17,38 +17,13 @@ public:
     Lent_Value(const Lent_Value&) = delete;
     Lent_Value& operator=(const Lent_Value&) = delete;
 
-    /// Shows another cell. False, and nothing changes, for a null cell and for a method.
-    bool show(const Instance* instance, const Meta_Feature* feature)
+    /// Shows another cell, which is not null.
+    void show(const Instance* instance, const Cell& cell)
     {
-        if (feature->flags & FLAG_PROPERTY) {
-            const auto* meta = static_cast<const Meta_Property*>(feature);
-            const char* const cell = &cell_at<char>(instance, meta->offset);
-            const uint32 size = null_offset(meta);
-            return !cell[size] &&
-                   lend(meta->subscript ? Value::ARRAY_BIT | meta->type : meta->type, cell, size);
-        }
-        return visit_feature(feature, Overloaded{
-                                          [&](Reference_Feature f) {
-                                              const auto& target = f.target(instance);
-                                              return target && lend(Value::INSTANCE, &target, sizeof target);
-                                          },
-                                          [&](Reference_Array_Feature f) {
-                                              const auto& targets = f.targets(instance);
-                                              return !f.null(instance) &&
-                                                     lend(Value::INSTANCE_ARRAY, &targets, sizeof targets);
-                                          },
-                                          [](auto) { return false; },
-                                      });
-    }
-
-    const Value& operator*() const { return _value; }
-
-private:
-    bool lend(sint32 type, const void* bytes, uint32 size)
-    {
+        const void* const bytes = &cell.in<char>(instance);
         memset(_value._bytes, 0, sizeof _value._bytes);
         // A copy of a known size is one instruction.
-        switch (size) {
+        switch (cell.size) {
         case 1:
             memcpy(_value._bytes, bytes, 1);
             break;
@@ -61,10 +36,12 @@ private:
         default:
             memcpy(_value._bytes, bytes, 8);
         }
-        _value.type = static_cast<Value::Type>(type);
-        return true;
+        _value.type = static_cast<Value::Type>(cell.type);
     }
 
+    const Value& operator*() const { return _value; }
+
+private:
     Value _value;
 };
 

@@ -99,12 +99,6 @@ String& String::operator=(const char* text)
     return *this;
 }
 
-void String::assign(const String& x)
-{
-    if (_rep != x._rep)
-        *this = String(x);
-}
-
 void String::assign(const char* text)
 {
     assign(text, length_of(text));

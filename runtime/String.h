@@ -56,7 +56,11 @@ public:
     }
     String& operator=(const char* text);
 
-    void assign(const String& x);
+    void assign(const String& x)
+    {
+        if (_rep != x._rep)
+            *this = String(x);
+    }
     void assign(const char* text);
     void assign(const char* text, uint32 n);
 

@@ -50,7 +50,8 @@ public:
     void set_value(real64 x)  { _set(x); }
     void set_value(char16 x)  { _set(x); }
     void set_value(const String& x)   { _set(x); }
-    void set_value(const char* x)     { _set(String(x)); }
+    void set_value(String&& x)        { _take(x); }
+    void set_value(const char* x)     { set_value(String(x)); }
     void set_value(const Datetime& x) { _set(x); }
     // clang-format on
     /// Takes over the caller's count. Null is a value here: `null` stays false.
@@ -148,6 +149,13 @@ private:
         _release();
         new (_bytes) T(hold);
         _become(static_cast<Type>(Type_Code<T>::value));
+    }
+    void _take(String& x)
+    {
+        String hold(std::move(x));
+        _release();
+        new (_bytes) String(std::move(hold));
+        _become(static_cast<Type>(STRING));
     }
     void _set_array(Type x, const __Array_Rep* rep);
     int _get_array(Type x, __Array_Rep*& rep) const;

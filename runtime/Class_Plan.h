@@ -1,0 +1,86 @@
+#pragma once
+
+#include "runtime/features.h"
+
+namespace KPRV {
+
+enum class Cell_Kind : uint8
+{
+    PLAIN, ///< A scalar of bytes: nothing stands behind it.
+    TEXT,
+    MOMENT,
+    ARRAY,
+    REFERENCE,
+    REFERENCE_ARRAY,
+    NONE, ///< A method has no cell.
+};
+
+/// What a walk over an instance needs to know of one cell, side by side. But for a reference, whose pointer
+/// tells whether it is null, the null byte stands right behind the value.
+struct Cell
+{
+    const Meta_Feature* feature;
+    uint32 offset;
+    sint16 type; ///< As `Value::Type` numbers it.
+    uint8 size;  ///< Bytes of the value.
+    Cell_Kind kind;
+
+    template <class T>
+    T& in(const Instance* instance) const
+    {
+        return cell_at<T>(instance, offset);
+    }
+    bool is_null(const Instance* instance) const
+    {
+        return kind == Cell_Kind::REFERENCE ? !in<Instance*>(instance)
+                                            : cell_at<uint8>(instance, offset + size) != 0;
+    }
+};
+
+Cell cell_of(const Meta_Feature* feature);
+
+enum class Cells
+{
+    ALL,
+    KEYS,
+    HOLDERS, ///< Those that hold a text, a moment, an array or an instance.
+};
+
+bool belongs(const Cell& cell, Cells cells);
+
+/// The cells of a class, each group in the order of the features. The records say the same, but a walk over
+/// them reads three places for each cell, and the walks that make, export and release instances are what an
+/// enumeration spends its time with.
+struct Class_Plan
+{
+    const Meta_Class* owner;
+    const Meta_Feature* const* features;
+    std::span<const Cell> groups[3];
+
+    std::span<const Cell> operator[](Cells cells) const { return groups[static_cast<size_t>(cells)]; }
+};
+
+/// The plan of a class of the catalogue, made when it is first asked for. Null for all other records, and
+/// when there is no room for another plan.
+const Class_Plan* plan_of(const Meta_Class* meta_class);
+
+/// For visitors that look at most cells only to pass on: `[](const Cell& cell) INLINE { ... }`.
+#define INLINE __attribute__((always_inline))
+
+/// Calls the visitor with each cell of the group.
+template <class Visitor>
+void visit_cells(const Meta_Class* meta_class, Cells cells, Visitor&& visitor)
+{
+    if (const Class_Plan* const plan = plan_of(meta_class)) {
+        for (const Cell& cell : (*plan)[cells])
+            visitor(cell);
+        return;
+    }
+    for (const Meta_Feature* feature : features_of(meta_class)) {
+        const Cell cell = cell_of(feature);
+        if (belongs(cell, cells))
+            visitor(cell);
+    }
+}
+
+} // namespace KPRV
