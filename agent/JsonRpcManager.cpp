@@ -118,7 +118,8 @@ sint32 JsonRpcManager::answer(std::string_view request, String& text) const
 
     // The text is copied while the values stand: once they are gone, the allocator sorts what they leave
     // before it finds room for a long text, and that takes longer than the copy.
-    text = Json::StyledWriter().write(reply).c_str();
+    const std::string written = Json::StyledWriter().write(reply);
+    text = String(written.data(), static_cast<uint32>(written.size()));
     return 200;
 }
 

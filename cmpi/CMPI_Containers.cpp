@@ -26,14 +26,20 @@ bool CMPI_Container::_in_bounds(uint32 index)
 
 int CMPI_Container::get_name(uint32 index, String& name)
 {
-    if (!_in_bounds(index))
+    const char* const text = peek_name(index, name);
+    if (!text)
         return -1;
+    name = text;
+    return 0;
+}
+
+const char* CMPI_Container::peek_name(uint32 index, String&)
+{
+    if (!_in_bounds(index))
+        return nullptr;
     CMPIString* string = nullptr;
     _at(index, &string);
-    if (!string)
-        return -1;
-    name = text_of(string);
-    return 0;
+    return string ? text_of(string) : nullptr;
 }
 
 int CMPI_Container::get_value(uint32 index, Value::Type type, Value& value)
@@ -86,23 +92,22 @@ int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags
     return _set(name, data);
 }
 
-int CMPIInstance_Container::get_name(uint32 index, String& name)
+const char* CMPIInstance_Container::peek_name(uint32 index, String&)
 {
     if (!_in_bounds(index))
-        return -1;
+        return nullptr;
     try {
         CMPIString* string = nullptr;
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         CMGetPropertyAt(_instance, index, &string, &status);
         if (status.rc != CMPI_RC_OK || !string) {
             LOG_CONVERSION(WARN, "CMGetPropertyAt() failed");
-            return -1;
+            return nullptr;
         }
-        name = text_of(string);
-        return 0;
+        return text_of(string);
     } catch (...) {
         LOG_CONVERSION(WARN, "CMGetPropertyAt() threw exception: index=%u size=%u", index, get_size());
-        return -1;
+        return nullptr;
     }
 }
 

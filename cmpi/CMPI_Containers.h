@@ -14,6 +14,7 @@ class CMPI_Container : public Container
 public:
     uint32 get_size() override;
     int get_name(uint32 index, String& name) override;
+    const char* peek_name(uint32 index, String& hold) override;
     int get_value(uint32 index, Value::Type type, Value& value) override;
     int set_value(const char* name, const Value& value, uint32 flags) override;
 
@@ -54,7 +55,7 @@ public:
     {
     }
     /// The only reader that is guarded against a throwing server.
-    int get_name(uint32 index, String& name) override;
+    const char* peek_name(uint32 index, String& hold) override;
 
 protected:
     CMPICount _count() override;

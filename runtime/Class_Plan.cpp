@@ -29,7 +29,7 @@ alignas(Class_Plan) constinit char room[ROOM] = {};
 constinit size_t room_used = 0;
 constinit std::mutex room_mutex;
 
-/// Open addressing; twice as many places as there are classes.
+/// Open addressing; twice as many places as there are classes and methods.
 constexpr size_t PLACES = 512;
 constinit std::atomic<const Class_Plan*> places[PLACES] = {};
 constinit size_t places_used = 0;
@@ -141,8 +141,9 @@ bool belongs(const Cell& cell, Cells cells)
 
 const Class_Plan* plan_of(const Meta_Class* meta_class)
 {
-    // A record that is counted may go, and another may take its place; a method's has no repository.
-    if (atomic_get(meta_class->refs) != 0 || meta_class->flags & FLAG_METHOD || !meta_class->meta_repository)
+    // A record that is counted may go, and another may take its place. A method's ends before the repository.
+    const bool lasts = meta_class->flags & FLAG_METHOD || meta_class->meta_repository;
+    if (atomic_get(meta_class->refs) != 0 || !lasts)
         return nullptr;
     const Class_Plan* plan = find_place(meta_class).load(std::memory_order_acquire);
     if (!plan)

@@ -60,8 +60,8 @@ struct Class_Plan
     std::span<const Cell> operator[](Cells cells) const { return groups[static_cast<size_t>(cells)]; }
 };
 
-/// The plan of a class of the catalogue, made when it is first asked for. Null for all other records, and
-/// when there is no room for another plan.
+/// The plan of a class or method of the catalogue, made when it is first asked for. Null for all other
+/// records, and when there is no room for another plan.
 const Class_Plan* plan_of(const Meta_Class* meta_class);
 
 /// For visitors that look at most cells only to pass on: `[](const Cell& cell) INLINE { ... }`.

@@ -67,15 +67,16 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& ins
     __set_null_flags(instance, true, true, 1);
 
     const uint32 size = get_size();
-    String name;
+    String hold;
     for (uint32 i = 0; i < size; i++) {
-        if (get_name(i, name) != 0) {
+        const char* const name = peek_name(i, hold);
+        if (!name) {
             LOG_CONVERSION(WARN, "get_name() failed: class=%s, index=%u", meta_class->name, i);
             continue;
         }
-        const Meta_Feature* feature = find_feature(meta_class, name.c_str(), FLAG_PROPERTY | FLAG_REFERENCE);
+        const Meta_Feature* feature = find_feature(meta_class, name, FLAG_PROPERTY | FLAG_REFERENCE);
         if (!feature) {
-            LOG_CONVERSION(WARN, "unknown feature: %s.%s", meta_class->name, name.c_str());
+            LOG_CONVERSION(WARN, "unknown feature: %s.%s", meta_class->name, name);
             continue;
         }
         if (mask && !(feature->flags & mask))

@@ -18,6 +18,12 @@ public:
     virtual int get_value(uint32 index, Value::Type type, Value& value) = 0;
     virtual int set_value(const char* name, const Value& value, uint32 flags) = 0;
 
+    /// The name where it stands, or in `hold`; null on failure. It lasts until the container is next asked.
+    virtual const char* peek_name(uint32 index, String& hold)
+    {
+        return get_name(index, hold) == 0 ? hold.c_str() : nullptr;
+    }
+
     /// Export: each feature with a flag of the mask (0: all) and a value goes to `set_value`. A feature that
     /// fails is logged and left out. -1 only for a null instance.
     int convert(const Instance* instance, uint32 mask);

@@ -36,6 +36,12 @@ constinit const uint8 __lower[256] = {
 #undef ROW
 // clang-format on
 
+bool name_rest_eq(const char* a, const char* b)
+{
+    // Mostly they are spelled alike, and the C library finds that out many letters at a time.
+    return strcmp(a, b) == 0 || folded_eq(a, b, ~size_t(0));
+}
+
 bool folded_eq(const char* a, const char* b, size_t n)
 {
     for (size_t i = 0; i < n; i++) {

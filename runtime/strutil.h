@@ -17,13 +17,16 @@ extern const uint8 __lower[256];
 /// locale, which belongs to the server: under some of them "I" and "i" are different letters.
 bool folded_eq(const char* a, const char* b, size_t n);
 
+/// For `name_eq`, which has compared the first characters.
+bool name_rest_eq(const char* a, const char* b);
+
 /// Case-insensitive equality of CIM names. The first characters are compared before a call is paid for.
 inline bool name_eq(const char* a, const char* b)
 {
     if (__lower[static_cast<uint8>(*a)] != __lower[static_cast<uint8>(*b)])
         return false;
     // Names of one binary are mostly the very same literal.
-    return a == b || folded_eq(a, b, ~size_t(0));
+    return a == b || name_rest_eq(a, b);
 }
 
 } // namespace KPRV
