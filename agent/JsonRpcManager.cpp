@@ -66,7 +66,14 @@ JsonRpcManager* JsonRpcManager::instance()
     if (!s_instance) {
         owner.reset(new JsonRpcManager);
         s_instance = owner.get();
-        MethodRegistration::registerMethods();
+        try {
+            MethodRegistration::registerMethods();
+        } catch (...) {
+            // The next call begins anew: a dispatcher that lacks methods would lack them for good.
+            s_instance = nullptr;
+            owner.reset();
+            throw;
+        }
         complete.store(true, std::memory_order_release);
     }
     return s_instance;

@@ -54,9 +54,13 @@ std::string message_id_of(sint32 key)
 
 void Event_Texts::fill(std::string (*text_of)(const Event_Row& row))
 {
-    if (_texts.empty())
+    if (_texts.empty()) {
+        // Whole or not at all: what is there already is not filled again.
+        std::map<sint32, std::string> texts;
         for (const Event_Row& row : rows)
-            _texts[row.key] = text_of(row);
+            texts[row.key] = text_of(row);
+        _texts.swap(texts);
+    }
     _filled = true;
 }
 

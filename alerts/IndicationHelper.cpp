@@ -29,10 +29,16 @@ bool IndicationHelper::subscribeForEventNotifications()
 {
     LOG_SCOPE("subscribeForEventNotifications");
     // The callback is armed before the catalogue is known: an event in between is an "Unknown" one.
-    const bool registered = registerForEvents();
-    if (registered)
+    if (!registerForEvents())
+        return false;
+    try {
         initEventDetailsMaps();
-    return registered;
+    } catch (...) {
+        // Nobody would ever disarm the callback of a subscription that does not come about.
+        deRegisterForEvents();
+        throw;
+    }
+    return true;
 }
 
 bool IndicationHelper::unsubscribeForEventNotifications()

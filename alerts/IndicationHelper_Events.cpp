@@ -82,14 +82,18 @@ int IndicationHelper::processEvent(const char* text)
 
     // Copied before the queue owns the alert. The standard one goes first.
     Ref<KALDERA_AlertIndication> proprietary(copy_alert(*alert));
-    if (verdict.standard)
-        updateIndicationObjects(alert.steal());
+    // A queue that has no room leaves the alert here.
+    if (verdict.standard) {
+        updateIndicationObjects(alert.ptr());
+        alert.steal();
+    }
     if (verdict.proprietary) {
         if (is_registry_event(event))
             message_id = proprietary_message_id(verdict.key).c_str();
         set_proprietary(*proprietary, event, message_id);
         LOG(INFO, "Updating kldrIndication");
-        updateIndicationObjects(proprietary.steal());
+        updateIndicationObjects(proprietary.ptr());
+        proprietary.steal();
     }
     LOG(DBG, "Returning: %s", "processEvent");
     return 1;

@@ -7,6 +7,8 @@
 #include "runtime/Instance_Enumerator.h"
 #include "runtime/log.h"
 
+#include <memory>
+
 namespace KPRV {
 
 /// Cursor over what the server enumerates. The enumeration belongs to the server.
@@ -48,8 +50,10 @@ Context_Scope::~Context_Scope()
 void* CMPI_Thread_Context::thread_create_hook(void*)
 {
     const CMPI_Thread_Context* const top = _top();
-    const CMPIContext* const context = CBPrepareAttachThread(top->_broker, top->_context);
-    return static_cast<Thread_Context*>(new CMPI_Thread_Context(top->_broker, context, top->_adapter));
+    // The server's context comes last: nobody would give it back.
+    auto thread = std::make_unique<CMPI_Thread_Context>(top->_broker, nullptr, top->_adapter);
+    thread->_context = CBPrepareAttachThread(top->_broker, top->_context);
+    return static_cast<Thread_Context*>(thread.release());
 }
 
 void CMPI_Thread_Context::thread_start_hook()

@@ -6,6 +6,8 @@
 #include "runtime/Time.h"
 #include "runtime/assert.h"
 
+#include <memory>
+
 // Filters are not evaluated: what counts is in which name spaces there are active ones. Filters and enabling
 // are independent of each other, since servers call them in either order.
 
@@ -117,15 +119,17 @@ static bool _indication_proc(Instance* instance, void* client_data)
     for (uint32 i = 0; i < adapter->name_spaces.size(); i++) {
         // A copy: the server may change the filters while it takes the delivery.
         const Name_Space_Entry entry = adapter->name_spaces[i];
-        CMPIInstance* ci;
+        CMPIInstance* ci = nullptr;
         if (make_cmpi_instance(adapter->broker, instance, entry.name_space.c_str(), nullptr, nullptr, ci) !=
             CMPI_RC_OK)
             continue;
+        // Given back also if the server throws.
+        const std::unique_ptr<CMPIInstance, void (*)(CMPIInstance*)> made(
+            ci, [](CMPIInstance* each) { CMRelease(each); });
         const auto* const thread_context = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
         CIMPLE_ASSERT(thread_context != 0);
         CBDeliverIndication(thread_context->broker(), thread_context->context(), entry.name_space.c_str(),
                             ci);
-        CMRelease(ci);
     }
     return true;
 }

@@ -25,8 +25,15 @@ public:
     template <class T>
     T* note(T* object)
     {
-        if (object)
-            _objects.push_back({object, [](void* each) { CMRelease(static_cast<T*>(each)); }});
+        if (!object)
+            return object;
+        const Made made = {object, [](void* each) { CMRelease(static_cast<T*>(each)); }};
+        try {
+            _objects.push_back(made);
+        } catch (...) {
+            made.release(object);
+            throw;
+        }
         return object;
     }
 

@@ -43,13 +43,16 @@ public:
         LOG(INFO, "Subscribtion for event notifications is successful.");
         if (_continue == 0)
             _continue++;
-        const int error = Thread::create_joinable(_thread, deliverIndications, this);
-        if (error == 0)
-            return ENABLE_INDICATIONS_OK;
-        LOG(ERR, "Unable to create the indication thread: %d", error);
-        IndicationManager::getIndicationManager()->unsubscribeForEventNotifications();
-        _continue--;
-        _handler.reset();
+        try {
+            const int error = Thread::create_joinable(_thread, deliverIndications, this);
+            if (error == 0)
+                return ENABLE_INDICATIONS_OK;
+            LOG(ERR, "Unable to create the indication thread: %d", error);
+        } catch (...) {
+            give_up();
+            throw;
+        }
+        give_up();
         return ENABLE_INDICATIONS_FAILED;
     }
 
@@ -78,6 +81,14 @@ public:
     }
 
 private:
+    /// Undoes what was done for a subscription without a thread.
+    void give_up()
+    {
+        IndicationManager::getIndicationManager()->unsubscribeForEventNotifications();
+        _continue--;
+        _handler.reset();
+    }
+
     /// The delivery thread: at most one alert a pass. What is left in the queue when it stops is delivered in
     /// the next subscription.
     static void* deliverIndications(void* provider)
@@ -91,9 +102,9 @@ private:
             if (manager->getIndicationObject(&alert)) {
                 // The clone is the handler's. The alert itself stays allocated for the life of the process:
                 // wanted so, and no leak to be mended.
-                KALDERA_AlertIndication* const clone = clone_of(alert);
-                // Nobody above this thread could catch what a server throws.
-                if (guarded(LOG_HERE, {"deliverIndications"}, [&] { self->_handler->handle(clone); }))
+                // Nobody above this thread could catch what a server throws, or a lack of memory.
+                if (guarded(LOG_HERE, {"deliverIndications"},
+                            [&] { self->_handler->handle(clone_of(alert)); }))
                     LOG(INFO, "Delivered indication to the CIM server");
             }
             passes.sleep_to_end();

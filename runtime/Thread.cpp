@@ -3,6 +3,7 @@
 #include "runtime/assert.h"
 
 #include <cstring>
+#include <memory>
 
 namespace KPRV {
 
@@ -70,7 +71,7 @@ int Thread::create_detached(Thread& thread, Function function, void* argument)
 int Thread::_create(Thread& thread, Function function, void* argument, bool detached)
 {
     Thread_Context* const parent = Thread_Context::top();
-    Start_Record* const record = new Start_Record{function, argument, nullptr};
+    std::unique_ptr<Start_Record> record(new Start_Record{function, argument, nullptr});
     if (parent)
         record->context = static_cast<Thread_Context*>(parent->thread_create_hook(argument));
 
@@ -78,16 +79,16 @@ int Thread::_create(Thread& thread, Function function, void* argument, bool deta
     pthread_attr_init(&attributes);
     pthread_attr_setdetachstate(&attributes, detached ? PTHREAD_CREATE_DETACHED : PTHREAD_CREATE_JOINABLE);
     pthread_t handle = {};
-    const int status = pthread_create(&handle, &attributes, _thread_proc, record);
+    const int status = pthread_create(&handle, &attributes, _thread_proc, record.get());
     pthread_attr_destroy(&attributes);
 
     if (status != 0) {
         // Settled: the parent's context goes here and stays on the parent's stack, while the new thread's
         // context is never released.
         delete parent;
-        delete record;
         return status;
     }
+    record.release();
     memcpy(thread._opaque, &handle, sizeof(handle));
     return 0;
 }

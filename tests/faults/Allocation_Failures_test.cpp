@@ -14,7 +14,6 @@ protected:
         // Kept in memory, so that a report of what was lost can name its places.
         ASSERT_TRUE(dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NODELETE));
         open("one_cna.json");
-        watch_library("libkldrprovider_Module");
     }
 
     /// Where the module guards a call of the adapter library, the failure costs no more than the element at
@@ -22,30 +21,58 @@ protected:
     static bool is_less(const host::Result& result, const host::Result& whole)
     {
         return result.instances.size() < whole.instances.size() ||
-               !(result.return_value == whole.return_value);
+               !(result.return_value == whole.return_value) || !(texts(result.out) == texts(whole.out));
+    }
+    static std::vector<std::string> texts(const std::vector<host::Named_Value>& values)
+    {
+        std::vector<std::string> all;
+        for (const host::Named_Value& each : values)
+            all.push_back(each.name + (each.value.null ? "" : " " + each.value.as_text()));
+        return all;
     }
 
-    /// The operation with each allocation of the module failing in turn, where they are few, or with a spread
-    /// of them. A failure leaves the provider as an exception, which takes all that was half made with it.
+    /// The operation with allocations failing in three ways: the module's own, from the n-th on; with those
+    /// that the C++ and the JSON library make for it, from the n-th on; and the n-th of those alone. A
+    /// failure leaves the provider as an exception, which takes all that was half made with it.
     template <class Operation>
     void starve(const std::string& what, Operation&& operation)
     {
+        starve(what, operation, false, false);
+        starve(what + " and its helpers", operation, true, false);
+        starve(what + " and its helpers, once", operation, true, true);
+    }
+
+    /// Each allocation in turn up to a bound, and from there a spread of them.
+    static unsigned long next(unsigned long nth, unsigned long count)
+    {
+        constexpr unsigned long EACH = 300;
+        constexpr unsigned long SPREAD = 200;
+        return nth + (nth < EACH ? 1 : 1 + count / SPREAD);
+    }
+
+    template <class Operation>
+    void starve(const std::string& what, Operation&& operation, bool helpers_too, bool once)
+    {
+        watch_library("libkldrprovider_Module", helpers_too);
         fail_allocation(~0ul);
         const host::Result whole = operation();
         const unsigned long count = mend_memory();
+        ASSERT_TRUE(whole.ok()) << what;
         ASSERT_LT(0u, count) << what;
-        const unsigned long step = 1 + count / 400;
-        for (unsigned long nth = 1; nth <= count; nth += step) {
+        for (unsigned long nth = 1; nth <= count; nth = next(nth, count)) {
             SCOPED_TRACE(what + ": allocation " + std::to_string(nth) + " of " + std::to_string(count));
-            fail_allocation(nth);
+            fail_allocation(nth, once);
             const host::Result result = operation();
             const unsigned long asked = mend_memory();
             EXPECT_LE(nth, asked);
-            EXPECT_TRUE(!result.ok() || is_less(result, whole));
+            // A value that a helper has no room for costs that value alone.
+            EXPECT_TRUE(helpers_too || !result.ok() || is_less(result, whole));
+            EXPECT_EQ(result.ok(), !result.exception) << "no other failure than that exception";
             expect_nothing_left();
         }
         const host::Result after = operation();
         EXPECT_TRUE(after.ok()) << what << ": " << after.rc << " " << after.exception.value_or("");
+        EXPECT_FALSE(is_less(after, whole)) << what;
     }
 };
 
@@ -60,10 +87,26 @@ TEST_F(Allocation_Failures, OfEnumerations)
 TEST_F(Allocation_Failures, OfAMethod)
 {
     const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
+    // The library agrees, and stays as it is.
+    simulator.add_fault(R"({"call": "setPortByWwn", "do": "answer", "answer": {"status": 0}})");
+    constexpr unsigned ON = 3;
     starve("SetAlarmState", [&] {
-        return server->invoke_method(alarm, "SetAlarmState",
-                                     {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 2)}});
+        return server->invoke_method(
+            alarm, "SetAlarmState", {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, ON)}});
     });
+}
+
+TEST_F(Allocation_Failures, OfTheAgent)
+{
+    const host::Path_Value service = server->enumerate_instances("KALDERA_AgentService").instances.at(0).path;
+    server->invoke_method(service, "executeMethod",
+                          {{"request", host::Value::text("{}")}}); // enters the methods
+    for (const char* request :
+         {R"({"method": "discovery.getAllHbasByHost", "params": []})",
+          R"({"method": "discovery.getPortByWwn", "params": ["10:00:02:4b:4c:20:00:00"]})"})
+        starve(request, [&] {
+            return server->invoke_method(service, "executeMethod", {{"request", host::Value::text(request)}});
+        });
 }
 
 TEST_F(Allocation_Failures, OfAssociations)

@@ -95,7 +95,7 @@ TEST_F(Broker_Refusals, OfAMethod)
     const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
     refuse_each("SetAlarmState", [&] {
         server->invoke_method(alarm, "SetAlarmState",
-                              {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 2)}});
+                              {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 1)}});
     });
     EXPECT_LT(10u, refused);
 }

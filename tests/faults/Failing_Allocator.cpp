@@ -5,28 +5,76 @@
 #include <cstring>
 #include <link.h>
 #include <new>
+#include <unwind.h>
 
 namespace KPRV {
 
 namespace {
 
-std::uintptr_t library_begin = 0;
-std::uintptr_t library_end = 0;
+struct Library
+{
+    const char* path_part;
+    std::uintptr_t begin = 0;
+    std::uintptr_t end = 0;
+
+    bool holds(std::uintptr_t at) const { return at >= begin && at < end; }
+};
+
+Library watched = {nullptr};
+/// What works on behalf of whoever called it.
+Library helpers[] = {{"libstdc++"}, {"libjsoncpp"}};
+bool with_helpers = false;
+
 thread_local unsigned long seen = 0;
 thread_local unsigned long first_to_fail = 0;
+thread_local unsigned long last_to_fail = 0;
 
-int find_library(dl_phdr_info* info, size_t, void* path_part)
+int find_library(dl_phdr_info* info, size_t, void* data)
 {
-    if (!std::strstr(info->dlpi_name, static_cast<const char*>(path_part)))
+    Library& library = *static_cast<Library*>(data);
+    if (!std::strstr(info->dlpi_name, library.path_part))
         return 0;
     for (int i = 0; i < info->dlpi_phnum; ++i) {
         const ElfW(Phdr)& part = info->dlpi_phdr[i];
         if (part.p_type != PT_LOAD || !(part.p_flags & PF_X))
             continue;
-        library_begin = info->dlpi_addr + part.p_vaddr;
-        library_end = library_begin + part.p_memsz;
+        library.begin = info->dlpi_addr + part.p_vaddr;
+        library.end = library.begin + part.p_memsz;
     }
     return 1;
+}
+
+bool is_helper(std::uintptr_t at)
+{
+    return helpers[0].holds(at) || helpers[1].holds(at);
+}
+
+struct Walk
+{
+    std::uintptr_t from;
+    bool reached = false;
+    bool is_for_watched = false;
+};
+
+/// Looks for the first frame, from the helper's on, that is no helper's.
+_Unwind_Reason_Code look_at_frame(_Unwind_Context* context, void* data)
+{
+    Walk& walk = *static_cast<Walk*>(data);
+    const std::uintptr_t at = _Unwind_GetIP(context);
+    walk.reached = walk.reached || at == walk.from;
+    if (!walk.reached || is_helper(at))
+        return _URC_NO_REASON;
+    walk.is_for_watched = watched.holds(at);
+    return _URC_NORMAL_STOP;
+}
+
+bool is_for_watched(std::uintptr_t caller)
+{
+    if (!with_helpers || !is_helper(caller))
+        return watched.holds(caller);
+    Walk walk{caller};
+    _Unwind_Backtrace(look_at_frame, &walk);
+    return walk.is_for_watched;
 }
 
 } // namespace
@@ -34,22 +82,26 @@ int find_library(dl_phdr_info* info, size_t, void* path_part)
 /// True if this allocation, asked for from that place, is one that has to fail.
 bool must_fail(const void* caller)
 {
-    const auto at = reinterpret_cast<std::uintptr_t>(caller);
-    if (first_to_fail == 0 || at < library_begin || at >= library_end)
+    if (first_to_fail == 0 || !is_for_watched(reinterpret_cast<std::uintptr_t>(caller)))
         return false;
-    return ++seen >= first_to_fail;
+    ++seen;
+    return seen >= first_to_fail && seen <= last_to_fail;
 }
 
-void watch_library(const char* path_part)
+void watch_library(const char* path_part, bool helpers_too)
 {
-    library_begin = library_end = 0;
-    dl_iterate_phdr(find_library, const_cast<char*>(path_part));
+    watched = {path_part};
+    dl_iterate_phdr(find_library, &watched);
+    for (Library& helper : helpers)
+        dl_iterate_phdr(find_library, &helper);
+    with_helpers = helpers_too;
 }
 
-void fail_allocation(unsigned long nth)
+void fail_allocation(unsigned long nth, bool once)
 {
     seen = 0;
     first_to_fail = nth;
+    last_to_fail = once ? nth : ~0ul;
 }
 
 unsigned long mend_memory()
@@ -60,8 +112,9 @@ unsigned long mend_memory()
 
 } // namespace KPRV
 
-// The module asks for memory through operator new alone, or through malloc and realloc; both end here.
-// Sanitizers have a malloc of their own, so that under them only operator new fails.
+// The module asks for memory through operator new alone, or through malloc and realloc; both end here. So
+// does the JSON library. What the C++ library asks malloc for is room for an exception, of which it has some
+// put by. Sanitizers have a malloc of their own, so that under them only operator new fails.
 void* operator new(std::size_t size)
 {
     void* block = KPRV::must_fail(__builtin_return_address(0)) ? nullptr : std::malloc(size);

@@ -1,16 +1,34 @@
-// The module pauses with select, for seconds where a port has to settle. In this program such a pause is a
-// short one.
+// The module pauses for seconds where a port has to settle, and between two alerts. In this program all
+// pauses are short.
 #include <ctime>
 #include <dlfcn.h>
 #include <sys/select.h>
 
+namespace {
+
+/// Where times outgrow the word, the functions have other names in the C library.
+constexpr bool has_long_times = sizeof(time_t) > sizeof(long);
+
+template <class Function>
+Function* real(const char* name, const char* name_with_long_times)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, has_long_times ? name_with_long_times : name));
+}
+
+} // namespace
+
 extern "C" [[gnu::visibility("default")]] int select(int count, fd_set* read, fd_set* write, fd_set* except,
                                                      timeval* limit)
 {
-    // Where times outgrow the word, the function has another name in the C library.
-    constexpr const char* name = sizeof(time_t) > sizeof(long) ? "__select64" : "select";
-    static const auto real = reinterpret_cast<decltype(&select)>(dlsym(RTLD_NEXT, name));
-    timeval short_pause = {0, 1000};
-    const bool is_long_pause = count == 0 && limit && limit->tv_sec > 0;
-    return real(count, read, write, except, is_long_pause ? &short_pause : limit);
+    static auto* const wait = real<decltype(select)>("select", "__select64");
+    timeval pause = {0, 1000};
+    return wait(count, read, write, except, count == 0 && limit ? &pause : limit);
+}
+
+extern "C" [[gnu::visibility("default")]] int clock_nanosleep(clockid_t clock, int, const timespec*,
+                                                              timespec* left)
+{
+    static auto* const wait = real<decltype(clock_nanosleep)>("clock_nanosleep", "__clock_nanosleep_time64");
+    const timespec pause = {0, 1000000};
+    return wait(clock, 0, &pause, left);
 }

@@ -1,11 +1,11 @@
 // Bad answers of the adapter library while the module is loaded or unloaded, and while indications are
 // enabled or disabled. Each in a process of its own, which some of them end.
+#include "tests/faults/Ends_Process.h"
 #include "tests/faults/Sweep_Fixture.h"
 #include "tests/support/In_Child.h"
 
 #include <algorithm>
 #include <dlfcn.h>
-#include <sys/resource.h>
 
 namespace KPRV {
 namespace {
@@ -96,20 +96,12 @@ TEST_P(Unguarded_Load, EndsTheProcessIfTheLibraryThrows)
 {
     for (const Bad_Answer& bad : bad_answers_of(NONE)) {
         SCOPED_TRACE(bad.name);
-        const pid_t child = fork();
-        if (child == 0) {
-            const rlimit none = {};
-            setrlimit(RLIMIT_CORE, &none);
-            close(STDERR_FILENO);
+        expect_end_of_process([&] {
             restore();
             simulator.add_fault(bad.fault(GetParam().entry_point));
             std::string error;
             host::Host::open(KLDR_MODULE, {}, error);
-            _exit(0);
-        }
-        int status = 0;
-        waitpid(child, &status, 0);
-        EXPECT_TRUE(WIFSIGNALED(status) && WTERMSIG(status) == SIGABRT) << status;
+        });
     }
 }
 

@@ -1,10 +1,10 @@
 // Bad answers of the adapter library to hardware tests. Each way has a process of its own: a module that has
 // run a test is pinned, and some faults end the process.
+#include "tests/faults/Ends_Process.h"
 #include "tests/faults/Sweep_Fixture.h"
 #include "tests/support/In_Child.h"
 
 #include <algorithm>
-#include <sys/resource.h>
 
 namespace KPRV {
 namespace {
@@ -146,19 +146,11 @@ TEST_P(Unguarded_Runs, EndTheProcessIfTheLibraryThrows)
 {
     for (const Bad_Answer& bad : bad_answers_of(NONE)) {
         SCOPED_TRACE(bad.name);
-        const pid_t child = fork();
-        if (child == 0) {
-            const rlimit none = {};
-            setrlimit(RLIMIT_CORE, &none);
-            close(STDERR_FILENO);
+        expect_end_of_process([&] {
             open_way();
             simulator.add_fault(bad.fault(GetParam().entry_point));
             run();
-            _exit(0);
-        }
-        int status = 0;
-        waitpid(child, &status, 0);
-        EXPECT_TRUE(WIFSIGNALED(status) && WTERMSIG(status) == SIGABRT) << status;
+        });
     }
 }
 

@@ -1,0 +1,50 @@
+// The first test of its program, since only the first call of a loaded module enters the agent's methods.
+#include "tests/faults/Failing_Allocator.h"
+#include "tests/faults/Fault_Fixture.h"
+#include "tests/support/In_Child.h"
+
+#include <dlfcn.h>
+
+namespace KPRV {
+namespace {
+
+using Agent_Memory = Fault_Fixture;
+
+host::Result call(host::Host& server)
+{
+    const host::Path_Value service = {{},
+                                      "root/kaldera",
+                                      "KALDERA_AgentService",
+                                      {{"Name", host::Value::text("Kaldera Agent Service Provider")}}};
+    // The last method that is entered.
+    return server.invoke_method(
+        service, "executeMethod",
+        {{"request", host::Value::text(R"({"method": "diagnostics.getDPortTestResults", "params": []})")}});
+}
+
+TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
+{
+    ASSERT_EQ(nullptr, dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD));
+    in_child([&] {
+        open("one_cna.json");
+        watch_library("libkldrprovider_Module", true);
+        for (unsigned long nth = 1, asked = nth; asked >= nth; nth++) {
+            fail_allocation(nth);
+            const host::Result result = call(*server);
+            asked = mend_memory();
+            EXPECT_EQ(asked >= nth, result.exception.has_value()) << nth;
+            expect_nothing_left();
+            if (asked < nth) {
+                EXPECT_LT(300u, asked);
+            }
+        }
+        // Found, since it complains of its parameters.
+        const host::Result whole = call(*server);
+        const host::Value* const response = host::find_value(whole.out, "response");
+        ASSERT_TRUE(response);
+        EXPECT_NE(std::string::npos, response->as_text().find("Mismatch in number of parameters"));
+    });
+}
+
+} // namespace
+} // namespace KPRV
