@@ -7,7 +7,7 @@
 #include "runtime/Ref.h"
 
 #include <initializer_list>
-#include <string>
+#include <string_view>
 
 namespace KPRV {
 
@@ -41,7 +41,7 @@ void set_system_keys(T& instance, classId_t id, const String& system_name)
     instance.SystemName.set(system_name);
 }
 
-inline String to_String(const std::string& text)
+inline String to_String(std::string_view text)
 {
     return String(text.data(), static_cast<uint32>(text.size()));
 }

@@ -45,17 +45,20 @@ const Name_Row* name_row(const _hbaLunInfo& lun)
     return row == std::end(name_rows) ? nullptr : row;
 }
 
-std::string trimmed(const char* text)
+std::string_view trimmed(const char* text)
 {
-    return std::string(ProviderUtil::trimmed(text));
+    return ProviderUtil::trimmed(text);
 }
 
 String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {
     case Named_By::PRODUCT:
-        return to_String(trimmed(lun.vendor) + "+" + trimmed(lun.productID) + "+" +
-                         trimmed(lun.serialNumber));
+        return to_String(std::string(trimmed(lun.vendor))
+                             .append("+")
+                             .append(trimmed(lun.productID))
+                             .append("+")
+                             .append(trimmed(lun.serialNumber)));
     case Named_By::DESCRIPTION:
         return lun.description;
     case Named_By::NOTHING:
@@ -64,14 +67,24 @@ String name(Named_By source, const _hbaLunInfo& lun)
     return "Unable To Fetch";
 }
 
-/// What the three classes have in common. A LUN goes by the path on which it is seen.
+/// A LUN goes by the path on which it is seen.
+String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const std::string& element)
+{
+    std::string id;
+    id.reserve(sizeof port.portWWN + sizeof lun.remoteWWN + sizeof lun.vendor + sizeof lun.productID +
+               element.size());
+    id.append(port.portWWN).append("_").append(lun.remoteWWN).append("_");
+    id.append(trimmed(lun.vendor)).append("_").append(trimmed(lun.productID)).append("_");
+    return to_String(id.append(element));
+}
+
+/// What the three classes have in common.
 template <class T>
-T* create_lun(classId_t id, const char* identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
+T* create_lun(classId_t id, const String& identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
     // Signed: a number beyond the positive range shows as a negative one.
     const std::string element = "LUN_" + std::to_string(static_cast<sint32>(lun.number));
-    const String device_id = to_String(std::string(port.portWWN) + "_" + lun.remoteWWN + "_" +
-                                       trimmed(lun.vendor) + "_" + trimmed(lun.productID) + "_" + element);
+    const String device_id = device_id_of(port, lun, element);
     Ref<T> instance(create_null<T>());
     set_system_keys(*instance, id, port.systemName);
     instance->ElementName.set(to_String(element));
@@ -88,8 +101,8 @@ KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo
                                                               const _hbaLunInfo& lun) const
 {
     LOG_SCOPE("getStorageExtentInstance");
-    auto* extent = create_lun<KALDERA_StorageExtent>(
-        STORAGEEXTENT, "It is a unique identification for a Storage Extent", port, lun);
+    static const String identification = "It is a unique identification for a Storage Extent";
+    auto* extent = create_lun<KALDERA_StorageExtent>(STORAGEEXTENT, identification, port, lun);
     if (const Name_Row* row = name_row(lun)) {
         extent->Name.set(name(row->source, lun));
         extent->NameFormat.set(row->format);
@@ -105,8 +118,8 @@ KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo
 KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const
 {
     LOG_SCOPE("getTapeDriveInstance");
-    auto* drive =
-        create_lun<KALDERA_TapeDrive>(TAPEDRIVE, "It is a unique identification for a Tape Drive", port, lun);
+    static const String identification = "It is a unique identification for a Tape Drive";
+    auto* drive = create_lun<KALDERA_TapeDrive>(TAPEDRIVE, identification, port, lun);
     if (const Name_Row* row = name_row(lun)) {
         drive->Name.set(name(row->source, lun));
     } else {
@@ -121,9 +134,9 @@ KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& po
                                                           const _hbaLunInfo& lun) const
 {
     LOG_SCOPE("getLogicalDiskInstance");
-    auto* disk = create_lun<KALDERA_LogicalDisk>(
-        LOGICALDISK, "It is a unique identification for a Logical Disk", port, lun);
-    const std::string device = trimmed(lun.deviceName);
+    static const String identification = "It is a unique identification for a Logical Disk";
+    auto* disk = create_lun<KALDERA_LogicalDisk>(LOGICALDISK, identification, port, lun);
+    const std::string_view device = trimmed(lun.deviceName);
     const bool by_device = !device.empty();
     disk->Name.set(by_device ? to_String(device) : String(lun.description));
     disk->NameFormat.set(by_device ? 12 : 1);

@@ -36,7 +36,7 @@ public:
             if (is_driver || _tokens[j].empty())
                 _of_all.push_back(j);
             else
-                _of_one.add(_tokens[j], j);
+                _of_one.add(view_of(_tokens[j]), j);
         }
     }
 
@@ -47,7 +47,7 @@ public:
     void for_each_of(const String& address, Visit visit) const
     {
         static constexpr uint32 END = NPOS;
-        const auto* own = _of_one.find(address);
+        const auto* own = _of_one.find(view_of(address));
         for (size_t a = 0, b = 0;;) {
             const uint32 of_all = a < _of_all.size() ? _of_all[a] : END;
             const uint32 of_one = own && b < own->size() ? (*own)[b] : END;

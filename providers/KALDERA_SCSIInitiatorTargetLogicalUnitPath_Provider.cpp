@@ -19,12 +19,12 @@ constexpr uint16 ROLE_INITIATOR = 2;
 
 /// The text up to the separator that stands n-th, without it; empty if there are fewer, so that it finds no
 /// partner.
-String up_to_separator(const String& text, int n)
+std::string_view up_to_separator(std::string_view text, int n)
 {
-    uint32 pos = text.find('_');
-    while (pos != NPOS && --n > 0)
+    size_t pos = text.find('_');
+    while (pos != text.npos && --n > 0)
         pos = text.find('_', pos + 1);
-    return pos == NPOS ? String() : text.substr(0, pos);
+    return pos == text.npos ? std::string_view() : text.substr(0, pos);
 }
 
 /// Logical units by the initiator and target addresses that begin their `DeviceID`.
@@ -35,14 +35,14 @@ public:
     explicit Units(const List<Unit>& units) : _units(units)
     {
         for (uint32 i = 0; i < units.size(); i++) {
-            const String pair = up_to_separator(units[i]->DeviceID.value, 2);
+            const std::string_view pair = up_to_separator(view_of(units[i]->DeviceID.value), 2);
             if (!pair.empty())
                 _index.add(pair, i);
         }
     }
 
     template <class Visit>
-    void for_each_behind(const String& pair, Visit visit) const
+    void for_each_behind(std::string_view pair, Visit visit) const
     {
         if (const auto* found = _index.find(pair)) {
             for (const uint32 i : *found)
@@ -82,7 +82,8 @@ public:
                 initiators.push_back(endpoints[i]);
                 continue;
             }
-            const String seen_through = up_to_separator(endpoints[i]->ElementName.value, 1);
+            const std::string_view seen_through =
+                up_to_separator(view_of(endpoints[i]->ElementName.value), 1);
             if (!seen_through.empty())
                 targets_of.add(seen_through, uint32(targets.size()));
             targets.push_back(endpoints[i]);
@@ -97,14 +98,14 @@ public:
         const Units<KALDERA_StorageExtent> extents_behind(extents);
         const Units<KALDERA_TapeDrive> drives_behind(drives);
         for (const auto* initiator : initiators) {
-            const auto* found = targets_of.find(initiator->ElementName.value);
+            const auto* found = targets_of.find(view_of(initiator->ElementName.value));
             for (size_t n = 0; found && n < found->size(); n++) {
                 const auto* target = targets[(*found)[n]];
                 const auto path_to = [&](const Instance* unit) {
                     deliver(*handler, initiator, target, unit);
                 };
-                extents_behind.for_each_behind(target->ElementName.value, path_to);
-                drives_behind.for_each_behind(target->ElementName.value, path_to);
+                extents_behind.for_each_behind(view_of(target->ElementName.value), path_to);
+                drives_behind.for_each_behind(view_of(target->ElementName.value), path_to);
             }
         }
         return ENUM_INSTANCES_OK;

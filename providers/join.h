@@ -1,13 +1,9 @@
 #pragma once
 
+#include "providers/Position_Index.h"
 #include "providers/deliver.h"
 #include "runtime/Property.h"
 #include "runtime/Ref.h"
-#include "runtime/strutil.h"
-
-#include <string>
-#include <unordered_map>
-#include <vector>
 
 namespace KPRV {
 
@@ -73,32 +69,6 @@ Enum_Instances_Status join_first_with_each(const List<L>& lefts, const List<R>& 
     return ENUM_INSTANCES_OK;
 }
 
-/// Positions of a list by a text of its elements, case folded: a join looks its partners up instead of
-/// walking the list for each element of the other one.
-class Position_Index
-{
-public:
-    void add(const String& key, uint32 position) { _positions[folded(key)].push_back(position); }
-
-    /// In the order of the list; null if there is none.
-    const std::vector<uint32>* find(const String& key) const
-    {
-        const auto found = _positions.find(folded(key));
-        return found == _positions.end() ? nullptr : &found->second;
-    }
-
-private:
-    static std::string folded(const String& text)
-    {
-        std::string key(text.c_str(), text.size());
-        for (char& c : key)
-            c = static_cast<char>(__lower[static_cast<uint8>(c)]);
-        return key;
-    }
-
-    std::unordered_map<std::string, std::vector<uint32>> _positions;
-};
-
 enum class Matches
 {
     FIRST,
@@ -114,9 +84,9 @@ Enum_Instances_Status join_equal(Matches matches, const List<Outer>& outers,
 {
     Position_Index index;
     for (uint32 j = 0; j < inners.size(); j++)
-        index.add((inners[j]->*inner_key).value, j);
+        index.add(view_of((inners[j]->*inner_key).value), j);
     for (uint32 i = 0; i < outers.size(); i++) {
-        const auto* found = index.find((outers[i]->*outer_key).value);
+        const auto* found = index.find(view_of((outers[i]->*outer_key).value));
         for (size_t n = 0; found && n < found->size() && (n == 0 || matches == Matches::ALL); n++)
             pair(outers[i], inners[(*found)[n]]);
     }

@@ -1,0 +1,68 @@
+#pragma once
+
+#include "runtime/String.h"
+#include "runtime/strutil.h"
+
+#include <cstring>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace KPRV {
+
+inline std::string_view view_of(const String& text)
+{
+    return {text.c_str(), text.size()};
+}
+
+/// Positions of a list by a text of its elements, whatever its case: a join looks its partners up instead of
+/// walking the list for each element of the other one. The texts stay where they are, and outlive the index.
+class Position_Index
+{
+public:
+    void add(std::string_view key, uint32 position) { _positions[key].push_back(position); }
+
+    /// In the order of the list; null if there is none.
+    const std::vector<uint32>* find(std::string_view key) const
+    {
+        const auto found = _positions.find(key);
+        return found == _positions.end() ? nullptr : &found->second;
+    }
+
+private:
+    struct Hash
+    {
+        /// Eight letters at a time. Setting the bit of lower case folds more than letters, which only puts
+        /// more texts into one place.
+        size_t operator()(std::string_view text) const
+        {
+            uint64 hash = text.size();
+            for (; text.size() > sizeof hash; text.remove_prefix(sizeof hash))
+                mix(hash, text.data(), sizeof hash);
+            mix(hash, text.data(), text.size());
+            return static_cast<size_t>(hash ^ hash >> 32);
+        }
+
+        static void mix(uint64& hash, const char* text, size_t size)
+        {
+            uint64 letters = 0;
+            if (size > 0)
+                memcpy(&letters, text, size);
+            hash = (hash ^ (letters | 0x2020202020202020)) * 0x9E3779B97F4A7C15;
+            hash ^= hash >> 29;
+        }
+    };
+
+    struct Equal
+    {
+        bool operator()(std::string_view a, std::string_view b) const
+        {
+            return a.size() == b.size() &&
+                   (memcmp(a.data(), b.data(), a.size()) == 0 || folded_eq(a.data(), b.data(), a.size()));
+        }
+    };
+
+    std::unordered_map<std::string_view, std::vector<uint32>, Hash, Equal> _positions;
+};
+
+} // namespace KPRV
