@@ -7,6 +7,7 @@
 #include "runtime/Instance_Enumerator.h"
 #include "runtime/log.h"
 
+#include <cxxabi.h>
 #include <memory>
 
 namespace KPRV {
@@ -56,14 +57,28 @@ void* CMPI_Thread_Context::thread_create_hook(void*)
     return static_cast<Thread_Context*>(thread.release());
 }
 
+/// A thread of the module's own has nobody above it to catch what a server throws. It goes on as it does
+/// where the server answers with a code.
+template <class Call>
+static void _on_own_thread(Call call)
+{
+    try {
+        call();
+    } catch (...) {
+        // Without a type it is no exception of C++: the thread is being cancelled, which nothing may stop.
+        if (!abi::__cxa_current_exception_type())
+            throw;
+    }
+}
+
 void CMPI_Thread_Context::thread_start_hook()
 {
-    CBAttachThread(_top()->_broker, _top()->_context);
+    _on_own_thread([] { CBAttachThread(_top()->_broker, _top()->_context); });
 }
 
 void CMPI_Thread_Context::thread_exit_hook()
 {
-    CBDetachThread(_top()->_broker, _top()->_context);
+    _on_own_thread([] { CBDetachThread(_top()->_broker, _top()->_context); });
 }
 
 /// The next element as an instance of the class; null at the end. An element that fails ends the walk too.

@@ -1,4 +1,5 @@
 #include "cmpi/Converter.h"
+#include "cmpi/Made_Objects.h"
 #include "cmpi/Operation_Scope.h"
 #include "cmpi/cmpi_text.h"
 #include "cmpi/entries.h"
@@ -124,8 +125,7 @@ static bool _indication_proc(Instance* instance, void* client_data)
             CMPI_RC_OK)
             continue;
         // Given back also if the server throws.
-        const std::unique_ptr<CMPIInstance, void (*)(CMPIInstance*)> made(
-            ci, [](CMPIInstance* each) { CMRelease(each); });
+        const std::unique_ptr<CMPIInstance, void (*)(CMPIInstance*)> made(ci, give_back<CMPIInstance>);
         const auto* const thread_context = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
         CIMPLE_ASSERT(thread_context != 0);
         CBDeliverIndication(thread_context->broker(), thread_context->context(), entry.name_space.c_str(),

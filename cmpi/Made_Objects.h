@@ -6,6 +6,17 @@
 
 namespace KPRV {
 
+/// Gives an object back. A server that throws even there has it still, and the guard that calls this goes on.
+template <class T>
+void give_back(T* object) noexcept
+{
+    try {
+        CMRelease(object);
+    } catch (...) {
+        return;
+    }
+}
+
 /// Objects of the server that the module made for its own use, given back when they have been used. A request
 /// needs none of this: the server frees what was made when the request ends. A thread of the module's own has
 /// no such end while it lives.
@@ -27,7 +38,7 @@ public:
     {
         if (!object)
             return object;
-        const Made made = {object, [](void* each) { CMRelease(static_cast<T*>(each)); }};
+        const Made made = {object, [](void* each) { give_back(static_cast<T*>(each)); }};
         try {
             _objects.push_back(made);
         } catch (...) {

@@ -1,4 +1,9 @@
 #include "tests/faults/Fault_Fixture.h"
+#include "tests/support/In_Child.h"
+
+#include <atomic>
+#include <dlfcn.h>
+#include <thread>
 
 namespace KPRV {
 namespace {
@@ -27,14 +32,19 @@ protected:
     template <class Operation>
     void refuse_each(const std::string& what, Operation&& operation)
     {
-        for (const auto& [name, count] : calls_of(operation)) {
-            refuse(what, name, 1, false, operation);
-            refuse(what, name, 1, true, operation);
-            if (count > 1)
-                refuse(what, name, (count + 2) / 2, false, operation);
-            if (count > 2)
-                refuse(what, name, count, true, operation);
-        }
+        for (const auto& [name, count] : calls_of(operation))
+            refuse_some(what, name, count, operation);
+    }
+
+    template <class Operation>
+    void refuse_some(const std::string& what, const std::string& name, unsigned count, Operation&& operation)
+    {
+        refuse(what, name, 1, false, operation);
+        refuse(what, name, 1, true, operation);
+        if (count > 1)
+            refuse(what, name, (count + 2) / 2, false, operation);
+        if (count > 2)
+            refuse(what, name, count, true, operation);
     }
 
     template <class Operation>
@@ -98,6 +108,78 @@ TEST_F(Broker_Refusals, OfAMethod)
                               {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 1)}});
     });
     EXPECT_LT(10u, refused);
+}
+
+class Refused_Deliveries : public Broker_Refusals
+{
+protected:
+    static constexpr const char* CLASS = "KALDERA_AlertIndication";
+
+    void SetUp() override
+    {
+        // Alerts stay allocated; the leak checker can tell them only while the module is mapped.
+        ASSERT_TRUE(dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NODELETE));
+        Broker_Refusals::SetUp();
+        server->set_sink([this](const std::string&, const host::Instance_Value&) {
+            ++came;
+            return CMPI_RC_OK;
+        });
+        ASSERT_EQ(CMPI_RC_OK, server->activate_filter(CLASS, "root/kaldera"));
+    }
+
+    /// A subscription, an event of two alerts, and some patience, since not all that is refused comes.
+    unsigned deliver(unsigned milliseconds = 30)
+    {
+        const unsigned before = came;
+        if (server->enable_indications(CLASS) == CMPI_RC_OK) {
+            EXPECT_TRUE(simulator.event(
+                R"({"eventSeverity": 2, "eventCategory": 2, "eventId": 11, "portIndexString": "10000024b4c200000"})"));
+            for (unsigned i = 0; i < milliseconds && came < before + 2; i++)
+                std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+        EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+        return came - before;
+    }
+    static bool is_about_threads(const std::string& call) { return call.ends_with("Thread"); }
+
+    std::atomic<unsigned> came = 0;
+};
+
+// What the server refuses of an alert is lost, and the delivery thread goes on.
+TEST_F(Refused_Deliveries, LoseAnAlertAtMost)
+{
+    const auto operation = [this] { deliver(); };
+    for (const auto& [name, count] : calls_of(operation))
+        if (!is_about_threads(name))
+            refuse_some("delivery", name, count, operation);
+    EXPECT_LT(10u, refused);
+    EXPECT_LE(2u, deliver(10000));
+    EXPECT_EQ(CMPI_RC_OK, server->deactivate_filter(CLASS, "root/kaldera"));
+}
+
+// A server that refuses to attach a thread, or to let it go, keeps what it had made for that thread. In a
+// process of its own, since that never goes away.
+TEST_F(Refused_Deliveries, OfAServerThatAttachesNoThreads)
+{
+    in_child([&] {
+        unsigned calls = 0;
+        for (const auto& [name, count] : calls_of([this] { deliver(); }))
+            for (const bool throws : {false, true})
+                if (is_about_threads(name)) {
+                    SCOPED_TRACE(name + (throws ? " throws" : " fails"));
+                    calls++;
+                    if (throws)
+                        server->calls().throw_at(name, 1);
+                    else
+                        server->calls().fail(name, 1, CMPI_RC_ERR_FAILED);
+                    deliver();
+                    server->calls().mend();
+                    EXPECT_LE(2u, deliver(10000));
+                    EXPECT_GE(calls, server->ledger().live(host::Object_Kind::CONTEXT));
+                }
+        EXPECT_EQ(6u, calls);
+    });
+    EXPECT_EQ(CMPI_RC_OK, server->deactivate_filter(CLASS, "root/kaldera"));
 }
 
 } // namespace
