@@ -38,6 +38,17 @@ if(KLDR_SANITIZE)
   add_link_options(-fsanitize=${KLDR_SANITIZE})
 endif()
 
+# Sanitizers make the compiler slow, and they look at what runs: there a few files share a compiler run. That each file stands
+# for itself, the other presets tell; some warnings take the files of a shared run for headers.
+if(CMAKE_UNITY_BUILD)
+  add_compile_options(-Wno-shadow -Wno-subobject-linkage)
+endif()
+
+# kldr_apart(<file> ...): files with a run of their own, since they have a private name that another file of the target has too.
+function(kldr_apart)
+  set_source_files_properties(${ARGN} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
+endfunction()
+
 find_package(Threads REQUIRED)
 
 # Linked by name: the compiler's search path finds the library of the word size in hand.
@@ -79,5 +90,6 @@ if(EXISTS ${KLDR_GTEST_ROOT}/src/gtest-all.cc)
               ${KLDR_GTEST_ROOT}/src/gtest-all.cc ${KLDR_GTEST_ROOT}/src/gtest_main.cc)
   target_include_directories(kldr_gtest SYSTEM PUBLIC ${KLDR_GTEST_ROOT}/include PRIVATE ${KLDR_GTEST_ROOT})
   target_compile_options(kldr_gtest PRIVATE -w -O0)
+  set_target_properties(kldr_gtest PROPERTIES UNITY_BUILD OFF)
   target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
 endif()
