@@ -57,8 +57,7 @@ private:
     {
         bool operator()(std::string_view a, std::string_view b) const
         {
-            return a.size() == b.size() &&
-                   (memcmp(a.data(), b.data(), a.size()) == 0 || folded_eq(a.data(), b.data(), a.size()));
+            return a == b || (a.size() == b.size() && folded_eq(a.data(), b.data(), a.size()));
         }
     };
 
