@@ -38,11 +38,13 @@ if(KLDR_SANITIZE)
   add_link_options(-fsanitize=${KLDR_SANITIZE})
 endif()
 
-# Sanitizers make the compiler slow, and they look at what runs: there a few files share a compiler run. That each file stands
-# for itself, the other presets tell; some warnings take the files of a shared run for headers.
-if(CMAKE_UNITY_BUILD)
+# kldr_share_runs(): from here on a few files share a compiler run, which is several times faster. That each file stands for
+# itself is for another preset to tell; some warnings take the files of a shared run for headers.
+macro(kldr_share_runs)
+  set(CMAKE_UNITY_BUILD ON)
+  set(CMAKE_UNITY_BUILD_BATCH_SIZE 8)
   add_compile_options(-Wno-shadow -Wno-subobject-linkage)
-endif()
+endmacro()
 
 # kldr_apart(<file> ...): files with a run of their own, since they have a private name that another file of the target has too.
 function(kldr_apart)
@@ -90,6 +92,5 @@ if(EXISTS ${KLDR_GTEST_ROOT}/src/gtest-all.cc)
               ${KLDR_GTEST_ROOT}/src/gtest-all.cc ${KLDR_GTEST_ROOT}/src/gtest_main.cc)
   target_include_directories(kldr_gtest SYSTEM PUBLIC ${KLDR_GTEST_ROOT}/include PRIVATE ${KLDR_GTEST_ROOT})
   target_compile_options(kldr_gtest PRIVATE -w -O0)
-  set_target_properties(kldr_gtest PROPERTIES UNITY_BUILD OFF)
   target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
 endif()
