@@ -91,7 +91,8 @@ std::atomic<const Class_Plan*>& find_place(const Meta_Class* meta_class)
     }
 }
 
-const Class_Plan* add_plan(const Meta_Class* meta_class)
+/// Once a class: apart, so that finding a plan needs few registers.
+[[gnu::noinline]] const Class_Plan* add_plan(const Meta_Class* meta_class)
 {
     const std::lock_guard lock(room_mutex);
     std::atomic<const Class_Plan*>& place = find_place(meta_class);

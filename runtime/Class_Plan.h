@@ -25,6 +25,8 @@ struct Cell
     uint8 size;  ///< Bytes of the value.
     Cell_Kind kind;
 
+    /// Of a scalar, or of an array's elements.
+    Type element_type() const { return static_cast<Type>(type & 0x7F); }
     template <class T>
     T& in(const Instance* instance) const
     {

@@ -43,40 +43,58 @@ __Array_Rep* default_array(Type type, const Meta_Value* value)
         });
 }
 
-/// Builds the cell of one feature.
-struct Constructor
+/// Builds an empty cell.
+void construct(Instance* instance, const Cell& cell)
+{
+    switch (cell.kind) {
+    case Cell_Kind::TEXT:
+        new (&cell.in<String>(instance)) String();
+        break;
+    case Cell_Kind::MOMENT:
+        new (&cell.in<Datetime>(instance)) Datetime();
+        break;
+    case Cell_Kind::ARRAY:
+        __construct(cell.in<__Array_Rep*>(instance), __cim_array_traits[cell.element_type()]);
+        break;
+    case Cell_Kind::REFERENCE:
+        cell.in<Instance*>(instance) = nullptr;
+        break;
+    case Cell_Kind::REFERENCE_ARRAY:
+        new (&cell.in<Array<Instance*>>(instance)) Array<Instance*>();
+        break;
+    default:
+        break;
+    }
+}
+
+/// Gives an empty cell its default, or makes it null if it has none. References have no defaults, and their
+/// null bytes are left alone.
+struct Default_Giver
 {
     Instance* instance;
-    bool defaults;
 
     void operator()(Scalar_Feature f) const
     {
+        const Meta_Value* literal = f.meta->value;
         void* value = f.value(instance);
-        const Meta_Value* literal = defaults ? f.meta->value : nullptr;
-        visit_storage(
-            f.type(), [=] { literal ? new (value) String(literal->string_value) : new (value) String(); },
-            [=] { literal ? new (value) Datetime(literal->string_value) : new (value) Datetime(); },
-            [=] {
-                if (literal)
-                    memcpy(value, literal, type_size[f.type()]);
-            });
-        if (defaults)
-            f.null(instance) = literal == nullptr;
+        if (literal)
+            visit_storage(
+                f.type(), [=] { *static_cast<String*>(value) = literal->string_value; },
+                [=] { *static_cast<Datetime*>(value) = Datetime(literal->string_value); },
+                [=] { memcpy(value, literal, type_size[f.type()]); });
+        f.null(instance) = literal == nullptr;
     }
     void operator()(Array_Feature f) const
     {
-        const Meta_Value* literal = defaults ? f.meta->value : nullptr;
+        const Meta_Value* literal = f.meta->value;
         if (literal)
             f.array(instance) = default_array(f.type(), literal);
-        else
-            __construct(f.array(instance), __cim_array_traits[f.type()]);
-        if (defaults)
-            f.null(instance) = literal == nullptr;
+        f.null(instance) = literal == nullptr;
     }
-    // References have no defaults, and their null bytes are left alone, with defaults too.
-    void operator()(Reference_Feature f) const { f.target(instance) = nullptr; }
-    void operator()(Reference_Array_Feature f) const { new (&f.targets(instance)) Array<Instance*>(); }
-    void operator()(Method_Feature) const {}
+    template <class Feature>
+    void operator()(Feature) const
+    {
+    }
 };
 
 /// Releases what a cell holds that is no text.
@@ -126,8 +144,11 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
     instance->__refs = 1;
     instance->__meta_class = meta_class;
     new (&instance->__name_space) String();
-    for (const Meta_Feature* feature : features_of(meta_class))
-        visit_feature(feature, Constructor{instance, defaults});
+    visit_cells(meta_class, Cells::HOLDERS, [=](const Cell& cell) { construct(instance, cell); });
+    if (defaults) {
+        for (const Meta_Feature* feature : features_of(meta_class))
+            visit_feature(feature, Default_Giver{instance});
+    }
 }
 
 void __destruct(Instance* instance)

@@ -1,19 +1,19 @@
 #include "runtime/Instance.h"
 
+#include "runtime/Class_Plan.h"
 #include "runtime/features.h"
 
 namespace KPRV {
 
 void __set_null_flags(Instance* instance, bool include_keys, bool include_non_keys, uint8 null_value)
 {
-    for (const Meta_Feature* feature : features_of(instance->__meta_class)) {
-        if (is_key(feature) ? include_keys : include_non_keys)
-            visit_feature(feature, Overloaded{
-                                       [=](Scalar_Feature f) { f.null(instance) = null_value; },
-                                       [=](Array_Feature f) { f.null(instance) = null_value; },
-                                       [](auto) {},
-                                   });
-    }
+    if (!include_keys && !include_non_keys)
+        return;
+    visit_cells(instance->__meta_class, include_non_keys ? Cells::ALL : Cells::KEYS,
+                [=](const Cell& cell) INLINE {
+                    if (cell.kind < Cell_Kind::REFERENCE && (include_keys || !is_key(cell.feature)))
+                        cell_at<uint8>(instance, cell.offset + cell.size) = null_value;
+                });
 }
 
 int filter_properties(Instance* instance, const char* const* names, bool keep_keys)

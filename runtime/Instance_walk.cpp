@@ -1,5 +1,6 @@
 #include "runtime/Instance.h"
 
+#include "runtime/Class_Plan.h"
 #include "runtime/features.h"
 
 namespace KPRV {
@@ -9,16 +10,13 @@ void __visit(Instance* instance, void (*function)(Instance* instance, void* data
     if (!instance)
         return;
     function(instance, data);
-    for (const Meta_Feature* feature : features_of(instance->__meta_class)) {
-        visit_feature(feature, Overloaded{
-                                   [=](Reference_Feature f) { __visit(f.target(instance), function, data); },
-                                   [=](Reference_Array_Feature f) {
-                                       for (Instance* target : f.targets(instance))
-                                           __visit(target, function, data);
-                                   },
-                                   [](auto) {},
-                               });
-    }
+    visit_cells(instance->__meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
+        if (cell.kind == Cell_Kind::REFERENCE)
+            __visit(cell.in<Instance*>(instance), function, data);
+        else if (cell.kind == Cell_Kind::REFERENCE_ARRAY)
+            for (Instance* target : cell.in<Array<Instance*>>(instance))
+                __visit(target, function, data);
+    });
 }
 
 namespace {
