@@ -35,17 +35,15 @@ void CMPI_Thread_Context::operator delete(CMPI_Thread_Context* self, std::destro
 }
 
 Context_Scope::Context_Scope(const CMPIBroker* broker, const CMPIContext* context, CMPI_Adapter* adapter)
-    : _thread_context(new CMPI_Thread_Context(broker, context, adapter))
+    : _thread_context(broker, context, adapter)
 {
-    _thread_context->_owned_by_scope = true;
-    Thread_Context::push(_thread_context);
+    _thread_context._owned_by_scope = true;
+    Thread_Context::push(&_thread_context);
 }
 
 Context_Scope::~Context_Scope()
 {
     Thread_Context::pop();
-    _thread_context->_owned_by_scope = false;
-    delete _thread_context;
 }
 
 void* CMPI_Thread_Context::thread_create_hook(void*)

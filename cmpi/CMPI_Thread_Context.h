@@ -65,7 +65,7 @@ public:
     Context_Scope& operator=(const Context_Scope&) = delete;
 
 private:
-    CMPI_Thread_Context* _thread_context;
+    CMPI_Thread_Context _thread_context;
 };
 
 } // namespace KPRV
