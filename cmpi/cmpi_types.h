@@ -23,11 +23,11 @@ inline Value::Type value_type_of(CMPIType word)
     const int array_bit = word & CMPI_ARRAY ? Value::ARRAY_BIT : 0;
     if (element == CMPI_instance || element == CMPI_ref)
         return Value::Type(Value::INSTANCE | array_bit);
-    for (int type = 0; type < int(NUM_TYPES); type++) {
-        if (cmpi_type_words[type] == element)
-            return Value::Type(type | array_bit);
-    }
-    return Value::NONE;
+    // From behind: most values are texts.
+    int type = int(NUM_TYPES) - 1;
+    while (type >= 0 && cmpi_type_words[type] != element)
+        type--;
+    return type < 0 ? Value::NONE : Value::Type(type | array_bit);
 }
 
 /// Numbers, booleans and characters lie at the start of the union as they are.

@@ -48,10 +48,10 @@ static Array<Instance*> targets_of(const Instance* instance, const Meta_Feature*
 
 /// As `Value::get`, for a cell that may be taken already: a server may name a reference twice, and then the
 /// instance that came first is given back.
-static int replace(Instance* instance, const Meta_Feature* feature, const Value& value)
+static int replace(Instance* instance, const Meta_Feature* feature, Value& value)
 {
     if (!(feature->flags & FLAG_REFERENCE))
-        return value.get(instance, feature);
+        return value.give(instance, feature);
     const Array<Instance*> earlier = targets_of(instance, feature);
     const int status = value.get(instance, feature);
     if (status == 0 || !(targets_of(instance, feature) == earlier))

@@ -297,4 +297,14 @@ int Value::get(Instance* instance, const Meta_Feature* feature) const
                                   });
 }
 
+int Value::give(Instance* instance, const Meta_Feature* feature)
+{
+    if (type != static_cast<Type>(STRING) || !instance || type != type_of(feature))
+        return get(instance, feature);
+    const Scalar_Feature cell{static_cast<const Meta_Property*>(feature)};
+    cell.null(instance) = null;
+    *static_cast<String*>(cell.value(instance)) = std::move(_as<String>());
+    return 0;
+}
+
 } // namespace KPRV

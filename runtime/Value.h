@@ -104,6 +104,8 @@ public:
     /// Stores this value into a cell of the instance. -1, with a log line, when it does not fit. A cell that
     /// held an instance is not released: this is for cells that have just been nulled.
     int get(Instance* instance, const Meta_Feature* feature) const;
+    /// As `get`, but hands over a text that it holds.
+    int give(Instance* instance, const Meta_Feature* feature);
 
     void print() const;
     void fprint(FILE* file) const;

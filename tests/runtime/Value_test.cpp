@@ -339,6 +339,28 @@ TEST(Value_get, NeedsAnInstance)
     EXPECT_EQ("Value.cpp", log.lines().at(0).file);
 }
 
+TEST(Value_give, HandsATextOverAndIsGetForAllElse)
+{
+    const Log_Capture log;
+    const Ref<Sample_Element> element(make_element("x"));
+    Value x;
+    x.set_value("handed over");
+    const char* const text = x.peek<String>()->c_str();
+    EXPECT_EQ(0, x.give(element.ptr(), &_Sample_Element_Name));
+    EXPECT_EQ(text, element->Name.value.c_str());
+    EXPECT_FALSE(element->Name.null);
+    x.set_null(Value::Type(STRING));
+    EXPECT_EQ(0, x.give(element.ptr(), &_Sample_Element_Name));
+    EXPECT_TRUE(element->Name.null);
+    EXPECT_EQ(-1, x.give(nullptr, &_Sample_Element_Name));
+    EXPECT_EQ(-1, x.give(element.ptr(), RESET));
+    x.set_value(uint8(1));
+    EXPECT_EQ(-1, x.give(element.ptr(), &_Sample_Element_Name));
+    EXPECT_EQ((Lines{"WARN null instance argument", "WARN type mismatch: Sample_Element.Reset",
+                     "WARN type mismatch: Sample_Element.Name"}),
+              log.said());
+}
+
 TEST(Value_get, OfAMethodFails)
 {
     const Log_Capture log;
