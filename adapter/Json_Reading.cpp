@@ -64,12 +64,17 @@ bool is_nested_too_deep(std::string_view text)
 
 bool read_json(std::string_view text, Json::Value& value, std::string& errors)
 {
+    Json::Reader reader;
+    return read_json(reader, text, value, errors);
+}
+
+bool read_json(Json::Reader& reader, std::string_view text, Json::Value& value, std::string& errors)
+{
     if (text.size() > MOST_NESTED && is_nested_too_deep(text)) {
         errors = "nested deeper than " + std::to_string(MOST_NESTED) + " levels";
         return false;
     }
     try {
-        Json::Reader reader;
         if (reader.parse(text.data(), text.data() + text.size(), value, true))
             return true;
         errors = reader.getFormattedErrorMessages();

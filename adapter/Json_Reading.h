@@ -1,6 +1,6 @@
 #pragma once
 
-#include <json/value.h>
+#include <json/forwards.h>
 
 #include <string>
 #include <string_view>
@@ -15,5 +15,8 @@ inline constexpr unsigned MOST_NESTED = 256;
 /// False if it cannot be parsed or is nested deeper than `MOST_NESTED`; `errors` then says why, for people.
 /// Throws nothing but std::bad_alloc.
 bool read_json(std::string_view text, Json::Value& value, std::string& errors);
+/// The same, with a reader that the caller keeps: to make one costs as much as to read a short text. A reader
+/// reads one text at a time, and what it has read before makes no difference.
+bool read_json(Json::Reader& reader, std::string_view text, Json::Value& value, std::string& errors);
 
 } // namespace KPRV

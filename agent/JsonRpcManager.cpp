@@ -6,8 +6,7 @@
 #include "agent/MethodRegistration.h"
 #include "runtime/Mutex.h"
 
-#include <json/writer.h>
-
+#include <algorithm>
 #include <atomic>
 #include <cxxabi.h>
 #include <memory>
@@ -42,16 +41,21 @@ void lift_error(Json::Value& reply, const Json::Value& result)
     reply["error"].swap(error);
 }
 
-/// A member of the request; null if it is absent. Throws in the JSON library's words if the request is
-/// neither an object nor null.
-const Json::Value* find(const Json::Value& root, std::string_view name)
+/// What is read of a request.
+enum Place
 {
-    return root.find(name.data(), name.data() + name.size());
-}
+    ID,
+    METHOD,
+    PARAMS,
+    VERSION,
+};
+constexpr Members<4>::Names PLACES = {"id", "method", "params", "version"};
 
-const Json::Value& value_of(const Json::Value* found)
+/// Throws in the JSON library's words if the request is neither an object nor null.
+void check_kind(const Json::Value& root)
 {
-    return found ? *found : Json::Value::nullSingleton();
+    if (!root.isObject())
+        root.find(PLACES[VERSION].begin(), PLACES[VERSION].end());
 }
 
 } // namespace
@@ -92,8 +96,10 @@ void JsonRpcManager::_registerMethod(const std::string& name, Handler handler)
 std::vector<std::string> JsonRpcManager::getMethods() const
 {
     std::vector<std::string> names;
+    names.reserve(_methods.size());
     for (const auto& [name, handler] : _methods)
         names.push_back(name);
+    std::ranges::sort(names);
     return names;
 }
 
@@ -106,27 +112,33 @@ void JsonRpcManager::process(const std::string& request, response& out) const
 
 sint32 JsonRpcManager::answer(std::string_view request, String& text) const
 {
+    return _tools.lend(request.size(), [&](Json_Tools& tools) { return answer(request, text, tools); });
+}
+
+sint32 JsonRpcManager::answer(std::string_view request, String& text, Json_Tools& tools) const
+{
     Json::Value parsed;
     std::string errors;
-    if (!read_json(request, parsed, errors)) {
+    if (!read_json(tools.reader, request, parsed, errors)) {
         text = String("There was an error parsing the JSON text comprising the Procedure Call:\n",
                       errors.c_str());
         return 500;
     }
-    const Json::Value& root = parsed;
+    check_kind(parsed);
+    const Members<4> told(parsed, PLACES);
     Json::Value reply;
     // Clients of all versions are served alike, but a version must be a text.
-    if (const Json::Value* const version = find(root, "version"))
-        asView(*version);
-    if (const Json::Value* const id = find(root, "id"))
-        reply["id"] = *id;
+    asView(told[VERSION]);
+    if (told.has(ID))
+        reply["id"] = told[ID];
     reply["version"] = "1.1";
-    call(asView(value_of(find(root, "method"))), value_of(find(root, "params")), reply);
+    call(asView(told[METHOD]), told[PARAMS], reply);
 
     // The text is copied while the values stand: once they are gone, the allocator sorts what they leave
     // before it finds room for a long text, and that takes longer than the copy.
-    const std::string written = Json::StyledWriter().write(reply);
-    text = String(written.data(), static_cast<uint32>(written.size()));
+    const std::string written = tools.writer.write(reply);
+    tools.reply.assign(written.data(), static_cast<uint32>(written.size()));
+    text = tools.reply;
     return 200;
 }
 

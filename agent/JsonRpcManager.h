@@ -1,12 +1,14 @@
 #pragma once
 
+#include "agent/Json_Tools.h"
 #include "runtime/String.h"
 
 #include <json/value.h>
 
-#include <map>
+#include <functional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace KPRV {
@@ -54,11 +56,18 @@ public:
 private:
     JsonRpcManager() = default;
 
+    struct Hash : std::hash<std::string_view>
+    {
+        using is_transparent = void;
+    };
+
+    sint32 answer(std::string_view request, String& text, Json_Tools& tools) const;
     void call(std::string_view name, const Json::Value& params, Json::Value& reply) const;
 
     static JsonRpcManager* s_instance;
 
-    std::map<std::string, Handler, std::less<>> _methods;
+    std::unordered_map<std::string, Handler, Hash, std::equal_to<>> _methods;
+    mutable Kept_Json_Tools _tools;
 };
 
 } // namespace KPRV

@@ -270,5 +270,74 @@ TEST_F(Dispatcher, IsAskedByManyThreadsAtOnce)
     EXPECT_EQ(64u * 3, good);
 }
 
+/// The answer as the provider takes it.
+String answered(const std::string& request)
+{
+    String text;
+    EXPECT_EQ(200, JsonRpcManager::instance()->answer(request, text));
+    return text;
+}
+
+TEST_F(Dispatcher, LeavesEarlierRepliesAloneWhateverComesAfterThem)
+{
+    library.answers("getPortStatistics", json("{'name': 'p'}"));
+    const auto request = [](const std::string& id) {
+        return R"({"method": "discovery.getPortStatistics", "params": ["x"], "id": ")" + id + R"("})";
+    };
+    const std::string size(5000, 'i');
+    const String first = answered(request("first")), second = answered(request("a longer second"));
+    const String third = answered(request(size)), fourth = answered(request("4"));
+    const auto reply = [](const std::string& id) {
+        return "{\n   \"id\" : \"" + id + "\",\n   \"result\" : {\n      \"name\" : \"p\"\n   },\n   " +
+               "\"version\" : \"1.1\"\n}\n";
+    };
+    EXPECT_EQ(reply("first"), first.c_str());
+    EXPECT_EQ(reply("a longer second"), second.c_str());
+    EXPECT_EQ(reply(size), third.c_str());
+    EXPECT_EQ(reply("4"), fourth.c_str());
+    // The comments, errors and depth of one request are none of the next one's.
+    EXPECT_NE("", why_unparsed(R"(/* before */ {"method": ["a", } )"));
+    EXPECT_EQ(reply("after"), answered(request("after")).c_str());
+}
+
+TEST_F(Dispatcher, HoldsOnToShortRepliesOnly)
+{
+    library.answers("getPortStatistics", json("{'name': '" + std::string(100000, 'n') + "'}"));
+    const std::string request = R"({"method": "discovery.getPortStatistics", "params": ["x"]})";
+    {
+        const String reply = answered(request);
+        EXPECT_LT(100000u, reply.size());
+    }
+    Kept_Json_Tools tools;
+    const auto capacity_after = [&tools](const char* reply) {
+        tools.lend(1, [&](Json_Tools& lent) { lent.reply.assign(reply); });
+        return tools.lend(1, [](Json_Tools& lent) { return lent.reply.capacity(); });
+    };
+    EXPECT_EQ(64u, capacity_after(std::string(50, 'a').c_str()));
+    EXPECT_EQ(64u, capacity_after("b"));
+    EXPECT_EQ(0u, capacity_after(std::string(5000, 'c').c_str()));
+    EXPECT_EQ(32u, capacity_after("d"));
+    const Kept_Json_Tools copy = tools;
+    EXPECT_EQ(0u, Kept_Json_Tools(copy).lend(1, [](Json_Tools& lent) { return lent.reply.capacity(); }));
+}
+
+TEST_F(Dispatcher, GivesItsToolsBackWhenAMethodThrows)
+{
+    Kept_Json_Tools tools;
+    const auto tools_of = [&tools](size_t request) {
+        return tools.lend(request, [](Json_Tools& lent) { return &lent; });
+    };
+    const Json_Tools* const kept = tools_of(1);
+    EXPECT_THROW(tools.lend(1, [](Json_Tools&) { throw 1; }), int);
+    EXPECT_EQ(kept, tools_of(1));
+    EXPECT_EQ(kept, tools_of(4096));
+    EXPECT_NE(kept, tools_of(4097));
+    tools.lend(1, [&](Json_Tools& lent) {
+        EXPECT_EQ(kept, &lent);
+        EXPECT_NE(kept, tools_of(1));
+    });
+    EXPECT_EQ(kept, tools_of(1));
+}
+
 } // namespace
 } // namespace KPRV
