@@ -1,5 +1,6 @@
 #include "runtime/Instance.h"
 
+#include "runtime/Class_Plan.h"
 #include "runtime/features.h"
 
 namespace KPRV {
@@ -94,11 +95,11 @@ bool key_eq(const Instance* a, const Instance* b)
 {
     if (!a || !b)
         return a == b;
-    for (const Meta_Feature* feature : features_of(a->__meta_class)) {
-        if (is_key(feature) && !visit_feature(feature, Key_Comparer{a, b}))
-            return false;
-    }
-    return true;
+    bool equal = true;
+    visit_cells(a->__meta_class, Cells::KEYS, [&](const Cell& cell) INLINE {
+        equal = equal && visit_feature(cell.feature, Key_Comparer{a, b});
+    });
+    return equal;
 }
 
 bool identical(const Instance* a, const Instance* b)

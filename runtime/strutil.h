@@ -17,16 +17,23 @@ extern const uint8 __lower[256];
 /// locale, which belongs to the server: under some of them "I" and "i" are different letters.
 bool folded_eq(const char* a, const char* b, size_t n);
 
-/// For `name_eq`, which has compared the first characters.
+/// For `name_eq`, which has compared what stands before.
 bool name_rest_eq(const char* a, const char* b);
 
-/// Case-insensitive equality of CIM names. The first characters are compared before a call is paid for.
+/// Case-insensitive equality of CIM names. Before a call is paid for, as many characters are compared as tell
+/// most names of one schema apart, its prefix and the one behind it.
 inline bool name_eq(const char* a, const char* b)
 {
-    if (__lower[static_cast<uint8>(*a)] != __lower[static_cast<uint8>(*b)])
-        return false;
     // Names of one binary are mostly the very same literal.
-    return a == b || name_rest_eq(a, b);
+    if (a == b)
+        return true;
+    for (int i = 0; i < 9; i++, a++, b++) {
+        if (__lower[static_cast<uint8>(*a)] != __lower[static_cast<uint8>(*b)])
+            return false;
+        if (*a == '\0')
+            return true;
+    }
+    return name_rest_eq(a, b);
 }
 
 } // namespace KPRV

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <string>
 
 namespace KPRV {
 
@@ -64,6 +65,18 @@ TEST(strutil, NamesAreEqualInAnyCase)
                          "e\xC4",
                          "Stra\xDF"
                          "e\xE4"));
+}
+
+TEST(strutil, NamesOfEveryLengthAreComparedToTheirEnd)
+{
+    const std::string lower = "kaldera_scsiprotocolendpoint", upper = "KALDERA_SCSIPROTOCOLENDPOINT";
+    for (size_t n = 0; n <= lower.size(); n++) {
+        const std::string a = lower.substr(0, n), b = upper.substr(0, n);
+        EXPECT_TRUE(name_eq(a.c_str(), b.c_str())) << n;
+        EXPECT_FALSE(name_eq(a.c_str(), (b + "x").c_str())) << n;
+        EXPECT_FALSE(name_eq((a + "x").c_str(), b.c_str())) << n;
+        EXPECT_FALSE(name_eq((a + "x").c_str(), (b + "y").c_str())) << n;
+    }
 }
 
 TEST(strutil, FoldedEqualityEndsAtTheLengthOrTheTerminator)
