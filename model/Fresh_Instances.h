@@ -31,7 +31,6 @@ public:
     }
     void append(const Array<Instance*>& instances)
     {
-        _instances.reserve(_instances.size() + instances.size());
         _instances.insert(_instances.end(), instances.begin(), instances.end());
     }
     uint32 size() const { return static_cast<uint32>(_instances.size()); }

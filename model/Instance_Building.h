@@ -32,6 +32,13 @@ Array<T> array_of(std::initializer_list<T> elements)
     return Array<T>(elements.begin(), static_cast<uint32>(elements.size()));
 }
 
+/// Of one element, which is not copied on the way.
+template <class T>
+Array<T> array_of(const T& element)
+{
+    return Array<T>(&element, 1);
+}
+
 /// The keys that all that belongs to the host has: its own class, and the host's class and name.
 template <class T>
 void set_system_keys(T& instance, classId_t id, const String& system_name)
@@ -44,6 +51,16 @@ void set_system_keys(T& instance, classId_t id, const String& system_name)
 inline String to_String(std::string_view text)
 {
     return String(text.data(), static_cast<uint32>(text.size()));
+}
+
+/// The texts one behind the other, up to 255 characters: more than the fields of any record together.
+inline String joined(std::initializer_list<std::string_view> texts)
+{
+    char all[255];
+    size_t size = 0;
+    for (const std::string_view text : texts)
+        size += text.copy(all + size, sizeof all - size);
+    return to_String({all, size});
 }
 
 } // namespace KPRV

@@ -54,11 +54,7 @@ String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {
     case Named_By::PRODUCT:
-        return to_String(std::string(trimmed(lun.vendor))
-                             .append("+")
-                             .append(trimmed(lun.productID))
-                             .append("+")
-                             .append(trimmed(lun.serialNumber)));
+        return joined({trimmed(lun.vendor), "+", trimmed(lun.productID), "+", trimmed(lun.serialNumber)});
     case Named_By::DESCRIPTION:
         return lun.description;
     case Named_By::NOTHING:
@@ -68,14 +64,10 @@ String name(Named_By source, const _hbaLunInfo& lun)
 }
 
 /// A LUN goes by the path on which it is seen.
-String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const std::string& element)
+String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, std::string_view element)
 {
-    std::string id;
-    id.reserve(sizeof port.portWWN + sizeof lun.remoteWWN + sizeof lun.vendor + sizeof lun.productID +
-               element.size());
-    id.append(port.portWWN).append("_").append(lun.remoteWWN).append("_");
-    id.append(trimmed(lun.vendor)).append("_").append(trimmed(lun.productID)).append("_");
-    return to_String(id.append(element));
+    return joined({port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
+                   "_", element});
 }
 
 /// What the three classes have in common.
@@ -89,8 +81,8 @@ T* create_lun(classId_t id, const String& identification, const _hbaPortInfo& po
     set_system_keys(*instance, id, port.systemName);
     instance->ElementName.set(to_String(element));
     instance->DeviceID.set(device_id);
-    instance->OtherIdentifyingInfo.set(array_of({device_id}));
-    instance->IdentifyingDescriptions.set(array_of<String>({identification}));
+    instance->OtherIdentifyingInfo.set(array_of(device_id));
+    instance->IdentifyingDescriptions.set(array_of(identification));
     instance->OperationalStatus.set(array_of<uint16>({2}));
     return instance.steal();
 }

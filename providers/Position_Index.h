@@ -20,7 +20,19 @@ inline std::string_view view_of(const String& text)
 class Position_Index
 {
 public:
-    void add(std::string_view key, uint32 position) { _positions[key].push_back(position); }
+    Position_Index() = default;
+    Position_Index(const Position_Index&) = delete;
+    Position_Index& operator=(const Position_Index&) = delete;
+
+    void add(std::string_view key, uint32 position)
+    {
+        // Lists are grouped: the units of a target stand together.
+        if (!_last || _last_key != key) {
+            _last = &_positions[key];
+            _last_key = key;
+        }
+        _last->push_back(position);
+    }
 
     /// In the order of the list; null if there is none.
     const std::vector<uint32>* find(std::string_view key) const
@@ -62,6 +74,8 @@ private:
     };
 
     std::unordered_map<std::string_view, std::vector<uint32>, Hash, Equal> _positions;
+    std::string_view _last_key;
+    std::vector<uint32>* _last = nullptr;
 };
 
 } // namespace KPRV

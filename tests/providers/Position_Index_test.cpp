@@ -14,8 +14,10 @@ TEST(Position_Index, FindsInTheOrderOfTheListWhateverTheCase)
     index.add("20008C7C00000001", 4);
     index.add("20008c7c00000002", 5);
     index.add("20008c7C00000001", 9);
+    index.add("20008c7C00000001", 11);
+    index.add("20008C7C00000001", 12);
     ASSERT_NE(nullptr, index.find("20008c7c00000001"));
-    EXPECT_EQ((Positions{4, 9}), *index.find("20008c7c00000001"));
+    EXPECT_EQ((Positions{4, 9, 11, 12}), *index.find("20008c7c00000001"));
     EXPECT_EQ(nullptr, index.find("20008c7c00000003"));
     EXPECT_EQ(nullptr, index.find("20008c7c0000000"));
 }
