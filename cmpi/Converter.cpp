@@ -78,9 +78,10 @@ CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const 
 /// The shape of the three imports: a fresh instance, filled from the container, in the path's name space.
 template <class Make_Container>
 static CMPIrc import(const Meta_Class* meta_class, uint32 mask, const CMPIObjectPath* path,
-                     Ref<Instance>& instance, Make_Container make_container)
+                     Ref<Instance>& instance, const Instance* neighbour, Make_Container make_container)
 {
     instance.reset();
+/// `neighbour` may have that text already.
     if (!path)
         return CMPI_RC_ERR_FAILED;
     const char* const name_space = name_space_of(path);
@@ -89,23 +90,24 @@ static CMPIrc import(const Meta_Class* meta_class, uint32 mask, const CMPIObject
     auto container = make_container(name_space);
     if (container.convert(meta_class, mask, target) != 0)
         return CMPI_RC_ERR_FAILED;
-    __set_name_space_recursive(target, name_space, false);
+    const bool shared = neighbour && neighbour->__name_space == name_space;
+    __set_name_space_recursive(target, shared ? neighbour->__name_space : String(name_space), false);
     return CMPI_RC_OK;
 }
 
 CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_class,
                             const CMPIObjectPath* path, const CMPIInstance* ci, Ref<Instance>& instance)
 {
-    return import(meta_class, 0, path, instance, [&](const char* name_space) {
+    return import(meta_class, 0, path, instance, nullptr, [&](const char* name_space) {
         return CMPIInstance_Container(meta_class->meta_repository, broker, name_space, ci);
     });
 }
 
 CMPIrc make_cimple_method(const CMPIBroker* broker, const Meta_Class* meta_class,
                           const Meta_Method* meta_method, const CMPIObjectPath* path, const CMPIArgs* in,
-                          void*, Ref<Instance>& record)
+                          void*, Ref<Instance>& record, const Instance* called_on)
 {
-    return import(as_class(meta_method), FLAG_IN, path, record, [&](const char* name_space) {
+    return import(as_class(meta_method), FLAG_IN, path, record, called_on, [&](const char* name_space) {
         return CMPIArgs_Container(meta_class->meta_repository, broker, name_space, in);
     });
 }
@@ -113,7 +115,7 @@ CMPIrc make_cimple_method(const CMPIBroker* broker, const Meta_Class* meta_class
 CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class,
                              const CMPIObjectPath* path, Ref<Instance>& instance)
 {
-    return import(meta_class, FLAG_KEY, path, instance, [&](const char* name_space) {
+    return import(meta_class, FLAG_KEY, path, instance, nullptr, [&](const char* name_space) {
         return CMPIObjectPath_Container(meta_class->meta_repository, broker, name_space, path);
     });
 }

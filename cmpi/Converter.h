@@ -28,10 +28,11 @@ CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const 
 CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_class,
                             const CMPIObjectPath* path, const CMPIInstance* ci, Ref<Instance>& instance);
 
-/// An invocation record with the In parameters. `client_data` is not read.
+/// An invocation record with the In parameters. `client_data` is not read. The record shares the text of its
+/// name space with the instance on which the method is called, if that is given and has the same.
 CMPIrc make_cimple_method(const CMPIBroker* broker, const Meta_Class* meta_class,
                           const Meta_Method* meta_method, const CMPIObjectPath* path, const CMPIArgs* in,
-                          void* client_data, Ref<Instance>& record);
+                          void* client_data, Ref<Instance>& record, const Instance* called_on = nullptr);
 
 /// An instance with the keys of the path; all else null.
 CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class,

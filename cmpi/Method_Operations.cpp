@@ -31,7 +31,8 @@ static CMPIStatus invokeMethod(CMPIMethodMI* mi, const CMPIContext* context, con
     if (const CMPIrc rc = make_cimple_reference(nullptr, meta_class, cop, reference); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc, "CIMPLE reference creation failed");
     Ref<Instance> record;
-    if (const CMPIrc rc = make_cimple_method(nullptr, meta_class, meta_method, cop, in, adapter, record);
+    if (const CMPIrc rc =
+            make_cimple_method(nullptr, meta_class, meta_method, cop, in, adapter, record, reference.ptr());
         rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc, "CIMPLE make_cimple_method function failed");
 

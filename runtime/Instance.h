@@ -79,7 +79,8 @@ int filter_properties(Instance* instance, const char* const* names, bool keep_ke
 /// Calls the function on the instance, then on each instance that it refers to, depth first.
 void __visit(Instance* instance, void (*function)(Instance* instance, void* data), void* data);
 /// Gives a name space to the instance and all that it refers to: to those without one, or to all with force.
-void __set_name_space_recursive(Instance* instance, const char* name_space, bool force);
+/// They share the text.
+void __set_name_space_recursive(Instance* instance, const String& name_space, bool force);
 /// Creates missing scalar references, with defaults.
 void __create_refs(Instance* instance);
 

@@ -23,7 +23,7 @@ namespace {
 
 struct Name_Space_Giver
 {
-    String name_space;
+    const String& name_space;
     bool force;
 
     static void give(Instance* instance, void* data)
@@ -36,10 +36,9 @@ struct Name_Space_Giver
 
 } // namespace
 
-void __set_name_space_recursive(Instance* instance, const char* name_space, bool force)
+void __set_name_space_recursive(Instance* instance, const String& name_space, bool force)
 {
-    // One text for all of them.
-    Name_Space_Giver giver{String(name_space), force};
+    Name_Space_Giver giver{name_space, force};
     __visit(instance, Name_Space_Giver::give, &giver);
 }
 

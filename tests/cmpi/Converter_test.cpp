@@ -327,3 +327,22 @@ TEST_F(Converter, method_takes_in_parameters_only)
     EXPECT_EQ(reset->return_value.null, 1);
     EXPECT_EQ(reset->__name_space, NAME_SPACE);
 }
+
+TEST_F(Converter, method_shares_the_name_space_of_what_it_is_called_on_if_it_is_the_same)
+{
+    const Ref<Instance> element(make_named<Sample_Element>("x"));
+    for (const char* name_space : {NAME_SPACE, "root/other", ""}) {
+        element->__name_space = name_space;
+        Ref<Instance> record;
+        host::Args_Object* const in =
+            host::make_object<host::Args_Object>(*server.core, "test", std::vector<host::Named_Value>());
+        ASSERT_EQ(make_cimple_method(nullptr, &Sample_Element::static_meta_class,
+                                     &Sample_Element_Reset_method::static_meta_class,
+                                     path(class_path("Sample_Element"))->cmpi(), in->cmpi(), nullptr, record,
+                                     element.ptr()),
+                  CMPI_RC_OK);
+        EXPECT_EQ(record->__name_space, NAME_SPACE);
+        EXPECT_EQ(record->__name_space.c_str() == element->__name_space.c_str(),
+                  element->__name_space == NAME_SPACE);
+    }
+}
