@@ -85,10 +85,20 @@ int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags
         data.value.string = CMNewString(_broker, text->c_str(), nullptr);
         return data.value.string ? _set(name, data) : _not_made(name);
     }
+    Instance* end = nullptr;
+    if (_ends && (flags & FLAG_REFERENCE) && value.get_value(end) == 0) {
+        if (CMPIObjectPath* const path = _ends->find(name, end)) {
+            data.type = CMPI_ref;
+            data.value.ref = path;
+            return _set(name, data);
+        }
+    }
     Made_Objects made;
     if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr) !=
         0)
         return _not_made(name);
+    if (end && data.type == CMPI_ref)
+        _ends->note(name, end, data.value.ref);
     return _set(name, data);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cmpi/Shared_Ends.h"
 #include "runtime/Container.h"
 
 #include <cmpidt.h>
@@ -21,6 +22,9 @@ public:
     /// From now on the objects that `set_value` makes are given back once they have been set, which copies
     /// them. For a thread that no request's end cleans up behind.
     void give_back_what_is_made() { _gives_back = true; }
+
+    /// Paths of references are taken from there and noted there. Null for none.
+    void share(Shared_Ends* ends) { _ends = ends; }
 
 protected:
     CMPI_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space)
@@ -44,6 +48,7 @@ protected:
 
 private:
     bool _gives_back = false;
+    Shared_Ends* _ends = nullptr;
 };
 
 class CMPIInstance_Container : public CMPI_Container

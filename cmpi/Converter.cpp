@@ -14,7 +14,7 @@ enum class Afterwards
 };
 
 static CMPIrc make_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                        Afterwards afterwards, CMPIObjectPath*& path)
+                        Afterwards afterwards, CMPIObjectPath*& path, Shared_Ends* ends)
 {
     const Meta_Class* const meta_class = instance->__meta_class;
     path = CMNewObjectPath(broker, name_space, meta_class->name, nullptr);
@@ -23,17 +23,20 @@ static CMPIrc make_path(const CMPIBroker* broker, const Instance* instance, cons
     CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space, path);
     if (afterwards == Afterwards::GIVE_BACK)
         container.give_back_what_is_made();
+    else
+        container.share(ends);
     return container.convert(instance, FLAG_KEY) == 0 ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
 }
 
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                             CMPIObjectPath*& path)
+                             CMPIObjectPath*& path, Shared_Ends* ends)
 {
-    return make_path(broker, instance, name_space, Afterwards::SERVER_FREES, path);
+    return make_path(broker, instance, name_space, Afterwards::SERVER_FREES, path, ends);
 }
 
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                          const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci)
+                          const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci,
+                          Shared_Ends* ends)
 {
     ci = nullptr;
     // Without the path of a request there is no request: the caller is a thread of the module's own, so that
@@ -43,7 +46,7 @@ CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, co
     if (!path) {
         LOG_CONVERSION(WARN, "No ObjectPath built before call to make_CMPI_instance");
         CMPIObjectPath* built;
-        const CMPIrc rc = make_path(broker, instance, name_space, afterwards, built);
+        const CMPIrc rc = make_path(broker, instance, name_space, afterwards, built, nullptr);
         path = made.note(built);
         if (rc != CMPI_RC_OK)
             return CMPI_RC_ERR_FAILED;
@@ -60,6 +63,8 @@ CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, co
     CMPIInstance_Container container(instance->__meta_class->meta_repository, broker, name_space, ci);
     if (afterwards == Afterwards::GIVE_BACK)
         container.give_back_what_is_made();
+    else
+        container.share(ends);
     return container.convert(instance, 0) == 0 ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
 }
 
@@ -76,12 +81,12 @@ CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const 
 }
 
 /// The shape of the three imports: a fresh instance, filled from the container, in the path's name space.
+/// `neighbour` may have that text already.
 template <class Make_Container>
 static CMPIrc import(const Meta_Class* meta_class, uint32 mask, const CMPIObjectPath* path,
                      Ref<Instance>& instance, const Instance* neighbour, Make_Container make_container)
 {
     instance.reset();
-/// `neighbour` may have that text already.
     if (!path)
         return CMPI_RC_ERR_FAILED;
     const char* const name_space = name_space_of(path);

@@ -12,14 +12,18 @@
 
 namespace KPRV {
 
-/// The path with every key that has a value. Null on failure.
+class Shared_Ends;
+
+/// The path with every key that has a value. Null on failure. `ends` shares the paths of references among
+/// all that is made with it.
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                             CMPIObjectPath*& path);
+                             CMPIObjectPath*& path, Shared_Ends* ends = nullptr);
 
 /// The instance under a property list (null-terminated; null for all). A null path is built from the keys,
 /// for a thread that no end of a request cleans up behind: all that is made but the instance is given back.
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                          const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci);
+                          const CMPIObjectPath* path, const char** properties, CMPIInstance*& ci,
+                          Shared_Ends* ends = nullptr);
 
 /// Out parameters into `out`; the return value apart, with type 0 when it is null.
 CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const Instance* method_record,

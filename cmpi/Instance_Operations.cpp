@@ -1,5 +1,6 @@
 #include "cmpi/Converter.h"
 #include "cmpi/Operation_Scope.h"
+#include "cmpi/Shared_Ends.h"
 #include "cmpi/cmpi_text.h"
 #include "cmpi/entries.h"
 #include "cmpi/status_translation.h"
@@ -34,6 +35,7 @@ struct enum_instances
     const CMPIObjectPath* cop;
     const char** properties;
     CMPIrc rc;
+    Shared_Ends ends;
 
     static bool _proc(Instance* instance, int, void* client_data)
     {
@@ -43,9 +45,10 @@ struct enum_instances
             return false;
         const char* const name_space = name_space_of(self->cop);
         CMPIObjectPath* path;
-        make_cmpi_object_path(self->broker, instance, name_space, path);
+        make_cmpi_object_path(self->broker, instance, name_space, path, &self->ends);
         CMPIInstance* ci;
-        self->rc = make_cmpi_instance(self->broker, instance, name_space, path, self->properties, ci);
+        self->rc =
+            make_cmpi_instance(self->broker, instance, name_space, path, self->properties, ci, &self->ends);
         if (self->rc != CMPI_RC_OK)
             return false;
         CMReturnInstance(self->result, ci);
@@ -60,6 +63,7 @@ struct enum_instance_names
     const CMPIResult* result;
     const char* name_space;
     CMPIrc rc;
+    Shared_Ends ends;
 
     static bool _proc(Instance* instance, int, void* client_data)
     {
@@ -68,7 +72,7 @@ struct enum_instance_names
         if (!instance || self->rc != CMPI_RC_OK)
             return false;
         CMPIObjectPath* path;
-        self->rc = make_cmpi_object_path(self->broker, instance, self->name_space, path);
+        self->rc = make_cmpi_object_path(self->broker, instance, self->name_space, path, &self->ends);
         if (self->rc != CMPI_RC_OK)
             return false;
         CMReturnObjectPath(self->result, path);
@@ -88,7 +92,7 @@ static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* 
         return scope.ret(LOG_HERE, rc);
     __set_null_flags(model.ptr(), false, true, 1);
 
-    enum_instance_names data{scope.broker(), result, name_space_of(cop), CMPI_RC_OK};
+    enum_instance_names data{scope.broker(), result, name_space_of(cop), CMPI_RC_OK, {}};
     const int status =
         scope.adapter()->Provider_Handle::enum_instances(model.ptr(), enum_instance_names::_proc, &data);
     const CMPIrc rc = translate(Status_Family::ENUM_INSTANCES, status);
@@ -109,7 +113,7 @@ static CMPIStatus enumerateInstances(CMPIInstanceMI* mi, const CMPIContext* cont
     if (properties)
         filter_properties(model.ptr(), properties, true);
 
-    enum_instances data{scope.broker(), result, cop, properties, CMPI_RC_OK};
+    enum_instances data{scope.broker(), result, cop, properties, CMPI_RC_OK, {}};
     const int status =
         scope.adapter()->Provider_Handle::enum_instances(model.ptr(), enum_instances::_proc, &data);
     const CMPIrc rc = translate(Status_Family::ENUM_INSTANCES, status);

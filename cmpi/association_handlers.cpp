@@ -81,15 +81,15 @@ bool references_handler::_proc(Instance* instance, int, void* client_data)
 {
     return deliver(instance, client_data, [&](Association_Results& results) {
         CMPIObjectPath* path;
-        results.rc = make_cmpi_object_path(results.broker, instance, results.name_space, path);
+        results.rc = make_cmpi_object_path(results.broker, instance, results.name_space, path, &results.ends);
         if (results.rc != CMPI_RC_OK)
             return;
         // Without a list every cell counts as wanted, so that null properties go out as zero or empty text.
         // Settled.
         filter_properties(instance, results.properties, false);
         CMPIInstance* ci;
-        results.rc =
-            make_cmpi_instance(results.broker, instance, results.name_space, path, results.properties, ci);
+        results.rc = make_cmpi_instance(results.broker, instance, results.name_space, path,
+                                        results.properties, ci, &results.ends);
         if (results.rc == CMPI_RC_OK)
             return_instance(results, ci);
     });
@@ -100,7 +100,7 @@ bool reference_names::_proc(Instance* instance, int, void* client_data)
     return deliver(instance, client_data, [&](Association_Results& results) {
         __set_null_flags(instance, false, true, 1);
         CMPIObjectPath* path;
-        results.rc = make_cmpi_object_path(results.broker, instance, results.name_space, path);
+        results.rc = make_cmpi_object_path(results.broker, instance, results.name_space, path, &results.ends);
         if (results.rc == CMPI_RC_OK)
             return_path(results, path);
     });

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cmpi/Shared_Ends.h"
 #include "runtime/Instance.h"
 
 #include <cmpidt.h>
@@ -17,6 +18,7 @@ struct Association_Results
     const char* name_space;
     const char** properties;
     CMPIrc rc;
+    Shared_Ends ends = {};
 };
 
 // Each takes over the instance; a null instance is the end mark. True for a result that was returned.

@@ -17,7 +17,8 @@ public:
     Instance_Handler(Instance_Handler_Proc proc, void* client_data) : _proc(proc), _client_data(client_data)
     {
     }
-    /// Takes over the instance.
+    /// Takes over the instance. The ends of an association may be ends of others too, and from then on nobody
+    /// writes to them: what they became for the server is used again.
     bool handle(T* instance) { return _proc(instance, 0, _client_data); }
 
 private:
