@@ -15,9 +15,16 @@ CMPIStatus plain_enumerate_fc_ports(const CMPIBroker* broker, const CMPIResult* 
 /// Enumerates and compares the keys of the path.
 CMPIStatus plain_get_fc_port(const CMPIBroker* broker, const CMPIResult* result, const CMPIObjectPath* cop);
 
+/// Where the object paths of initiators and targets are made.
+enum class plain_ends
+{
+    of_each_path, ///< In the innermost loop, the usual shape.
+    once,         ///< As far out as can be.
+};
+
 /// The paths from initiators through targets to logical units, by three nested loops over the names.
 CMPIStatus plain_enumerate_paths(const CMPIBroker* broker, const CMPIResult* result,
-                                 const CMPIObjectPath* cop);
+                                 const CMPIObjectPath* cop, plain_ends ends);
 /// The names of the paths' ends that one end is joined to, by the same loops.
 CMPIStatus plain_path_associator_names(const CMPIBroker* broker, const CMPIResult* result,
                                        const CMPIObjectPath* cop);

@@ -30,11 +30,12 @@ CMPIObjectPath* first_unit(Lean_Broker& server)
     return path;
 }
 
-Twins paths(const Storage_Size& size)
+Twins paths(const Storage_Size& size, plain_ends rival_ends)
 {
     CMPIInstanceMI* const mi = Module::get().instances(PATH_CLASS);
+    const char* const rival = rival_ends == plain_ends::once ? " against ends made once" : "";
     return {
-        .name = "B3 enumerate paths/" + words(size),
+        .name = std::string("B3 enumerate paths") + rival + "/" + words(size),
         .prepare = [size] { Fast_Library::get().prepare(size); },
         .ours =
             [mi](Lean_Broker& server) {
@@ -42,8 +43,8 @@ Twins paths(const Storage_Size& size)
                                            nullptr);
             },
         .plain =
-            [](Lean_Broker& server) {
-                plain_enumerate_paths(server.broker(), server.result(), server.path(PATH_CLASS));
+            [rival_ends](Lean_Broker& server) {
+                plain_enumerate_paths(server.broker(), server.result(), server.path(PATH_CLASS), rival_ends);
             },
         .slow = size.all_paths() > 10000,
     };
@@ -78,7 +79,8 @@ void add_paths(bool tiny)
         {.adapters = 8, .ports = 2, .targets = 32, .luns = 32},
         {.adapters = 8, .ports = 2, .targets = 64, .luns = 64},
     };
-    for (const Twins& twins : {paths(smallest), ends(smallest)}) {
+    for (const Twins& twins :
+         {paths(smallest, plain_ends::of_each_path), paths(smallest, plain_ends::once), ends(smallest)}) {
         check_equal(twins);
         if (tiny)
             add(twins);
@@ -86,7 +88,8 @@ void add_paths(bool tiny)
     for (const Storage_Size& size : sizes) {
         if (tiny)
             break;
-        add(paths(size));
+        add(paths(size, plain_ends::of_each_path));
+        add(paths(size, plain_ends::once));
         add(ends(size));
     }
 }

@@ -117,23 +117,36 @@ void read_storage(storage& all)
     read_endpoints(all);
 }
 
-/// The three loops. Sizes are compared before texts, and each path is made as far out as it can be.
+CMPIObjectPath* path_to(const CMPIBroker* broker, const storage& all, const endpoint& endpoint)
+{
+    return plain_device_path(broker, "KALDERA_SCSIProtocolEndpoint", all.host, "Name", endpoint.name);
+}
+
+CMPIObjectPath* path_to(const CMPIBroker* broker, const storage& all, const unit& unit)
+{
+    return plain_device_path(broker, "KALDERA_StorageExtent", all.host, "DeviceID", unit.id.c_str());
+}
+
+/// The three loops. Sizes are compared before texts.
 template <class On_Path>
-void join(const CMPIBroker* broker, const storage& all, On_Path on_path)
+void join(const CMPIBroker* broker, const storage& all, plain_ends ends, On_Path on_path)
 {
     for (const endpoint& initiator : all.initiators) {
-        CMPIObjectPath* const from =
-            plain_device_path(broker, "KALDERA_SCSIProtocolEndpoint", all.host, "Name", initiator.name);
+        CMPIObjectPath* from = path_to(broker, all, initiator);
         for (const endpoint& target : all.targets) {
             if (target.initiator_size != initiator.initiator_size ||
                 strncasecmp(target.name, initiator.name, initiator.initiator_size) != 0)
                 continue;
-            CMPIObjectPath* const through =
-                plain_device_path(broker, "KALDERA_SCSIProtocolEndpoint", all.host, "Name", target.name);
+            CMPIObjectPath* through = path_to(broker, all, target);
             const size_t size = strlen(target.name);
             for (const unit& unit : all.units) {
-                if (unit.target_size == size && strncasecmp(unit.id.c_str(), target.name, size) == 0)
-                    on_path(from, through, unit);
+                if (unit.target_size != size || strncasecmp(unit.id.c_str(), target.name, size) != 0)
+                    continue;
+                if (ends == plain_ends::of_each_path) {
+                    from = path_to(broker, all, initiator);
+                    through = path_to(broker, all, target);
+                }
+                on_path(from, through, unit);
             }
         }
     }
@@ -153,20 +166,15 @@ void set_end(CMPIInstance* instance, const char* role, CMPIObjectPath* end)
     CMSetProperty(instance, role, &value, CMPI_ref);
 }
 
-CMPIObjectPath* path_to(const CMPIBroker* broker, const storage& all, const unit& unit)
-{
-    return plain_device_path(broker, "KALDERA_StorageExtent", all.host, "DeviceID", unit.id.c_str());
-}
-
 } // namespace
 
 CMPIStatus plain_enumerate_paths(const CMPIBroker* broker, const CMPIResult* result,
-                                 const CMPIObjectPath* cop)
+                                 const CMPIObjectPath* cop, plain_ends ends)
 {
     storage all = {};
     read_storage(all);
     const char* const name_space = CMGetCharPtr(CMGetNameSpace(cop, nullptr));
-    join(broker, all, [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
+    join(broker, all, ends, [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
         CMPIObjectPath* const to = path_to(broker, all, unit);
         CMPIObjectPath* const path =
             CMNewObjectPath(broker, name_space, "KALDERA_SCSIInitiatorTargetLogicalUnitPath", nullptr);
@@ -189,12 +197,13 @@ CMPIStatus plain_path_associator_names(const CMPIBroker* broker, const CMPIResul
     storage all = {};
     read_storage(all);
     const char* const wanted = plain_key(cop, "DeviceID");
-    join(broker, all, [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
-        if (unit.id != wanted)
-            return;
-        CMReturnObjectPath(result, initiator);
-        CMReturnObjectPath(result, target);
-    });
+    join(broker, all, plain_ends::once,
+         [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
+             if (unit.id != wanted)
+                 return;
+             CMReturnObjectPath(result, initiator);
+             CMReturnObjectPath(result, target);
+         });
     return {CMPI_RC_OK, nullptr};
 }
 
