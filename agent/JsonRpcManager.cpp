@@ -51,6 +51,9 @@ enum Place
 };
 constexpr Members<4>::Names PLACES = {"id", "method", "params", "version"};
 
+/// What every reply has, which need not be copied into each.
+const Json::StaticString ID_NAME("id"), RESULT_NAME("result"), VERSION_NAME("version"), OUR_VERSION("1.1");
+
 /// Throws in the JSON library's words if the request is neither an object nor null.
 void check_kind(const Json::Value& root)
 {
@@ -130,8 +133,8 @@ sint32 JsonRpcManager::answer(std::string_view request, String& text, Json_Tools
     // Clients of all versions are served alike, but a version must be a text.
     asView(told[VERSION]);
     if (told.has(ID))
-        reply["id"] = told[ID];
-    reply["version"] = "1.1";
+        reply[ID_NAME] = told[ID];
+    reply[VERSION_NAME] = OUR_VERSION;
     call(asView(told[METHOD]), told[PARAMS], reply);
 
     // The text is copied while the values stand: once they are gone, the allocator sorts what they leave
@@ -148,7 +151,7 @@ void JsonRpcManager::call(std::string_view name, const Json::Value& params, Json
     if (method == _methods.end())
         return fail(reply, "JSONRPCError", 105, "Procedure not found");
     try {
-        Json::Value& result = reply["result"];
+        Json::Value& result = reply[RESULT_NAME];
         method->second(params, result);
         lift_error(reply, result);
     } catch (const HbaAgentError& error) {

@@ -5,6 +5,7 @@
 
 #include <json/value.h>
 
+#include <algorithm>
 #include <functional>
 #include <string>
 #include <string_view>
@@ -56,9 +57,17 @@ public:
 private:
     JsonRpcManager() = default;
 
-    struct Hash : std::hash<std::string_view>
+    /// Of the last letters: the names of the methods differ there.
+    struct Hash
     {
         using is_transparent = void;
+        size_t operator()(std::string_view name) const
+        {
+            uint64 letters = 0;
+            const size_t count = std::min(name.size(), sizeof letters);
+            std::copy_n(name.end() - static_cast<ptrdiff_t>(count), count, reinterpret_cast<char*>(&letters));
+            return static_cast<size_t>((letters ^ name.size()) * 0x9E3779B97F4A7C15 >> 32);
+        }
     };
 
     sint32 answer(std::string_view request, String& text, Json_Tools& tools) const;
