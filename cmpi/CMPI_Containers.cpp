@@ -85,6 +85,12 @@ int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags
         data.value.string = CMNewString(_broker, text->c_str(), nullptr);
         return data.value.string ? _set(name, data) : _not_made(name);
     }
+    return _set_any(name, value, flags);
+}
+
+int CMPI_Container::_set_any(const char* name, const Value& value, uint32 flags)
+{
+    CMPIData data = {};
     Instance* end = nullptr;
     if (_ends && (flags & FLAG_REFERENCE) && value.get_value(end) == 0) {
         if (CMPIObjectPath* const path = _ends->find(name, end)) {

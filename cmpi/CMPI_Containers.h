@@ -47,6 +47,9 @@ protected:
     const char* _name_space;
 
 private:
+    /// Values that go the long way; apart, so that the others find a small function.
+    int _set_any(const char* name, const Value& value, uint32 flags);
+
     bool _gives_back = false;
     Shared_Ends* _ends = nullptr;
 };

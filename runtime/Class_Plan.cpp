@@ -115,13 +115,14 @@ Cell cell_of(const Meta_Feature* feature)
     const auto code = [](sint16 type, bool array) { return sint16(array ? ARRAY_BIT | type : type); };
     if (feature->flags & FLAG_PROPERTY) {
         const auto* const meta = static_cast<const Meta_Property*>(feature);
-        return {feature, meta->offset, code(sint16(meta->type), meta->subscript != 0),
-                uint8(null_offset(meta)), kind_of(meta)};
+        const uint32 size = null_offset(meta);
+        return {feature, meta->offset + size, code(sint16(meta->type), meta->subscript != 0), uint8(size),
+                kind_of(meta)};
     }
     if (feature->flags & FLAG_REFERENCE) {
         const auto* const meta = static_cast<const Meta_Reference*>(feature);
-        return {feature, meta->offset, code(INSTANCE, meta->subscript != 0), sizeof(void*),
-                meta->subscript ? Cell_Kind::REFERENCE_ARRAY : Cell_Kind::REFERENCE};
+        return {feature, uint32(meta->offset + sizeof(void*)), code(INSTANCE, meta->subscript != 0),
+                sizeof(void*), meta->subscript ? Cell_Kind::REFERENCE_ARRAY : Cell_Kind::REFERENCE};
     }
     return {feature, 0, -1, 0, Cell_Kind::NONE};
 }

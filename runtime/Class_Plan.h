@@ -20,23 +20,26 @@ enum class Cell_Kind : uint8
 struct Cell
 {
     const Meta_Feature* feature;
-    uint32 offset;
+    uint32 end;  ///< Where the value ends and the null byte stands: of most cells nothing else is read.
     sint16 type; ///< As `Value::Type` numbers it.
     uint8 size;  ///< Bytes of the value.
     Cell_Kind kind;
+
+    uint32 offset() const { return end - size; }
 
     /// Of a scalar, or of an array's elements.
     Type element_type() const { return static_cast<Type>(type & 0x7F); }
     template <class T>
     T& in(const Instance* instance) const
     {
-        return cell_at<T>(instance, offset);
+        return cell_at<T>(instance, offset());
     }
     bool is_null(const Instance* instance) const
     {
-        return kind == Cell_Kind::REFERENCE ? !in<Instance*>(instance)
-                                            : cell_at<uint8>(instance, offset + size) != 0;
+        return kind == Cell_Kind::REFERENCE ? !in<Instance*>(instance) : null(instance) != 0;
     }
+    /// Of any cell but a reference.
+    uint8& null(const Instance* instance) const { return cell_at<uint8>(instance, end); }
 };
 
 Cell cell_of(const Meta_Feature* feature);

@@ -25,8 +25,13 @@ int Container::convert(const Instance* instance, uint32 mask)
     };
     // Most cells are null, and nulls never leave the instance.
     visit_cells(meta_class, mask == FLAG_KEY ? Cells::KEYS : Cells::ALL, [&](const Cell& cell) INLINE {
-        if (!cell.is_null(instance))
-            put(cell);
+        if (cell.kind != Cell_Kind::REFERENCE) [[likely]] {
+            if (cell.null(instance)) [[likely]]
+                return;
+        } else if (cell.is_null(instance)) {
+            return;
+        }
+        put(cell);
     });
     return 0;
 }

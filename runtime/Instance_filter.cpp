@@ -12,7 +12,7 @@ void __set_null_flags(Instance* instance, bool include_keys, bool include_non_ke
     visit_cells(instance->__meta_class, include_non_keys ? Cells::ALL : Cells::KEYS,
                 [=](const Cell& cell) INLINE {
                     if (cell.kind < Cell_Kind::REFERENCE && (include_keys || !is_key(cell.feature)))
-                        cell_at<uint8>(instance, cell.offset + cell.size) = null_value;
+                        cell.null(instance) = null_value;
                 });
 }
 

@@ -51,7 +51,7 @@ TEST(Class_Plan, ACellSaysWhatItsRecordSays)
     for (const Meta_Feature* feature : features_of(&Sample_Types::static_meta_class)) {
         const Cell cell = cell_of(feature);
         const auto* const meta = static_cast<const Meta_Property*>(feature);
-        EXPECT_EQ(meta->offset, cell.offset);
+        EXPECT_EQ(meta->offset, cell.offset());
         EXPECT_EQ(null_offset(meta), cell.size);
         EXPECT_EQ(type_of(feature), cell.type);
     }
