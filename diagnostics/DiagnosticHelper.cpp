@@ -2,6 +2,7 @@
 
 #include "adapter/Adapter_List.h"
 #include "model/Fresh_Instances.h"
+#include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <algorithm>
@@ -129,8 +130,9 @@ DiagnosticJob DiagnosticHelper::createDiagnosticJob(const DiagnosticTestInput* i
     job.instance_id = job_id_of(ProviderUtil::getDiagTestName(input->test_id), getNextJobID());
     job.start_time = Datetime::now();
     job.elapsed_time = Datetime(uint64(0));
-    job.instance = create<KALDERA_ConcreteJob>(true);
-    job.instance->InstanceID.set(job.instance_id);
+    Ref<KALDERA_ConcreteJob> instance(create<KALDERA_ConcreteJob>(true));
+    instance->InstanceID.set(job.instance_id);
+    job.instance = instance.steal();
     return job;
 }
 

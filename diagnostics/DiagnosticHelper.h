@@ -12,6 +12,7 @@
 
 #include <atomic>
 #include <initializer_list>
+#include <memory>
 #include <vector>
 
 namespace KPRV {
@@ -129,7 +130,7 @@ private:
     Array<Instance*> read(List<T>& list, Make make);
 
     Run_Result start_loopback(const String& portId, const String& testName);
-    Run_Result start(const Diagnostic_Test& test, DiagnosticTestInput* input);
+    Run_Result start(const Diagnostic_Test& test, std::unique_ptr<DiagnosticTestInput> input);
 
     std::atomic<uint32> _record_number = 0;
     std::atomic<uint32> _job_number = 0;

@@ -31,11 +31,14 @@ bool getAdapterStatus(const String& address)
 int setPortState(const String& index, bool enable)
 {
     LOG_SCOPE("setPortState");
-    Json::Value request(Json::objectValue), answer;
-    request["indexStr"] = index.c_str();
-    request["port"]["portStatus"] = enable;
-    request["propArray"].append("portStatus");
-    guarded_call(LOG_HERE, {"libSetPortByWwn"}, libSetPortByWwn, request, answer);
+    Json::Value answer;
+    guarded(LOG_HERE, {"libSetPortByWwn"}, [&] {
+        Json::Value request(Json::objectValue);
+        request["indexStr"] = index.c_str();
+        request["port"]["portStatus"] = enable;
+        request["propArray"].append("portStatus");
+        answer = libSetPortByWwn(request);
+    });
     if (!ProviderUtil::isValidJsonResponse(answer))
         return -1;
     LOG(INFO, "setPortState - %s %d", index.c_str(), hasMember(answer, "status"));

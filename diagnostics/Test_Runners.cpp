@@ -9,6 +9,7 @@
 #include "runtime/log.h"
 
 #include <cstdio>
+#include <exception>
 #include <string>
 
 namespace KPRV {
@@ -52,10 +53,16 @@ public:
     const DiagnosticTestInput& input;
 
 private:
+    /// Without memory the record is lost, and nothing else of the run.
     void add(const char* text, bool is_service, diag_compl_record_state_t state, Log_Level level) const
     {
         log(level, __FILE_NAME__, __LINE__, "%s", text);
-        input.helper->generateDiagnosticRecord(text, is_service, &input, state);
+        try {
+            input.helper->generateDiagnosticRecord(text, is_service, &input, state);
+        } catch (const std::exception&) {
+            log(Log_Level::ERR, __FILE_NAME__, __LINE__, "no memory for a record of %s",
+                input.job_id.c_str());
+        }
     }
 };
 
@@ -135,6 +142,16 @@ void report_loopback(const Test_Run& run, const Loopback_Words& words, const Tes
     run.failed_with(Log_Level::ERR, words.status_format, answer.text("output").c_str());
 }
 
+/// What a loopback test of any kind is asked for.
+Json::Value port_request(const DiagnosticTestInput& input, const String& index)
+{
+    Json::Value request(Json::objectValue);
+    request["portWwn"] = index.c_str();
+    request["dataPattern"] = input.data_pattern;
+    request["frameCount"] = input.frame_count;
+    return request;
+}
+
 /// A port is known by one of the two. A loopback test of an FC port was given a MAC if a client wrote one.
 const String& port_address(const DiagnosticTestInput& input)
 {
@@ -144,11 +161,12 @@ const String& port_address(const DiagnosticTestInput& input)
 /// The road of both loopback tests. A port that somebody had disabled before is left so: it leaves the test
 /// in the state in which it came.
 ///
-/// Nothing guards the test's call: what the library throws there ends the thread as any uncaught exception
-/// does, and with it the server. A guard would turn it into a bad answer, and a bad answer reads as success:
+/// Nothing guards the test's call: what the library throws there ends the process, as any uncaught exception
+/// of a thread does. A guard would turn it into a bad answer, and a bad answer reads as success:
 /// a hardware test that blew up would be recorded as passed.
-template <class Call>
-void run_loopback(const Test_Run& run, const Loopback_Words& words, Call call)
+template <class Add_Members>
+void run_loopback(const Test_Run& run, const Loopback_Words& words, const JsonReqFP& entry,
+                  Add_Members add_members)
 {
     const auto pause = [&] {
         if (words.pauses)
@@ -156,6 +174,10 @@ void run_loopback(const Test_Run& run, const Loopback_Words& words, Call call)
     };
     const String& address = port_address(run.input);
     const String index = ProviderUtil::getIndexInColonFormat(address);
+    // Made before the port is touched: what fails for want of memory leaves it as it is.
+    Json::Value request = port_request(run.input, index);
+    request["mode"] = run.input.mode;
+    add_members(request);
     run.progress(words.checking);
     const bool was_disabled = PortHelper::getPortHelperObject()->isPortDisabled(address);
     if (was_disabled) {
@@ -170,7 +192,7 @@ void run_loopback(const Test_Run& run, const Loopback_Words& words, Call call)
         pause();
     }
     run.progress(words.running);
-    const Json::Value answer = call(index);
+    const Json::Value answer = [&]() noexcept { return entry(request); }();
     check_answer(words.entry, answer);
     pause();
     if (!was_disabled) {
@@ -182,15 +204,6 @@ void run_loopback(const Test_Run& run, const Loopback_Words& words, Call call)
     run.close_job();
     run.progress(words.checking_result);
     report_loopback(run, words, {words.entry, answer});
-}
-
-Json::Value port_request(const DiagnosticTestInput& input, const String& index)
-{
-    Json::Value request(Json::objectValue);
-    request["portWwn"] = index.c_str();
-    request["dataPattern"] = input.data_pattern;
-    request["frameCount"] = input.frame_count;
-    return request;
 }
 
 /// What is known of a failure, for the log alone.
@@ -211,12 +224,8 @@ void* DiagnosticHelper::runLoopbackTestThread(void* argument)
 {
     LOG_SCOPE("runLoopbackTestThread");
     const Test_Run run(argument);
-    run_loopback(run, FC_WORDS, [&](const String& index) {
-        Json::Value request = port_request(run.input, index);
-        request["mode"] = run.input.mode;
-        request["speed"] = run.input.speed;
-        return libDiagLoopbackTest(request);
-    });
+    run_loopback(run, FC_WORDS, libDiagLoopbackTest,
+                 [&](Json::Value& request) { request["speed"] = run.input.speed; });
     return nullptr;
 }
 
@@ -224,11 +233,7 @@ void* DiagnosticHelper::runEthLoopbackTestThread(void* argument)
 {
     LOG_SCOPE("runEthLoopbackTestThread");
     const Test_Run run(argument);
-    run_loopback(run, ETH_WORDS, [&](const String& index) {
-        Json::Value request = port_request(run.input, index);
-        request["mode"] = run.input.mode;
-        return libDiagEthLoopbackTest(request);
-    });
+    run_loopback(run, ETH_WORDS, libDiagEthLoopbackTest, [](Json::Value&) {});
     return nullptr;
 }
 

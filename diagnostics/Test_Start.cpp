@@ -3,10 +3,12 @@
 
 #include "adapter/Json_Access.h"
 #include "model/PortHelper.h"
+#include "runtime/Ref.h"
 #include "runtime/Thread.h"
 #include "runtime/log.h"
 
 #include <atomic>
+#include <exception>
 #include <memory>
 #include <pthread.h>
 
@@ -56,7 +58,16 @@ void* run_test(void* argument)
 {
     // Nothing joins the thread, so that its stack must go back by itself.
     pthread_detach(pthread_self());
-    return find_diagnostic_test(static_cast<const DiagnosticTestInput*>(argument)->test_id)->run(argument);
+    const auto& input = *static_cast<const DiagnosticTestInput*>(argument);
+    try {
+        return find_diagnostic_test(input.test_id)->run(argument);
+    } catch (const std::exception& error) {
+        // Memory ran out, in the module's own words or in the JSON library's. Without an end of its job no
+        // test would ever start again.
+        input.helper->updateJobState(input.job_id);
+        LOG(ERR, "test ended: %s", error.what());
+        return nullptr;
+    }
 }
 
 Run_Result refused(Run_Code code)
@@ -77,7 +88,7 @@ const Diagnostic_Test* test_by_name(classId_t class_id, const String& name)
 
 } // namespace
 
-Run_Result DiagnosticHelper::start(const Diagnostic_Test& test, DiagnosticTestInput* input)
+Run_Result DiagnosticHelper::start(const Diagnostic_Test& test, std::unique_ptr<DiagnosticTestInput> input)
 {
     input->test_id = test.id;
     input->frame_count = test.frame_count;
@@ -85,17 +96,24 @@ Run_Result DiagnosticHelper::start(const Diagnostic_Test& test, DiagnosticTestIn
     input->mode = test.mode;
     input->helper = this;
     LOG(INFO, "Creating the Job instance.");
-    const DiagnosticJob job = createDiagnosticJob(input);
+    const DiagnosticJob job = createDiagnosticJob(input.get());
+    Ref<KALDERA_ConcreteJob> instance(job.instance);
     input->job_id = job.instance_id;
     // Between the check for a running test and here no lock is held: two starts at the same moment can both
     // come through. The later job then takes the place of the other, and both tests run.
     addDiagnosticJob(job);
-    keep_for_ever(input);
     pin_module();
-    // A thread that cannot be made is not noticed: its job stays a running one, and refuses all others.
+    // A thread that the system does not make is not noticed: its job stays a running one, and refuses all
+    // others. One for which there is no memory is.
     Thread thread;
-    Thread::create_joinable(thread, run_test, input);
-    return {RUN_JOB_STARTED, job.instance};
+    try {
+        Thread::create_joinable(thread, run_test, input.get());
+    } catch (...) {
+        updateJobState(job.instance_id);
+        throw;
+    }
+    keep_for_ever(input.release());
+    return {RUN_JOB_STARTED, instance.steal()};
 }
 
 Run_Result DiagnosticHelper::runLoopbackTest(const String& portId, const String& testName)
@@ -136,7 +154,7 @@ Run_Result DiagnosticHelper::start_loopback(const String& portId, const String& 
             return refused(RUN_NOT_SUPPORTED);
     }
     const Diagnostic_Test* const test = test_by_name(LOOPBACKDIAGNOSTICTEST, testName);
-    return test ? start(*test, input.release()) : refused(RUN_INVALID_PARAMETER);
+    return test ? start(*test, std::move(input)) : refused(RUN_INVALID_PARAMETER);
 }
 
 Run_Result DiagnosticHelper::runEthLoopbackTest(const String& portId, const String& testName)
@@ -150,7 +168,7 @@ Run_Result DiagnosticHelper::runEthLoopbackTest(const String& portId, const Stri
         return refused(RUN_INVALID_PARAMETER);
     }
     const Diagnostic_Test* const test = test_by_name(ETHLOOPBACKDIAGNOSTICTEST, testName);
-    return test ? start(*test, input.release()) : refused(RUN_INVALID_PARAMETER);
+    return test ? start(*test, std::move(input)) : refused(RUN_INVALID_PARAMETER);
 }
 
 Run_Result DiagnosticHelper::runPCILoopbackTest(const String& portId)
@@ -163,7 +181,7 @@ Run_Result DiagnosticHelper::runPCILoopbackTest(const String& portId)
         LOG(ERR, "%s - Invalid port WWN or MAC value", portId.c_str());
         return refused(RUN_INVALID_PARAMETER);
     }
-    return start(*find_diagnostic_test(PCI_LOOPBACK_TEST), input.release());
+    return start(*find_diagnostic_test(PCI_LOOPBACK_TEST), std::move(input));
 }
 
 Run_Result DiagnosticHelper::runMemoryTest(const String& address)
@@ -183,7 +201,7 @@ Run_Result DiagnosticHelper::runMemoryTest(const String& address)
     input->class_id = PORTCONTROLLER;
     input->adapter_id = adapter_id;
     input->adapter_address = address;
-    return start(*find_diagnostic_test(MEMORY_TEST), input.release());
+    return start(*find_diagnostic_test(MEMORY_TEST), std::move(input));
 }
 
 } // namespace KPRV

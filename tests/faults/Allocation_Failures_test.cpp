@@ -110,6 +110,28 @@ TEST_F(Allocation_Failures, OfTheAgent)
         });
 }
 
+TEST_F(Allocation_Failures, OfAFirmwareUpdate)
+{
+    const auto first = [this](const char* name) {
+        return server->enumerate_instance_names(name).paths.at(0);
+    };
+    const host::Path_Value service = first("KALDERA_HBASoftwareInstallationService");
+    const host::Path_Value controller = first("KALDERA_PortController");
+    // The library agrees, and stays as it is.
+    simulator.add_fault(R"({"call": "adapterUpdateFlash", "do": "answer",
+                            "answer": {"status": 0, "message": "done"}})");
+    const host::Value update = host::Value::unsigned_number(CMPI_uint16, 5);
+    const auto install = [&] {
+        return server->invoke_method(service, "InstallFromURI",
+                                     {{"URI", host::Value::text("file:///firmware/image")},
+                                      {"Target", host::Value::path(controller)},
+                                      {"InstallOptions", host::Value::array(CMPI_uint16, {update})}});
+    };
+    // The last text is for the log alone, so that its loss changes no answer.
+    for (const bool once : {false, true})
+        starve("InstallFromURI", install, true, once);
+}
+
 TEST_F(Allocation_Failures, OfAssociations)
 {
     const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;

@@ -1,5 +1,6 @@
 #include "tests/faults/Failing_Allocator.h"
 
+#include <atomic>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
@@ -25,9 +26,12 @@ Library watched = {nullptr};
 Library helpers[] = {{"libstdc++"}, {"libjsoncpp"}};
 bool with_helpers = false;
 
+std::atomic<unsigned long> first_on_new_threads = 0;
+std::atomic<unsigned long> last_on_new_threads = 0;
+
 thread_local unsigned long seen = 0;
-thread_local unsigned long first_to_fail = 0;
-thread_local unsigned long last_to_fail = 0;
+thread_local unsigned long first_to_fail = first_on_new_threads;
+thread_local unsigned long last_to_fail = last_on_new_threads;
 
 int find_library(dl_phdr_info* info, size_t, void* data)
 {
@@ -102,6 +106,12 @@ void fail_allocation(unsigned long nth, bool once)
     seen = 0;
     first_to_fail = nth;
     last_to_fail = once ? nth : ~0ul;
+}
+
+void fail_allocation_of_new_threads(unsigned long nth, bool once)
+{
+    first_on_new_threads = nth;
+    last_on_new_threads = once ? nth : ~0ul;
 }
 
 unsigned long mend_memory()
