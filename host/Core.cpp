@@ -9,9 +9,6 @@ namespace KPRV::host {
 
 namespace {
 
-/// Released shells that are remembered. Enough for every object of one large operation.
-constexpr std::size_t max_retired = 1 << 18;
-
 /// All addresses that any host has handed out, in shards so that threads rarely wait for each other.
 class Address_Book
 {
@@ -94,7 +91,7 @@ void Core::retire(Object& object)
         return;
     retired_.push_back(std::move(at->second));
     objects_.erase(at);
-    if (retired_.size() > max_retired) {
+    if (retired_.size() > options.most_shells) {
         address_book().remove(retired_.front().get());
         retired_.pop_front();
     }

@@ -55,6 +55,9 @@ struct Host_Options
     CMPIrc unknown_name_space_rc = CMPI_RC_ERR_INVALID_NAMESPACE;
     /// Name space of the module's classes.
     std::string name_space = "root/kaldera";
+    /// How many released objects are remembered, so that a later use of one is seen. Enough for every object
+    /// of one large operation.
+    std::size_t most_shells = 1 << 18;
 
     /// The two public servers whose behaviour was measured.
     static Host_Options sfcb_like();

@@ -4,9 +4,16 @@
 
 namespace KPRV::simulator {
 
+void Recorder::keep(std::size_t most)
+{
+    most_ = std::max<std::size_t>(most, 1);
+    while (calls_.size() > most_)
+        calls_.pop_front();
+}
+
 void Recorder::add(const char* symbol, const Json::Value& request)
 {
-    if (calls_.size() == most_calls)
+    if (calls_.size() == most_)
         calls_.pop_front();
     calls_.push_back({symbol, request});
 }

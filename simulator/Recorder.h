@@ -12,8 +12,10 @@ namespace KPRV::simulator {
 class Recorder
 {
 public:
-    static constexpr std::size_t most_calls = 65536;
+    static constexpr std::size_t MOST_CALLS = 65536;
 
+    /// How many calls are remembered from now on, at least one.
+    void keep(std::size_t most);
     void add(const char* symbol, const Json::Value& request);
     void clear() { calls_.clear(); }
 
@@ -29,6 +31,7 @@ private:
         const char* symbol;
         Json::Value request;
     };
+    std::size_t most_ = MOST_CALLS;
     std::deque<Call> calls_;
 };
 

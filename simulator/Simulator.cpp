@@ -186,6 +186,12 @@ void Simulator::clear_calls()
     recorder_.clear();
 }
 
+void Simulator::keep_calls(std::size_t most)
+{
+    const std::lock_guard lock(mutex_);
+    recorder_.keep(most);
+}
+
 Json::Value Simulator::status()
 {
     const std::lock_guard lock(mutex_);

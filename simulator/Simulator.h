@@ -48,6 +48,8 @@ public:
 
     Json::Value calls();
     void clear_calls();
+    /// How many of the latest calls are recorded.
+    void keep_calls(std::size_t most);
 
     /// What a caller has registered, and why the inventory was refused.
     Json::Value status();

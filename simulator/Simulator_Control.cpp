@@ -117,6 +117,11 @@ void Simulator_Control::clear_calls()
     CONTROL(simulator_clear_calls)();
 }
 
+void Simulator_Control::keep_calls(unsigned most)
+{
+    CONTROL(simulator_keep_calls)(most);
+}
+
 Json::Value Simulator_Control::status()
 {
     return parsed(CONTROL(simulator_status)());

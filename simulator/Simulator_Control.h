@@ -53,6 +53,8 @@ public:
     std::vector<std::string> call_names();
     std::vector<Json::Value> requests(const std::string& name);
     void clear_calls();
+    /// How many of the latest calls are recorded from now on.
+    void keep_calls(unsigned most);
 
     /// The object that simulator_status of control.h describes.
     Json::Value status();

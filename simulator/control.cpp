@@ -74,6 +74,11 @@ void simulator_clear_calls(void)
     Simulator::instance().clear_calls();
 }
 
+void simulator_keep_calls(unsigned most)
+{
+    Simulator::instance().keep_calls(most);
+}
+
 const char* simulator_status(void)
 {
     return given(KPRV::simulator::compact_text(Simulator::instance().status()));

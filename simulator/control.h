@@ -35,9 +35,10 @@ SIMULATOR_EXPORT int simulator_wait_for_calls(const char* symbol, unsigned count
 
 /* The calls of entry points in order, oldest first: a JSON array of {"call", "request"}. A callback
  * registration has the request {"callback": true}, or false for a null pointer. The latest 65,536
- * are kept. */
+ * are kept, or as many as simulator_keep_calls has said, at least one. */
 SIMULATOR_EXPORT const char* simulator_calls(void);
 SIMULATOR_EXPORT void simulator_clear_calls(void);
+SIMULATOR_EXPORT void simulator_keep_calls(unsigned most);
 
 /* A JSON object: "initialised", "wantsEvents", "logCallback", "eventCallback" (booleans) and
  * "problem", the reason why the inventory was refused, or "". */

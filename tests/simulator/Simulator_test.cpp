@@ -43,6 +43,23 @@ TEST_F(Simulator_test, forgets_the_oldest_of_very_many_calls)
     EXPECT_TRUE(simulator.requests("getServerTime").empty());
 }
 
+TEST_F(Simulator_test, keeps_as_many_calls_as_it_is_told)
+{
+    for (const unsigned most : {2U, 1U, 0U}) {
+        call("getHost");
+        call("getServerTime");
+        integer("getRequestID");
+        simulator.keep_calls(most);
+        const std::vector<std::string> latest = {"getServerTime", "getRequestID"};
+        EXPECT_EQ(std::vector<std::string>(latest.end() - (most == 2 ? 2 : 1), latest.end()),
+                  simulator.call_names());
+        call("getHost");
+        EXPECT_EQ(simulator.call_names().back(), "getHost");
+        EXPECT_EQ(simulator.calls().size(), most == 2 ? 2U : 1U);
+    }
+    simulator.keep_calls(65536);
+}
+
 TEST_F(Simulator_test, a_call_that_is_held_lets_the_others_go_on)
 {
     simulator.add_fault(R"({"call": "getHost", "do": "hold"})");
