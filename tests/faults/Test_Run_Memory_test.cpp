@@ -97,6 +97,15 @@ TEST_P(Test_Thread_Memory, EndsTheRunAlone)
     in_child([&] {
         start_host(GetParam().test, GetParam().element);
         expect_a_good_run();
+        const auto records = [this] {
+            return server->enumerate_instances("KALDERA_DiagnosticCompletionRecord").instances.size();
+        };
+        const size_t before = records();
+        fail_allocation_of_new_threads(1);
+        start();
+        wait_for_the_end();
+        fail_allocation_of_new_threads(0);
+        EXPECT_EQ(before, records()) << "memory did not fail";
         constexpr unsigned long MOST = 120; // a run asks for up to 91
         for (const bool once : {false, true}) {
             for (unsigned long nth = 1; nth <= MOST; nth++) {
