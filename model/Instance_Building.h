@@ -53,14 +53,4 @@ inline String to_String(std::string_view text)
     return String(text.data(), static_cast<uint32>(text.size()));
 }
 
-/// The texts one behind the other, up to 255 characters: more than the fields of any record together.
-inline String joined(std::initializer_list<std::string_view> texts)
-{
-    char all[255];
-    size_t size = 0;
-    for (const std::string_view text : texts)
-        size += text.copy(all + size, sizeof all - size);
-    return to_String({all, size});
-}
-
 } // namespace KPRV

@@ -50,6 +50,16 @@ std::string_view trimmed(const char* text)
     return ProviderUtil::trimmed(text);
 }
 
+/// The texts one behind the other, up to 255 characters: more than the fields that name a LUN hold together.
+String joined(std::initializer_list<std::string_view> texts)
+{
+    char all[255];
+    size_t size = 0;
+    for (const std::string_view text : texts)
+        size += text.copy(all + size, sizeof all - size);
+    return to_String({all, size});
+}
+
 String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {

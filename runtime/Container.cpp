@@ -25,6 +25,7 @@ int Container::convert(const Instance* instance, uint32 mask)
     };
     // Most cells are null, and nulls never leave the instance.
     visit_cells(meta_class, mask == FLAG_KEY ? Cells::KEYS : Cells::ALL, [&](const Cell& cell) INLINE {
+        // As `is_null`, but for a property it is one byte that is looked at.
         if (cell.kind != Cell_Kind::REFERENCE) [[likely]] {
             if (cell.null(instance)) [[likely]]
                 return;
