@@ -2,6 +2,8 @@
 
 #include "runtime/features.h"
 
+#include <algorithm>
+
 namespace KPRV {
 
 enum class Cell_Kind : uint8
@@ -86,6 +88,22 @@ void visit_cells(const Meta_Class* meta_class, Cells cells, Visitor&& visitor)
         if (belongs(cell, cells))
             visitor(cell);
     }
+}
+
+/// Whether the predicate holds for each cell of the group. The last cell is asked first: of the keys it is
+/// the one that tells most objects of a host apart.
+template <class Predicate>
+bool all_cells(const Meta_Class* meta_class, Cells cells, Predicate&& predicate)
+{
+    if (const Class_Plan* const plan = plan_of(meta_class)) {
+        const auto group = (*plan)[cells];
+        return std::all_of(group.rbegin(), group.rend(), predicate);
+    }
+    const auto features = features_of(meta_class);
+    return std::all_of(features.rbegin(), features.rend(), [&](const Meta_Feature* feature) {
+        const Cell cell = cell_of(feature);
+        return !belongs(cell, cells) || predicate(cell);
+    });
 }
 
 } // namespace KPRV

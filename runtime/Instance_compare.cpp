@@ -95,11 +95,13 @@ bool key_eq(const Instance* a, const Instance* b)
 {
     if (!a || !b)
         return a == b;
-    bool equal = true;
-    visit_cells(a->__meta_class, Cells::KEYS, [&](const Cell& cell) INLINE {
-        equal = equal && visit_feature(cell.feature, Key_Comparer{a, b});
+    const bool same_class = a->__meta_class == b->__meta_class;
+    return all_cells(a->__meta_class, Cells::KEYS, [=](const Cell& cell) {
+        // Nearly all keys are texts.
+        if (same_class && cell.kind == Cell_Kind::TEXT)
+            return cell.null(a) == cell.null(b) && cell.in<String>(a) == cell.in<String>(b);
+        return visit_feature(cell.feature, Key_Comparer{a, b});
     });
-    return equal;
 }
 
 bool identical(const Instance* a, const Instance* b)

@@ -8,6 +8,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <thread>
 #include <vector>
 
@@ -88,6 +89,26 @@ TEST(Class_Plan, WhatIsMadeAtRunTimeHasNoneAndIsWalkedAllTheSame)
     EXPECT_EQ(plan_of(ported)->groups[static_cast<size_t>(Cells::HOLDERS)].size(), walked.size());
     destroy(made);
     EXPECT_EQ(nullptr, plan_of(&Instance::static_meta_class));
+}
+
+TEST(Class_Plan, CellsAreAskedFromTheLastOnUntilOneDenies)
+{
+    Meta_Class* const made = create_meta_class("Made", &Sample_Types::static_meta_class, 0);
+    for (const Meta_Class* meta_class :
+         {&Sample_Types::static_meta_class, static_cast<const Meta_Class*>(made)}) {
+        std::vector<const Meta_Feature*> forwards, backwards;
+        visit_cells(meta_class, Cells::ALL, [&](const Cell& cell) { forwards.push_back(cell.feature); });
+        EXPECT_TRUE(all_cells(meta_class, Cells::ALL, [&](const Cell& cell) {
+            backwards.push_back(cell.feature);
+            return true;
+        }));
+        std::reverse(backwards.begin(), backwards.end());
+        EXPECT_EQ(forwards, backwards);
+        size_t asked = 0;
+        EXPECT_FALSE(all_cells(meta_class, Cells::HOLDERS, [&](const Cell&) { return ++asked < 2; }));
+        EXPECT_EQ(2u, asked);
+    }
+    destroy(made);
 }
 
 TEST(Class_Plan, AnotherRecordInTheSamePlaceIsNotTakenForTheFirst)
