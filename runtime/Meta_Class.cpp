@@ -30,8 +30,13 @@ bool is_subclass(const Meta_Class* ancestor, const Meta_Class* descendant)
     // Other records of that name count as the root too: copies made at run time.
     if (ancestor == &Instance::static_meta_class || name_eq(ancestor->name, Instance::static_meta_class.name))
         return true;
+    // Mostly the very record is found, for which no name need be compared.
     for (const Meta_Class* p = descendant; p; p = super_of(p)) {
-        if (p == ancestor || name_eq(p->name, ancestor->name))
+        if (p == ancestor)
+            return true;
+    }
+    for (const Meta_Class* p = descendant; p; p = super_of(p)) {
+        if (name_eq(p->name, ancestor->name))
             return true;
     }
     return false;

@@ -84,6 +84,7 @@ struct Find_By_Key
 struct Find_Associators
 {
     const Instance* instance;
+    Fitting_References fitting;
     String result_class;
     String role;
     String result_role;
@@ -97,8 +98,8 @@ struct Find_Associators
             return false;
         const std::unique_ptr<Instance, decltype(&destroyer)> owner(association, destroyer);
         Instance* far_ends[MAX_ASSOCIATORS];
-        const int count = get_associators(self->instance, association, self->result_class, self->role,
-                                          self->result_role, far_ends);
+        const int count = get_associators(self->instance, self->fitting, association, self->result_class,
+                                          self->role, self->result_role, far_ends);
         for (int i = 0; i < count; i++) {
             ref(far_ends[i]);
             self->proc(far_ends[i], 0, self->client_data);
@@ -216,7 +217,8 @@ int Provider_Handle::enum_associator_names(const Instance* instance, const Strin
 
     const Ref<Instance> model(create(meta_class, false));
     __set_null_flags(model.ptr(), false, true, 1);
-    Find_Associators data{instance, result_class, role, result_role, proc, client_data};
+    Find_Associators data{instance,   Fitting_References(instance), result_class, role, result_role, proc,
+                          client_data};
     const int status = enum_instances(model.ptr(), Find_Associators::_proc, &data);
     proc(nullptr, 0, client_data);
 

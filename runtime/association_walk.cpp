@@ -42,14 +42,33 @@ static bool is_a(const Meta_Class* meta_class, const String& name)
     return false;
 }
 
+bool Fitting_References::fits(const Meta_Reference* reference)
+{
+    for (Known& known : _known) {
+        if (!known.reference)
+            known = {reference, is_subclass(reference->meta_class, _class)};
+        if (known.reference == reference)
+            return known.fits;
+    }
+    return is_subclass(reference->meta_class, _class);
+}
+
 int get_associators(const Instance* instance, const Instance* association, const String& result_class,
                     const String& role, const String& result_role, Instance* (&out)[MAX_ASSOCIATORS])
+{
+    Fitting_References fitting(instance);
+    return get_associators(instance, fitting, association, result_class, role, result_role, out);
+}
+
+int get_associators(const Instance* instance, Fitting_References& fitting, const Instance* association,
+                    const String& result_class, const String& role, const String& result_role,
+                    Instance* (&out)[MAX_ASSOCIATORS])
 {
     bool found = false;
     size_t count = 0;
     for_each_target(association, [&](const Meta_Reference* reference, Instance* target) {
         // Both ends of a self-association are near ends, so neither is an answer.
-        if (is_subclass(reference->meta_class, instance->__meta_class) && key_eq(instance, target)) {
+        if (fitting.fits(reference) && key_eq(instance, target)) {
             if (passes(role, reference->name))
                 found = true;
         } else if (is_a(target->__meta_class, result_class) && passes(result_role, reference->name)) {

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <vector>
+
 using namespace KPRV;
 
 namespace {
@@ -95,6 +97,26 @@ TEST(association_walk, result_class_is_the_far_end_or_an_ancestor)
     EXPECT_EQ(far_ends(a, link, {.result_class = "Sample_Element"}), "b;");
     EXPECT_EQ(far_ends(a, link, {.result_class = "Sample_Other"}), "");
     EXPECT_EQ(far_ends(b, link, {.result_class = "Sample_Port"}), "") << "a subclass of the far end";
+}
+
+TEST(association_walk, what_fits_is_the_same_whenever_it_is_asked)
+{
+    const Ref<Instance> port(make_port("p"));
+    const Meta_Class* const classes[] = {&Sample_Other::static_meta_class, &Sample_Element::static_meta_class,
+                                         &Sample_Group::static_meta_class, &Sample_Port::static_meta_class,
+                                         &Instance::static_meta_class,     &Sample_Types::static_meta_class};
+    std::vector<Meta_Reference> references;
+    for (const Meta_Class* meta_class : classes) {
+        references.push_back(_Sample_Link_Antecedent);
+        references.back().meta_class = meta_class;
+    }
+    Fitting_References fitting(port.ptr());
+    for (int pass = 0; pass < 2; pass++) {
+        for (const Meta_Reference& reference : references) {
+            EXPECT_EQ(is_subclass(reference.meta_class, port->__meta_class), fitting.fits(&reference))
+                << reference.meta_class->name;
+        }
+    }
 }
 
 TEST(association_walk, reference_arrays_take_no_part)
