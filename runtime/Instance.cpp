@@ -2,6 +2,7 @@
 
 #include "runtime/Atomic.h"
 #include "runtime/Class_Plan.h"
+#include "runtime/empty_arrays.h"
 #include "runtime/features.h"
 #include "runtime/type_dispatch.h"
 
@@ -156,7 +157,7 @@ void __destruct(Instance* instance)
     visit_cells(instance->__meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
         if (cell.kind == Cell_Kind::TEXT)
             cell.in<String>(instance).~String();
-        else
+        else if (cell.kind != Cell_Kind::ARRAY || !is_empty_array(cell.in<__Array_Rep*>(instance)))
             release(instance, cell);
     });
     unref(instance->__meta_class);
