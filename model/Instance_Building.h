@@ -4,7 +4,7 @@
 #include "adapter/ProviderUtil.h"
 #include "runtime/Array.h"
 #include "runtime/Instance.h"
-#include "runtime/Ref.h"
+#include "runtime/Prototype.h"
 
 #include <initializer_list>
 #include <string_view>
@@ -16,14 +16,12 @@ namespace KPRV {
 template <class T>
 T* create_null()
 {
-    // Cloned from one that is kept: cheaper than to make one and clear it.
-    static const Ref<T> all_null = [] {
-        Ref<T> instance(create<T>(false));
-        clear(instance.ptr());
+    static const Prototype<T> all_null([] {
+        T* const instance = create<T>(false);
+        clear(instance);
         return instance;
-    }();
-    static const bool is_blank = holds_nothing(all_null.ptr());
-    return is_blank ? static_cast<T*>(clone_of_blank(all_null.ptr())) : clone_of<T>(all_null.ptr());
+    }());
+    return all_null.copy();
 }
 
 template <class T>

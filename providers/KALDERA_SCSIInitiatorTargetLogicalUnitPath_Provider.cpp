@@ -115,7 +115,7 @@ private:
     static void deliver(Enum_Instances_Handler<Path>& handler, const Instance* initiator,
                         const Instance* target, const Instance* unit)
     {
-        Ref<Path> path(create<Path>(true));
+        Ref<Path> path(create_association<Path>());
         set_end(path.ptr(), &Path::Initiator, initiator);
         set_end(path.ptr(), &Path::Target, target);
         set_end(path.ptr(), &Path::LogicalUnit, unit);

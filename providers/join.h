@@ -3,7 +3,7 @@
 #include "providers/Position_Index.h"
 #include "providers/deliver.h"
 #include "runtime/Property.h"
-#include "runtime/Ref.h"
+#include "runtime/Prototype.h"
 
 namespace KPRV {
 
@@ -25,6 +25,14 @@ void set_end(A* association, Target* A::*role, const Instance* end)
     }
 }
 
+/// An association without ends, its other properties as `create` with defaults leaves them.
+template <class A>
+A* create_association()
+{
+    static const Prototype<A> as_created(create<A>(true));
+    return as_created.copy();
+}
+
 /// Makes associations of two ends and hands each over.
 template <class A, class First, class Second>
 class Pairs
@@ -37,7 +45,7 @@ public:
 
     void operator()(const Instance* first, const Instance* second) const
     {
-        Ref<A> association(create<A>(true));
+        Ref<A> association(create_association<A>());
         set_end(association.ptr(), _first_role, first);
         set_end(association.ptr(), _second_role, second);
         _handler->handle(association.steal());
