@@ -34,8 +34,12 @@ class Units
 public:
     explicit Units(const List<Unit>& units) : _units(units)
     {
+        std::string_view pair;
         for (uint32 i = 0; i < units.size(); i++) {
-            const std::string_view pair = up_to_separator(view_of(units[i]->DeviceID.value), 2);
+            const std::string_view id = view_of(units[i]->DeviceID.value);
+            // The units of a target stand together, and the pair before has one separator in it.
+            if (pair.empty() || id.size() <= pair.size() || id[pair.size()] != '_' || !id.starts_with(pair))
+                pair = up_to_separator(id, 2);
             if (!pair.empty())
                 _index.add(pair, i);
         }
