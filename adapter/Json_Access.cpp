@@ -23,10 +23,12 @@ T number(const Json::Value& value, const char* failure)
             return static_cast<T>(n);
         break;
     }
-    case Json::uintValue:
-        if (value.asLargestUInt() <= std::numeric_limits<T>::max())
-            return static_cast<T>(value.asLargestUInt());
+    case Json::uintValue: {
+        const Json::UInt64 n = value.asUInt64();
+        if (n <= std::numeric_limits<T>::max())
+            return static_cast<T>(n);
         break;
+    }
     case Json::realValue: {
         const double n = value.asDouble();
         if (n >= std::numeric_limits<T>::min() && n <= std::numeric_limits<T>::max())
@@ -55,8 +57,11 @@ std::string_view asView(const Json::Value& value)
 {
     const char* begin = nullptr;
     const char* end = nullptr;
+    if (value.getString(&begin, &end))
+        return {begin, size_t(end - begin)};
+    // An empty one that was never given a text.
     if (value.isString())
-        return value.getString(&begin, &end) ? std::string_view(begin, size_t(end - begin)) : "";
+        return "";
     if (value.isNull())
         return "";
     if (value.isBool())
