@@ -32,21 +32,21 @@ bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_descr
     const Members<NUM_NAMES> members(element, names);
     if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
         return false;
-    copy_flat(lun.remoteWWN, remote_wwn);
+    copy_text(lun.remoteWWN, remote_wwn);
     lun.number = asUInt(members[NUMBER]);
-    copy_text(lun.vendor, text_of(members[VENDOR]));
-    copy_text(lun.productID, text_of(members[PRODUCT_ID]));
+    copy_text(lun.vendor, asView(members[VENDOR]));
+    copy_text(lun.productID, asView(members[PRODUCT_ID]));
     lun.idType = asUInt(members[ID_TYPE]);
 
     if (members.has(DESCRIPTION))
-        copy_text(lun.description, text_of(members[DESCRIPTION]));
+        copy_text(lun.description, asView(members[DESCRIPTION]));
     else
         no_description_seen = true;
     // One LUN without a description puts all that follow in the same walk under these rules, those with a
     // description, too: the names of LUNs that clients already keep depend on it.
     if (no_description_seen) {
         if (members.has(SERIAL_NUMBER))
-            copy_text(lun.serialNumber, text_of(members[SERIAL_NUMBER]));
+            copy_text(lun.serialNumber, asView(members[SERIAL_NUMBER]));
         lun.idType = members.has(SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
     }
     return true;

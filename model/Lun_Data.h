@@ -20,7 +20,8 @@ struct _hbaLunInfo
     uint32 idType; ///< What identifies the LUN; decides on the form of its name.
 };
 
-/// Fills the record from an element of `lunList`; false if it lacks what a LUN must have.
+/// Fills the record from an element of `lunList` of a remote port, given by its flat address; false if it
+/// lacks what a LUN must have.
 /// `no_description_seen` is the walk's: it is set by the first LUN without a description and from then on
 /// decides for all. Throws `Not_Convertible` for a member of the wrong type.
 bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen,

@@ -1,11 +1,14 @@
 #include "adapter/ProviderUtil.h"
 #include "model/Instance_Building.h"
+#include "model/Record_Filling.h"
 #include "model/TargetHelper.h"
 #include "runtime/Ref.h"
 #include "runtime/log.h"
 
 #include <algorithm>
+#include <array>
 #include <iterator>
+#include <utility>
 
 namespace KPRV {
 
@@ -50,21 +53,35 @@ std::string_view trimmed(const char* text)
     return ProviderUtil::trimmed(text);
 }
 
-/// The texts one behind the other, up to 255 characters: more than the fields that name a LUN hold together.
-String joined(std::initializer_list<std::string_view> texts)
+/// Texts and single characters one behind the other, up to 255 characters: more than the fields that name a
+/// LUN hold together.
+class Joined
 {
-    char all[255];
-    size_t size = 0;
-    for (const std::string_view text : texts)
-        size += text.copy(all + size, sizeof all - size);
-    return to_String({all, size});
-}
+public:
+    template <class... Parts>
+    explicit Joined(const Parts&... parts)
+    {
+        (add(parts), ...);
+    }
+    operator String() const { return to_String({_text, _size}); }
+
+private:
+    void add(std::string_view part) { _size += copy_cut(_text + _size, sizeof _text - _size, part); }
+    void add(char part)
+    {
+        if (_size < sizeof _text)
+            _text[_size++] = part;
+    }
+
+    char _text[255];
+    size_t _size = 0;
+};
 
 String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {
     case Named_By::PRODUCT:
-        return joined({trimmed(lun.vendor), "+", trimmed(lun.productID), "+", trimmed(lun.serialNumber)});
+        return Joined(trimmed(lun.vendor), '+', trimmed(lun.productID), '+', trimmed(lun.serialNumber));
     case Named_By::DESCRIPTION:
         return lun.description;
     case Named_By::NOTHING:
@@ -74,24 +91,41 @@ String name(Named_By source, const _hbaLunInfo& lun)
 }
 
 /// A LUN goes by the path on which it is seen.
-String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, std::string_view element)
+String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const String& element)
 {
-    return joined({port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
-                   "_", element});
+    return Joined(port.portWWN, '_', lun.remoteWWN, '_', trimmed(lun.vendor), '_', trimmed(lun.productID),
+                  '_', std::string_view(element.c_str(), element.size()));
+}
+
+/// Signed: a number beyond the positive range shows as a negative one.
+String numbered_name(uint32 number)
+{
+    return to_String("LUN_" + std::to_string(static_cast<sint32>(number)));
+}
+
+/// Most LUNs of a host bear one of the first numbers: those share their names.
+String element_name(uint32 number)
+{
+    static const auto first_names = [] {
+        std::array<String, 64> names;
+        for (uint32 i = 0; i < names.size(); i++)
+            names[i] = numbered_name(i);
+        return names;
+    }();
+    return number < first_names.size() ? first_names[number] : numbered_name(number);
 }
 
 /// What the three classes have in common.
 template <class T>
 T* create_lun(classId_t id, const String& identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
-    // Signed: a number beyond the positive range shows as a negative one.
-    const std::string element = "LUN_" + std::to_string(static_cast<sint32>(lun.number));
-    const String device_id = device_id_of(port, lun, element);
+    String element = element_name(lun.number);
+    String device_id = device_id_of(port, lun, element);
     Ref<T> instance(create_null<T>());
     set_system_keys(*instance, id, port.systemName);
-    instance->ElementName.set(to_String(element));
-    instance->DeviceID.set(device_id);
+    instance->ElementName.set(std::move(element));
     instance->OtherIdentifyingInfo.set(array_of(device_id));
+    instance->DeviceID.set(std::move(device_id));
     instance->IdentifyingDescriptions.set(array_of(identification));
     instance->OperationalStatus.set(array_of<uint16>({2}));
     return instance.steal();

@@ -48,7 +48,7 @@ void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _
     copy_flat(port.localWWN, text_of(members[WWN]));
     copy_text(port.portWWN, port.localWWN);
     copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
-    copy_text(port.symbolicName, text_of(members[SYMBOLIC_NAME]));
+    copy_text(port.symbolicName, asView(members[SYMBOLIC_NAME]));
     port.status = asInt(members[STATUS]);
     port.systemName = host.get();
     port.portType = asInt(members[PORT_TYPE]);

@@ -11,13 +11,17 @@ namespace KPRV {
 // first zero byte. What reads an answer throws `Not_Convertible` for a member of the wrong type; a missing
 // one is the empty text.
 
+/// Copies what there is room for and returns its size; does not terminate it.
+size_t copy_cut(char* to, size_t room, std::string_view text);
+
+/// A zero byte within the text goes along, and ends it where the field is read.
 template <size_t N>
 void copy_text(char (&field)[N], std::string_view text)
 {
-    field[text.copy(field, N - 1)] = '\0';
+    field[copy_cut(field, N - 1, text)] = '\0';
 }
 
-/// A text where it stands, up to its first zero byte.
+/// A text where it stands, up to its first zero byte: for what is done to it before it is in a field.
 inline std::string_view text_of(const Json::Value& value)
 {
     const std::string_view text = asView(value);
@@ -27,7 +31,7 @@ inline std::string_view text_of(const Json::Value& value)
 template <size_t N>
 void copy_member(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_text(field, text_of(member(object, name)));
+    copy_text(field, asView(member(object, name)));
 }
 
 /// Without blanks around it.

@@ -4,6 +4,7 @@
 #include "adapter/Json_Access.h"
 #include "adapter/ProviderUtil.h"
 #include "model/Fresh_Instances.h"
+#include "model/Record_Filling.h"
 #include "model/Remote_Ports.h"
 
 namespace KPRV {
@@ -79,14 +80,16 @@ void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
         return;
     }
     LOG(DBG, "Number of Luns = %d.", static_cast<int>(luns.size()));
+    char address[sizeof(_hbaLunInfo::remoteWWN)];
+    copy_flat(address, wwn);
     for (const Json::Value& element : luns)
-        guarded(LOG_HERE, entry, [&] { publish_lun(walk, wwn, element); });
+        guarded(LOG_HERE, entry, [&] { publish_lun(walk, address, element); });
 }
 
-void TargetHelper::publish_lun(Walk& walk, const char* wwn, const Json::Value& element) const
+void TargetHelper::publish_lun(Walk& walk, const char* address, const Json::Value& element) const
 {
     _hbaLunInfo lun = {};
-    if (!fill_lun(element, wwn, walk.no_description_seen, lun)) {
+    if (!fill_lun(element, address, walk.no_description_seen, lun)) {
         LOG(ERR, "LUN info is NOT available");
         return;
     }

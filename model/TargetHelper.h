@@ -36,7 +36,7 @@ private:
 
     struct Walk;
     void publish_target(Walk& walk, unsigned index, const char* wwn, const Json::Value& answer) const;
-    void publish_lun(Walk& walk, const char* wwn, const Json::Value& element) const;
+    void publish_lun(Walk& walk, const char* address, const Json::Value& element) const;
 
     const Logged_Life _life;
 };

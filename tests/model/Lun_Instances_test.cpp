@@ -1,9 +1,12 @@
 #include "model/Record_Filling.h"
 #include "model/TargetHelper.h"
+#include "runtime/Ref.h"
 #include "tests/model/Taken_Instances.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
+
+#include <map>
 
 using namespace KPRV;
 
@@ -86,6 +89,30 @@ TEST_F(Lun_Instances, a_disk_goes_by_its_device_name_if_it_has_one)
     EXPECT_EQ(disk["NameFormat"], "12");
     EXPECT_EQ(disk["NameNamespace"], "8");
     EXPECT_EQ(log.said("ERR"), Lines{});
+}
+
+TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
+{
+    for (const auto& [number, name] : std::map<uint32, std::string>{{0, "LUN_0"},
+                                                                    {1, "LUN_1"},
+                                                                    {63, "LUN_63"},
+                                                                    {64, "LUN_64"},
+                                                                    {2147483647, "LUN_2147483647"},
+                                                                    {2147483648, "LUN_-2147483648"},
+                                                                    {4294967295, "LUN_-1"}}) {
+        lun.number = number;
+        Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
+        EXPECT_EQ(disk["ElementName"], name);
+        EXPECT_EQ(disk["DeviceID"], "W__V_P_" + name);
+    }
+}
+
+TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
+{
+    lun.number = 1;
+    const Ref<KALDERA_LogicalDisk> first(helper->getLogicalDiskInstance(port, lun));
+    first->ElementName.value.append("!");
+    EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["ElementName"], "LUN_1");
 }
 
 TEST_F(Lun_Instances, builders_are_traced)

@@ -76,6 +76,18 @@ TEST_F(Targets, which_class_a_device_type_feeds)
     EXPECT_EQ(log.said("INFO"), Lines(8, "INFO Continue with next rport. Looking for another device type "));
 }
 
+TEST_F(Targets, a_text_ends_at_its_first_zero_byte)
+{
+    for (const char* name : {"vendor", "productID", "lunDescription"}) {
+        static constexpr char text[] = "A\0B";
+        described[name] = Json::Value(text, text + 3);
+    }
+    remote_ports({REMOTE}, target("Disk", {described}));
+    Set_Properties extent = walk(STORAGEEXTENT).at(0);
+    EXPECT_EQ(extent["DeviceID"], "10008c7cff000001_500601600000000a_A_A_LUN_1");
+    EXPECT_EQ(extent["Name"], "A");
+}
+
 TEST_F(Targets, disks_and_drives)
 {
     remote_ports({REMOTE}, target("Disk", {described}));
