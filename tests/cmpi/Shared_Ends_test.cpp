@@ -8,9 +8,8 @@ using host::Result;
 
 namespace {
 
-class Shared_Ends_Test : public testing::Test
+struct Shared_Ends_Test : testing::Test
 {
-protected:
     Shared_Ends_Test()
     {
         provider.factory('I');
@@ -82,6 +81,16 @@ protected:
         return links;
     }
 
+    /// The same of instances and of names.
+    void expect_made(Result (Shared_Ends_Test::*operation)(bool names), const Texts& links,
+                     std::pair<long, long> ends)
+    {
+        for (const bool names : {false, true}) {
+            EXPECT_EQ(links, links_of((this->*operation)(names))) << names;
+            EXPECT_EQ(ends, ends_made()) << names;
+        }
+    }
+
     Test_Server server;
     Served_Provider provider{server, link_registration};
     const Ref<Instance> a{make_named<Sample_Element>("a")};
@@ -93,21 +102,13 @@ protected:
 
 TEST_F(Shared_Ends_Test, an_end_becomes_a_path_once_for_all_in_a_row_that_have_it)
 {
-    const std::pair<long, long> once = {3, 5};
-    EXPECT_EQ(all, links_of(enumerate(false)));
-    EXPECT_EQ(once, ends_made());
-    EXPECT_EQ(all, links_of(enumerate(true)));
-    EXPECT_EQ(once, ends_made());
+    expect_made(&Shared_Ends_Test::enumerate, all, {3, 5});
 }
 
 TEST_F(Shared_Ends_Test, references_share_too)
 {
     // The fourth link is not delivered, so that all that is has one end.
-    const std::pair<long, long> once = {1, 4};
-    EXPECT_EQ(of_a, links_of(refer(false)));
-    EXPECT_EQ(once, ends_made());
-    EXPECT_EQ(of_a, links_of(refer(true)));
-    EXPECT_EQ(once, ends_made());
+    expect_made(&Shared_Ends_Test::refer, of_a, {1, 4});
 }
 
 TEST_F(Shared_Ends_Test, nothing_is_shared_between_requests)
