@@ -141,9 +141,7 @@ protected:
         if (name == "KALDERA_ComputerSystem") {
             EXPECT_EQ(texts, now);
         }
-        // What a pair says of a neighbour may be about the host, such as a test or a driver, which the first
-        // adapter's answer decides.
-        if (code.empty() || server->providers().serves(name, host::Mi_Kind::ASSOCIATION))
+        if (code.empty())
             return;
         for (const std::string& text : texts)
             if (is_of_neighbour(text, code) && !is_given_up(name, text, code)) {
@@ -155,12 +153,20 @@ protected:
             }
     }
 
-    /// The walk of the connectors ends with the first adapter that tells nothing of itself, unlike all
-    /// others.
     static bool is_given_up(const std::string& name, const std::string& text, const std::string& code)
     {
-        return name == "KALDERA_PhysicalConnector" && GetParam().entry_point == std::string("getHbaByWwn") &&
-               code == FIRST && !is_of(text, FIRST);
+        if (GetParam().entry_point != std::string("getHbaByWwn"))
+            return false;
+        // The walk of the connectors ends with the first adapter that tells nothing of itself, unlike all
+        // others.
+        if (text.find("KALDERA_PhysicalConnector") != std::string::npos)
+            return code == FIRST;
+        // The tests and the drivers of the host are told by its adapters together: what one of them answers
+        // changes them for all.
+        const std::set<std::string> of_host = {"KALDERA_AdapterElementSoftwareIdentity",
+                                               "KALDERA_AvailableDiagnosticServiceForEthernetPort",
+                                               "KALDERA_AvailableDiagnosticServiceForFCPort"};
+        return of_host.contains(name);
     }
 
     Picture healthy;
@@ -183,10 +189,7 @@ TEST_P(Listed_Answers, CostNoMoreThanTheElementAtHand)
         if (request != requests.end())
             sweep(*request, code);
     }
-    const bool is_of_devices = std::any_of(asked.begin(), asked.end(), [&](const auto& each) {
-        return !each.second.empty() && !server->providers().serves(each.first, host::Mi_Kind::ASSOCIATION);
-    });
-    EXPECT_EQ(is_of_devices, neighbours > 0);
+    EXPECT_LT(0u, neighbours);
 }
 
 INSTANTIATE_TEST_SUITE_P(Way, Listed_Answers, testing::ValuesIn(ways),
