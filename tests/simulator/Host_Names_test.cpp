@@ -56,5 +56,4 @@ TEST_F(Host_Names, AreSoughtInFilesAlone)
     const Silent_Name_Server server;
     EXPECT_EQ(nullptr, gethostbyname("a-host-that-no-file-knows"));
     EXPECT_FALSE(server.was_asked());
-    EXPECT_NE(nullptr, gethostbyname("localhost"));
 }
