@@ -1,8 +1,8 @@
 #include "diagnostics/DiagnosticHelper.h"
-#include "diagnostics/Module_Pin.h"
 
 #include "adapter/Json_Access.h"
 #include "model/PortHelper.h"
+#include "runtime/Module_Pin.h"
 #include "runtime/Ref.h"
 #include "runtime/Thread.h"
 #include "runtime/log.h"
@@ -102,7 +102,7 @@ Run_Result DiagnosticHelper::start(const Diagnostic_Test& test, std::unique_ptr<
     // Between the check for a running test and here no lock is held: two starts at the same moment can both
     // come through. The later job then takes the place of the other, and both tests run.
     addDiagnosticJob(job);
-    pin_module();
+    Module_Pin::hold_for_ever();
     // A thread that the system does not make is not noticed: its job stays a running one, and refuses all
     // others. One for which there is no memory is.
     Thread thread;

@@ -2,6 +2,7 @@
 #include "alerts/Delivery_Pace.h"
 #include "alerts/IndicationManager.h"
 #include "providers/proc.h"
+#include "runtime/Module_Pin.h"
 #include "runtime/Thread.h"
 #include "runtime/log.h"
 #include "schema/KALDERA_AlertIndication_Skeleton.h"
@@ -43,6 +44,8 @@ public:
         LOG(INFO, "Subscribtion for event notifications is successful.");
         if (_continue == 0)
             _continue++;
+        // A server may close the library without stopping its providers.
+        _pin.hold();
         try {
             const int error = Thread::create_joinable(_thread, deliverIndications, this);
             if (error == 0)
@@ -77,6 +80,7 @@ public:
             _handler->handle(nullptr);
             _handler.reset();
         }
+        _pin.give_back();
         return DISABLE_INDICATIONS_OK;
     }
 
@@ -87,6 +91,7 @@ private:
         IndicationManager::getIndicationManager()->unsubscribeForEventNotifications();
         _continue--;
         _handler.reset();
+        _pin.give_back();
     }
 
     /// The delivery thread: at most one alert a pass. What is left in the queue when it stops is delivered in
@@ -113,6 +118,8 @@ private:
     }
 
     Thread _thread;
+    /// Held while the thread runs.
+    Module_Pin _pin;
     /// 1 while the thread is to go on, which is as long as there is a subscription.
     std::atomic<uint32> _continue = 0;
     std::unique_ptr<Handler> _handler;

@@ -2,6 +2,7 @@
 #include "host/Path_Parser.h"
 #include "host/Subscription.h"
 #include "tests/module/Module_Fixture.h"
+#include "tests/support/In_Child.h"
 
 #include <atomic>
 #include <condition_variable>
@@ -31,12 +32,25 @@ protected:
         ASSERT_TRUE(pinned);
         drop_what_tests_left();
 #endif
+        take_alerts();
+    }
+    void take_alerts()
+    {
         server->set_sink([this](const std::string& name_space, const host::Instance_Value& alert) {
             const std::lock_guard lock(_mutex);
             _alerts.emplace_back(name_space, alert);
             _came.notify_all();
             return CMPI_RC_OK;
         });
+    }
+    /// The server's own reference to the library goes, as at its dlclose; the broker, which the delivery
+    /// thread still knows, stays.
+    static void let_go_of_the_module()
+    {
+        void* const handle = dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD);
+        ASSERT_NE(nullptr, handle);
+        EXPECT_EQ(0, dlclose(handle));
+        EXPECT_EQ(0, dlclose(handle));
     }
 
     static std::string event(int category, int id, const std::string& more = "")
@@ -280,6 +294,54 @@ TEST_F(Alert_Indications, OfManyThreadsComeCompleteAndInOrder)
     for (size_t i = 1; i < list.size(); i++)
         EXPECT_EQ(list[0].property("SequenceNumber")->as_sint() + std::int64_t(i),
                   list[i].property("SequenceNumber")->as_sint());
+}
+
+TEST_F(Alert_Indications, GoOnWhereAServerClosesTheModuleWithoutACleanup)
+{
+    close();
+    in_child([&] {
+        open();
+        take_alerts();
+        ASSERT_EQ(CMPI_RC_OK, server->activate_filter(CLASS, "root/kaldera"));
+        ASSERT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+        let_go_of_the_module();
+        for (unsigned i = 1; i <= 3; i++) {
+            ASSERT_TRUE(simulator.event(event(9, 1)));
+            ASSERT_TRUE(wait_for(i));
+            let_pass();
+        }
+        // Nobody can stop it any more, and what a process does at its end to a library with a live thread is
+        // not for this test to see.
+        fflush(nullptr);
+        _exit(testing::Test::HasFailure() ? 1 : 0);
+    });
+}
+
+TEST_F(Alert_Indications, PinTheModuleNoLongerThanTheyGoOn)
+{
+    close();
+    in_child([&] {
+        for (int i = 0; i < 3; i++) {
+            open();
+            ASSERT_EQ(CMPI_RC_OK, server->activate_filter(CLASS, "root/kaldera"));
+            ASSERT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+            ASSERT_EQ(CMPI_RC_OK, server->enable_indications(CLASS));
+            ASSERT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+            ASSERT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+            close();
+#ifndef __SANITIZE_ADDRESS__ // which keeps it mapped for the leak checker
+            EXPECT_EQ(nullptr, dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD));
+#endif
+        }
+        // A subscription that does not come about pins nothing.
+        open();
+        simulator.add_fault(R"({"call": "register_for_events", "do": "null"})");
+        EXPECT_EQ(CMPI_RC_ERR_FAILED, server->enable_indications(CLASS));
+        close();
+#ifndef __SANITIZE_ADDRESS__
+        EXPECT_EQ(nullptr, dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD));
+#endif
+    });
 }
 
 TEST_F(Alert_Indications, OfWrongTypesAreAnExceptionInTheLibrary)
