@@ -1,5 +1,5 @@
 #include "adapter/Guarded_Call.h"
-#include "alerts/Delivery_Pace.h"
+#include "alerts/Delivery_Pause.h"
 #include "alerts/IndicationManager.h"
 #include "providers/proc.h"
 #include "runtime/Module_Pin.h"
@@ -101,7 +101,6 @@ private:
         LOG_SCOPE("deliverIndications");
         auto* const self = static_cast<KALDERA_AlertIndication_Provider*>(provider);
         IndicationManager* const manager = IndicationManager::getIndicationManager();
-        Delivery_Passes passes;
         while (self->_continue != 0) {
             KALDERA_AlertIndication* alert = nullptr;
             if (manager->getIndicationObject(&alert)) {
@@ -112,7 +111,7 @@ private:
                             [&] { self->_handler->handle(clone_of(alert)); }))
                     LOG(INFO, "Delivered indication to the CIM server");
             }
-            passes.sleep_to_end();
+            Delivery_Pause::wait();
         }
         return nullptr;
     }

@@ -10,11 +10,7 @@ inline constexpr uint64 SEC = 1000000;
 
 /// Microseconds since the epoch.
 uint64 now();
+/// Sleeps for no less than that, signals or not.
 void sleep(uint64 microseconds);
-
-/// Microseconds of a clock that nobody sets: good for spans, and for `sleep_until` alone.
-uint64 monotonic();
-/// Sleeps until `monotonic()` has come to the moment, signals or not; returns at once if it has.
-void sleep_until(uint64 moment);
 
 } // namespace KPRV::Time

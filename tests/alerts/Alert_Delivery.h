@@ -1,6 +1,6 @@
 #pragma once
 
-#include "alerts/Delivery_Pace.h"
+#include "alerts/Delivery_Pause.h"
 #include "schema/module_registration.h"
 
 #include <atomic>
@@ -16,45 +16,34 @@ inline const Registration* alert_registration()
     return each;
 }
 
-/// The delivery thread's clock, for a scope: it stands still but for its sleeps, so that each should be a
-/// whole period.
-class Pace_Override
+/// Puts a function in the place of the delivery thread's sleep for a scope.
+class Delivery_Pause_Override
 {
 public:
-    /// What a sleep does in the place of sleeping.
-    explicit Pace_Override(void (*sleep)(uint64 moment)) : _product(delivery_pace)
-    {
-        clock = 1;
-        delivery_pace = {[]() -> uint64 { return clock; }, sleep};
-    }
-    ~Pace_Override() { delivery_pace = _product; }
-    Pace_Override(const Pace_Override&) = delete;
-    Pace_Override& operator=(const Pace_Override&) = delete;
-
-    static inline std::atomic<uint64> clock;
-
-private:
-    const Delivery_Pace _product;
+    explicit Delivery_Pause_Override(void (*sleep)(uint64)) { Delivery_Pause::sleep = sleep; }
+    ~Delivery_Pause_Override() { Delivery_Pause::sleep = Time::sleep; }
+    Delivery_Pause_Override(const Delivery_Pause_Override&) = delete;
+    Delivery_Pause_Override& operator=(const Delivery_Pause_Override&) = delete;
 };
 
 /// Sleeps as short as can be, and counted.
-class Short_Pace
+class Short_Pauses
 {
 public:
-    Short_Pace()
+    Short_Pauses()
     {
-        passes = 0;
+        count = 0;
         strange = 0;
     }
 
-    static inline std::atomic<int> passes;
+    static inline std::atomic<int> count;
     /// Sleeps of another length than the product's.
     static inline std::atomic<int> strange;
 
 private:
-    const Pace_Override _pace{[](uint64 moment) {
-        passes++;
-        strange += moment - Pace_Override::clock.exchange(moment) != 20000;
+    const Delivery_Pause_Override _override{[](uint64 microseconds) {
+        count++;
+        strange += microseconds != 20000;
         Time::sleep(50);
     }};
 };

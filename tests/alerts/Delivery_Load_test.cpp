@@ -80,7 +80,7 @@ TEST(Delivery_Load, TenThousandEventsOfFourThreadsReachTheServerAndLeaveNothingB
     Fake_Library library;
     library.answers("register_for_events", json("{}"));
     library.answers("unregister_for_events", json("{}"));
-    const Pace_Override pace([](uint64) {});
+    const Delivery_Pause_Override pause([](uint64) {});
 
     constexpr int THREADS = 4;
     constexpr int EVENTS = 2500;
@@ -130,7 +130,7 @@ TEST(Delivery_Load, EndsInTheMiddleOfAStorm)
         std::this_thread::sleep_for(std::chrono::milliseconds(2));
         return json("{}");
     });
-    const Pace_Override pace([](uint64) { std::this_thread::yield(); });
+    const Delivery_Pause_Override pause([](uint64) { std::this_thread::yield(); });
     std::atomic<int> count = 0;
     {
         Alert_Server server([&](const std::string&, const host::Instance_Value&) { ++count; });

@@ -7,12 +7,15 @@
 #include "tests/support/Driver_Status_Override.h"
 
 #include <algorithm>
+#include <chrono>
 #include <condition_variable>
 #include <mutex>
 #include <thread>
 
 namespace KPRV {
 namespace {
+
+using Clock = std::chrono::steady_clock;
 
 /// What the server's handler is given, in order.
 struct Received
@@ -21,6 +24,13 @@ struct Received
     std::condition_variable came;
     std::vector<Alert> alerts;
     std::vector<int> passes;
+    struct Span
+    {
+        Clock::time_point begin, end;
+    };
+    std::vector<Span> spans;
+    /// How long the server takes for each.
+    std::chrono::milliseconds takes{0};
     int end_marks = 0;
     bool was_last_an_end_mark = false;
     bool throws = false;
@@ -36,8 +46,11 @@ struct Received
             return false;
         }
         self.thread = std::this_thread::get_id();
+        const Clock::time_point begin = Clock::now();
+        std::this_thread::sleep_for(self.takes);
+        self.spans.push_back({begin, Clock::now()});
         self.alerts.emplace_back(static_cast<KALDERA_AlertIndication*>(instance));
-        self.passes.push_back(Short_Pace::passes);
+        self.passes.push_back(Short_Pauses::count);
         self.came.notify_all();
         if (self.throws)
             throw std::runtime_error("the server is out of order");
@@ -67,7 +80,7 @@ protected:
     ~Alert_Provider() override
     {
         provider.unload();
-        EXPECT_EQ(0, Short_Pace::strange);
+        EXPECT_EQ(0, Short_Pauses::strange);
         take_alerts(gIndicationHelperObj);
     }
 
@@ -81,7 +94,7 @@ protected:
     }
     Lines told(const char* level) { return log.said(level); }
 
-    const Short_Pace pace;
+    const Short_Pauses pauses;
     const Driver_Status_Override driver{0};
     Received received;
     Provider_Handle provider{alert_registration()};
@@ -144,17 +157,22 @@ TEST_F(Alert_Provider, DeliversOneAlertAPass)
         EXPECT_EQ(first + sint64(i), received.alerts[i]->SequenceNumber.value);
 }
 
-TEST_F(Alert_Provider, PassesTwentyMillisecondsFromAlertToAlert)
+TEST_F(Alert_Provider, LeavesTwentyMillisecondsBetweenAlertsHoweverLongADeliveryTakes)
 {
-    delivery_pace = {Time::monotonic, Time::sleep_until};
-    enable();
-    const uint64 begin = Time::monotonic();
-    for (int i = 0; i < 3; i++)
-        happen(2, 1);
-    ASSERT_TRUE(received.wait_for(6));
-    // The first may leave at any moment of its pass, the others not before their own.
-    EXPECT_GE(Time::monotonic() - begin, 4 * 20 * Time::MSEC);
-    disable();
+    const Delivery_Pause_Override products_own(Time::sleep);
+    for (const int takes : {0, 15, 25}) {
+        received.takes = std::chrono::milliseconds(takes);
+        received.spans.clear();
+        received.alerts.clear();
+        enable();
+        for (int i = 0; i < 3; i++)
+            happen(2, 1);
+        ASSERT_TRUE(received.wait_for(6));
+        disable();
+        for (size_t i = 1; i < received.spans.size(); i++)
+            EXPECT_GE(received.spans[i].begin - received.spans[i - 1].end, std::chrono::milliseconds(20))
+                << takes;
+    }
 }
 
 TEST_F(Alert_Provider, WithoutADriverRefuses)
@@ -171,7 +189,7 @@ TEST_F(Alert_Provider, WithoutADriverRefuses)
     EXPECT_EQ(Lines{"INFO No subscription for event notifications happened or successful"}, log.said());
     EXPECT_TRUE(library.calls.empty());
     EXPECT_EQ(0, received.end_marks) << "the handler was not kept";
-    EXPECT_EQ(0, Short_Pace::passes) << "no thread";
+    EXPECT_EQ(0, Short_Pauses::count) << "no thread";
 }
 
 TEST_F(Alert_Provider, RefusesWhatTheLibraryRefuses)
@@ -224,9 +242,9 @@ TEST_F(Alert_Provider, StopsWhenItIsUnloadedWithASubscription)
     EXPECT_TRUE(log.has("INFO Stopping the indication thread created."));
     EXPECT_EQ(1, received.end_marks);
     EXPECT_EQ(nullptr, library.event_callback);
-    const int passes = Short_Pace::passes;
+    const int passes = Short_Pauses::count;
     std::this_thread::sleep_for(std::chrono::milliseconds(5));
-    EXPECT_EQ(passes, Short_Pace::passes) << "the thread has ended";
+    EXPECT_EQ(passes, Short_Pauses::count) << "the thread has ended";
 }
 
 TEST_F(Alert_Provider, KeepsWhatIsLeftForTheNextSubscription)
