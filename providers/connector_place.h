@@ -2,7 +2,9 @@
 
 #include "runtime/String.h"
 
+#include <algorithm>
 #include <cstdlib>
+#include <limits>
 
 namespace KPRV {
 
@@ -12,8 +14,8 @@ struct Connector_Place
     explicit Connector_Place(const String& tag)
     {
         const String rest = behind(tag);
-        adapter_id = static_cast<int>(std::strtol(rest.c_str(), nullptr, 10));
-        port_number = static_cast<uint32>(std::strtol(behind(rest).c_str(), nullptr, 10));
+        adapter_id = number(rest);
+        port_number = static_cast<uint32>(number(behind(rest)));
     }
 
     /// Counted from 1; 0 when the tag names none.
@@ -22,6 +24,15 @@ struct Connector_Place
     uint32 port_number;
 
 private:
+    /// As `strtol` reads where a long has 32 bits, on either word size: what lies beyond is clamped, and no
+    /// adapter and no port has such a number.
+    static sint32 number(const String& text)
+    {
+        using Limits = std::numeric_limits<sint32>;
+        const long long wide = std::strtoll(text.c_str(), nullptr, 10);
+        return static_cast<sint32>(std::clamp<long long>(wide, Limits::min(), Limits::max()));
+    }
+
     static String behind(const String& text)
     {
         const uint32 pos = text.find('_');
