@@ -137,7 +137,7 @@ String ProviderUtil::getDriverVersion()
     guarded(UTIL_HERE, adapter_entry(address), [&] {
         const std::string text = asString(driver[name]);
         const std::string_view kept = trimmed(text.c_str()).substr(0, SIZE - 1);
-        version = String(kept.data(), static_cast<uint32>(kept.size()));
+        version = String(kept.data(), kept.size());
         UTIL_LOG(INFO, "Driver version is %s", version.c_str());
     });
     return version;

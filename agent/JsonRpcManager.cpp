@@ -140,8 +140,7 @@ sint32 JsonRpcManager::answer(std::string_view request, String& text, Json_Tools
     // The text is copied while the values stand: once they are gone, the allocator sorts what they leave
     // before it finds room for a long text, and that takes longer than the copy.
     const std::string written = tools.writer.write(reply);
-    tools.reply.assign(written.data(), static_cast<uint32>(written.size()));
-    text = tools.reply;
+    text = tools.keep(written);
     return 200;
 }
 

@@ -7,6 +7,7 @@
 
 #include <atomic>
 #include <optional>
+#include <string_view>
 
 namespace KPRV {
 
@@ -17,6 +18,14 @@ struct Json_Tools
     Json::StyledWriter writer;
     /// The text of the last reply: the next one is written over it if nobody holds it any more.
     String reply;
+
+    /// A text that the writer wrote becomes the reply. One for which there is no room throws
+    /// `std::bad_alloc`.
+    const String& keep(std::string_view written)
+    {
+        reply.assign(written.data(), written.size());
+        return reply;
+    }
 };
 
 /// Tools kept from one request to the next, since to make them costs as much as a short text costs to read.

@@ -48,7 +48,7 @@ void set_system_keys(T& instance, classId_t id, const String& system_name)
 
 inline String to_String(std::string_view text)
 {
-    return String(text.data(), static_cast<uint32>(text.size()));
+    return String(text.data(), text.size());
 }
 
 } // namespace KPRV

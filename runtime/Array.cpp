@@ -7,6 +7,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <functional>
+#include <limits>
 #include <new>
 
 namespace KPRV {
@@ -27,9 +28,13 @@ const char* element(const __Array_Rep* rep, uint32 i)
     return element(const_cast<__Array_Rep*>(rep), i);
 }
 
+/// Throws `std::bad_alloc` for a block that no word size can address.
 size_t block_size(const __Array_Traits* traits, uint32 capacity)
 {
-    return size_t(capacity) * traits->size + BLOCK_EXTRA;
+    const uint64 size = uint64(capacity) * traits->size + BLOCK_EXTRA;
+    if (size > std::numeric_limits<size_t>::max())
+        throw std::bad_alloc();
+    return static_cast<size_t>(size);
 }
 
 __Array_Rep* allocate(const __Array_Traits* traits, uint32 capacity)
@@ -82,8 +87,11 @@ __Array_Rep* make(const __Array_Traits* traits, const void* data, uint32 n)
 
 /// Before something is written: a block of the array's own with room for n elements. Exactly n, not a
 /// doubled figure: a cell in an instance is filled once and lives long.
-void make_room(__Array_Rep*& rep, uint32 n)
+void make_room(__Array_Rep*& rep, uint64 wanted)
 {
+    if (wanted > NPOS)
+        throw std::bad_alloc();
+    const uint32 n = static_cast<uint32>(wanted);
     if (is_empty_array(rep)) {
         rep = allocate(rep->traits, std::max(n, rep->capacity));
     } else if (rep->capacity < n) {
@@ -125,9 +133,11 @@ __Array_Rep* _clone(const __Array_Rep* rep)
     return make(rep->traits, __data(rep), rep->size);
 }
 
-void __assign(__Array_Rep*& rep, const __Array_Rep* other)
+void __assign(__Array_Rep*& rep, __Array_Rep* const& other)
 {
-    if (rep == other)
+    // The handles tell, since arrays that never held an element may share a block: the clone of a fresh one
+    // has no capacity, and one that is given to itself keeps what it has.
+    if (&rep == &other)
         return;
     __Array_Rep* old = rep;
     rep = _clone(other);
@@ -158,7 +168,7 @@ void __insert(__Array_Rep*& rep, uint32 pos, const void* data, uint32 n)
         return;
     }
     pos = std::min(pos, rep->size);
-    make_room(rep, rep->size + n);
+    make_room(rep, uint64(rep->size) + n);
     memmove(element(rep, pos + n), element(rep, pos), size_t(rep->size - pos) * rep->traits->size);
     construct_elements(rep->traits, element(rep, pos), data, n);
     rep->size += n;

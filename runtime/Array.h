@@ -23,7 +23,7 @@ void __construct(__Array_Rep*& rep, const __Array_Traits* traits);
 void __construct(__Array_Rep*& rep, const __Array_Traits* traits, const void* data, uint32 n);
 void __destruct(__Array_Rep* rep);
 __Array_Rep* _clone(const __Array_Rep* rep);
-void __assign(__Array_Rep*& rep, const __Array_Rep* other);
+void __assign(__Array_Rep*& rep, __Array_Rep* const& other);
 void __assign(__Array_Rep*& rep, const void* data, uint32 n);
 /// Room for exactly n elements. Repeated appends reallocate each time beyond the first 8: memory before
 /// speed.

@@ -47,6 +47,15 @@ const char* Buffer::data() const
     return _data;
 }
 
+/// A size as a buffer holds it. Beyond, `std::bad_alloc`, as for every size for which there is no memory.
+static uint32 checked(uint64 n)
+{
+    // The terminator must have its place too.
+    if (n >= NPOS)
+        throw std::bad_alloc();
+    return static_cast<uint32>(n);
+}
+
 void Buffer::reserve(uint32 n)
 {
     n = std::max(n, LEAST_CAPACITY);
@@ -63,15 +72,15 @@ void Buffer::_reserve_aux(uint32 n)
 
 void Buffer::_append_aux()
 {
-    reserve(_cap == 0 ? LEAST_CAPACITY : 2 * _cap);
+    reserve(_cap == 0 ? LEAST_CAPACITY : checked(2 * uint64(_cap)));
 }
 
-void Buffer::insert(uint32 pos, const char* data, uint32 n)
+void Buffer::insert(uint32 pos, const char* data, size_t n)
 {
     if (n == 0)
         return;
     pos = std::min(pos, _size);
-    const uint32 size = _size + n;
+    const uint32 size = checked(uint64(_size) + n);
     if (size > _cap)
         _reserve_aux(size);
     memmove(_data + pos + n, _data + pos, _size - pos);
@@ -79,14 +88,14 @@ void Buffer::insert(uint32 pos, const char* data, uint32 n)
     _size = size;
 }
 
-void Buffer::append(const char* data, uint32 n)
+void Buffer::append(const char* data, size_t n)
 {
     insert(_size, data, n);
 }
 
 void Buffer::append(const char* text)
 {
-    append(text, static_cast<uint32>(strlen(text)));
+    append(text, strlen(text));
 }
 
 void Buffer::append(char c)
@@ -120,7 +129,7 @@ uint32 Buffer::vformat(const char* format, va_list arguments)
     // ends somewhere.
     constexpr uint32 GIVE_UP = 1u << 20;
     for (uint32 room = 128;;) {
-        _reserve_aux(_size + room);
+        _reserve_aux(checked(uint64(_size) + room));
         va_list copy;
         va_copy(copy, arguments);
         const int n = vsnprintf(_data + _size, room, format, copy);
@@ -153,7 +162,7 @@ void Buffer::append_uint64(uint64 x)
     char buffer[NUMBER_TEXT_SIZE];
     size_t size;
     const char* digits = uint64_to_str(buffer, x, size);
-    append(digits, static_cast<uint32>(size));
+    append(digits, size);
 }
 
 void Buffer::dump() const

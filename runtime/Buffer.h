@@ -22,8 +22,8 @@ public:
 
     /// Grows only: to at least 4096, with exact size beyond that.
     void reserve(uint32 n);
-    void insert(uint32 pos, const char* data, uint32 n);
-    void append(const char* data, uint32 n);
+    void insert(uint32 pos, const char* data, size_t n);
+    void append(const char* data, size_t n);
     void append(const char* text);
     void append(char c);
     void remove(uint32 pos, uint32 n);

@@ -46,7 +46,7 @@ public:
             return false;
         while (begins_name(*_at) || (*_at >= '0' && *_at <= '9'))
             _at++;
-        out.assign(start, static_cast<uint32>(_at - start));
+        out.assign(start, static_cast<size_t>(_at - start));
         return true;
     }
 

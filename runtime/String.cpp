@@ -20,16 +20,28 @@ uint32 _next_pow_2(uint32 n)
 
 namespace {
 
-uint32 length_of(const char* text)
+constexpr size_t EXTRA = 16;
+/// The terminator, and on 32 bits the block, must have their place too.
+constexpr uint32 MOST = NPOS - EXTRA;
+
+/// A size or a capacity as a rep holds it.
+uint32 checked(uint64 n)
 {
-    return text ? static_cast<uint32>(strlen(text)) : 0;
+    if (n > MOST)
+        throw std::bad_alloc();
+    return static_cast<uint32>(n);
+}
+
+size_t length_of(const char* text)
+{
+    return text ? strlen(text) : 0;
 }
 
 /// A rep with a count of 1 and room for `n` characters by the capacity rule; size 0, not terminated.
 String_Rep* allocate(uint32 n)
 {
-    const uint32 cap = _next_pow_2(n);
-    void* block = ::operator new(size_t(cap) + 16);
+    const uint32 cap = checked(_next_pow_2(n));
+    void* block = ::operator new(size_t(cap) + EXTRA);
     return new (block) String_Rep{1, 0, cap, {}};
 }
 
@@ -53,9 +65,9 @@ String_Rep* make(const char* text, uint32 n, uint32 room)
     return rep;
 }
 
-String_Rep* make(const char* text, uint32 n)
+String_Rep* make(const char* text, size_t n)
 {
-    return n == 0 ? &String::_empty : make(text, n, n);
+    return n == 0 ? &String::_empty : make(text, checked(n), checked(n));
 }
 
 /// Never true of `_empty`.
@@ -68,15 +80,15 @@ bool is_unique(const String_Rep* rep)
 
 String::String(const char* text) : _rep(make(text, length_of(text))) {}
 
-String::String(const char* text, uint32 n) : _rep(make(text, n)) {}
+String::String(const char* text, size_t n) : _rep(make(text, n)) {}
 
 String::String(const char* a, const char* b) : String(a, b, nullptr) {}
 
 String::String(const char* a, const char* b, const char* c) : _rep(&_empty)
 {
     const char* const parts[] = {a, b, c};
-    const uint32 lengths[] = {length_of(a), length_of(b), length_of(c)};
-    const uint32 total = lengths[0] + lengths[1] + lengths[2];
+    const uint32 lengths[] = {checked(length_of(a)), checked(length_of(b)), checked(length_of(c))};
+    const uint32 total = checked(uint64(lengths[0]) + lengths[1] + lengths[2]);
     if (total == 0)
         return;
     _rep = allocate(total);
@@ -104,12 +116,12 @@ void String::assign(const char* text)
     assign(text, length_of(text));
 }
 
-void String::assign(const char* text, uint32 n)
+void String::assign(const char* text, size_t n)
 {
     if (n <= _rep->cap && is_unique(_rep)) {
         // The text may be a stretch of this very string.
         memmove(characters(_rep), text ? text : "", n);
-        finish(_rep, n);
+        finish(_rep, static_cast<uint32>(n));
         return;
     }
     String_Rep* old = _rep;
@@ -122,7 +134,7 @@ void String::append(char c)
     if (_rep->size >= _rep->cap || !is_unique(_rep)) {
         // Doubles even when only the sharing forbids to write in place.
         String_Rep* old = _rep;
-        _rep = make(characters(old), old->size, old->cap == 0 ? 0 : 2 * old->cap);
+        _rep = make(characters(old), old->size, checked(2 * uint64(old->cap)));
         _release(old);
     }
     characters(_rep)[_rep->size] = c;
@@ -134,11 +146,11 @@ void String::append(const char* text)
     append(text, length_of(text));
 }
 
-void String::append(const char* text, uint32 n)
+void String::append(const char* text, size_t n)
 {
     if (n == 0)
         return;
-    const uint32 size = _rep->size + n;
+    const uint32 size = checked(uint64(_rep->size) + n);
     const uint32 room = _next_pow_2(size);
     // The text may be a stretch of this very string: the old rep goes last.
     String_Rep* old = _rep;
@@ -228,7 +240,7 @@ bool String::equal(const String& x) const
 
 bool String::equal(const char* text) const
 {
-    return equal(text, length_of(text));
+    return length_of(text) == _rep->size && equal(text, _rep->size);
 }
 
 bool String::equal(const char* text, uint32 n) const

@@ -20,7 +20,8 @@ struct String_Rep
 /// Handle to a reference-counted, copy-on-write text; one machine word, so that it can sit in an instance.
 /// Handles that share a text may be used from different threads; one handle is written by one thread at a
 /// time. All zero bytes are not a valid `String`; the empty one points at `_empty`. A null text is taken for
-/// an empty one, and a string may be given a stretch of its own text.
+/// an empty one, and a string may be given a stretch of its own text. What would grow to 4 GiB or more throws
+/// `std::bad_alloc`, as every text does for which there is no memory.
 class String
 {
 public:
@@ -35,7 +36,7 @@ public:
     }
     String(String&& x) noexcept : _rep(std::exchange(x._rep, &_empty)) {}
     String(const char* text);
-    String(const char* text, uint32 n);
+    String(const char* text, size_t n);
     String(const char* a, const char* b);
     String(const char* a, const char* b, const char* c);
     ~String()
@@ -62,11 +63,11 @@ public:
             *this = String(x);
     }
     void assign(const char* text);
-    void assign(const char* text, uint32 n);
+    void assign(const char* text, size_t n);
 
     void append(char c);
     void append(const char* text);
-    void append(const char* text, uint32 n);
+    void append(const char* text, size_t n);
     void append(const String& x);
 
     /// Makes the text this handle's own, with room for n characters.

@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <new>
 
 namespace KPRV {
 
@@ -86,6 +87,39 @@ TYPED_TEST(Array_Typed_Test, GrowsAndClonesAndCompares)
     EXPECT_FALSE(a == b);
     b = a;
     EXPECT_TRUE(a == b);
+}
+
+// Two arrays that were never used may share a block, and are two all the same.
+TYPED_TEST(Array_Typed_Test, AssignedFromOneThatWasNeverUsedHasNoCapacity)
+{
+    const Array<TypeParam> fresh;
+    Array<TypeParam> a;
+    a = fresh;
+    EXPECT_EQ(0u, a.capacity());
+    Array<TypeParam> used;
+    used.append(value_of<TypeParam>(1));
+    used = fresh;
+    EXPECT_EQ(0u, used.capacity());
+    EXPECT_EQ(0u, used.size());
+    Array<TypeParam> b;
+    Array<TypeParam>& itself = b;
+    b = itself;
+    EXPECT_EQ(8u, b.capacity()) << "nothing becomes of one that is given to itself";
+    a = itself;
+    a.append(value_of<TypeParam>(1));
+    EXPECT_EQ(1u, a.capacity());
+}
+
+TYPED_TEST(Array_Typed_Test, OfMoreThanThereIsRoomForIsRefused)
+{
+    Array<TypeParam> a;
+    a.append(value_of<TypeParam>(1));
+    // On 32 bits the size of such a block is no number that the allocator could be asked for.
+    if (sizeof(size_t) == 4 && sizeof(TypeParam) > 1) {
+        EXPECT_THROW(a.reserve(NPOS), std::bad_alloc);
+    }
+    EXPECT_EQ(1u, a.size());
+    EXPECT_TRUE(a[0] == value_of<TypeParam>(1));
 }
 
 // A place for elements that know equality; only a yes for plain bytes.

@@ -4,6 +4,8 @@
 
 #include <algorithm>
 #include <cstring>
+#include <limits>
+#include <new>
 #include <string>
 
 namespace KPRV {
@@ -132,6 +134,18 @@ TEST(Buffer, Numbers)
     x.append(' ');
     x.append_uint64(18446744073709551615ull);
     EXPECT_STREQ("0 65535 4294967295 18446744073709551615", x.data());
+}
+
+TEST(Buffer, WhatWouldTakeFourGigabytesIsNeverCut)
+{
+    Buffer x;
+    x.append("abc");
+    for (const uint64 size : {uint64(NPOS), uint64(NPOS) - 3, uint64(NPOS) + 1, uint64(NPOS) + 4})
+        if (size <= std::numeric_limits<size_t>::max()) {
+            EXPECT_THROW(x.append("abc", static_cast<size_t>(size)), std::bad_alloc);
+            EXPECT_THROW(x.insert(1, "abc", static_cast<size_t>(size)), std::bad_alloc);
+        }
+    EXPECT_STREQ("abc", x.data());
 }
 
 TEST(Buffer, DumpIsALinePerSixteenBytes)

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+#include <new>
 #include <string>
 #include <thread>
 #include <vector>
@@ -27,7 +29,7 @@ TEST(String, EmptyOnesShareTheOneRepUncounted)
 {
     const String a;
     const String b("");
-    const String c("abc", 0u);
+    const String c("abc", size_t(0));
     const String d(a);
     const String e("", "", "");
     for (const String* x : {&a, &b, &c, &d, &e}) {
@@ -299,6 +301,26 @@ TEST(String, EqualityThatFoldsCase)
     EXPECT_FALSE(x.equali("ABc{"));
     EXPECT_FALSE(x.equali("ABc"));
     EXPECT_FALSE(x.equali(String("ABc[x")));
+}
+
+TEST(String, WhatWouldTakeFourGigabytesIsNeverCut)
+{
+    String x("abc");
+    const String shared(x);
+    // The last two are sizes on 64 bits only.
+    for (const uint64 wide : {uint64(NPOS), uint64(NPOS) + 1, uint64(NPOS) + 4}) {
+        if (wide > std::numeric_limits<size_t>::max())
+            continue;
+        const size_t size = static_cast<size_t>(wide);
+        EXPECT_THROW(String("abc", size), std::bad_alloc);
+        EXPECT_THROW(x.assign("abc", size), std::bad_alloc);
+        EXPECT_THROW(x.append("abc", size), std::bad_alloc);
+        EXPECT_THROW(String().append("abc", size), std::bad_alloc);
+    }
+    EXPECT_THROW(x.append("abc", NPOS - 3), std::bad_alloc) << "the sum is what counts";
+    EXPECT_THROW(x.reserve(NPOS), std::bad_alloc);
+    EXPECT_STREQ("abc", x.c_str());
+    EXPECT_EQ(rep_of(x), rep_of(shared));
 }
 
 TEST(String, HandlesThatShareMayBeUsedFromDifferentThreads)
