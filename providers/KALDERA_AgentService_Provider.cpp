@@ -4,6 +4,8 @@
 #include "providers/proc.h"
 #include "schema/KALDERA_AgentService_Skeleton.h"
 
+#include <new>
+
 namespace KPRV {
 
 namespace {
@@ -20,8 +22,13 @@ std::string as_logged(std::string text)
 void log_text(Call_Site site, const char* text)
 {
     // Texts are long, and most logs do not want them.
-    if (log_uses(Log_Level::DBG))
+    if (!log_uses(Log_Level::DBG))
+        return;
+    try {
         log(Log_Level::DBG, site.file, site.line, "%s", as_logged(text).c_str());
+    } catch (const std::bad_alloc&) {
+        // A request does not fail for want of a line.
+    }
 }
 
 } // namespace

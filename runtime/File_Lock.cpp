@@ -1,4 +1,5 @@
 #include "runtime/File_Lock.h"
+#include "runtime/Regular_File.h"
 
 #include <cerrno>
 #include <fcntl.h>
@@ -31,8 +32,8 @@ static int apply(int fd, const struct flock& record)
 }
 
 File_Lock::File_Lock(const char* path)
-    : _rep(
-          new Rep{whole_file(F_WRLCK), whole_file(F_UNLCK), open(path, O_WRONLY | O_CREAT | O_CLOEXEC, 0600)})
+    : _rep(new Rep{whole_file(F_WRLCK), whole_file(F_UNLCK),
+                   open_regular_file(path, O_WRONLY | O_CREAT, 0600)})
 {
 }
 

@@ -6,7 +6,7 @@ namespace KPRV {
 class File_Lock
 {
 public:
-    /// Opens the file for writing, created with mode 0600 if missing.
+    /// Opens the file for writing, created with mode 0600 if missing. What is no regular file is not opened.
     explicit File_Lock(const char* path);
     ~File_Lock();
     File_Lock(const File_Lock&) = delete;

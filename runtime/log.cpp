@@ -1,14 +1,19 @@
 #include "runtime/log.h"
 #include "runtime/Buffer.h"
-#include "runtime/Datetime.h"
 #include "runtime/File_Lock.h"
+#include "runtime/Regular_File.h"
+#include "runtime/Time.h"
 #include "runtime/log_configuration.h"
 
+#include <algorithm>
 #include <cstdio>
-#include <cstring>
+#include <ctime>
+#include <fcntl.h>
+#include <new>
 #include <pthread.h>
 #include <strings.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace KPRV {
 
@@ -28,16 +33,39 @@ static File_Lock* _lock;
 
 namespace {
 
+/// Nobody cancels a thread that holds it: the unwinding would meet destructors that log.
 class Auto_Log_Mutex
 {
 public:
-    Auto_Log_Mutex() { pthread_mutex_lock(&_mutex); }
-    ~Auto_Log_Mutex() { pthread_mutex_unlock(&_mutex); }
+    Auto_Log_Mutex()
+    {
+        pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &_cancel_state);
+        pthread_mutex_lock(&_mutex);
+    }
+    ~Auto_Log_Mutex()
+    {
+        pthread_mutex_unlock(&_mutex);
+        pthread_setcancelstate(_cancel_state, nullptr);
+    }
     Auto_Log_Mutex(const Auto_Log_Mutex&) = delete;
     Auto_Log_Mutex& operator=(const Auto_Log_Mutex&) = delete;
+
+private:
+    int _cancel_state;
 };
 
 } // namespace
+
+static FILE* open_messages(const char* path)
+{
+    const int descriptor = open_regular_file(path, O_WRONLY | O_CREAT | O_APPEND, 0666);
+    if (descriptor < 0)
+        return nullptr;
+    FILE* const file = fdopen(descriptor, "a");
+    if (!file)
+        close(descriptor);
+    return file;
+}
 
 /// Tried anew by every call until it succeeds: a user may put the rc file in place while the server runs.
 static void configure()
@@ -50,7 +78,7 @@ static void configure()
     mkdir(configuration.directory, 0777);
     _lock = new File_Lock(configuration.lock);
     if (_lock->okay())
-        _log_file_handle = fopen(configuration.messages, "ae");
+        _log_file_handle = open_messages(configuration.messages);
     if (_log_file_handle) {
         _initialized = true;
         _threshold = _level;
@@ -60,24 +88,56 @@ static void configure()
     }
 }
 
-static void write_line(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+static void write(const char* text, size_t size)
 {
-    char time[32];
-    Datetime::now().ascii(time, true);
-    if (char* const fraction = strchr(time, '.'))
-        *fraction = '\0';
-
-    Buffer text;
-    text.format("%s %s: %s(%d): ", time, _log_level_strings[int(level)], file, int(line));
-    text.vformat(format, arguments);
-    if (text.data()[text.size() - 1] != '\n')
-        text.append('\n');
-
     // A lock that cannot be had does not keep the line out of the log.
     _lock->lock();
-    fwrite(text.data(), 1, text.size(), _log_file_handle);
+    fwrite(text, 1, size, _log_file_handle);
     fflush(_log_file_handle);
     _lock->unlock();
+}
+
+/// The time of the line, its level and its place.
+static void write_head(char (&head)[256], Log_Level level, const char* file, size_t line)
+{
+    const time_t now = time_t(Time::now() / Time::SEC);
+    tm local = {};
+    localtime_r(&now, &local);
+    snprintf(head, sizeof head, "%04d/%02d/%02d %02d:%02d:%02d %s: %s(%d): ", local.tm_year + 1900,
+             local.tm_mon + 1, local.tm_mday, local.tm_hour, local.tm_min, local.tm_sec,
+             _log_level_strings[int(level)], file, int(line));
+}
+
+/// What fits of a line for which there is no memory.
+static void write_cut_line(const char* head, const char* format, va_list arguments)
+{
+    char text[512];
+    constexpr size_t ROOM = sizeof text - 1;
+    size_t size = size_t(snprintf(text, ROOM, "%s", head));
+    const int wanted = vsnprintf(text + size, ROOM - size, format, arguments);
+    size = std::min(size + size_t(std::max(wanted, 0)), ROOM - 1);
+    if (text[size - 1] != '\n')
+        text[size++] = '\n';
+    write(text, size);
+}
+
+static void write_line(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+{
+    char head[256];
+    write_head(head, level, file, line);
+    va_list again;
+    va_copy(again, arguments);
+    try {
+        Buffer text;
+        text.append(head);
+        text.vformat(format, arguments);
+        if (text.data()[text.size() - 1] != '\n')
+            text.append('\n');
+        write(text.data(), text.size());
+    } catch (const std::bad_alloc&) {
+        write_cut_line(head, format, again);
+    }
+    va_end(again);
 }
 
 bool log_uses(Log_Level level)
@@ -85,18 +145,22 @@ bool log_uses(Log_Level level)
     return level <= _threshold.load(std::memory_order_relaxed);
 }
 
-void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments) noexcept
 {
     if (!log_uses(level))
         return;
     const Auto_Log_Mutex guard;
-    if (!_initialized)
-        configure();
+    try {
+        if (!_initialized)
+            configure();
+    } catch (const std::bad_alloc&) {
+        return;
+    }
     if (_log_file_handle && level <= _level)
         write_line(level, file, line, format, arguments);
 }
 
-void log(Log_Level level, const char* file, size_t line, const char* format, ...)
+void log(Log_Level level, const char* file, size_t line, const char* format, ...) noexcept
 {
     if (!log_uses(level))
         return;
@@ -106,7 +170,7 @@ void log(Log_Level level, const char* file, size_t line, const char* format, ...
     va_end(arguments);
 }
 
-void Log_Call_Frame::invoke(const char* format, ...) const
+void Log_Call_Frame::invoke(const char* format, ...) const noexcept
 {
     va_list arguments;
     va_start(arguments, format);

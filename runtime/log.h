@@ -20,10 +20,11 @@ enum class Log_Level : int
 extern const char* const _log_level_strings[5];
 
 /// Writes one line to the log of the user's account, `.cimple/messages` in the home directory, if `.cimplerc`
-/// there asks for it. Never fails and never calls into the CIM server. `file` is a base name.
-void log(Log_Level level, const char* file, size_t line, const char* format, ...)
+/// there asks for it. Never fails, never throws, is no point where a thread is cancelled, and never calls into
+/// the CIM server: a line for which there is no memory is cut. `file` is a base name.
+void log(Log_Level level, const char* file, size_t line, const char* format, ...) noexcept
     __attribute__((format(printf, 4, 5)));
-void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments) noexcept
     __attribute__((format(printf, 4, 0)));
 
 /// Switches the runtime's own conversion lines on or off; direct calls of `log` are not touched. -1 if it was
@@ -47,7 +48,7 @@ struct Log_Call_Frame
     Log_Level level;
     const char* file;
     uint32 line;
-    void invoke(const char* format, ...) const __attribute__((format(printf, 2, 3)));
+    void invoke(const char* format, ...) const noexcept __attribute__((format(printf, 2, 3)));
 };
 
 /// Where a shared function was called from, so that its log lines carry the caller's file and line: pass

@@ -1,4 +1,5 @@
 #include "runtime/log_configuration.h"
+#include "runtime/Regular_File.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -80,7 +81,7 @@ bool read_log_configuration(Log_Configuration& configuration)
         return false;
 
     // Most accounts have none, and each line comes here: no stream is made before there is something to read.
-    const int descriptor = open(rc_path, O_RDONLY | O_CLOEXEC);
+    const int descriptor = open_regular_file(rc_path, O_RDONLY);
     if (descriptor < 0)
         return false;
     FILE* const file = fdopen(descriptor, "r");

@@ -87,7 +87,8 @@ uint32 SoftwareUpdateHelper::UpdatePortControllerSoftware(const KALDERA_PortCont
         return NO_STATUS;
     }
     const uint32 status = asUInt(answer["status"]);
-    LOG(DBG, "status=%d message = %s\n", int(status), asString(answer["message"]).c_str());
+    const std::string_view message = asView(answer["message"]);
+    LOG(DBG, "status=%d message = %.*s\n", int(status), int(message.size()), message.data());
     return status;
 }
 

@@ -78,6 +78,19 @@ TEST(File_Lock, waits_for_another_process)
     close(ready[1]);
 }
 
+TEST(File_Lock, is_not_taken_for_what_is_no_regular_file)
+{
+    Temp_Folder folder;
+    const std::string path = folder.path("lock");
+    ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
+    // With a reader, so that opening it would succeed at once.
+    const int reader = open(path.c_str(), O_RDONLY | O_NONBLOCK);
+    File_Lock lock(path.c_str());
+    EXPECT_FALSE(lock.okay());
+    EXPECT_EQ(lock.lock(), -1);
+    close(reader);
+}
+
 TEST(File_Lock, a_path_that_cannot_be_opened_is_not_okay)
 {
     File_Lock lock("/nonexistent/folder/lock");

@@ -1,9 +1,15 @@
 #include "runtime/log.h"
+#include "tests/support/In_Child.h"
 #include "tests/support/Log_Capture.h"
 
+#include <atomic>
 #include <filesystem>
 #include <gtest/gtest.h>
+#include <pthread.h>
+#include <sys/resource.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
+#include <sys/un.h>
 #include <sys/wait.h>
 #include <thread>
 #include <unistd.h>
@@ -201,6 +207,131 @@ TEST(log, a_folder_that_cannot_be_used_is_tried_again)
 
     log(Log_Level::ERR, "F", 1, "kept");
     ASSERT_EQ(split(home.messages()).size(), 1u);
+}
+
+/// Puts what opening may wait for, or what is not there to be written to, in the place of a file.
+struct Odd_File
+{
+    const char* name;
+    void (*make)(const std::string& path);
+};
+
+const Odd_File odd_files[] = {
+    {"a FIFO", [](const std::string& path) { ASSERT_EQ(mkfifo(path.c_str(), 0600), 0); }},
+    {"a device", [](const std::string& path) { fs::create_symlink("/dev/zero", path); }},
+    {"a FIFO behind a link",
+     [](const std::string& path) {
+         ASSERT_EQ(mkfifo((path + ".fifo").c_str(), 0600), 0);
+         fs::create_symlink(path + ".fifo", path);
+     }},
+    {"a socket",
+     [](const std::string& path) {
+         const int descriptor = socket(AF_UNIX, SOCK_STREAM, 0);
+         sockaddr_un address = {AF_UNIX, {}};
+         path.copy(address.sun_path, sizeof address.sun_path - 1);
+         ASSERT_EQ(bind(descriptor, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
+         close(descriptor);
+     }},
+};
+
+TEST(log, what_is_no_regular_file_neither_waits_nor_logs)
+{
+    for (const Odd_File& odd : odd_files)
+        for (const char* place : {".cimplerc", ".cimple/messages", ".cimple/messages.lock"}) {
+            SCOPED_TRACE(std::string(odd.name) + " for " + place);
+            in_child([&] {
+                alarm(60); // whoever waits does so for ever
+                Home home;
+                home.level("ERR");
+                fs::create_directory(home.path(".cimple"));
+                fs::remove(home.path(place));
+                odd.make(home.path(place));
+                const size_t before = open_files();
+                log(Log_Level::ERR, "F", 1, "lost");
+                EXPECT_EQ(open_files(), before);
+                fs::remove(home.path(place));
+                home.level("ERR");
+                log(Log_Level::ERR, "F", 1, "kept");
+                EXPECT_EQ(split(home.messages()).size(), 1u);
+            });
+        }
+}
+
+TEST(log, links_to_regular_files_are_followed)
+{
+    Home home;
+    Temp_Folder elsewhere;
+    elsewhere.write("rc", "LOG_LEVEL=ERR\n");
+    elsewhere.write("log", "");
+    elsewhere.write("lock", "");
+    fs::create_directory(home.path(".cimple"));
+    fs::create_symlink(elsewhere.path("rc"), home.path(".cimplerc"));
+    fs::create_symlink(elsewhere.path("log"), home.path(".cimple/messages"));
+    fs::create_symlink(elsewhere.path("lock"), home.path(".cimple/messages.lock"));
+    log(Log_Level::ERR, "F", 1, "x");
+    EXPECT_EQ(split(elsewhere.read("log")).size(), 1u);
+}
+
+// Sanitizers take more room for themselves than they could be given, and end the process without memory.
+#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__)
+TEST(log, a_line_without_memory_is_cut)
+{
+    in_child([] {
+        Home home;
+        home.level("ERR");
+        log(Log_Level::ERR, "F", 1, "whole");
+        const std::string text(100u << 20, 'y');
+        std::ifstream statm("/proc/self/statm");
+        rlim_t pages = 0;
+        statm >> pages;
+        const rlim_t room = pages * rlim_t(sysconf(_SC_PAGESIZE)) + (50u << 20);
+        const rlimit limit = {room, room};
+        ASSERT_EQ(setrlimit(RLIMIT_AS, &limit), 0);
+        log(Log_Level::ERR, "F", 1, "%s", text.c_str());
+        log(Log_Level::ERR, "F", 1, "%s", "whole again");
+        const std::vector<std::string> lines = split(home.messages());
+        ASSERT_EQ(lines.size(), 3u);
+        EXPECT_EQ(lines[1].size(), 510u);
+        EXPECT_EQ(text_of_line(lines[1]).find_first_not_of('y'), std::string::npos);
+        EXPECT_EQ(text_of_line(lines[2]), "whole again");
+    });
+}
+#endif
+
+TEST(log, is_no_place_to_be_cancelled_at)
+{
+    Home home;
+    home.level("DBG");
+    struct Argument
+    {
+        std::atomic<bool> is_in = false;
+        std::atomic<bool> is_cancelled = false;
+    } argument;
+    pthread_t thread;
+    const auto body = [](void* data) -> void* {
+        auto& told = *static_cast<Argument*>(data);
+        told.is_in = true;
+        while (!told.is_cancelled)
+            continue;
+        {
+            // Writes as it leaves: an unwinding in there would end the process.
+            LOG_SCOPE("cancelled");
+        }
+        log(Log_Level::ERR, "F", 1, "last words");
+        pthread_testcancel();
+        return data;
+    };
+    ASSERT_EQ(pthread_create(&thread, nullptr, body, &argument), 0);
+    while (!argument.is_in)
+        continue;
+    ASSERT_EQ(pthread_cancel(thread), 0);
+    argument.is_cancelled = true;
+    void* result = nullptr;
+    pthread_join(thread, &result);
+    EXPECT_EQ(result, PTHREAD_CANCELED);
+    EXPECT_EQ(split(home.messages()).size(), 3u);
+    log(Log_Level::ERR, "F", 1, "the mutex is free");
+    EXPECT_EQ(split(home.messages()).size(), 4u);
 }
 
 TEST(log, a_failing_lock_does_not_stop_the_line)
