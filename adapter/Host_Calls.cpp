@@ -4,6 +4,6 @@
 
 namespace KPRV {
 
-constinit Host_Calls host_calls = {::gethostname, ::getdomainname, ::gethostbyname, ::uname};
+constinit Host_Calls host_calls = {::gethostname, ::getdomainname, ::gethostbyname_r, ::uname};
 
 } // namespace KPRV

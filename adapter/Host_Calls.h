@@ -13,7 +13,8 @@ struct Host_Calls
 {
     int (*gethostname)(char* name, size_t size);
     int (*getdomainname)(char* name, size_t size);
-    hostent* (*gethostbyname)(const char* name);
+    int (*gethostbyname_r)(const char* name, hostent* entry, char* room, size_t size, hostent** found,
+                           int* error);
     int (*uname)(utsname* name);
 };
 

@@ -6,8 +6,10 @@
 #include <arpa/inet.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <cstring>
-#include <mutex>
+#include <memory>
+#include <new>
 
 namespace KPRV {
 
@@ -51,19 +53,53 @@ enum class Lookup
     FOUND
 };
 
+/// The resolver's answer in room of its own, so that no thread waits for another's name server.
+class Host_Entry
+{
+public:
+    explicit Host_Entry(const char* host)
+    {
+        constexpr size_t MOST = size_t(1) << 20;
+        size_t size = sizeof _usual;
+        bool wants_more = !ask(host, _usual, size);
+        while (wants_more && size < MOST) {
+            size *= 4;
+            _more.reset(new (std::nothrow) char[size]);
+            if (!_more)
+                return;
+            wants_more = !ask(host, _more.get(), size);
+        }
+    }
+    /// Null if there is none.
+    const hostent* entry() const { return _entry; }
+
+private:
+    /// False if the answer needs more room.
+    bool ask(const char* host, char* room, size_t size)
+    {
+        int error = 0;
+        const int status = host_calls.gethostbyname_r(host, &_record, room, size, &_entry, &error);
+        if (status != 0)
+            _entry = nullptr;
+        return status != ERANGE;
+    }
+
+    hostent _record;
+    hostent* _entry = nullptr;
+    char _usual[1024];
+    std::unique_ptr<char[]> _more;
+};
+
 /// Finds the host's first address that is no loopback address.
 Lookup look_up(const char* host, Out_Text out)
 {
-    // The resolver's answer is one static record.
-    static constinit std::mutex resolver;
-    const std::lock_guard lock(resolver);
-    const hostent* entry = host_calls.gethostbyname(host);
+    const Host_Entry answer(host);
+    const hostent* const entry = answer.entry();
     if (!entry || !entry->h_addr_list || !entry->h_addr_list[0])
         return Lookup::NONE;
     for (char** next = entry->h_addr_list; *next; next++) {
-        in_addr address;
-        memcpy(&address, *next, sizeof address);
-        const char* text = inet_ntoa(address);
+        char text[INET_ADDRSTRLEN];
+        inet_ntop(AF_INET, *next, text, sizeof text);
         if (strncmp(text, "127", 3) != 0) {
             out.set(text);
             return Lookup::FOUND;

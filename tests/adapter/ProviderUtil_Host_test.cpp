@@ -8,8 +8,13 @@
 
 #include <arpa/inet.h>
 
-#include <array>
+#include <cerrno>
+#include <chrono>
+#include <condition_variable>
 #include <cstring>
+#include <functional>
+#include <mutex>
+#include <thread>
 
 using namespace KPRV;
 
@@ -27,7 +32,9 @@ struct ProviderUtil_Host : testing::Test
         host_calls = {
             [](char* out, size_t size) { return current->tell(current->name, out, size); },
             [](char* out, size_t size) { return current->tell(current->domain, out, size); },
-            [](const char*) { return current->look_up(); },
+            [](const char*, hostent* entry, char* room, size_t size, hostent** found, int*) {
+                return current->look_up(entry, room, size, found);
+            },
             [](utsname* out) {
                 strcpy(out->nodename, "node");
                 return current->uname_result;
@@ -44,18 +51,27 @@ struct ProviderUtil_Host : testing::Test
         strncpy(out, text, size);
         return 0;
     }
-    hostent* look_up()
+    /// Writes all that it finds into the caller's room.
+    int look_up(hostent* entry, char* room, size_t size, hostent** found)
     {
+        if (wanted_room)
+            rooms.push_back(size);
+        *found = nullptr;
+        const size_t count = addresses.size();
+        if (size < wanted_room)
+            return ERANGE;
+        if (on_look_up)
+            on_look_up();
         if (!resolves)
-            return nullptr;
-        pointers.clear();
-        for (in_addr& address : addresses)
-            pointers.push_back(reinterpret_cast<char*>(&address));
-        pointers.push_back(nullptr);
-        entry.h_addrtype = AF_INET;
-        entry.h_length = 4;
-        entry.h_addr_list = pointers.data();
-        return &entry;
+            return 0;
+        char** const pointers = reinterpret_cast<char**>(room);
+        char* const words = room + (count + 1) * sizeof(char*);
+        for (size_t i = 0; i < count; i++)
+            pointers[i] = static_cast<char*>(memcpy(words + i * sizeof(in_addr), &addresses[i], sizeof(in_addr)));
+        pointers[count] = nullptr;
+        *entry = {nullptr, nullptr, AF_INET, sizeof(in_addr), pointers};
+        *found = entry;
+        return 0;
     }
     void has(std::initializer_list<const char*> texts)
     {
@@ -72,8 +88,10 @@ struct ProviderUtil_Host : testing::Test
     bool resolves = true;
     int uname_result = 0;
     std::vector<in_addr> addresses;
-    std::vector<char*> pointers;
-    hostent entry = {};
+    /// What an answer takes, and what was offered for it.
+    size_t wanted_room = 0;
+    std::vector<size_t> rooms;
+    std::function<void()> on_look_up;
     Log_Capture log;
     char buffer[64] = "left over";
 };
@@ -183,6 +201,51 @@ TEST_F(ProviderUtil_Host, nothing_is_written_beyond_the_buffer)
     buffer[0] = '#';
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, 0), 2);
     EXPECT_EQ(buffer[0], '#');
+}
+
+TEST_F(ProviderUtil_Host, a_long_answer_gets_more_room)
+{
+    has({"127.0.0.1", "10.1.2.3"});
+    wanted_room = 40000;
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 0);
+    EXPECT_STREQ(buffer, "10.1.2.3");
+    EXPECT_EQ(rooms, (std::vector<size_t>{1024, 4096, 16384, 65536}));
+    // An answer without end is none.
+    wanted_room = ~size_t(0);
+    rooms.clear();
+    EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
+    EXPECT_STREQ(buffer, "alpha");
+    EXPECT_EQ(rooms.back(), size_t(1) << 20);
+    EXPECT_EQ(log.said(), Lines{BY_NAME});
+}
+
+// A slow name server holds up who asks it, and nobody else.
+TEST_F(ProviderUtil_Host, look_ups_do_not_wait_for_each_other)
+{
+    has({"10.1.2.3"});
+    std::mutex mutex;
+    std::condition_variable came;
+    int inside = 0;
+    bool all_inside = true;
+    constexpr int THREADS = 8;
+    on_look_up = [&] {
+        std::unique_lock lock(mutex);
+        inside++;
+        came.notify_all();
+        all_inside &= came.wait_for(lock, std::chrono::seconds(30), [&] { return inside == THREADS; });
+    };
+    std::vector<std::string> names(THREADS);
+    {
+        std::vector<std::jthread> threads;
+        for (std::string& each : names)
+            threads.emplace_back([&each] {
+                char text[64] = {};
+                ProviderUtil::getHostInfo(text, sizeof text);
+                each = text;
+            });
+    }
+    EXPECT_TRUE(all_inside) << "they were let in one by one";
+    EXPECT_EQ(names, std::vector<std::string>(THREADS, "10.1.2.3"));
 }
 
 TEST_F(ProviderUtil_Host, node_name)

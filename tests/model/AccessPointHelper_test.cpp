@@ -85,7 +85,7 @@ TEST_F(Access_Point, a_host_without_a_name_has_none_even_with_an_agent)
 TEST_F(Access_Point, a_name_takes_the_place_of_a_missing_address)
 {
     const Named_Process agent("qxmagent");
-    host_calls.gethostbyname = [](const char*) { return static_cast<hostent*>(nullptr); };
+    host_calls.gethostbyname_r = find_no_host;
     EXPECT_EQ(points().at(0).at("AccessInfo"), "https://h:34568/index.html");
     EXPECT_EQ(log.said("WARN"), Lines{});
 }

@@ -47,7 +47,7 @@ TEST_F(Host_System, is_one_instance_without_the_library)
 
 TEST_F(Host_System, whose_name_does_not_resolve)
 {
-    host_calls.gethostbyname = [](const char*) { return static_cast<hostent*>(nullptr); };
+    host_calls.gethostbyname_r = find_no_host;
     Set_Properties set = system();
     EXPECT_EQ(set["Name"], "h");
     EXPECT_EQ(set["NameFormat"], "Other");

@@ -6,6 +6,14 @@
 
 namespace KPRV {
 
+/// A name that nobody knows, for `gethostbyname_r`.
+inline int find_no_host(const char*, hostent*, char*, size_t, hostent** found, int* error)
+{
+    *found = nullptr;
+    *error = HOST_NOT_FOUND;
+    return 0;
+}
+
 /// A host with the address 10.0.0.1, for a scope.
 class Fixed_Host
 {
@@ -17,11 +25,12 @@ public:
             name[1] = '\0';
             return 0;
         };
-        host_calls.gethostbyname = [](const char*) {
+        host_calls.gethostbyname_r = [](const char*, hostent*, char*, size_t, hostent** found, int*) {
             static in_addr address = {inet_addr("10.0.0.1")};
             static char* addresses[] = {reinterpret_cast<char*>(&address), nullptr};
             static hostent entry = {nullptr, nullptr, AF_INET, sizeof address, addresses};
-            return &entry;
+            *found = &entry;
+            return 0;
         };
     }
     ~Fixed_Host() { host_calls = _old; }
