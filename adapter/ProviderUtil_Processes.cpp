@@ -1,41 +1,18 @@
+#include "adapter/Child_Program.h"
 #include "adapter/ProviderUtil.h"
 #include "adapter/ProviderUtil_Log.h"
 
 #include <dirent.h>
 #include <fcntl.h>
-#include <spawn.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
-#include <cerrno>
 #include <cstdio>
 #include <memory>
 
 namespace KPRV {
 
 namespace {
-
-/// Runs a program of the search path and waits for it; the result has the form that a shell's caller knows.
-int run(const char* const* arguments)
-{
-    constexpr int CANNOT_RUN = 126 << 8, NOT_FOUND = 127 << 8;
-    pid_t child = 0;
-    const int error =
-        posix_spawnp(&child, arguments[0], nullptr, nullptr, const_cast<char* const*>(arguments), environ);
-    if (error == ENOENT)
-        return NOT_FOUND;
-    if (error == EACCES || error == ENOEXEC)
-        return CANNOT_RUN;
-    if (error != 0)
-        return -1;
-    int status = -1;
-    while (waitpid(child, &status, 0) < 0) {
-        if (errno != EINTR)
-            return -1;
-    }
-    return status;
-}
 
 /// True if the name that a process list shows for a live process ends in `ending`. The list shows 15
 /// characters, and marks a zombie behind its name.
@@ -88,8 +65,8 @@ int ProviderUtil::TftpGetFile(const char* host, const char* file)
     UTIL_SCOPE("TftpGetFile");
     const char* const remove[] = {"rm", "-f", file, nullptr};
     const char* const fetch[] = {"tftp", host, "-c", "get", file, nullptr};
-    run(remove);
-    return run(fetch);
+    run_program(remove);
+    return run_program(fetch);
 }
 
 bool ProviderUtil::IsFileExist(const char* path)
