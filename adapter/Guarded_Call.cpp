@@ -1,6 +1,7 @@
 #include "adapter/Guarded_Call.h"
 
 #include "adapter/HbaAgentError.h"
+#include "adapter/No_Address.h"
 
 #include <exception>
 
@@ -17,6 +18,9 @@ void log_caught(const Guarded_Entry& entry, Call_Site site)
         throw;
     } catch (const HbaAgentError& error) {
         say("%s%s%s got User exception %d: %s", address, dash, entry.name, error.code, error.message.c_str());
+    } catch (const No_Address& error) {
+        // Requests are made inside the guards: the entry point has no part in this.
+        say("%s", error.what());
     } catch (const std::exception& error) {
         say("%s%s%s got std exception: %s", address, dash, entry.name, error.what());
     } catch (...) {

@@ -12,6 +12,8 @@ namespace KPRV {
 ///     libGetPortByWwn got User exception 7: text        an HbaAgentError, with its code and message
 ///     libGetPortByWwn got std exception: text           a std::exception
 ///     libGetPortByWwn got default exception             anything else
+///
+/// An address that is none, of which the request was to be made, is told without the entry point.
 struct Guarded_Entry
 {
     /// As the texts write it: the variable's name, one historical misspelling apart.

@@ -49,7 +49,7 @@ public:
 
     static String eraseColonsFromIndex(const String& text);
     /// Index form of a flat address. What holds a colon comes back as it is, and so do two or three
-    /// characters. Throws std::out_of_range for less.
+    /// characters. Throws `No_Address` for less.
     static String getIndexInColonFormat(const String& address);
     /// Six bytes of a flat MAC. Digits that do not parse leave 0.
     static void getRawMacFromStr(const char* text, unsigned char* mac);

@@ -1,9 +1,10 @@
+#include "adapter/No_Address.h"
 #include "adapter/ProviderUtil.h"
 #include "adapter/ProviderUtil_Log.h"
 
 #include <cstdio>
 #include <cstring>
-#include <stdexcept>
+
 
 namespace KPRV {
 
@@ -26,7 +27,7 @@ String ProviderUtil::getIndexInColonFormat(const String& address)
     }
     const uint32 size = address.size();
     if (size < 2)
-        throw std::out_of_range("an address has at least two characters");
+        throw No_Address(address.c_str());
     if (size < 4)
         return address;
 

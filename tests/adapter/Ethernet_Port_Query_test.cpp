@@ -57,5 +57,9 @@ TEST_F(Ethernet_Port_Query, an_exception_is_minus_1)
 TEST_F(Ethernet_Port_Query, an_address_too_short_is_minus_1)
 {
     EXPECT_EQ(query("8"), -1);
+    EXPECT_EQ(query(""), -1);
     EXPECT_EQ(library.calls.size(), 0u);
+    EXPECT_EQ(log.said(), (Lines{R"(ERR "8" is no address: it has fewer than two characters)",
+                                 R"(ERR "" is no address: it has fewer than two characters)"}))
+        << "a call that was not made is not told of";
 }

@@ -1,5 +1,7 @@
 #include "adapter/ProviderUtil.h"
 
+#include "adapter/No_Address.h"
+
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
@@ -46,7 +48,7 @@ TEST(ProviderUtil_Addresses, index_form_has_a_colon_after_each_pair)
     EXPECT_EQ(index_form("AABBC"), "AA:BB:C");
     EXPECT_EQ(index_form("AA"), "AA");
     EXPECT_EQ(index_form("AAB"), "AAB");
-    EXPECT_THROW(index_form("A"), std::out_of_range);
+    EXPECT_THROW(index_form("A"), No_Address);
     EXPECT_THROW(index_form(""), std::out_of_range);
 }
 

@@ -230,6 +230,20 @@ TEST_F(Processed_Events, OfAnEthernetPortWithoutADeviceStillGoOut)
     EXPECT_EQ(2u, alerts_of(10, 4).size()) << "no port at all";
 }
 
+TEST_F(Processed_Events, OfAnEthernetPortThatIsNotNamedBlameNoCallThatWasNotMade)
+{
+    for (const char* port : {"", R"("portIndexString": "")", R"("portIndexString": "8")"}) {
+        library.calls.clear();
+        log.clear();
+        const std::vector<Alert> alerts = alerts_of(10, 3, port);
+        ASSERT_EQ(2u, alerts.size()) << port;
+        EXPECT_EQ("The network port  has been enabled", text_of(alerts[0], "Message"));
+        EXPECT_TRUE(library.calls.empty());
+        for (const std::string& line : log.said("ERR"))
+            EXPECT_EQ(std::string::npos, line.find("libGetEthPortByEthMac")) << line;
+    }
+}
+
 TEST_F(Processed_Events, OfADeviceWithALongNameAreCut)
 {
     library.answers("getEthPortByEthMac", json("{'ethData': {'ethDev': '" + std::string(400, 'e') + "'}}"));
