@@ -44,22 +44,38 @@ const char* CMPI_Container::peek_name(uint32 index, String&)
 
 int CMPI_Container::get_value(uint32 index, Value::Type type, Value& value)
 {
+    return _get(index, type, nullptr, value);
+}
+
+int CMPI_Container::get_reference(uint32 index, const Meta_Reference* reference, Value::Type type,
+                                  Value& value)
+{
+    return _get(index, type, reference->meta_class, value);
+}
+
+int CMPI_Container::_get(uint32 index, Value::Type type, const Meta_Class* wanted, Value& value)
+{
     value.clear();
     if (!_in_bounds(index))
         return -1;
     CMPIString* name = nullptr;
     const CMPIData data = _at(index, &name);
-    if (cmpi_to_cimple_value(_repository, _broker, _name_space, data, value) != 0) {
+    const auto mismatch = [&](Value::Type actual) {
+        LOG_CONVERSION(WARN, "type mismatch on %s: %s/%s", text_of(name), name_of(actual), name_of(type));
+        return -1;
+    };
+    // An object with others in it is not taken apart for a feature that cannot hold it.
+    const Value::Type sent = value_type_of(data.type);
+    const bool is_object = sent == Value::INSTANCE || sent == Value::INSTANCE_ARRAY;
+    if (is_object && sent != type && !(data.state & CMPI_nullValue))
+        return mismatch(sent);
+    if (cmpi_to_cimple_value(_repository, _broker, _name_space, data, value, {_depth, wanted}) != 0) {
         LOG_CONVERSION(WARN, "cmpi_to_cimple_value() failed");
         return -1;
     }
     if (value.type != type)
         _relax(type, value);
-    if (value.type != type) {
-        LOG_CONVERSION(WARN, "type mismatch on %s: %s/%s", text_of(name), name_of(value.type), name_of(type));
-        return -1;
-    }
-    return 0;
+    return value.type == type ? 0 : mismatch(value.type);
 }
 
 void CMPI_Container::_relax(Value::Type, Value&) {}
@@ -100,8 +116,8 @@ int CMPI_Container::_set_any(const char* name, const Value& value, uint32 flags)
         }
     }
     Made_Objects made;
-    if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr) !=
-        0)
+    if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr,
+                      _depth) != 0)
         return _not_made(name);
     if (end && data.type == CMPI_ref)
         _ends->note(name, end, data.value.ref);

@@ -17,11 +17,15 @@ public:
     int get_name(uint32 index, String& name) override;
     const char* peek_name(uint32 index, String& hold) override;
     int get_value(uint32 index, Value::Type type, Value& value) override;
+    int get_reference(uint32 index, const Meta_Reference* reference, Value::Type type, Value& value) override;
     int set_value(const char* name, const Value& value, uint32 flags) override;
 
     /// From now on the objects that `set_value` makes are given back once they have been set, which copies
     /// them. For a thread that no request's end cleans up behind.
     void give_back_what_is_made() { _gives_back = true; }
+
+    /// How many references and embedded instances the object lies in.
+    void lies_in(unsigned depth) { _depth = depth; }
 
     /// Paths of references are taken from there and noted there. Null for none.
     void share(Shared_Ends* ends) { _ends = ends; }
@@ -47,10 +51,13 @@ protected:
     const char* _name_space;
 
 private:
+    /// `wanted`: what an instance must be of, if that is known.
+    int _get(uint32 index, Value::Type type, const Meta_Class* wanted, Value& value);
     /// Values that go the long way; apart, so that the others find a small function.
     int _set_any(const char* name, const Value& value, uint32 flags);
 
     bool _gives_back = false;
+    unsigned _depth = 0;
     Shared_Ends* _ends = nullptr;
 };
 

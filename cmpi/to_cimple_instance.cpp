@@ -21,15 +21,22 @@ static const Meta_Class* class_of(const Meta_Repository* repository, const CMPIO
     return meta_class;
 }
 
-static Instance* import(Container&& container, const Meta_Class* meta_class, uint32 mask)
+/// From the container, which lies one level below the place where the object was met.
+static Instance* import(CMPI_Container&& container, const Meta_Class* meta_class, uint32 mask,
+                        Nesting nesting)
 {
+    if (!may_descend(nesting.depth))
+        return nullptr;
     Ref<Instance> instance(create(meta_class, false));
+    if (nesting.wanted && !is_subclass(nesting.wanted, meta_class))
+        return instance.steal();
+    container.lies_in(nesting.depth + 1);
     Instance* target = instance.ptr();
     return container.convert(meta_class, mask, target) == 0 ? instance.steal() : nullptr;
 }
 
 Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
-                              const char* name_space, const CMPIInstance* instance)
+                              const char* name_space, const CMPIInstance* instance, Nesting nesting)
 {
     if (!instance)
         return nullptr;
@@ -41,11 +48,11 @@ Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroke
     const Meta_Class* const meta_class = class_of(repository, path);
     if (!meta_class)
         return nullptr;
-    return import(CMPIInstance_Container(repository, broker, name_space, instance), meta_class, 0);
+    return import(CMPIInstance_Container(repository, broker, name_space, instance), meta_class, 0, nesting);
 }
 
 Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
-                              const char* name_space, const CMPIObjectPath* path)
+                              const char* name_space, const CMPIObjectPath* path, Nesting nesting)
 {
     if (!path) {
         LOG_CONVERSION(WARN, "null instance");
@@ -54,7 +61,8 @@ Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroke
     const Meta_Class* const meta_class = class_of(repository, path);
     if (!meta_class)
         return nullptr;
-    return import(CMPIObjectPath_Container(repository, broker, name_space, path), meta_class, FLAG_KEY);
+    return import(CMPIObjectPath_Container(repository, broker, name_space, path), meta_class, FLAG_KEY,
+                  nesting);
 }
 
 } // namespace KPRV

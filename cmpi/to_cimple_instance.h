@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cmpi/Nesting.h"
 #include "runtime/Instance.h"
 #include "runtime/Meta_Repository.h"
 
@@ -10,11 +11,12 @@ namespace KPRV {
 
 /// An embedded instance or a reference of the server as an instance of whatever class of the repository it
 /// names, so that it keeps its most derived class. Null on failure, with a log line (but none for a null
-/// `CMPIInstance`). The caller owns the result.
+/// `CMPIInstance`). One whose class is not that which is wanted comes without its content: it is refused by
+/// that class, and what may lie in it is not looked at. The caller owns the result.
 Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
-                              const char* name_space, const CMPIInstance* instance);
+                              const char* name_space, const CMPIInstance* instance, Nesting nesting = {});
 /// As above, with the keys only.
 Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,
-                              const char* name_space, const CMPIObjectPath* path);
+                              const char* name_space, const CMPIObjectPath* path, Nesting nesting = {});
 
 } // namespace KPRV

@@ -92,11 +92,13 @@ struct Instance_Source
     const Meta_Repository* repository;
     const CMPIBroker* broker;
     const char* name_space;
+    Nesting nesting;
 
     Instance* make(CMPIType word, const CMPIValue& value) const
     {
-        return word == CMPI_instance ? _to_cimple_instance(repository, broker, name_space, value.inst)
-                                     : _to_cimple_instance(repository, broker, name_space, value.ref);
+        return word == CMPI_instance
+                   ? _to_cimple_instance(repository, broker, name_space, value.inst, nesting)
+                   : _to_cimple_instance(repository, broker, name_space, value.ref, nesting);
     }
 };
 
@@ -192,7 +194,7 @@ static void set_typed_null(Value::Type type, Value& value)
 }
 
 int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                         const CMPIData& data, Value& value)
+                         const CMPIData& data, Value& value, Nesting nesting)
 {
     value.clear();
     const Value::Type type = value_type_of(data.type);
@@ -210,7 +212,7 @@ int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* br
         return 0;
     }
 
-    const Instance_Source source{repository, broker, name_space};
+    const Instance_Source source{repository, broker, name_space, nesting};
     if (type == Value::INSTANCE)
         return load_instance(source, data, value);
     if (type == Value::INSTANCE_ARRAY)

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cmpi/Nesting.h"
 #include "runtime/Meta_Repository.h"
 #include "runtime/Value.h"
 
@@ -11,6 +12,6 @@ namespace KPRV {
 /// Translates what the server gives into a value of its own type; nothing is widened. 0, or -1 with a log
 /// line (but none for an array without object).
 int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                         const CMPIData& data, Value& value);
+                         const CMPIData& data, Value& value, Nesting nesting = {});
 
 } // namespace KPRV

@@ -1,6 +1,7 @@
 #include "cmpi/to_cmpi_data.h"
 #include "cmpi/CMPI_Containers.h"
 #include "cmpi/Made_Objects.h"
+#include "cmpi/Nesting.h"
 #include "cmpi/cmpi_types.h"
 #include "runtime/log.h"
 #include "runtime/type_dispatch.h"
@@ -87,7 +88,7 @@ static int array_to_data(const Maker& maker, const Value& value, CMPIType elemen
 
 static int instance_array_to_data(const Meta_Repository* repository, const Maker& maker,
                                   const char* name_space, const Value& value, CMPIType element_word,
-                                  CMPIData& data)
+                                  CMPIData& data, unsigned depth)
 {
     const Array<Instance*>& elements = *value.peek<Array<Instance*>>();
     CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
@@ -96,7 +97,7 @@ static int instance_array_to_data(const Meta_Repository* repository, const Maker
     for (uint32 i = 0; i < elements.size(); i++) {
         CMPIData element = {};
         if (to_cmpi_scalar<Instance*>::func(repository, maker.broker, name_space, elements[i], element_word,
-                                            element) != 0) {
+                                            element, depth) != 0) {
             LOG_CONVERSION(WARN, "element conversion failed");
             return -1;
         }
@@ -107,7 +108,7 @@ static int instance_array_to_data(const Meta_Repository* repository, const Maker
 }
 
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made)
+                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made, unsigned depth)
 {
     const Maker maker = {broker, made};
     data = CMPIData();
@@ -121,10 +122,11 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
     if (value.type == Value::INSTANCE) {
         Instance* instance = nullptr;
         value.get_value(instance);
-        return to_cmpi_scalar<Instance*>::func(repository, broker, name_space, instance, instance_word, data);
+        return to_cmpi_scalar<Instance*>::func(repository, broker, name_space, instance, instance_word, data,
+                                               depth);
     }
     if (value.type == Value::INSTANCE_ARRAY)
-        return instance_array_to_data(repository, maker, name_space, value, instance_word, data);
+        return instance_array_to_data(repository, maker, name_space, value, instance_word, data, depth);
 
     const uint32 scalar = uint32(value.type) & ~uint32(Value::ARRAY_BIT);
     if (scalar >= NUM_TYPES) {
@@ -142,7 +144,7 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
 
 int to_cmpi_scalar<Instance*>::func(const Meta_Repository* repository, const CMPIBroker* broker,
                                     const char* name_space, const Instance* instance, CMPIType type,
-                                    CMPIData& data)
+                                    CMPIData& data, unsigned depth)
 {
     if (!instance) {
         LOG_CONVERSION(WARN, "null instance argument");
@@ -159,6 +161,8 @@ int to_cmpi_scalar<Instance*>::func(const Meta_Repository* repository, const CMP
         LOG_CONVERSION(WARN, "null classname");
         return -1;
     }
+    if (!may_descend(depth))
+        return -1;
 
     CMPIObjectPath* const path = CMNewObjectPath(broker, name_space, class_name, nullptr);
     if (!path) {
@@ -166,6 +170,7 @@ int to_cmpi_scalar<Instance*>::func(const Meta_Repository* repository, const CMP
         return -1;
     }
     CMPIObjectPath_Container path_container(repository, broker, name_space, path);
+    path_container.lies_in(depth + 1);
     if (path_container.convert(instance, FLAG_KEY) != 0) {
         LOG_CONVERSION(WARN, "Container::convert() failed");
         return -1;
@@ -183,6 +188,7 @@ int to_cmpi_scalar<Instance*>::func(const Meta_Repository* repository, const CMP
             return -1;
         }
         CMPIInstance_Container container(repository, broker, name_space, data.value.inst);
+        container.lies_in(depth + 1);
         if (container.convert(instance, 0) != 0) {
             LOG_CONVERSION(WARN, "Container::convert() failed");
             return -1;

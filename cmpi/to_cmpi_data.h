@@ -12,9 +12,10 @@ class Made_Objects;
 
 /// Translates one value for the server. `flags` are the feature's: they tell an embedded instance from a
 /// reference. 0, or -1 with a log line. The objects made belong to the server; those of texts, datetimes and
-/// arrays are noted in `made`, if given.
+/// arrays are noted in `made`, if given. `depth` is that of the object that the value lies in.
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made = nullptr);
+                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made = nullptr,
+                  unsigned depth = 0);
 
 template <class T>
 struct to_cmpi_scalar;
@@ -25,7 +26,7 @@ template <>
 struct to_cmpi_scalar<Instance*>
 {
     static int func(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
-                    const Instance* instance, CMPIType type, CMPIData& data);
+                    const Instance* instance, CMPIType type, CMPIData& data, unsigned depth = 0);
 };
 
 } // namespace KPRV

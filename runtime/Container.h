@@ -24,6 +24,12 @@ public:
         return get_name(index, hold) == 0 ? hold.c_str() : nullptr;
     }
 
+    /// `get_value` for a reference, where the container may spare itself what the reference cannot hold.
+    virtual int get_reference(uint32 index, const Meta_Reference*, Value::Type type, Value& value)
+    {
+        return get_value(index, type, value);
+    }
+
     /// Export: each feature with a flag of the mask (0: all) and a value goes to `set_value`. A feature that
     /// fails is logged and left out. -1 only for a null instance.
     int convert(const Instance* instance, uint32 mask);

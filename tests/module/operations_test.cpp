@@ -1,6 +1,8 @@
 #include "runtime/Registration.h"
 #include "tests/module/Module_Fixture.h"
+#include "tests/support/Small_Stack.h"
 
+#include <algorithm>
 #include <set>
 #include <thread>
 
@@ -143,6 +145,33 @@ TEST_F(Operations, ComeAndGoWithTheCountOfTheirInterfaces)
     EXPECT_EQ(CMPI_RC_OK, server->unload(false));
     EXPECT_EQ(0u, server->providers().count());
     EXPECT_EQ(1u, server->enumerate_instances("KALDERA_Product").instances.size());
+}
+
+// A server's request threads may have small stacks, and its clients name what they like.
+TEST_F(Operations, TakeNoReferenceApartThatFitsNowhere)
+{
+    open("empty.json");
+    host::Path_Value nested = path_of("KALDERA_FCPortSystemDevice");
+    for (int depth = 0; depth < 400; depth++) {
+        host::Path_Value around = path_of("KALDERA_FCPortSystemDevice");
+        around.keys.push_back({"GroupComponent", host::Value::path(std::move(nested))});
+        nested = std::move(around);
+    }
+    const host::Path_Value service = {{},
+                                      "root/kaldera",
+                                      "KALDERA_HBASoftwareInstallationService",
+                                      {{"Name", host::Value::path(nested)}}};
+    on_small_stack([&] {
+        mark();
+        server->get_instance(nested);
+        server->invoke_method(service, "InstallFromURI", {{"Target", host::Value::path(nested)}});
+        server->associators("KALDERA_FCPortSystemDevice", nested, {});
+    });
+    const Lines warnings = said("WARN");
+    EXPECT_NE(0, std::ranges::count(warnings, "WARN failed to assign instance of KALDERA_FCPortSystemDevice to "
+                                              "KALDERA_FCPortSystemDevice.GroupComponent"));
+    EXPECT_NE(0, std::ranges::count(warnings, "WARN type mismatch on Name: instance/string"));
+    EXPECT_EQ("", server->violations().text());
 }
 
 } // namespace
