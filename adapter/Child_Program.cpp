@@ -11,9 +11,9 @@
 #include <vector>
 
 // A server may ignore SIGCHLD, or wait for every child that it has: the status of a child of its own would be
-// lost. So the program is the child of a process in between, which waits for it and tells the status through a
-// pipe. In both processes stand only calls that are safe where other threads of the server held locks at the
-// fork.
+// lost. So the program is the child of a process in between, which waits for it and tells the status through
+// a pipe. In both processes stand only calls that are safe where other threads of the server held locks at
+// the fork.
 
 namespace KPRV {
 
@@ -128,8 +128,8 @@ void set_default_dispositions()
         sigaction(number, &standard, nullptr);
 }
 
-/// Of the server's descriptors standard output and error stay, and the one that is kept, which gets the number
-/// behind them.
+/// Of the server's descriptors standard output and error stay, and the one that is kept, which gets the
+/// number behind them.
 void leave_descriptors(int kept)
 {
     const int null = open("/dev/null", O_RDWR);

@@ -5,7 +5,6 @@
 #include <cstdio>
 #include <cstring>
 
-
 namespace KPRV {
 
 String ProviderUtil::eraseColonsFromIndex(const String& text)

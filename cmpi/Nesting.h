@@ -4,8 +4,9 @@
 
 namespace KPRV {
 
-/// References and embedded instances may lie in each other so deep; an object of a request itself is no level.
-/// No client comes near it, and without a bound a hostile one ends a server whose threads have small stacks.
+/// References and embedded instances may lie in each other so deep; an object of a request itself is no
+/// level. No client comes near it, and without a bound a hostile one ends a server whose threads have small
+/// stacks.
 inline constexpr unsigned MOST_NESTED_REFERENCES = 64;
 
 /// Where in an object of the server a reference or an embedded instance is met.

@@ -93,10 +93,9 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& ins
             continue;
         }
         Value value;
-        const int status =
-            feature->flags & FLAG_REFERENCE
-                ? get_reference(i, static_cast<const Meta_Reference*>(feature), type, value)
-                : get_value(i, type, value);
+        const int status = feature->flags & FLAG_REFERENCE
+                               ? get_reference(i, static_cast<const Meta_Reference*>(feature), type, value)
+                               : get_value(i, type, value);
         if (status != 0 || replace(instance, feature, value) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
     }

@@ -20,8 +20,8 @@ enum class Log_Level : int
 extern const char* const _log_level_strings[5];
 
 /// Writes one line to the log of the user's account, `.cimple/messages` in the home directory, if `.cimplerc`
-/// there asks for it. Never fails, never throws, is no point where a thread is cancelled, and never calls into
-/// the CIM server: a line for which there is no memory is cut. `file` is a base name.
+/// there asks for it. Never fails, never throws, is no point where a thread is cancelled, and never calls
+/// into the CIM server: a line for which there is no memory is cut. `file` is a base name.
 void log(Log_Level level, const char* file, size_t line, const char* format, ...) noexcept
     __attribute__((format(printf, 4, 5)));
 void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments) noexcept

@@ -67,7 +67,8 @@ struct ProviderUtil_Host : testing::Test
         char** const pointers = reinterpret_cast<char**>(room);
         char* const words = room + (count + 1) * sizeof(char*);
         for (size_t i = 0; i < count; i++)
-            pointers[i] = static_cast<char*>(memcpy(words + i * sizeof(in_addr), &addresses[i], sizeof(in_addr)));
+            pointers[i] =
+                static_cast<char*>(memcpy(words + i * sizeof(in_addr), &addresses[i], sizeof(in_addr)));
         pointers[count] = nullptr;
         *entry = {nullptr, nullptr, AF_INET, sizeof(in_addr), pointers};
         *found = entry;

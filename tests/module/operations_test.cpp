@@ -157,10 +157,8 @@ TEST_F(Operations, TakeNoReferenceApartThatFitsNowhere)
         around.keys.push_back({"GroupComponent", host::Value::path(std::move(nested))});
         nested = std::move(around);
     }
-    const host::Path_Value service = {{},
-                                      "root/kaldera",
-                                      "KALDERA_HBASoftwareInstallationService",
-                                      {{"Name", host::Value::path(nested)}}};
+    const host::Path_Value service = {
+        {}, "root/kaldera", "KALDERA_HBASoftwareInstallationService", {{"Name", host::Value::path(nested)}}};
     on_small_stack([&] {
         mark();
         server->get_instance(nested);
@@ -168,8 +166,9 @@ TEST_F(Operations, TakeNoReferenceApartThatFitsNowhere)
         server->associators("KALDERA_FCPortSystemDevice", nested, {});
     });
     const Lines warnings = said("WARN");
-    EXPECT_NE(0, std::ranges::count(warnings, "WARN failed to assign instance of KALDERA_FCPortSystemDevice to "
-                                              "KALDERA_FCPortSystemDevice.GroupComponent"));
+    EXPECT_NE(0,
+              std::ranges::count(warnings, "WARN failed to assign instance of KALDERA_FCPortSystemDevice to "
+                                           "KALDERA_FCPortSystemDevice.GroupComponent"));
     EXPECT_NE(0, std::ranges::count(warnings, "WARN type mismatch on Name: instance/string"));
     EXPECT_EQ("", server->violations().text());
 }

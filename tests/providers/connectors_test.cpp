@@ -91,17 +91,20 @@ TEST_F(Connectors, WithATagWithoutNumbersAreOfNoAdapter)
 // A number beyond 32 bits is clamped to one that no adapter and no port has, whatever the word size.
 TEST_F(Connectors, WithNumbersBeyondThirtyTwoBitsAreOfNoAdapter)
 {
-    const char* const beyond[] = {"4294967297",           "4294967298",           "-4294967295",
-                                  "18446744073709551617", "-18446744073709551615", "9223372036854775808"};
+    const char* const beyond[] = {
+        "4294967297",         "4294967298", "-4294967295", "18446744073709551617", "-18446744073709551615",
+        "9223372036854775808"};
     for (const char* number : beyond) {
         SCOPED_TRACE(number);
         const std::string id = number;
         lists("PhysicalConnector: c1 Tag=x_" + id + "_0; PhysicalPackage: k1 SerialNumber=S1");
         expect_contained("");
         const std::string clamped = id[0] == '-' ? "-2147483648" : "2147483647";
-        lists("PhysicalConnector: c1 Tag=x_" + id + "_0;"
+        lists("PhysicalConnector: c1 Tag=x_" + id +
+              "_0;"
               "Ethernet ports of adapter 1: e1 PortNumber=0;"
-              "Ethernet ports of adapter " + clamped + ": f1 PortNumber=0");
+              "Ethernet ports of adapter " +
+              clamped + ": f1 PortNumber=0");
         expect_realized("c1 f1");
     }
     // Port numbers have 16 bits: none is as large as what a number beyond is clamped to.
