@@ -4,6 +4,7 @@
 #include "providers/proc.h"
 #include "schema/KALDERA_AgentService_Skeleton.h"
 
+#include <cstring>
 #include <new>
 
 namespace KPRV {
@@ -12,8 +13,9 @@ namespace {
 
 /// A logged text has always been its own format: two percent signs are one in the log. As a format it could
 /// also name arguments that are not there, and a client writes the texts.
-std::string as_logged(std::string text)
+std::string as_logged(const char* told)
 {
+    std::string text = told;
     for (size_t at = text.find("%%"); at != text.npos; at = text.find("%%", at + 1))
         text.erase(at, 1);
     return text;
@@ -24,6 +26,10 @@ void log_text(Call_Site site, const char* text)
     // Texts are long, and most logs do not want them.
     if (!log_uses(Log_Level::DBG))
         return;
+    if (!strstr(text, "%%")) {
+        log(Log_Level::DBG, site.file, site.line, "%s", text);
+        return;
+    }
     try {
         log(Log_Level::DBG, site.file, site.line, "%s", as_logged(text).c_str());
     } catch (const std::bad_alloc&) {

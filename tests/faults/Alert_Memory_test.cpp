@@ -102,8 +102,9 @@ TEST_F(Alert_Memory, OfTheLibrarysThread)
         for (unsigned long nth = 1; nth <= count; nth++) {
             const std::string number = std::to_string(nth) + mode;
             EXPECT_TRUE(wait_for("RICH_" + number, 2)) << number;
-            // The standard alert goes into the queue before the other one is finished.
-            EXPECT_GE(1, number_of("POOR_" + number)) << number;
+            // The standard alert goes into the queue before the other one is finished, and a line that fails
+            // costs none of them.
+            EXPECT_GE(logs() ? 2 : 1, number_of("POOR_" + number)) << number;
         }
 }
 
@@ -133,7 +134,12 @@ TEST_F(Alert_Memory, OfTheDeliveryThread)
         ASSERT_TRUE(wait_for("RICH", 2 * static_cast<long>(nth)));
         lost += 2 - number_of(name);
     }
-    EXPECT_EQ(static_cast<long>(count), lost);
+    if (logs()) {
+        EXPECT_GT(static_cast<long>(count), lost) << "lines are lost, too";
+        EXPECT_LT(0, lost);
+    } else {
+        EXPECT_EQ(static_cast<long>(count), lost);
+    }
     EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
     expect_nothing_left();
     on_delivery({});

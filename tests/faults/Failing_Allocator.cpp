@@ -28,6 +28,7 @@ bool with_helpers = false;
 
 std::atomic<unsigned long> first_on_new_threads = 0;
 std::atomic<unsigned long> last_on_new_threads = 0;
+std::atomic<unsigned long> most_seen_on_new_threads = 0;
 
 thread_local unsigned long seen = 0;
 thread_local unsigned long first_to_fail = first_on_new_threads;
@@ -89,6 +90,8 @@ bool must_fail(const void* caller)
     if (first_to_fail == 0 || !is_for_watched(reinterpret_cast<std::uintptr_t>(caller)))
         return false;
     ++seen;
+    if (first_on_new_threads != 0 && seen > most_seen_on_new_threads)
+        most_seen_on_new_threads = seen;
     return seen >= first_to_fail && seen <= last_to_fail;
 }
 
@@ -108,10 +111,11 @@ void fail_allocation(unsigned long nth, bool once)
     last_to_fail = once ? nth : ~0ul;
 }
 
-void fail_allocation_of_new_threads(unsigned long nth, bool once)
+unsigned long fail_allocation_of_new_threads(unsigned long nth, bool once)
 {
     first_on_new_threads = nth;
     last_on_new_threads = once ? nth : ~0ul;
+    return most_seen_on_new_threads.exchange(0);
 }
 
 unsigned long mend_memory()

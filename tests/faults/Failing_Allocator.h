@@ -8,8 +8,9 @@ namespace KPRV {
 /// the library called them is the library's, too.
 void watch_library(const char* path_part, bool helpers_too = false);
 void fail_allocation(unsigned long nth, bool once = false);
-/// The same for each thread that begins from now on; 0 for none.
-void fail_allocation_of_new_threads(unsigned long nth, bool once = false);
+/// The same for each thread that begins from now on; 0 for none. How many allocations the busiest of those
+/// before has made.
+unsigned long fail_allocation_of_new_threads(unsigned long nth, bool once = false);
 /// How many allocations of the library were seen since `fail_allocation`.
 unsigned long mend_memory();
 

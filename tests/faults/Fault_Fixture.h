@@ -11,11 +11,19 @@
 
 namespace KPRV {
 
-/// The built module without a log, in a server whose calls, and over an adapter library whose answers, are
-/// made to fail. Whatever happened, each test ends with a module that answers as it did at first.
+/// The built module without a log, or with one that tells all where KLDR_TEST_LOG is set, in a server whose
+/// calls, and over an adapter library whose answers, are made to fail. Whatever happened, each test ends with
+/// a module that answers as it did at first.
 class Fault_Fixture : public ::testing::Test
 {
 protected:
+    Fault_Fixture()
+    {
+        if (logs())
+            _home.write(".cimplerc", "LOG_LEVEL=DBG\n");
+    }
+    static bool logs() { return getenv("KLDR_TEST_LOG"); }
+
     void open(const std::string& inventory)
     {
         simulator.load_file(std::string(KLDR_INVENTORIES "/") + inventory);
@@ -37,6 +45,7 @@ protected:
             server.reset();
         }
         simulator.reset();
+        EXPECT_EQ(logs(), !_home.read(".cimple/messages").empty());
     }
 
     /// Every class enumerated once; `exceptions` gets the texts of what left a provider.
@@ -78,7 +87,8 @@ protected:
     Picture healthy;
 
 private:
-    Temp_Folder _home;
+    // Of the whole program: a module that stays mapped keeps its log open.
+    static inline Temp_Folder _home;
     Environment_Override _home_override{"HOME", _home.path()};
 };
 
