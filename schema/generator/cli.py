@@ -3,12 +3,12 @@
 import argparse
 import sys
 
-from . import loading, module, records, registrations, skeletons, tables
+from . import listing, loading, module, records, registrations, skeletons, tables
 from .declarations import QualifierType
 from .errors import MofError
 from .flags import ASSOCIATION, INDICATION
 from .output import Output
-from .parser import parse
+from .parser import parse_all
 from .resolver import resolve
 
 
@@ -27,9 +27,16 @@ def providers_of(classes, prefix, without):
     ]
 
 
+def read(files):
+    """The declarations of the files, which must be all that there are."""
+    declarations, included = parse_all(files)
+    listing.check(files, included)
+    return declarations
+
+
 def generate(files, prefix, without=()):
     """All generated files of the MOF files, in memory."""
-    classes = resolve(parse(files))
+    classes = resolve(read(files))
     providers = providers_of(classes, prefix, without)
     output = Output()
     records.emit(classes, output)
@@ -41,7 +48,7 @@ def generate(files, prefix, without=()):
 
 def deployment(files, prefix, without, version, word_size):
     """What servers read, in memory: registrations and MOF."""
-    declarations = parse(files)
+    declarations = read(files)
     classes = resolve(declarations)
     output = Output()
     registrations.emit(providers_of(classes, prefix, without), output, version, word_size)

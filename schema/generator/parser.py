@@ -10,7 +10,7 @@ from .lexer import tokens
 class Parser:
     """Reads one file; what it finds goes to the lists that all files share."""
 
-    def __init__(self, file, declarations, open_files):
+    def __init__(self, file, declarations, included, open_files):
         try:
             with open(file, encoding="utf-8") as stream:
                 text = stream.read()
@@ -18,6 +18,7 @@ class Parser:
             raise MofError(Where(file, 1), f"cannot be read: {error.strerror}") from error
         self.file = file
         self.declarations = declarations
+        self.included = included
         self.open_files = open_files + [os.path.realpath(file)]
         self.tokens = tokens(text, file)
         self.at = 0
@@ -79,7 +80,8 @@ class Parser:
             self.refuse(name, f"cannot include '{name.text}': no such file")
         if os.path.realpath(path) in self.open_files:
             self.refuse(name, f"'{name.text}' includes itself")
-        Parser(path, self.declarations, self.open_files).parse()
+        self.included[os.path.realpath(path)] = self.file
+        Parser(path, self.declarations, self.included, self.open_files).parse()
 
     def qualifier_type(self):
         name = self.name("the name of a qualifier")
@@ -193,7 +195,12 @@ class Parser:
 
 def parse(files):
     """The declarations of the files, and of what they include, in order."""
-    declarations = []
+    return parse_all(files)[0]
+
+
+def parse_all(files):
+    """The same, and beside it which file includes which: the including one by the included one's real path."""
+    declarations, included = [], {}
     for file in files:
-        Parser(file, declarations, []).parse()
-    return declarations
+        Parser(file, declarations, included, []).parse()
+    return declarations, included

@@ -1,6 +1,10 @@
 """Schemas that are well written but mean nothing: each is refused with its place and reason."""
 
-from schema_case import SchemaCase
+import os
+
+from generator.cli import generate
+from generator.errors import MofError
+from schema_case import QUALIFIERS, SchemaCase
 
 BASE = "class Base { [Key] string Name; uint16 Speed; string Notes[]; Base REF Other; };\n"
 
@@ -14,6 +18,26 @@ class Classes(SchemaCase):
 
     def test_class_declared_twice(self):
         self.refuse("class A {};\nclass a {};", 2, "class 'a' is declared twice")
+
+
+class Files(SchemaCase):
+    def test_a_file_that_nobody_lists(self):
+        self.file("class A {};", "some/A.mof")
+        self.file("class B {};", "some/B.mof")
+        self.file("what is no MOF", "some/notes.txt")
+        one = '#pragma include ("some/A.mof")\n'
+        index = self.file(one, "index.mof")
+        forgotten = os.path.realpath(os.path.join(self.folder, "some/B.mof"))
+        with self.assertRaises(MofError) as caught:
+            generate([QUALIFIERS, index], "P_")
+        self.assertEqual(
+            str(caught.exception),
+            f'{forgotten}:1: not included: {index} lacks the line #pragma include ("some/B.mof")',
+        )
+        # Wherever it is read.
+        generate([QUALIFIERS, index, forgotten], "P_")
+        self.file(one + '#pragma include ("some/B.mof")\n', "index.mof")
+        generate([QUALIFIERS, index], "P_")
 
 
 class Types(SchemaCase):
