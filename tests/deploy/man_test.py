@@ -16,6 +16,22 @@ class Man(unittest.TestCase):
         faults = [line for line in done.stdout.splitlines() if "referenced manual not found" not in line]
         self.assertEqual(faults, [])
 
+    def test_no_line_is_wider_than_a_terminal(self):
+        for page in PAGES:
+            for line in self.rendered(page).splitlines():
+                self.assertLessEqual(len(line), 80, f"{page.name}: {line}")
+
+    def test_headings_are_shown_as_they_are_meant(self):
+        # A word that is the name of a macro would be taken for one.
+        for page in PAGES:
+            shown = self.rendered(page)
+            for heading in re.findall(r"(?m)^\.S[sh] (.*)$", page.read_text(encoding="utf-8")):
+                self.assertRegex(shown, rf"(?m)^ *{re.escape(heading)}$", page.name)
+
+    def rendered(self, page):
+        shown = output_of("mandoc", "-Tascii", "-Owidth=78", page)
+        return re.sub(".\N{BACKSPACE}", "", shown)
+
     def test_every_verb_and_option_of_kldrcim_stands_in_its_page(self):
         page = (SOURCE / "deploy/man/kldrcim.1").read_text(encoding="utf-8")
         section, found = "", 0
