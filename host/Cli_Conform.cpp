@@ -3,6 +3,7 @@
 #include "host/Conformance.h"
 #include "host/Format_Json.h"
 #include "host/Format_Table.h"
+#include "host/Output.h"
 
 #include <algorithm>
 
@@ -98,7 +99,7 @@ int run_conform(const Cli_Options& options, Host& host)
 {
     std::vector<Conformance_Finding> findings = check_conformance(host);
     std::string text = options.format == Cli_Options::Format::JSON ? json(findings) : table(findings);
-    std::fwrite(text.data(), 1, text.size(), stdout);
+    put(text);
     return misses_something(findings);
 }
 

@@ -5,9 +5,12 @@
 #include "host/Diag_Job.h"
 #include "host/Diag_Names.h"
 #include "host/Format_Table.h"
+#include "host/Interruption.h"
+#include "host/Output.h"
 #include "host/Value_Text.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <iterator>
 
 namespace KPRV::host {
@@ -23,11 +26,6 @@ int complain_of(const Result& result)
     return complain(code_text(result.rc), CIM_STATUS);
 }
 
-void put(const std::string& text)
-{
-    std::fwrite(text.data(), 1, text.size(), stdout);
-}
-
 const std::string& text_of(const Instance_Value& instance, const char* name)
 {
     static const std::string none;
@@ -35,17 +33,25 @@ const std::string& text_of(const Instance_Value& instance, const char* name)
     return value ? value->as_text() : none;
 }
 
-/// CIM's `Characteristics` in words.
+/// Of CIM's `Characteristics`.
+constexpr std::uint64_t OUT_OF_SERVICE = 4;
+constexpr std::uint64_t LOOPBACK_PLUG = 10;
+
+bool has_characteristic(const Instance_Value& test, std::uint64_t number)
+{
+    const Value* const value = test.property("Characteristics");
+    return value && std::ranges::any_of(value->elements(),
+                                        [&](const Value& each) { return each.as_uint() == number; });
+}
+
 std::string characteristics_of(const Instance_Value& test)
 {
-    static constexpr std::pair<std::uint64_t, const char*> words[] = {{4, "takes it out of service"},
-                                                                      {10, "needs a loopback plug"}};
+    static constexpr std::pair<std::uint64_t, const char*> words[] = {
+        {OUT_OF_SERVICE, "takes it out of service"}, {LOOPBACK_PLUG, "needs a loopback plug"}};
     std::string text;
-    const Value* const value = test.property("Characteristics");
     for (const auto& [number, word] : words)
-        for (const Value& each : value ? value->elements() : std::vector<Value>())
-            if (each.as_uint() == number)
-                text += (text.empty() ? "" : ", ") + std::string(word);
+        if (has_characteristic(test, number))
+            text += (text.empty() ? "" : ", ") + std::string(word);
     return text;
 }
 
@@ -90,9 +96,70 @@ int report(const Run_Report& outcome)
     for (const Run_Record& record : outcome.records)
         rows.push_back({std::to_string(record.number), record.time, record.outcome, record.text});
     put(rows_as_table({"Record", "Time", "Outcome", "Text"}, rows));
-    std::printf("%s\n", outcome.passed ? "passed" : "failed");
+    put(outcome.passed ? "passed\n" : "failed\n");
     return outcome.passed ? 0 : 1;
 }
+
+bool takes_out_of_service(Host& host, const Path_Value& test)
+{
+    const Result result = host.get_instance(test, {{"Characteristics"}});
+    return result.ok() && !result.instances.empty() &&
+           has_characteristic(result.instances[0], OUT_OF_SERVICE);
+}
+
+/// The test and its job live in this process: whatever ends the verb, the element is brought back first. A
+/// signal is an order to come to that end, a second one to leave at once.
+class Running_Test
+{
+public:
+    Running_Test(Host& host, bool out_of_service, std::string element)
+        : host_(host), out_of_service_(out_of_service), element_(std::move(element))
+    {
+    }
+    ~Running_Test() { wait_for_end(); }
+    Running_Test(const Running_Test&) = delete;
+    Running_Test& operator=(const Running_Test&) = delete;
+
+    void wait_for_end()
+    {
+        while (is_test_running(host_))
+            wait();
+    }
+    /// For a moment.
+    void wait()
+    {
+        constexpr auto MOMENT = std::chrono::milliseconds(100);
+        interruption_.wait(MOMENT);
+        if (interruption_.count() > 1)
+            leave();
+        if (interruption_.count() == 1 && !told_) {
+            told_ = true;
+            complain(out_of_service_
+                         ? "interrupted: waiting until the test has brought " + element_ +
+                               " back into service; a second signal leaves it as it is"
+                         : "interrupted: waiting for the end of the test; a second signal ends it",
+                     0);
+        }
+    }
+    /// The signal that has come; 0 for none.
+    int signal() const { return interruption_.latest(); }
+
+private:
+    [[noreturn]] void leave()
+    {
+        complain(out_of_service_ ? element_ + " is left out of service: the test was ended while it ran"
+                                 : "the test of " + element_ + " was ended while it ran",
+                 0);
+        // Not by the usual end, which would wait for the provider.
+        std::_Exit(status_of_signal(interruption_.latest()));
+    }
+
+    Host& host_;
+    const bool out_of_service_;
+    const std::string element_;
+    bool told_ = false;
+    Interruption interruption_;
+};
 
 int run(const Cli_Options& options, Host& host)
 {
@@ -101,6 +168,7 @@ int run(const Cli_Options& options, Host& host)
     if (!find_test(host, options.arguments[1], test, error) ||
         !find_element(host, test.class_name, options.arguments[2], element, error))
         return complain(error, USAGE_ERROR);
+    Running_Test running(host, takes_out_of_service(host, test), options.arguments[2]);
     const Result started =
         host.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
     if (!started.ok())
@@ -113,18 +181,21 @@ int run(const Cli_Options& options, Host& host)
     if (!reference || !reference->as_path())
         return complain("the test was started without a job", CIM_STATUS);
     const Path_Value& job = *reference->as_path();
-    std::printf("%s\n", path_text(job).c_str());
-    std::fflush(stdout);
-    if (options.wait)
-        return report(follow_job(host, job));
-    // A server would go on; this one is the module's process, and its end would leave the element out of
-    // service.
-    complain(
-        "the test and its job live in this process, which waits for the end of the test and then takes the "
-        "records with it; --wait shows them",
-        0);
-    wait_for_end(host);
-    return 0;
+    put(path_text(job) + "\n");
+    flush_output();
+    int status = 0;
+    if (options.wait) {
+        status = report(follow_job(host, job, [&] { running.wait(); }));
+    } else {
+        // A server would go on; this one is the module's process, and its end would leave the element out of
+        // service.
+        complain("the test and its job live in this process, which waits for the end of the test and then "
+                 "takes the "
+                 "records with it; --wait shows them",
+                 0);
+        running.wait_for_end();
+    }
+    return running.signal() ? status_of_signal(running.signal()) : status;
 }
 
 } // namespace

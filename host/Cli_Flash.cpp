@@ -3,6 +3,8 @@
 #include "host/Association_Index.h"
 #include "host/Cli_Complaints.h"
 #include "host/Format_Json.h"
+#include "host/Interruption.h"
+#include "host/Output.h"
 #include "host/Path_Parser.h"
 #include "host/Value_Text.h"
 #include "host/Visible_Text.h"
@@ -10,6 +12,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cstdio>
+#include <unistd.h>
 
 namespace KPRV::host {
 
@@ -108,12 +111,26 @@ int tell(const Cli_Options& options, const Update& update)
 {
     const bool is_json = options.format == Cli_Options::Format::JSON;
     if (is_json || update.return_value == 0)
-        std::fputs((is_json ? as_json(update) : as_line(update)).c_str(), stdout);
+        put(is_json ? as_json(update) : as_line(update));
     if (update.return_value == 0)
         return 0;
     return complain(update.adapter + ": the update failed (return value " +
                         std::to_string(update.return_value) + "); the module's log says why",
                     FAILED);
+}
+
+/// What the user answers; only a yes is one.
+bool is_wanted(const Update& update)
+{
+    std::fprintf(stderr, "Update the firmware of adapter %s%s from %s? [y/N] ", update.adapter.c_str(),
+                 update.before ? (", now " + *update.before + ",").c_str() : "",
+                 visible_text(update.uri).c_str());
+    char answer[16] = {};
+    if (!std::fgets(answer, sizeof answer, stdin))
+        return false;
+    std::string word = answer;
+    std::erase_if(word, [](char c) { return c == '\n' || c == ' '; });
+    return same_name(word, "y") || same_name(word, "yes");
 }
 
 } // namespace
@@ -136,6 +153,12 @@ int flash(const Cli_Options& options, Host& host)
                         FAILED);
 
     Update update = {visible_text(device_id(*controller)), uri, 0, firmware_version(host, *controller), {}};
+    if (!options.yes && isatty(STDIN_FILENO) && !is_wanted(update))
+        return complain(update.adapter + ": not updated", FAILED);
+    flush_output();
+    // An image that an adapter has in part may be its end.
+    complain(update.adapter + ": updating; SIGINT, SIGTERM and SIGHUP wait for the end of it", 0);
+    const Signals_Held_Back held_back;
     const Value install_options =
         Value::array(CMPI_uint16, {Value::unsigned_number(CMPI_uint16, option_update)});
     const Result answer = host.invoke_method(services.paths.front(), "InstallFromURI",
@@ -146,7 +169,9 @@ int flash(const Cli_Options& options, Host& host)
         return complain(failure_text(answer), FAILED);
     update.return_value = answer.return_value.as_uint();
     update.after = firmware_version(host, *controller);
-    return tell(options, update);
+    const int status = tell(options, update);
+    flush_output();
+    return status;
 }
 
 } // namespace KPRV::host

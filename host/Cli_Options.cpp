@@ -1,7 +1,9 @@
 #include "host/Cli_Options.h"
 
+#include "host/Cli_Help.h"
 #include "host/Cli_Rpc.h"
 #include "host/Cli_Verbs.h"
+#include "host/Nearest_Word.h"
 
 #include <algorithm>
 #include <charconv>
@@ -24,21 +26,28 @@ std::vector<std::string> split_list(const std::string& text)
     return names;
 }
 
-bool set_format(Cli_Options& options, const std::string& value)
+constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
+    {"table", Cli_Options::Format::TABLE},
+    {"json", Cli_Options::Format::JSON},
+    {"mof", Cli_Options::Format::MOF},
+};
+constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
+    {"auto", Cli_Options::Color::AUTO},
+    {"always", Cli_Options::Color::ALWAYS},
+    {"never", Cli_Options::Color::NEVER},
+};
+
+/// One of a few words.
+template <auto Member, auto& Words>
+bool set_word(Cli_Options& options, const std::string& value)
 {
-    using Format = Cli_Options::Format;
-    static constexpr std::pair<const char*, Format> formats[] = {
-        {"table", Format::TABLE}, {"json", Format::JSON}, {"mof", Format::MOF}};
-    for (auto [name, format] : formats)
+    for (const auto& [name, meaning] : Words)
         if (value == name) {
-            options.format = format;
+            options.*Member = meaning;
             return true;
         }
     return false;
 }
-
-/// False for a value that is none.
-using Setter = bool (*)(Cli_Options& options, const std::string& value);
 
 /// A text of the options.
 template <std::string Cli_Options::*Member>
@@ -86,59 +95,136 @@ bool set_raw(Cli_Options& options, const std::string& value)
     return true;
 }
 
-struct Option
-{
-    const char* name;
-    /// Null if the option takes no value.
-    Setter set;
-    /// Of an option without value.
-    bool Cli_Options::*flag;
-    /// The verbs that know the option, null for all.
-    const char* verbs;
-};
-
 using Filter = Association_Filter;
+using Options = Cli_Options;
 
 // clang-format off
-constexpr Option option_table[] = {
-    {"--format",      set_format,                              nullptr,                   nullptr},
-    {"--properties",  set_properties,                          nullptr,                   nullptr},
-    {"--namespace",   set_text<&Cli_Options::name_space>,      nullptr,                   nullptr},
-    {"--module",      set_text<&Cli_Options::module>,          nullptr,                   nullptr},
-    {"--user",        set_user,                                nullptr,                   nullptr},
-    {"--server-instances", set_text<&Cli_Options::server_instances>, nullptr,             nullptr},
-    {"--assoc",       set_filter<&Filter::association_class>,  nullptr,                   "ai ain ri rin"},
-    {"--result",      set_filter<&Filter::result_class>,       nullptr,                   "ai ain"},
-    {"--role",        set_filter<&Filter::role>,               nullptr,                   "ai ain ri rin"},
-    {"--result-role", set_filter<&Filter::result_role>,        nullptr,                   "ai ain"},
-    {"--filter",      add_filter,                              nullptr,                   "watch"},
-    {"--count",       set_count,                               nullptr,                   "watch"},
-    {"--software",    nullptr,                                 &Cli_Options::software,    "tree graph"},
-    {"--connectors",  nullptr,                                 &Cli_Options::connectors,  "tree graph"},
-    {"--ascii",       nullptr,                                 &Cli_Options::ascii,       "tree profiles"},
-    {"--raw",         set_raw,                                 nullptr,                   "rpc"},
-    {"--list",        nullptr,                                 &Cli_Options::list_methods, "rpc"},
-    {"--wait",        nullptr,                                 &Cli_Options::wait,        "diag"},
-    {"--leaks",       nullptr,                                 &Cli_Options::leaks,       nullptr},
-    {"--help",        nullptr,                                 &Cli_Options::help,        nullptr},
-    {"-h",            nullptr,                                 &Cli_Options::help,        nullptr},
-    {"--version",     nullptr,                                 &Cli_Options::version,     nullptr},
+constexpr Cli_Option option_table[] = {
+//   name            value             set                                  flag                     takes                     common
+    {"--format",     "table|json|mof", set_word<&Options::format, formats>, nullptr,                 "table, json or mof",     true,
+     "how results are written (default: table)"},
+    {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
+     "ask for these properties only"},
+    {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
+     "namespace of the classes (default: root/kaldera)"},
+    {"--module",     "FILE",           set_text<&Options::module>,          nullptr,                 nullptr,                  true,
+     "provider library (default: libkldrprovider_Module.so beside this program, then in ../lib/cim and /usr/lib/cim, then on "
+     "the library search path)"},
+    {"--user",       "NAME",           set_user,                            nullptr,                 nullptr,                  true,
+     "authenticated user that the provider sees (default: none)"},
+    {"--server-instances", "FILE",     set_text<&Options::server_instances>, nullptr,                nullptr,                  true,
+     "JSON of what the server's own name spaces hold, for providers that ask the server (default: it has none besides "
+     "--namespace)"},
+    {"--assoc",      "CLASS",          set_filter<&Filter::association_class>, nullptr,              nullptr,                  false,
+     "only this association class and its subclasses (default: every one that can hold the class of PATH)"},
+    {"--role",       "ROLE",           set_filter<&Filter::role>,           nullptr,                 nullptr,                  false,
+     "only where PATH stands in this role"},
+    {"--result",     "CLASS",          set_filter<&Filter::result_class>,   nullptr,                 nullptr,                  false,
+     "only results of this class or a subclass"},
+    {"--result-role", "ROLE",          set_filter<&Filter::result_role>,    nullptr,                 nullptr,                  false,
+     "only results that stand in this role"},
+    {"--filter",     "NS",             add_filter,                          nullptr,                 "a namespace",            false,
+     "a filter in this namespace, instead of --namespace; may be given several times"},
+    {"--count",      "N",              set_count,                           nullptr,                 "a number above 0",       false,
+     "end after N indications"},
+    {"--software",   nullptr,          nullptr,                             &Options::software,      nullptr,                  false,
+     "also firmware and drivers"},
+    {"--connectors", nullptr,          nullptr,                             &Options::connectors,    nullptr,                  false,
+     "also cards and transceivers"},
+    {"--ascii",      nullptr,          nullptr,                             &Options::ascii,         nullptr,                  false,
+     "no box-drawing characters (default where the locale is not UTF-8)"},
+    {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,
+     "states in colors: auto, always or never (default: auto, on a terminal and without NO_COLOR)"},
+    {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
+     "the whole text of a call"},
+    {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,
+     "list the methods"},
+    {"--wait",       nullptr,          nullptr,                             &Options::wait,          nullptr,                  false,
+     "show the job while it runs, then its records"},
+    {"--yes",        nullptr,          nullptr,                             &Options::yes,           nullptr,                  false,
+     "do not ask (default where standard input is no terminal)"},
+    {"--leaks",      nullptr,          nullptr,                             &Options::leaks,         nullptr,                  true,
+     "say on standard error which CMPI objects the provider did not release"},
+    {"--help",       nullptr,          nullptr,                             &Options::help,          nullptr,                  true,
+     "this text, or after a verb what there is to know of it"},
+    {"--version",    nullptr,          nullptr,                             &Options::version,       nullptr,                  true,
+     "the program's version"},
 };
 // clang-format on
 
-const Option* find_option(const std::string& name)
+const Cli_Option* find_option(const std::string& written)
 {
-    auto at = std::find_if(std::begin(option_table), std::end(option_table),
-                           [&](const Option& option) { return name == option.name; });
+    const std::string name = written == "-h" ? "--help" : written;
+    const auto at =
+        std::ranges::find_if(option_table, [&](const Cli_Option& option) { return name == option.name; });
     return at == std::end(option_table) ? nullptr : &*at;
 }
 
-/// What the values of an option are, for one that has bad ones.
-const char* words_for(const Option& option)
+template <class Rows>
+std::vector<std::string> names_of(const Rows& rows)
 {
-    if (option.set == set_count)
-        return "a number above 0";
-    return option.set == add_filter ? "a namespace" : "table, json or mof";
+    std::vector<std::string> names;
+    for (const auto& row : rows)
+        names.push_back(row.name);
+    return names;
+}
+
+std::string unknown_option(const std::string& argument)
+{
+    return "no option \"" + argument + "\"" +
+           suggestion(argument.substr(0, argument.find('=')), names_of(option_table)) +
+           "; \"kldrcim --help\" lists them";
+}
+
+std::string verbs_with(const Cli_Option& option)
+{
+    std::string names;
+    for (const Cli_Verb& verb : cli_verbs())
+        if (contains_word(verb.options, option.name))
+            names += (names.empty() ? "" : " ") + std::string(verb.name);
+    return names;
+}
+
+/// An option that the verb would ignore is a mistake of the user, who should hear of it.
+bool check_sense(const Cli_Options& options, const Cli_Verb& verb,
+                 const std::vector<const Cli_Option*>& given, std::string& error)
+{
+    for (const Cli_Option* option : given)
+        if (!option->is_common && !contains_word(verb.options, option->name)) {
+            error = std::string(option->name) + " makes no sense for " + verb.name + "; it is for " +
+                    verbs_with(*option);
+            return false;
+        }
+    const char* const format = formats[static_cast<int>(options.format)].first;
+    if (!contains_word(verb.formats, format)) {
+        error = "--format " + std::string(format) + " makes no sense for " + verb.name;
+        return false;
+    }
+    return true;
+}
+
+bool check_verb(const Cli_Options& options, const Cli_Verb* verb, std::string& error)
+{
+    if (options.verb.empty())
+        error = "no verb; \"kldrcim --help\" lists them";
+    else if (!verb)
+        error = "no verb \"" + options.verb + "\"" + suggestion(options.verb, names_of(cli_verbs())) +
+                "; \"kldrcim --help\" lists them";
+    return error.empty();
+}
+
+bool check_arguments(const Cli_Options& options, const Cli_Verb& verb, std::string& error)
+{
+    if (options.arguments.size() < verb.least || options.arguments.size() > verb.most)
+        error = usage_line(verb);
+    return error.empty() && (options.verb != "rpc" || check_rpc(options, error));
+}
+
+} // namespace
+
+std::span<const Cli_Option> cli_options()
+{
+    return option_table;
 }
 
 bool contains_word(const std::string& words, const std::string& word)
@@ -146,45 +232,10 @@ bool contains_word(const std::string& words, const std::string& word)
     return (" " + words + " ").find(" " + word + " ") != std::string::npos;
 }
 
-/// An option that the verb would ignore is a mistake of the user, who should hear of it.
-bool check_sense(const Cli_Options& options, const std::vector<const Option*>& given, std::string& error)
-{
-    for (const Option* option : given)
-        if (option->verbs && !contains_word(option->verbs, options.verb)) {
-            error = std::string(option->name) + " makes no sense for " + options.verb + "; it is for " +
-                    option->verbs;
-            return false;
-        }
-    using Format = Cli_Options::Format;
-    const bool no_mof = contains_word("tree profiles rpc flash", options.verb);
-    if ((options.verb == "graph" && options.format != Format::TABLE) ||
-        (no_mof && options.format == Format::MOF)) {
-        error = "--format " + std::string(options.format == Format::MOF ? "mof" : "json") +
-                " makes no sense for " + options.verb;
-        return false;
-    }
-    return options.verb != "rpc" || check_rpc(options, error);
-}
-
-bool check_verb(const Cli_Options& options, std::string& error)
-{
-    const Cli_Verb* verb = find_verb(options.verb);
-    if (options.verb.empty())
-        error = "no verb; \"kldrcim --help\" lists them";
-    else if (!verb)
-        error = "no verb \"" + options.verb + "\"; \"kldrcim --help\" lists them";
-    else if (options.arguments.size() < verb->least || options.arguments.size() > verb->most)
-        error = std::string("usage: kldrcim [options] ") + verb->name + (*verb->arguments ? " " : "") +
-                verb->arguments;
-    return error.empty();
-}
-
-} // namespace
-
 bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error)
 {
     bool options_end = false;
-    std::vector<const Option*> given;
+    std::vector<const Cli_Option*> given;
     for (std::size_t i = 0; i < arguments.size(); ++i) {
         const std::string& argument = arguments[i];
         if (options_end || argument.size() < 2 || argument[0] != '-') {
@@ -199,9 +250,13 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
             continue;
         }
         std::size_t equals = argument.find('=');
-        const Option* option = find_option(argument.substr(0, equals));
-        if (!option || (option->flag && equals != std::string::npos)) {
-            error = "no option \"" + argument + "\"; \"kldrcim --help\" lists them";
+        const Cli_Option* option = find_option(argument.substr(0, equals));
+        if (!option) {
+            error = unknown_option(argument);
+            return false;
+        }
+        if (option->flag && equals != std::string::npos) {
+            error = std::string(option->name) + " takes no value";
             return false;
         }
         given.push_back(option);
@@ -215,13 +270,17 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
         }
         std::string value = equals == std::string::npos ? arguments[++i] : argument.substr(equals + 1);
         if (!option->set(options, value)) {
-            error = std::string(option->name) + " takes " + words_for(*option) + ", not \"" + value + "\"";
+            error = std::string(option->name) + " takes " + option->takes + ", not \"" + value + "\"";
             return false;
         }
     }
-    if (options.help || options.version)
+    if (options.version || (options.help && options.verb.empty()))
         return true;
-    return check_verb(options, error) && check_sense(options, given, error);
+    const Cli_Verb* const verb = find_verb(options.verb);
+    if (!check_verb(options, verb, error))
+        return false;
+    return options.help ||
+           (check_arguments(options, *verb, error) && check_sense(options, *verb, given, error));
 }
 
 bool split_assignment(const std::string& text, std::string& name, std::string& value)

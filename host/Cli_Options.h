@@ -2,6 +2,8 @@
 
 #include "host/Request.h"
 
+#include <span>
+
 namespace KPRV::host {
 
 /// What stands on the command line of `kldrcim`.
@@ -13,8 +15,16 @@ struct Cli_Options
         JSON,
         MOF,
     };
+    enum class Color
+    {
+        AUTO,
+        ALWAYS,
+        NEVER,
+    };
 
     Format format = Format::TABLE;
+    /// Of a tree: on a terminal, unless it is said.
+    Color color = Color::AUTO;
     Property_List properties;
     std::string name_space = "root/kaldera";
     /// Empty: look for it.
@@ -38,6 +48,8 @@ struct Cli_Options
     bool list_methods = false;
     /// Follow the job of a test that was started.
     bool wait = false;
+    /// Update firmware without asking.
+    bool yes = false;
     bool leaks = false;
     bool help = false;
     bool version = false;
@@ -46,14 +58,33 @@ struct Cli_Options
     std::vector<std::string> arguments;
 };
 
+/// One option, as the table of them has it.
+struct Cli_Option
+{
+    const char* name;
+    /// What its value is, for the help; null if it takes none.
+    const char* value;
+    /// False for a value that is none.
+    bool (*set)(Cli_Options& options, const std::string& value);
+    /// Of an option without value.
+    bool Cli_Options::*flag;
+    /// What its values are, for one that has bad ones; null if it takes any.
+    const char* takes;
+    /// All verbs know it; the others name theirs.
+    bool is_common;
+    const char* summary;
+};
+
+std::span<const Cli_Option> cli_options();
+
 /// Reads the arguments behind the program's name. False with a one-line `error` for what is not understood,
 /// wrong numbers of arguments for the verb included. Options may stand anywhere; "--" ends them.
 bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error);
 
-/// The text of `--help`.
-extern const char* const cli_usage;
-
 /// "NAME=VALUE" apart; false if there is no name or no equals sign.
 bool split_assignment(const std::string& text, std::string& name, std::string& value);
+
+/// True if the words, with blanks between them, hold the word.
+bool contains_word(const std::string& words, const std::string& word);
 
 } // namespace KPRV::host

@@ -12,7 +12,5 @@ void write_instance(const Cli_Options& options, const std::vector<Instance_Value
 void write_paths(const Cli_Options& options, const std::vector<Path_Value>& paths);
 /// Return value, then out parameters.
 void write_method(const Cli_Options& options, const Result& result);
-/// Classes that have a provider and match the verb's pattern: superclass, provider kinds, keys.
-void write_classes(const Cli_Options& options, const Host& host);
 
 } // namespace KPRV::host

@@ -2,9 +2,8 @@
 
 #include "host/Branch_Text.h"
 #include "host/Cli_Complaints.h"
+#include "host/Output.h"
 #include "host/Profile_Text.h"
-
-#include <cstdio>
 
 namespace KPRV::host {
 
@@ -19,7 +18,7 @@ int write_profiles(const Cli_Options& options, Host& host)
     const std::string text = options.format == Cli_Options::Format::JSON
                                  ? profile_json(roots)
                                  : profile_text(roots, options.ascii || !locale_is_utf8());
-    std::fwrite(text.data(), 1, text.size(), stdout);
+    put(text);
     warn_of(failures);
     return 0;
 }

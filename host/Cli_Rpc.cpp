@@ -3,6 +3,7 @@
 #include "host/Cli_Complaints.h"
 #include "host/Format_Json.h"
 #include "host/Format_Table.h"
+#include "host/Output.h"
 #include "host/Rpc_Methods.h"
 #include "host/Rpc_Text.h"
 
@@ -23,9 +24,9 @@ constexpr const char* next_call = "+";
 
 void put_line(const std::string& text)
 {
-    std::fwrite(text.data(), 1, text.size(), stdout);
+    put(text);
     if (text.empty() || text.back() != '\n')
-        std::fputc('\n', stdout);
+        put("\n");
 }
 
 std::string read_all(std::FILE* file)

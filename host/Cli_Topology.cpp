@@ -1,27 +1,51 @@
 #include "host/Cli_Topology.h"
 
 #include "host/Branch_Text.h"
+#include "host/Cli_Complaints.h"
+#include "host/Output.h"
+#include "host/Terminal.h"
 #include "host/Topology_Text.h"
-
-#include <cstdio>
 
 namespace KPRV::host {
 
-bool write_topology(const Cli_Options& options, Host& host, std::vector<Provider_Failure>& failures)
+namespace {
+
+/// Walks, and writes what `text_of` makes of it.
+template <class Text_Of>
+int draw(const Cli_Options& options, Host& host, bool cross_links, Text_Of text_of)
 {
-    bool is_graph = options.verb == "graph";
     Association_Index index(host);
-    Topology topology = walk_topology(
-        index, {.software = options.software, .connectors = options.connectors, .cross_links = is_graph});
-    failures = index.failures();
+    const Topology topology = walk_topology(
+        index, {.software = options.software, .connectors = options.connectors, .cross_links = cross_links});
+    const std::vector<Provider_Failure>& failures = index.failures();
     if (!failures.empty() && same_name(failures.front().provider_class, topology_root_class))
-        return false;
-    std::string text = is_graph ? graphviz_text(topology)
-                       : options.format == Cli_Options::Format::JSON
-                           ? tree_json(topology)
-                           : tree_text(topology, options.ascii || !locale_is_utf8());
-    std::fwrite(text.data(), 1, text.size(), stdout);
-    return true;
+        return complain(
+            code_text(failures.front().rc) + ": no answer from " + failures.front().provider_class, 1);
+    put(text_of(topology));
+    warn_of(failures);
+    return 0;
+}
+
+bool wants_color(const Cli_Options& options)
+{
+    using Color = Cli_Options::Color;
+    return options.color == Color::ALWAYS || (options.color == Color::AUTO && terminal_shows_colors());
+}
+
+} // namespace
+
+int draw_tree(const Cli_Options& options, Host& host)
+{
+    return draw(options, host, false, [&](const Topology& topology) {
+        return options.format == Cli_Options::Format::JSON
+                   ? tree_json(topology)
+                   : tree_text(topology, options.ascii || !locale_is_utf8(), wants_color(options));
+    });
+}
+
+int draw_graph(const Cli_Options& options, Host& host)
+{
+    return draw(options, host, true, graphviz_text);
 }
 
 } // namespace KPRV::host

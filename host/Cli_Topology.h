@@ -5,9 +5,11 @@
 
 namespace KPRV::host {
 
-/// The verbs `tree` and `graph`. False with the status of the computer system's enumeration if that fails;
-/// `failures` then has it first. Other associations and classes that cannot be asked are in `failures` too,
-/// and what they would have shown is left out.
-bool write_topology(const Cli_Options& options, Host& host, std::vector<Provider_Failure>& failures);
+/// The host's adapters and what lies behind them, found by following associations, as lines of a tree or in
+/// JSON. Status 1 without the host's own system; other answers that are missing are warned of.
+int draw_tree(const Cli_Options& options, Host& host);
+
+/// The same as Graphviz text, with the links that a tree cannot show.
+int draw_graph(const Cli_Options& options, Host& host);
 
 } // namespace KPRV::host

@@ -3,14 +3,12 @@
 #include "host/Cli_Complaints.h"
 #include "host/Cli_Output.h"
 #include "host/Convert.h"
+#include "host/Interruption.h"
+#include "host/Output.h"
 #include "host/Subscription.h"
 
-#include <atomic>
-#include <cerrno>
-#include <csignal>
-#include <cstring>
 #include <deque>
-#include <semaphore.h>
+#include <mutex>
 
 namespace KPRV::host {
 
@@ -18,57 +16,12 @@ namespace {
 
 constexpr const char* alert_class = "KALDERA_AlertIndication";
 
-/// Counts what there is to do: indications that have come, and the interruption. A signal handler may post
-/// it.
-sem_t work;
-std::atomic<bool> is_interrupted;
-
-extern "C" void interrupt(int)
-{
-    is_interrupted = true;
-    sem_post(&work);
-}
-
-/// Ends the watch by SIGINT and SIGTERM, for a scope; a second one in the clean-up behind it ends the
-/// program.
-class Interruption
-{
-public:
-    Interruption()
-    {
-        is_interrupted = false;
-        sem_init(&work, 0, 0);
-        set(SIGINT, interrupt, old_int_);
-        set(SIGTERM, interrupt, old_term_);
-        // A reader that has gone should be seen by the write, not end the program.
-        set(SIGPIPE, SIG_IGN, old_pipe_);
-    }
-    ~Interruption()
-    {
-        sigaction(SIGINT, &old_int_, nullptr);
-        sigaction(SIGTERM, &old_term_, nullptr);
-    }
-    Interruption(const Interruption&) = delete;
-    Interruption& operator=(const Interruption&) = delete;
-
-private:
-    static void set(int signal, void (*handler)(int), struct sigaction& old)
-    {
-        struct sigaction action = {};
-        action.sa_handler = handler;
-        action.sa_flags = SA_RESTART;
-        sigaction(signal, &action, &old);
-    }
-
-    struct sigaction old_int_ = {};
-    struct sigaction old_term_ = {};
-    struct sigaction old_pipe_ = {};
-};
-
 /// Indications between the thread that delivers them and the one that writes them.
 class Inbox
 {
 public:
+    explicit Inbox(Interruption& interruption) : interruption_(interruption) {}
+
     void put(const std::string& name_space, const Instance_Value& indication)
     {
         {
@@ -76,16 +29,15 @@ public:
             indications_.push_back(indication);
             indications_.back().path.name_space = name_space;
         }
-        sem_post(&work);
+        interruption_.wake();
     }
     /// Waits; false when the watch is interrupted.
     bool take(Instance_Value& indication)
     {
         for (;;) {
-            while (sem_wait(&work) != 0) {
-            }
+            interruption_.wait();
             std::lock_guard lock(mutex_);
-            if (is_interrupted)
+            if (interruption_.count() != 0)
                 return false;
             if (indications_.empty())
                 continue;
@@ -96,6 +48,7 @@ public:
     }
 
 private:
+    Interruption& interruption_;
     std::mutex mutex_;
     std::deque<Instance_Value> indications_;
 };
@@ -111,8 +64,7 @@ struct Sink_Scope
     Host& host;
 };
 
-/// 0, or the error that the output has.
-int write(const Cli_Options& options, Instance_Value& indication)
+void write(const Cli_Options& options, Instance_Value& indication)
 {
     if (options.properties)
         std::erase_if(indication.properties, [&](const Named_Value& property) {
@@ -120,8 +72,8 @@ int write(const Cli_Options& options, Instance_Value& indication)
         });
     write_instance(options, {indication});
     if (options.format == Cli_Options::Format::TABLE)
-        std::putchar('\n');
-    return std::fflush(stdout) == 0 ? 0 : errno;
+        put("\n");
+    flush_output();
 }
 
 int refused(const std::string& name_space, const std::string& provider_class, CMPIrc rc)
@@ -137,13 +89,13 @@ int watch(const Cli_Options& options, Host& host)
     const std::vector<std::string> name_spaces =
         options.filters.empty() ? std::vector{options.name_space} : options.filters;
 
-    Inbox inbox;
+    Interruption interruption;
+    Inbox inbox(interruption);
     const Sink_Scope sink(host, [&](const std::string& name_space, const Instance_Value& indication) {
         inbox.put(name_space, indication);
         return CMPI_RC_OK;
     });
     Subscription subscription(host, provider_class);
-    const Interruption interruption;
     for (const std::string& name_space : name_spaces)
         if (const CMPIrc rc = subscription.add(name_space); rc != CMPI_RC_OK)
             return refused(name_space, provider_class, rc);
@@ -151,13 +103,7 @@ int watch(const Cli_Options& options, Host& host)
     for (unsigned written = 0; options.count == 0 || written < options.count; ++written) {
         if (!inbox.take(indication))
             break;
-        const int error = write(options, indication);
-        if (error == EPIPE)
-            break;
-        if (error != 0) {
-            std::fprintf(stderr, "kldrcim: cannot write: %s\n", std::strerror(error));
-            return 1;
-        }
+        write(options, indication);
     }
     return 0;
 }

@@ -5,7 +5,6 @@
 #include <algorithm>
 #include <chrono>
 #include <cstdlib>
-#include <thread>
 #include <unistd.h>
 
 namespace KPRV::host {
@@ -13,15 +12,8 @@ namespace KPRV::host {
 namespace {
 
 using Clock = std::chrono::steady_clock;
-constexpr auto POLL = std::chrono::milliseconds(100);
 constexpr std::uint64_t JOB_OVER = 7;
 constexpr std::uint64_t PASSED = 2;
-
-/// The thread of a run stays attached to its server until it ends.
-bool has_attached_threads(Host& host)
-{
-    return host.ledger().live(Object_Kind::CONTEXT) != 0;
-}
 
 std::string state_words(const Result& job)
 {
@@ -89,19 +81,19 @@ void collect(Host& host, const char* class_name, const std::string& job_id, Run_
 
 } // namespace
 
-void wait_for_end(Host& host)
+bool is_test_running(Host& host)
 {
-    while (has_attached_threads(host))
-        std::this_thread::sleep_for(POLL);
+    // The thread of a run stays attached to its server until it ends.
+    return host.ledger().live(Object_Kind::CONTEXT) != 0;
 }
 
-Run_Report follow_job(Host& host, const Path_Value& job)
+Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause)
 {
     {
         Progress progress;
-        while (has_attached_threads(host)) {
+        while (is_test_running(host)) {
             progress.show(state_words(host.get_instance(job)));
-            std::this_thread::sleep_for(POLL);
+            pause();
         }
         progress.show(state_words(host.get_instance(job)));
     }

@@ -2,6 +2,8 @@
 
 #include "host/Host.h"
 
+#include <functional>
+
 namespace KPRV::host {
 
 /// One record of a run.
@@ -24,12 +26,13 @@ struct Run_Report
     bool passed = false;
 };
 
-/// Waits for the end of a run: of its thread, not only of its job, which is closed before the results are
+/// True until the end of a run: of its thread, not only of its job, which is closed before the results are
 /// written.
-void wait_for_end(Host& host);
+bool is_test_running(Host& host);
 
-/// Waits for the end of a run and collects its records. Meanwhile standard error shows the job's state and
-/// how long it has been at work: on a terminal in one line that changes, else a line for each state.
-Run_Report follow_job(Host& host, const Path_Value& job);
+/// Follows a run to its end and collects its records. Meanwhile standard error shows the job's state and how
+/// long it has been at work: on a terminal in one line that changes, else a line for each state. `pause` is
+/// called between two looks.
+Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause);
 
 } // namespace KPRV::host

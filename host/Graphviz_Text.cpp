@@ -10,7 +10,7 @@ struct Look
 {
     Node_Kind kind;
     const char* shape;
-    const char* colour;
+    const char* color;
 };
 
 constexpr Look looks[] = {
@@ -29,6 +29,21 @@ constexpr bool in_order()
     return true;
 }
 static_assert(in_order());
+
+/// Around a node that does not do what it is there for.
+const char* outline(Condition condition)
+{
+    switch (condition) {
+    case Condition::IDLE:
+        return ", color=\"#7f7f7f\", fontcolor=\"#5f5f5f\"";
+    case Condition::DOUBTFUL:
+        return ", color=\"#e69500\", penwidth=3";
+    case Condition::BAD:
+        return ", color=\"#d0021b\", penwidth=3";
+    default:
+        return "";
+    }
+}
 
 /// A text inside double quotes; what could end them or begin an escape is escaped.
 std::string escaped(const std::string& text)
@@ -68,8 +83,9 @@ std::string graphviz_text(const Topology& topology)
                        "  edge [fontname=\"sans-serif\", fontsize=9];\n";
     for (std::size_t i = 0; i < topology.nodes.size(); ++i) {
         const Look& look = looks[static_cast<int>(topology.nodes[i].kind)];
-        text += "  " + name_of(i) + " [label=\"" + label_lines(node_label(topology.nodes[i])) +
-                "\", shape=" + look.shape + ", fillcolor=\"" + look.colour + "\"];\n";
+        const Node_Label label = node_label(topology.nodes[i]);
+        text += "  " + name_of(i) + " [label=\"" + label_lines(label) + "\", shape=" + look.shape +
+                ", fillcolor=\"" + look.color + "\"" + outline(label.condition) + "];\n";
     }
     for (const Topology::Edge& edge : topology.edges)
         text += "  " + name_of(edge.from) + " -> " + name_of(edge.to) + " [label=\"" +

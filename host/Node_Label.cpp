@@ -11,38 +11,60 @@ namespace KPRV::host {
 
 namespace {
 
-/// By number, as the CIM Schema has them.
-const char* const enabled_states[] = {
-    "unknown", "other",    "enabled",  "disabled", "shutting down", "not applicable", "enabled but offline",
-    "in test", "deferred", "quiesced", "starting",
+struct State_Word
+{
+    const char* words;
+    Condition condition;
 };
 
-const char* const operational_states[] = {
-    "unknown",
-    "other",
-    "OK",
-    "degraded",
-    "stressed",
-    "failing soon",
-    "error",
-    "non-recoverable error",
-    "starting",
-    "stopping",
-    "stopped",
-    "in service",
-    "no contact",
-    "lost contact",
-    "aborted",
-    "dormant",
-    "supporting entity in error",
-    "completed",
-    "power mode",
+using enum Condition;
+
+// By number, as the CIM Schema has them, in the words of those who look after ports.
+const State_Word enabled_states[] = {
+    {"unknown", NONE},
+    {"other", NONE},
+    {"enabled", GOOD},
+    {"disabled", IDLE},
+    {"shutting down", IDLE},
+    {"not applicable", NONE},
+    {"enabled but offline", BAD},
+    {"in test", IDLE},
+    {"deferred", IDLE},
+    {"quiesced", IDLE},
+    {"starting", IDLE},
 };
+
+const State_Word operational_states[] = {
+    {"unknown", NONE},
+    {"other", NONE},
+    {"OK", GOOD},
+    {"degraded", DOUBTFUL},
+    {"stressed", DOUBTFUL},
+    {"failing soon", DOUBTFUL},
+    {"error", BAD},
+    {"non-recoverable error", BAD},
+    {"starting", IDLE},
+    {"stopping", IDLE},
+    {"stopped", IDLE},
+    {"in service", GOOD},
+    {"no contact", BAD},
+    {"link down", BAD},
+    {"aborted", BAD},
+    {"dormant", IDLE},
+    {"supporting entity in error", BAD},
+    {"completed", GOOD},
+    {"power mode", IDLE},
+};
+
+/// What stops a port is a command.
+constexpr std::uint64_t STOPPED = 10;
 
 template <std::size_t Count>
-std::string word(const char* const (&words)[Count], std::uint64_t number)
+Node_State state_of(const State_Word (&words)[Count], std::uint64_t number)
 {
-    return number < Count ? words[number] : "state " + std::to_string(number);
+    if (number < Count)
+        return {words[number].words, words[number].condition};
+    return {"state " + std::to_string(number), NONE};
 }
 
 /// The number, or the first of an array.
@@ -56,31 +78,42 @@ std::optional<std::uint64_t> number(const Instance_Value& instance, const char* 
     return value->as_uint();
 }
 
-std::string state(const Instance_Value& instance)
+Node_State operational_state(const Instance_Value& instance)
 {
-    if (auto enabled = number(instance, "EnabledState"))
-        return word(enabled_states, *enabled);
-    auto operational = number(instance, "OperationalStatus");
-    return operational ? word(operational_states, *operational) : "";
+    if (const auto operational = number(instance, "OperationalStatus"))
+        return state_of(operational_states, *operational);
+    const auto enabled = number(instance, "EnabledState");
+    return enabled ? state_of(enabled_states, *enabled) : Node_State();
 }
 
-std::string operational_state(const Instance_Value& instance)
+/// Of what has a link: its status says more than whether it is enabled.
+Node_State link_state(const Instance_Value& instance)
 {
-    auto operational = number(instance, "OperationalStatus");
-    return operational ? word(operational_states, *operational) : state(instance);
+    if (number(instance, "OperationalStatus") == STOPPED)
+        return {"disabled", IDLE};
+    return operational_state(instance);
+}
+
+/// The state stands behind the facts.
+Node_Label with_state(Node_Label label, const Node_State& state)
+{
+    label.facts.push_back(state.words);
+    label.condition = state.condition;
+    return label;
 }
 
 Node_Label system_label(const Instance_Value& system)
 {
-    return {"host", line_of(system, "Name"), {operational_state(system)}};
+    return with_state({"host", line_of(system, "Name"), {}}, operational_state(system));
 }
 
 Node_Label adapter_label(const Instance_Value& adapter)
 {
     std::string kind = line_of(adapter, "Caption"), serial = line_of(adapter, "Name");
-    return {kind.empty() ? "adapter" : kind,
-            serial + (serial.empty() ? "" : " ") + "(" + line_of(adapter, "DeviceID") + ")",
-            {operational_state(adapter)}};
+    return with_state({kind.empty() ? "adapter" : kind,
+                       serial + (serial.empty() ? "" : " ") + "(" + line_of(adapter, "DeviceID") + ")",
+                       {}},
+                      operational_state(adapter));
 }
 
 Node_Label software_label(const Instance_Value& software)
@@ -113,16 +146,17 @@ Node_Label connector_label(const Instance_Value& connector)
 
 Node_Label port_label(const char* what, const std::string& device, const Instance_Value& port)
 {
-    return {what,
-            colon_form(line_of(port, "DeviceID")),
-            {device, speed_text(number(port, "Speed").value_or(0)), state(port)}};
+    return with_state({what,
+                       colon_form(line_of(port, "DeviceID")),
+                       {device, speed_text(number(port, "Speed").value_or(0))}},
+                      link_state(port));
 }
 
 /// An endpoint at the far side is named for both sides of the path: near address, "_", far address.
 Node_Label endpoint_label(const char* what, const Instance_Value& endpoint)
 {
     std::string name = line_of(endpoint, "Name");
-    return {what, colon_form(name.substr(name.find('_') + 1)), {state(endpoint)}};
+    return with_state({what, colon_form(name.substr(name.find('_') + 1)), {}}, link_state(endpoint));
 }
 
 /// Vendor and product stand in the unit's identifier, between the two addresses and the element name.
@@ -189,11 +223,17 @@ Node_Label node_label(const Topology::Node& node)
     return label;
 }
 
-std::string label_line(const Node_Label& label)
+std::string label_line(const Node_Label& label, bool color)
 {
+    // As terminals have them: green, grey, yellow, red.
+    static constexpr const char* colors[] = {"", "\33[32m", "\33[90m", "\33[33m", "\33[1;31m"};
     std::string line = label.what + (label.name.empty() ? "" : " ") + label.name;
-    for (std::size_t i = 0; i < label.facts.size(); ++i)
-        line += (i ? ", " : " ") + label.facts[i];
+    for (std::size_t i = 0; i < label.facts.size(); ++i) {
+        const bool is_state = i + 1 == label.facts.size() && label.condition != NONE;
+        line += i ? ", " : " ";
+        line += color && is_state ? colors[static_cast<int>(label.condition)] + label.facts[i] + "\33[0m"
+                                  : label.facts[i];
+    }
     return line;
 }
 

@@ -4,6 +4,27 @@
 
 namespace KPRV::host {
 
+/// How it is with a node, in one word and as a color.
+enum class Condition
+{
+    /// Nothing is known, or there is nothing to know.
+    NONE,
+    /// It does what it is there for.
+    GOOD,
+    /// It does not, because somebody wants it so.
+    IDLE,
+    /// It may not for long.
+    DOUBTFUL,
+    /// It does not.
+    BAD,
+};
+
+struct Node_State
+{
+    std::string words;
+    Condition condition = Condition::NONE;
+};
+
 /// What people want to read of a node. Each text is one line and may be empty.
 struct Node_Label
 {
@@ -11,8 +32,10 @@ struct Node_Label
     std::string what;
     /// Name or address, addresses in colon form.
     std::string name;
-    /// Model, speed, state: what is known of them.
+    /// Model, speed, product: what is known of them. A state stands last.
     std::vector<std::string> facts;
+    /// That of the last fact.
+    Condition condition = Condition::NONE;
 };
 
 Node_Label node_label(const Topology::Node& node);
@@ -20,8 +43,8 @@ Node_Label node_label(const Topology::Node& node);
 /// A property's text on one line; empty for a null or missing one.
 std::string line_of(const Instance_Value& instance, const char* property);
 
-/// "WHAT NAME FACT, FACT".
-std::string label_line(const Node_Label& label);
+/// "WHAT NAME FACT, FACT"; with the state in the color of its condition if that is wanted.
+std::string label_line(const Node_Label& label, bool color = false);
 
 /// "fc_port" and its like: the kind for programs.
 const char* node_kind_name(Node_Kind kind);

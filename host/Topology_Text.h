@@ -5,8 +5,8 @@
 namespace KPRV::host {
 
 /// The tree for people, one line a node, branches drawn with box-drawing characters or in ASCII. Initiators
-/// have no line: each is the port above it in another role.
-std::string tree_text(const Topology& topology, bool ascii);
+/// have no line: each is the port above it in another role. States are in color if that is wanted.
+std::string tree_text(const Topology& topology, bool ascii, bool color);
 
 /// The same as nested objects with "kind", "name", "facts", "path" and, unless it is empty, "children"; an
 /// array if the roots are not exactly one.

@@ -26,12 +26,12 @@ std::vector<const Branch*> shown(const Topology& topology, const std::vector<Bra
     return result;
 }
 
-std::vector<Text_Branch> lines_of(const Topology& topology, const std::vector<Branch>& branches)
+std::vector<Text_Branch> lines_of(const Topology& topology, const std::vector<Branch>& branches, bool color)
 {
     std::vector<Text_Branch> lines;
     for (const Branch* branch : shown(topology, branches))
-        lines.push_back(
-            {label_line(node_label(topology.nodes[branch->node])), lines_of(topology, branch->children)});
+        lines.push_back({label_line(node_label(topology.nodes[branch->node]), color),
+                         lines_of(topology, branch->children, color)});
     return lines;
 }
 
@@ -49,9 +49,9 @@ std::string json_of(const Topology& topology, const Branch& branch, unsigned ind
 
 } // namespace
 
-std::string tree_text(const Topology& topology, bool ascii)
+std::string tree_text(const Topology& topology, bool ascii, bool color)
 {
-    return branch_text(lines_of(topology, topology.roots), ascii);
+    return branch_text(lines_of(topology, topology.roots, color), ascii);
 }
 
 std::string tree_json(const Topology& topology)

@@ -58,7 +58,7 @@ TEST(Cli_Profiles, Json)
     const Json::Value& standard = roots[0];
     EXPECT_EQ("profile", standard["kind"].asString());
     EXPECT_EQ("Standard", standard["name"].asString());
-    EXPECT_EQ("root/toy:KALDERA_RegisteredProfile.InstanceID=\"std\"", standard["path"].asString());
+    EXPECT_EQ("root/kaldera:KALDERA_RegisteredProfile.InstanceID=\"std\"", standard["path"].asString());
     EXPECT_EQ("4 profiles conform", standard["facts"][2].asString());
     const Json::Value& profile = standard["children"][0];
     const Json::Value& element = profile["children"][1];

@@ -34,7 +34,7 @@ TEST(Cli_Topology, Tree)
 │     └─ target 20:00:00:60:16:00:00:02 quiesced
 │        └─ disk LUN_1 two\nlines
 └─ Kaldera CNA KLDR00C2001 (00024b4c2000) stopped
-   ├─ FC port 10:00:02:4b:4c:20:00:ff 2.5 Gb/s, state 99
+   ├─ FC port 10:00:02:4b:4c:20:00:ff 2.5 Gb/s, no contact
    └─ Ethernet port 00:02:4b:4c:20:01 eth4, in service
 )",
               run.out);
@@ -60,7 +60,7 @@ const char* const ascii_tree = R"(host 10.0.0.5 OK
    |- driver zst 3.2.1
    |- card CNA-101 KLDR00C2001
    |  `- transceiver SFP02_2_0 ACME "Optics", 10G
-   |- FC port 10:00:02:4b:4c:20:00:ff 2.5 Gb/s, state 99
+   |- FC port 10:00:02:4b:4c:20:00:ff 2.5 Gb/s, no contact
    `- Ethernet port 00:02:4b:4c:20:01 eth4, in service
 )";
 
@@ -72,13 +72,25 @@ TEST(Cli_Topology, TreeInAsciiWithAllThatIsOptional)
     EXPECT_EQ(ascii_tree, on_fabric("tree --software --connectors", "LC_ALL=no_SUCH.locale").out);
 }
 
+TEST(Cli_Topology, StatesInColorWhereThatIsWanted)
+{
+    const std::string out = on_fabric("tree --color always").out;
+    for (const char* words : {"\n├─ Kaldera FC HBA KLDR00A1001 (2000024b4c100000) \33[32min service\33[0m\n",
+                              " 2.5 Gb/s, \33[1;31mno contact\33[0m\n", ":01 \33[90mdisabled\33[0m\n",
+                              "disk LUN_0 ACME Disk Array, naa.6001\\x\n"})
+        EXPECT_NE(std::string::npos, out.find(words)) << words;
+    EXPECT_EQ(std::string::npos, on_fabric("tree").out.find('\33'));
+    EXPECT_EQ(on_fabric("tree").out, on_fabric("tree --color=never").out);
+    EXPECT_EQ(std::string::npos, on_fabric("tree --color always --format json").out.find('\33'));
+}
+
 TEST(Cli_Topology, TreeAsJson)
 {
     Outcome run = on_fabric("tree --format json");
     Json::Value tree;
     ASSERT_TRUE(Json::Reader().parse(run.out, tree)) << run.out;
     EXPECT_EQ("system", tree["kind"].asString());
-    EXPECT_EQ("root/toy:KALDERA_ComputerSystem.Name=\"10.0.0.5\"", tree["path"].asString());
+    EXPECT_EQ("root/kaldera:KALDERA_ComputerSystem.Name=\"10.0.0.5\"", tree["path"].asString());
     const Json::Value& port = tree["children"][0]["children"][0];
     EXPECT_EQ("fc_port", port["kind"].asString());
     EXPECT_EQ("10:00:02:4b:4c:10:00:00", port["name"].asString());
@@ -106,14 +118,14 @@ TEST(Cli_Topology, Graph)
   n7 [label="target\n20:00:00:60:16:00:00:01\nenabled", shape=ellipse, fillcolor="#e2d1ee"];
   n8 [label="disk\nLUN_0\nACME Disk Array, naa.6001\\x", shape=cylinder, fillcolor="#f6d5d5"];
   n9 [label="disk\nLUN_1\ntwo\\nlines", shape=cylinder, fillcolor="#f6d5d5"];
-  n10 [label="target\n20:00:00:60:16:00:00:02\nquiesced", shape=ellipse, fillcolor="#e2d1ee"];
+  n10 [label="target\n20:00:00:60:16:00:00:02\nquiesced", shape=ellipse, fillcolor="#e2d1ee", color="#7f7f7f", fontcolor="#5f5f5f"];
   n11 [label="tape\ntape_only", shape=cylinder, fillcolor="#f6d5d5"];
-  n12 [label="FC port\n10:00:02:4b:4c:10:00:01\ndisabled", shape=box, fillcolor="#b5d3ee"];
-  n13 [label="initiator\n10:00:02:4b:4c:10:00:01\ndisabled", shape=ellipse, fillcolor="#d4e5f5"];
-  n14 [label="Kaldera CNA\nKLDR00C2001 (00024b4c2000)\nstopped", shape=component, fillcolor="#fdd9a0"];
+  n12 [label="FC port\n10:00:02:4b:4c:10:00:01\ndisabled", shape=box, fillcolor="#b5d3ee", color="#7f7f7f", fontcolor="#5f5f5f"];
+  n13 [label="initiator\n10:00:02:4b:4c:10:00:01\ndisabled", shape=ellipse, fillcolor="#d4e5f5", color="#7f7f7f", fontcolor="#5f5f5f"];
+  n14 [label="Kaldera CNA\nKLDR00C2001 (00024b4c2000)\nstopped", shape=component, fillcolor="#fdd9a0", color="#7f7f7f", fontcolor="#5f5f5f"];
   n15 [label="card\nCNA-101\nKLDR00C2001", shape=box, fillcolor="#fbe8c8"];
   n16 [label="transceiver\nSFP02_2_0\nACME \"Optics\", 10G", shape=cds, fillcolor="#fbe8c8"];
-  n17 [label="FC port\n10:00:02:4b:4c:20:00:ff\n2.5 Gb/s, state 99", shape=box, fillcolor="#b5d3ee"];
+  n17 [label="FC port\n10:00:02:4b:4c:20:00:ff\n2.5 Gb/s, no contact", shape=box, fillcolor="#b5d3ee", color="#d0021b", penwidth=3];
   n18 [label="Ethernet port\n00:02:4b:4c:20:01\neth4, in service", shape=box, fillcolor="#bfe3c0"];
   n1 -> n2 [label="KALDERA_PortControllerSystemDevice"];
   n2 -> n3 [label="KALDERA_Realizes"];
@@ -144,22 +156,22 @@ TEST(Cli_Topology, Graph)
 TEST(Cli_Topology, AssociatorsAndReferences)
 {
     Outcome names = on_fabric("ain " + the_system);
-    EXPECT_EQ("root/toy:KALDERA_PortController.DeviceID=\"2000024b4c100000\"\n"
-              "root/toy:KALDERA_PortController.DeviceID=\"00024b4c2000\"\n"
-              "root/toy:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
+    EXPECT_EQ("root/kaldera:KALDERA_PortController.DeviceID=\"2000024b4c100000\"\n"
+              "root/kaldera:KALDERA_PortController.DeviceID=\"00024b4c2000\"\n"
+              "root/kaldera:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
               names.out);
     EXPECT_EQ(0, names.status);
     EXPECT_EQ("Name         Caption\n-----------  --------------\nKLDR00A1001  Kaldera FC HBA\n"
               "KLDR00C2001  Kaldera CNA\n",
               on_fabric("ai " + the_system + "--assoc TOY_Scope --properties Name,Caption").out);
-    EXPECT_EQ("root/toy:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
+    EXPECT_EQ("root/kaldera:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
               on_fabric("ain " + the_system +
                         "--assoc TOY_Component --result TOY_Port --role groupcomponent "
                         "--result-role PartComponent")
                   .out);
-    std::string link = "root/toy:TOY_PortSystemDevice.GroupComponent="
-                       "\"root/toy:KALDERA_ComputerSystem.Name=\\\"10.0.0.5\\\"\",PartComponent="
-                       "\"root/toy:KALDERA_FCPort.DeviceID=\\\"1000024b4c100000\\\"\"\n";
+    std::string link = "root/kaldera:TOY_PortSystemDevice.GroupComponent="
+                       "\"root/kaldera:KALDERA_ComputerSystem.Name=\\\"10.0.0.5\\\"\",PartComponent="
+                       "\"root/kaldera:KALDERA_FCPort.DeviceID=\\\"1000024b4c100000\\\"\"\n";
     EXPECT_EQ(link, on_fabric("rin " + the_system + "--assoc TOY_PortSystemDevice").out);
     EXPECT_EQ("", on_fabric("rin " + the_system + "--assoc TOY_PortSystemDevice --role PartComponent").out);
     Json::Value parsed;
@@ -205,7 +217,7 @@ TEST(Cli_Topology, OptionsThatMakeNoSense)
         {"tree x", "usage: kldrcim [options] tree"},
         {"ain", "usage: kldrcim [options] ain PATH"},
         {"ain x --role", "--role wants a value"},
-        {"tree --ascii=yes", "no option \"--ascii=yes\"; \"kldrcim --help\" lists them"},
+        {"tree --ascii=yes", "--ascii takes no value"},
     };
     for (const auto& [arguments, error] : mistakes) {
         Outcome run = kldrcim(arguments);

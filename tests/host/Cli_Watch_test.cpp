@@ -127,7 +127,7 @@ TEST(Cli_Watch, SaysWhatTheOutputLacks)
         std::string(KLDRCIM) + " --module " + TOY_DESCRIBED + " --namespace root/toy watch TOY_Alert";
     const int full = std::system((watch + " >/dev/full 2>cli_watch.err").c_str());
     EXPECT_EQ(1, WEXITSTATUS(full));
-    EXPECT_EQ("kldrcim: cannot write: No space left on device\n", read_file("cli_watch.err"));
+    EXPECT_EQ("kldrcim: write error: No space left on device\n", read_file("cli_watch.err"));
 }
 
 } // namespace

@@ -1,8 +1,10 @@
 // The program as users run it.
 #include "Run_Kldrcim.h"
 #include "Toy_Host.h"
+#include "host/Cli_Verbs.h"
 
 #include <json/json.h>
+#include <sstream>
 
 namespace KPRV::host {
 namespace {
@@ -132,6 +134,15 @@ TEST(Cli, OneClearLineForEachMistake)
         {"ci TOY_Item Foo=1", 2, "kldrcim: TOY_Item has no property \"Foo\"\n"},
         {"", 2, "kldrcim: no verb; \"kldrcim --help\" lists them\n"},
         {"frobnicate", 2, "kldrcim: no verb \"frobnicate\"; \"kldrcim --help\" lists them\n"},
+        {"frobnicate --help", 2, "kldrcim: no verb \"frobnicate\"; \"kldrcim --help\" lists them\n"},
+        {"graf", 2, "kldrcim: no verb \"graf\" (did you mean \"graph\"?); \"kldrcim --help\" lists them\n"},
+        {"prof", 2,
+         "kldrcim: no verb \"prof\" (did you mean \"profiles\"?); \"kldrcim --help\" lists them\n"},
+        {"ei X --propreties=A", 2,
+         "kldrcim: no option \"--propreties=A\" (did you mean \"--properties\"?); \"kldrcim --help\" lists "
+         "them\n"},
+        {"tree --leaks=1", 2, "kldrcim: --leaks takes no value\n"},
+        {"tree --color red", 2, "kldrcim: --color takes auto, always or never, not \"red\"\n"},
         {"ei", 2, "kldrcim: usage: kldrcim [options] ei CLASS\n"},
         {"ei TOY_Item --format xml", 2, "kldrcim: --format takes table, json or mof, not \"xml\"\n"},
         {"ei TOY_Item --nothing", 2, "kldrcim: no option \"--nothing\"; \"kldrcim --help\" lists them\n"},
@@ -161,7 +172,92 @@ TEST(Cli, HelpAndVersion)
     Outcome run = kldrcim("--help");
     EXPECT_EQ(0, run.status);
     EXPECT_EQ(0u, run.out.find("Usage: kldrcim [options] VERB ARGUMENT...\n"));
+    EXPECT_EQ(run.out, kldrcim("-h").out);
     EXPECT_EQ(0u, kldrcim("--version").out.find("kldrcim "));
+}
+
+TEST(Cli, EachVerbHasHelpOfItsOwn)
+{
+    const std::string all = kldrcim("--help").out;
+    for (const Cli_Verb& verb : cli_verbs()) {
+        SCOPED_TRACE(verb.name);
+        // Also where its arguments are not complete.
+        const Outcome run = kldrcim(std::string(verb.name) + " --help");
+        EXPECT_EQ(0, run.status);
+        EXPECT_EQ("", run.error);
+        EXPECT_EQ(0u, run.out.find(std::string("Usage: kldrcim [options] ") + verb.name)) << run.out;
+        for (const Cli_Option& option : cli_options()) {
+            const bool has_it = option.is_common || contains_word(verb.options, option.name);
+            EXPECT_EQ(has_it, run.out.find("\n  " + std::string(option.name)) != std::string::npos)
+                << option.name;
+            EXPECT_NE(std::string::npos, all.find("\n  " + std::string(option.name)));
+        }
+        std::istringstream lines(run.out + all);
+        for (std::string line; std::getline(lines, line);)
+            EXPECT_GE(80u, line.size()) << line;
+    }
+    EXPECT_NE(std::string::npos, kldrcim("rpc --help").out.find("Parameters of rpc\n"));
+    EXPECT_EQ(std::string::npos, kldrcim("ei --help").out.find("Parameters of rpc\n"));
+    EXPECT_NE(std::string::npos, kldrcim("gi --help").out.find("Paths and values\n"));
+}
+
+TEST(Cli, AnOutputThatCannotBeWrittenIsAFailure)
+{
+    for (const char* arguments :
+         {"ei TOY_Item", "ein TOY_Item", "classes", "--help", "ei --help", "--version", "rpc --list",
+          "cm TOY_Item Echo Text=t", "ei TOY_Item --format json"}) {
+        SCOPED_TRACE(arguments);
+        const std::string command = std::string(KLDRCIM " --module " TOY_DESCRIBED " --namespace root/toy ") +
+                                    arguments + " 2>cli_test.err ";
+        EXPECT_EQ(1, WEXITSTATUS(std::system((command + ">/dev/full").c_str())));
+        EXPECT_EQ("kldrcim: write error: No space left on device\n", read_file("cli_test.err"));
+        EXPECT_EQ(1, WEXITSTATUS(std::system((command + ">&-").c_str())));
+        EXPECT_EQ("kldrcim: write error: Bad file descriptor\n", read_file("cli_test.err"));
+        // A reader that has had enough.
+        EXPECT_EQ(0, WEXITSTATUS(std::system((command + "| true").c_str())));
+        EXPECT_EQ("", read_file("cli_test.err"));
+        const std::string status = "sh -c '" + command + "; echo $? >cli_test.status' | true";
+        if (std::string(arguments).find('\'') == std::string::npos) {
+            std::system(status.c_str());
+            EXPECT_EQ("0\n", read_file("cli_test.status"));
+        }
+    }
+}
+
+TEST(Cli, AClosedOutputIsNotTakenByAFileThatIsOpened)
+{
+    // What is loaded and logged would else get the place of the output.
+    const std::string command =
+        KLDRCIM " --module " TOY_DESCRIBED " --namespace root/toy ein TOY_Item <&- >&- 2>cli_test.err";
+    EXPECT_EQ(1, WEXITSTATUS(std::system(command.c_str())));
+    EXPECT_EQ("kldrcim: write error: Bad file descriptor\n", read_file("cli_test.err"));
+}
+
+TEST(Cli, WithoutMemoryOneLineTellsIt)
+{
+    // What is loaded takes its place before the limit is met.
+    const Outcome run = kldrcim("cm TOY_Item Echo \"Text=$(head -c 100000 /dev/zero | tr '\\0' x)\"");
+    EXPECT_EQ(0, run.status);
+#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__)
+    const std::string command = "ulimit -v 60000; exec " KLDRCIM " --module " TOY_DESCRIBED
+                                " --namespace root/toy rpc --raw - </dev/zero 2>cli_test.err";
+    EXPECT_EQ(1, WEXITSTATUS(std::system(command.c_str())));
+    EXPECT_EQ("kldrcim: out of memory\n", read_file("cli_test.err"));
+#endif
+}
+
+TEST(Cli, ANameSpaceThatNobodyServes)
+{
+    const std::string own = KLDRCIM " --module " TOY_FABRIC " 2>cli_test.err >cli_test.out ";
+    const auto run = [&](const std::string& arguments) {
+        const int status = WEXITSTATUS(std::system((own + arguments).c_str()));
+        return std::pair(status, read_file("cli_test.err"));
+    };
+    const std::pair unserved(2, std::string("kldrcim: no namespace \"root/x\"; there is root/kaldera\n"));
+    EXPECT_EQ(unserved, run("--namespace root/x ei KALDERA_FCPort"));
+    EXPECT_EQ(unserved, run("--namespace root/x tree"));
+    EXPECT_EQ(unserved.first, run("ei root/x:KALDERA_FCPort").first);
+    EXPECT_EQ(0, run("--namespace ROOT/Kaldera ei KALDERA_FCPort").first);
 }
 
 } // namespace

@@ -46,6 +46,45 @@ TEST(Node_Label, UnitsTellVendorAndProduct)
         EXPECT_EQ("disk LUN_3", unit(odd)) << odd;
 }
 
+TEST(Node_Label, StatesOfAPortInTheWordsOfThoseWhoLookAfterIt)
+{
+    struct Row
+    {
+        int operational;
+        int enabled;
+        const char* words;
+        Condition condition;
+    };
+    // As the module fills the two together.
+    const Row rows[] = {
+        {11, 2, "in service", Condition::GOOD},  {10, 3, "disabled", Condition::IDLE},
+        {12, 1, "no contact", Condition::BAD},   {13, 6, "link down", Condition::BAD},
+        {6, 1, "error", Condition::BAD},         {8, 9, "starting", Condition::IDLE},
+        {9, 4, "stopping", Condition::IDLE},     {14, 1, "aborted", Condition::BAD},
+        {3, 2, "degraded", Condition::DOUBTFUL}, {99, 1, "state 99", Condition::NONE},
+    };
+    for (const Row& row : rows)
+        for (const Node_Kind kind : {Node_Kind::FC_PORT, Node_Kind::ETHERNET_PORT, Node_Kind::TARGET}) {
+            const Node_Label label = node_label(
+                {kind,
+                 {.path = {},
+                  .properties = {
+                      {"OperationalStatus",
+                       states({Value::unsigned_number(CMPI_uint16, std::uint64_t(row.operational))})},
+                      {"EnabledState", Value::unsigned_number(CMPI_uint16, std::uint64_t(row.enabled))}}}});
+            EXPECT_EQ(row.words, label.facts.back());
+            EXPECT_EQ(row.condition, label.condition) << row.words;
+        }
+}
+
+TEST(Node_Label, WithoutAStatusItIsWhetherAPortIsEnabled)
+{
+    for (const auto& [enabled, words] : {std::pair{2, "enabled"}, {3, "disabled"}, {99, "state 99"}})
+        EXPECT_EQ(std::string("FC port ") + words,
+                  line(Node_Kind::FC_PORT, "P",
+                       {{"EnabledState", Value::unsigned_number(CMPI_uint16, std::uint64_t(enabled))}}));
+}
+
 TEST(Node_Label, WhatIsMissingLeavesNoTrace)
 {
     EXPECT_EQ("host", line(Node_Kind::SYSTEM, "S", {}));

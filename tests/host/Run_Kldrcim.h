@@ -27,12 +27,15 @@ inline std::string read_file(const char* name)
     return text;
 }
 
-/// `arguments` as a shell reads them, `environment` as assignments before the command.
+/// `arguments` as a shell reads them, `environment` as assignments before the command. The toy that passes
+/// for the product's own module has its name space, too.
 inline Outcome kldrcim(const std::string& arguments, const char* library = TOY_DESCRIBED,
                        const char* environment = "")
 {
     std::string command = std::string(environment) + " " + KLDRCIM + " --module " + library +
-                          " --namespace root/toy " + arguments + " >cli_test.out 2>cli_test.err";
+                          " --namespace " +
+                          (std::string(library) == TOY_FABRIC ? "root/kaldera" : "root/toy") + " " +
+                          arguments + " >cli_test.out 2>cli_test.err";
     int status = std::system(command.c_str());
     return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, read_file("cli_test.out"),
             read_file("cli_test.err")};

@@ -110,7 +110,7 @@ TEST_F(Topology_Test, FailuresAreToldOnce)
 
 TEST_F(Topology_Test, NoSystemIsNoTree)
 {
-    EXPECT_EQ("", tree_text({}, false));
+    EXPECT_EQ("", tree_text({}, false, false));
     EXPECT_EQ("[]\n", tree_json({}));
 }
 

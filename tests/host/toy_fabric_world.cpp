@@ -65,7 +65,7 @@ const std::vector<Fabric_Object> fabric_objects = {
     {"KALDERA_AdapterSoftwareIdentity", "InstanceID=2000024b4c100000_firmware;Classifications=10;VersionString=3.2.0"},
     {"KALDERA_FCPort",                  "DeviceID=1000024b4c100000;Speed=8000000000;EnabledState=2"},
     {"KALDERA_FCPort",                  "DeviceID=1000024b4c100001;Speed=0;EnabledState=3"},
-    {"KALDERA_FCPort",                  "DeviceID=1000024b4c2000ff;Speed=2500000000;EnabledState=99"},
+    {"KALDERA_FCPort",                  "DeviceID=1000024b4c2000ff;Speed=2500000000;EnabledState=1;OperationalStatus=12"},
     {"KALDERA_EthernetPort",            "DeviceID=00024b4c2001;ElementName=eth4;OperationalStatus=11"},
     {"KALDERA_SCSIProtocolEndpoint",    "Name=1000024b4c100000;EnabledState=2"},
     {"KALDERA_SCSIProtocolEndpoint",    "Name=1000024b4c100001;EnabledState=3"},
