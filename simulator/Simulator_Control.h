@@ -46,7 +46,7 @@ public:
     void release();
 
     /// Waits until the entry point has been called so often. False if that takes too long.
-    bool wait_for_calls(const std::string& name, unsigned count, unsigned milliseconds = 10000);
+    bool wait_for_calls(const std::string& name, unsigned count, unsigned milliseconds = 120000);
 
     /// All recorded calls, or the names or the requests of some, oldest first.
     std::vector<Simulator_Call> calls();

@@ -2,6 +2,7 @@
 
 #include "adapter/Host_Calls.h"
 #include "adapter/Host_Name.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
@@ -233,7 +234,7 @@ TEST_F(ProviderUtil_Host, look_ups_do_not_wait_for_each_other)
         std::unique_lock lock(mutex);
         inside++;
         came.notify_all();
-        all_inside &= came.wait_for(lock, std::chrono::seconds(30), [&] { return inside == THREADS; });
+        all_inside &= came.wait_for(lock, PATIENCE, [&] { return inside == THREADS; });
     };
     std::vector<std::string> names(THREADS);
     {

@@ -1,6 +1,7 @@
 // The provider as the CMPI adapter calls it: subscription, delivery thread and end.
 #include "tests/alerts/Alert_Delivery.h"
 #include "tests/alerts/Event_Fixture.h"
+#include "tests/support/Eventually.h"
 
 #include "runtime/Provider_Handle.h"
 #include "runtime/provider_status.h"
@@ -59,7 +60,7 @@ struct Received
     bool wait_for(size_t count)
     {
         std::unique_lock lock(mutex);
-        return came.wait_for(lock, std::chrono::seconds(20), [&] { return alerts.size() >= count; });
+        return came.wait_for(lock, PATIENCE, [&] { return alerts.size() >= count; });
     }
     std::vector<std::string> ids()
     {

@@ -1,6 +1,7 @@
 #include "diagnostics/DiagnosticHelper.h"
 #include "schema/KALDERA_DiagnosticCompletionRecord.h"
 #include "tests/diagnostics/Settle_Pause_Override.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Fixed_Host.h"
 #include "tests/support/In_Child.h"
@@ -54,9 +55,7 @@ protected:
                 count += line.starts_with("DBG Returning: run") && line.ends_with("Thread");
             return count >= started;
         };
-        for (int i = 0; i < 2000 && !over(); i++)
-            usleep(5000);
-        EXPECT_TRUE(over());
+        EXPECT_TRUE(eventually(over));
         // Takes the locks that the threads have used.
         helper.isAnyJobRunning();
         for (Instance* instance : helper.getDiagnosticCompletionRecordInstances())
@@ -270,8 +269,7 @@ TEST_F(Test_Start, OfTwoAtTheSameMomentBothRunAndTheLaterJobStays)
     EXPECT_EQ(Lines{"Kaldera:InternalLoopbackTest-2 4"}, jobs());
     // The end of the run whose job is gone changes nothing.
     released->set_value();
-    for (int i = 0; i < 2000 && !log.has("INFO PCI Loopback test run is successful"); i++)
-        usleep(5000);
+    EXPECT_TRUE(eventually([&] { return log.has("INFO PCI Loopback test run is successful"); }));
     EXPECT_EQ(Lines{"Kaldera:InternalLoopbackTest-2 4"}, jobs());
     loopback_released->set_value();
     wait();
@@ -292,8 +290,7 @@ TEST_F(Test_Start, OfTwoAtTheSameMomentTheOtherOrder)
     EXPECT_EQ(4096u, code(helper.runMemoryTest(WWN)));
     EXPECT_EQ(Lines{"Kaldera:MemoryTest-2 4"}, jobs());
     released->set_value();
-    for (int i = 0; i < 2000 && helper.isAnyJobRunning(); i++)
-        usleep(5000);
+    EXPECT_TRUE(eventually([&] { return !helper.isAnyJobRunning(); }));
     EXPECT_EQ(Lines{"Kaldera:MemoryTest-2 7"}, jobs());
     loopback_released->set_value();
 }

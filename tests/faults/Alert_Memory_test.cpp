@@ -2,12 +2,13 @@
 // them, and while a subscription begins and ends.
 #include "tests/faults/Failing_Allocator.h"
 #include "tests/faults/Fault_Fixture.h"
+#include "tests/support/Eventually.h"
 
 #include <condition_variable>
 #include <dlfcn.h>
 #include <mutex>
 
-namespace KPRV {
+namespace KPRV::alert_memory {
 namespace {
 
 const char* const CLASS = "KALDERA_AlertIndication";
@@ -55,9 +56,8 @@ protected:
     bool wait_for(const std::string& name, long count)
     {
         std::unique_lock lock(_mutex);
-        return _arrived.wait_for(lock, std::chrono::seconds(20), [&] {
-            return std::count(_came.begin(), _came.end(), "ZNT_" + name) >= count;
-        });
+        return _arrived.wait_for(
+            lock, PATIENCE, [&] { return std::count(_came.begin(), _came.end(), "ZNT_" + name) >= count; });
     }
     long number_of(const std::string& name)
     {
@@ -181,4 +181,4 @@ TEST_F(Alert_Memory, OfTheBeginningAndTheEndOfASubscription)
 }
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::alert_memory

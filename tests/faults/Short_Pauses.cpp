@@ -24,11 +24,3 @@ extern "C" [[gnu::visibility("default")]] int select(int count, fd_set* read, fd
     timeval pause = {0, 1000};
     return wait(count, read, write, except, count == 0 && limit ? &pause : limit);
 }
-
-extern "C" [[gnu::visibility("default")]] int clock_nanosleep(clockid_t clock, int, const timespec*,
-                                                              timespec* left)
-{
-    static auto* const wait = real<decltype(clock_nanosleep)>("clock_nanosleep", "__clock_nanosleep_time64");
-    const timespec pause = {0, 1000000};
-    return wait(clock, 0, &pause, left);
-}

@@ -2,12 +2,13 @@
 // since alerts stay allocated.
 #include "host/Subscription.h"
 #include "tests/faults/Sweep_Fixture.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
 
 #include <condition_variable>
 #include <mutex>
 
-namespace KPRV {
+namespace KPRV::subscription_answers {
 namespace {
 
 struct Way
@@ -52,7 +53,7 @@ protected:
         came = 0;
         EXPECT_TRUE(simulator.event(
             R"({"eventSeverity": 2, "eventCategory": 2, "eventId": 11, "portIndexString": "1000024b4ccc0000"})"));
-        return arrived.wait_for(lock, std::chrono::seconds(10), [&] { return came >= 2; });
+        return arrived.wait_for(lock, PATIENCE, [&] { return came >= 2; });
     }
     void live_through(const Bad_Answer& bad)
     {
@@ -109,4 +110,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Subscription_Answers, testing::ValuesIn(ways), [](
 });
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::subscription_answers

@@ -2,6 +2,7 @@
 
 #include "simulator/Simulator_Control.h"
 #include "tests/faults/Bad_Answers.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/Module_Picture.h"
 #include "tests/support/Temp_Folder.h"
 
@@ -72,7 +73,7 @@ protected:
         std::packaged_task<decltype(operation())()> task(operation);
         auto result = task.get_future();
         std::thread thread(std::move(task));
-        if (result.wait_for(std::chrono::seconds(60)) != std::future_status::ready) {
+        if (result.wait_for(PATIENCE) != std::future_status::ready) {
             ADD_FAILURE() << "a lock was left";
             fflush(nullptr);
             std::_Exit(1);

@@ -2,11 +2,12 @@
 // run a test is pinned, and some faults end the process.
 #include "tests/faults/Ends_Process.h"
 #include "tests/faults/Sweep_Fixture.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
 
 #include <algorithm>
 
-namespace KPRV {
+namespace KPRV::test_run_answers {
 namespace {
 
 enum Outcome
@@ -73,9 +74,7 @@ protected:
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
         if (result.return_value.as_uint() != STARTED)
             return REFUSED;
-        for (int i = 0; i < 20000 && server->ledger().live() != 0; i++)
-            std::this_thread::sleep_for(std::chrono::milliseconds(1));
-        EXPECT_EQ(0u, server->ledger().live());
+        EXPECT_TRUE(eventually([&] { return server->ledger().live() == 0; }));
         const std::vector<host::Instance_Value> all = records();
         EXPECT_LT(before, all.size());
         bool failed = false;
@@ -163,4 +162,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Test_Run_Answers, testing::ValuesIn(ways), name_of
 INSTANTIATE_TEST_SUITE_P(Way, Unguarded_Runs, testing::ValuesIn(Unguarded_Runs::own_ways()), name_of);
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::test_run_answers

@@ -2,11 +2,12 @@
 // unloading the module, which a test thread has pinned.
 #include "tests/faults/Failing_Allocator.h"
 #include "tests/faults/Fault_Fixture.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
 
 #include <thread>
 
-namespace KPRV {
+namespace KPRV::test_run_memory {
 namespace {
 
 constexpr unsigned STARTED = 4096;
@@ -36,9 +37,7 @@ protected:
     /// Until the thread of a test has left the server.
     void wait_for_the_end()
     {
-        for (int i = 0; i < 20000 && server->ledger().live() != 0; i++)
-            std::this_thread::sleep_for(std::chrono::milliseconds(1));
-        EXPECT_EQ(0u, server->ledger().live());
+        EXPECT_TRUE(eventually([&] { return server->ledger().live() == 0; }));
     }
     /// A run that nothing disturbs.
     void expect_a_good_run()
@@ -137,4 +136,4 @@ INSTANTIATE_TEST_SUITE_P(Of, Test_Start_Memory, testing::ValuesIn(ways), name_of
 INSTANTIATE_TEST_SUITE_P(Of, Test_Thread_Memory, testing::ValuesIn(ways), name_of);
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::test_run_memory

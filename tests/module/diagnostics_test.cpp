@@ -1,6 +1,7 @@
 // A program of its own, each test in a process of its own: a test run pins the module, so that it is not
 // loaded anew.
 #include "tests/module/Module_Fixture.h"
+#include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
 
 #include <algorithm>
@@ -50,9 +51,7 @@ protected:
     /// Until the test threads have detached from the server.
     void wait()
     {
-        for (int i = 0; i < 2000 && server->ledger().live() != 0; i++)
-            std::this_thread::sleep_for(std::chrono::milliseconds(5));
-        EXPECT_EQ(0u, server->ledger().live());
+        EXPECT_TRUE(eventually([&] { return server->ledger().live() == 0; }));
     }
     Lines texts(const char* class_name, const char* property)
     {

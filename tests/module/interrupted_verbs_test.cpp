@@ -104,9 +104,7 @@ TEST_F(Interrupted_Verbs, AReaderThatGoesLeavesNothingOutOfService)
     const std::string command =
         std::string("sh -c '" KLDRCIM " diag run MemoryTest ") + ADAPTER + " --wait 2>/dev/null | true'";
     EXPECT_EQ(0, std::system(command.c_str()));
-    for (int i = 0; i < 600 && logged(SWITCHED) < 2; i++)
-        std::this_thread::sleep_for(std::chrono::milliseconds(10));
-    EXPECT_EQ(2u, logged(SWITCHED));
+    EXPECT_TRUE(eventually([&] { return logged(SWITCHED) == 2; }));
 }
 
 const char* const SLOW_FLASH =

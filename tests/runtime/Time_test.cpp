@@ -1,4 +1,5 @@
 #include "runtime/Time.h"
+#include "tests/support/Eventually.h"
 
 #include <chrono>
 #include <csignal>
@@ -8,6 +9,9 @@
 #include <sys/time.h>
 
 using namespace KPRV;
+
+/// One that nobody sets.
+using Clock = std::chrono::steady_clock;
 
 TEST(Time, units_are_microseconds)
 {
@@ -26,23 +30,23 @@ TEST(Time, now_counts_from_the_epoch)
 
 TEST(Time, sleep_takes_at_least_its_time)
 {
-    const uint64 start = Time::now();
+    const auto start = Clock::now();
     Time::sleep(20 * Time::MSEC);
-    EXPECT_GE(Time::now() - start, 20 * Time::MSEC);
+    EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(20));
 }
 
 TEST(Time, sleep_splits_seconds_and_remainder)
 {
-    const uint64 start = Time::now();
+    const auto start = Clock::now();
     Time::sleep(Time::SEC + 10 * Time::MSEC);
-    EXPECT_GE(Time::now() - start, Time::SEC + 10 * Time::MSEC);
+    EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(1010));
 }
 
 TEST(Time, sleep_of_nothing_returns_at_once)
 {
-    const uint64 start = Time::now();
+    const auto start = Clock::now();
     Time::sleep(0);
-    EXPECT_LT(Time::now() - start, Time::SEC);
+    EXPECT_LT(Clock::now() - start, PATIENCE);
 }
 
 TEST(Time, sleep_sleeps_on_after_a_signal)
@@ -52,10 +56,10 @@ TEST(Time, sleep_sleeps_on_after_a_signal)
     count.sa_handler = [](int) { signals = signals + 1; };
     ASSERT_EQ(0, sigaction(SIGALRM, &count, &before));
     const itimerval every_5_ms = {{0, 5000}, {0, 5000}};
-    const auto start = std::chrono::steady_clock::now();
+    const auto start = Clock::now();
     setitimer(ITIMER_REAL, &every_5_ms, nullptr);
     Time::sleep(50 * Time::MSEC);
-    EXPECT_GE(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(50));
+    EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(50));
     const itimerval never = {};
     setitimer(ITIMER_REAL, &never, nullptr);
     EXPECT_GT(signals, 0);

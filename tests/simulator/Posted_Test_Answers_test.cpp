@@ -1,4 +1,5 @@
 #include "tests/simulator/Agent_Fixture.h"
+#include "tests/support/Eventually.h"
 
 #include <atomic>
 #include <thread>
@@ -173,8 +174,7 @@ TEST_F(Posted_Test_Answers_test, a_running_test_ends_by_itself)
     load("{'milliseconds': 5}");
     done("postDiagnostics", post("1", "QuickTest", HBA));
     done("startTests", start("1"));
-    for (int tries = 0; tries < 2000 && results("1")["state"] != "Completed"; ++tries)
-        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    EXPECT_TRUE(eventually([&] { return results("1")["state"] == "Completed"; }));
     EXPECT_EQ(outcomes("1"), "Comp:Passed");
 }
 

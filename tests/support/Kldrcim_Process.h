@@ -1,12 +1,11 @@
 #pragma once
 
+#include "tests/support/Eventually.h"
 #include "tests/support/Temp_Folder.h"
 
 #include <gtest/gtest.h>
 
-#include <chrono>
 #include <csignal>
-#include <thread>
 #include <vector>
 
 #include <fcntl.h>
@@ -61,12 +60,9 @@ public:
     /// False if the words do not come on standard error, or on standard output.
     bool says(const std::string& words) const
     {
-        for (int i = 0; i < 3000; i++) {
-            if (error().find(words) != std::string::npos || out().find(words) != std::string::npos)
-                return true;
-            std::this_thread::sleep_for(std::chrono::milliseconds(10));
-        }
-        return false;
+        return eventually([&] {
+            return error().find(words) != std::string::npos || out().find(words) != std::string::npos;
+        });
     }
     void send(int number) const { kill(_child, number); }
     void answer(const std::string& line) const

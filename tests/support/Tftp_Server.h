@@ -1,5 +1,6 @@
 #pragma once
 
+#include "tests/support/Eventually.h"
 #include "tests/support/Temp_Folder.h"
 
 #include <arpa/inet.h>
@@ -73,13 +74,12 @@ private:
             _problem = std::string(PROGRAM) + " cannot be run";
             return;
         }
-        for (int tries = 0; tries < 500 && !port_is_taken(); tries++) {
-            if (waitpid(_server, nullptr, WNOHANG) == _server) {
+        // It serves, or it ends.
+        eventually([&] {
+            if (waitpid(_server, nullptr, WNOHANG) == _server)
                 _server = 0;
-                break;
-            }
-            usleep(5000);
-        }
+            return !_server || port_is_taken();
+        });
         if (!_server || !port_is_taken())
             _problem = std::string(PROGRAM) + " cannot serve 127.0.0.1:69 here";
     }
