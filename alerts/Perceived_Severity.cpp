@@ -14,7 +14,7 @@ struct Severity_Row
 };
 
 // clang-format off
-constexpr Severity_Row rows[] = {
+constexpr Severity_Row severity_rows[] = {
 //   event  standard               exact
     {1,     SEVERITY_CRITICAL,     SEVERITY_CRITICAL},
     {2,     SEVERITY_CRITICAL,     SEVERITY_MAJOR},
@@ -27,7 +27,7 @@ uint16 look_up(sint32 event_severity, Severity Severity_Row::*column)
 {
     // Both go by this name in the log.
     LOG_SCOPE("getPerceivedSeverity");
-    for (const Severity_Row& row : rows)
+    for (const Severity_Row& row : severity_rows)
         if (row.event_severity == event_severity)
             return row.*column;
     LOG(WARN, "Received a un-expected severity value: %d", event_severity);

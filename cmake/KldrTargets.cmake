@@ -42,11 +42,11 @@ endif()
 # itself is for another preset to tell; some warnings take the files of a shared run for headers.
 macro(kldr_share_runs)
   set(CMAKE_UNITY_BUILD ON)
-  set(CMAKE_UNITY_BUILD_BATCH_SIZE 8)
+  set(CMAKE_UNITY_BUILD_BATCH_SIZE 16)
   add_compile_options(-Wno-shadow -Wno-subobject-linkage)
 endmacro()
 
-# kldr_apart(<file> ...): files with a run of their own, since they have a private name that another file of the target has too.
+# kldr_apart(<file> ...): files with a run of their own, where they must be linked or left out by themselves.
 function(kldr_apart)
   set_source_files_properties(${ARGN} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
 endfunction()
@@ -65,15 +65,21 @@ function(kldr_library name)
   target_link_libraries(${name} PUBLIC ${ARG_LIBS} Threads::Threads ${CMAKE_DL_LIBS})
 endfunction()
 
+set(KLDR_TEST_OPTIONS -O0)
+if(KLDR_SANITIZE MATCHES "undefined")
+  list(APPEND KLDR_TEST_OPTIONS -fno-sanitize=undefined)
+endif()
+
 # kldr_test(<name> SOURCES ... LIBS ... [ENV K=V ...] [DEPENDS target ...]): a GoogleTest program, run by CTest in its build
 # folder.
 function(kldr_test name)
   cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV;DEPENDS" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})
   target_link_libraries(${name} PRIVATE ${ARG_LIBS} kldr_gtest)
-  # Tests are the larger half of the house: they are compiled for the compiler's speed, not for theirs.
-  target_compile_options(${name} PRIVATE -O0)
-  target_precompile_headers(${name} PRIVATE <gtest/gtest.h>)
+  # Tests are the larger half of the house: they are compiled for the compiler's speed, not for theirs, and it is not they
+  # whose behaviour must be defined.
+  target_compile_options(${name} PRIVATE ${KLDR_TEST_OPTIONS})
+  target_precompile_headers(${name} REUSE_FROM kldr_test_headers)
   if(ARG_DEPENDS)
     add_dependencies(${name} ${ARG_DEPENDS})
   endif()
@@ -93,4 +99,10 @@ if(EXISTS ${KLDR_GTEST_ROOT}/src/gtest-all.cc)
   target_include_directories(kldr_gtest SYSTEM PUBLIC ${KLDR_GTEST_ROOT}/include PRIVATE ${KLDR_GTEST_ROOT})
   target_compile_options(kldr_gtest PRIVATE -w -O0)
   target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
+
+  # What all tests begin with, read once for all of them: a program like theirs, which is only compiled.
+  add_executable(kldr_test_headers EXCLUDE_FROM_ALL ${CMAKE_CURRENT_LIST_DIR}/test_headers.cpp)
+  target_link_libraries(kldr_test_headers PRIVATE kldr_gtest)
+  target_compile_options(kldr_test_headers PRIVATE ${KLDR_TEST_OPTIONS})
+  target_precompile_headers(kldr_test_headers PRIVATE <gtest/gtest.h> <algorithm> <fstream> <functional> <map> <thread>)
 endif()

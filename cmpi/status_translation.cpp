@@ -4,7 +4,7 @@ namespace KPRV {
 
 namespace {
 
-struct Row
+struct Status_Row
 {
     Status_Family family;
     int status;
@@ -14,7 +14,7 @@ struct Row
 } // namespace
 
 // clang-format off
-static constexpr Row rows[] = {
+static constexpr Status_Row status_rows[] = {
     {Status_Family::GET_INSTANCE,          GET_INSTANCE_NOT_FOUND,              CMPI_RC_ERR_NOT_FOUND},
     // The handle's fallback absorbs "unsupported"; where it shows up all the same, something failed.
     {Status_Family::GET_INSTANCE,          GET_INSTANCE_UNSUPPORTED,            CMPI_RC_ERR_FAILED},
@@ -58,7 +58,7 @@ CMPIrc translate(Status_Family family, int status)
     // Success is 0 in every family.
     if (status == 0)
         return CMPI_RC_OK;
-    for (const Row& row : rows) {
+    for (const Status_Row& row : status_rows) {
         if (row.family == family && row.status == status)
             return row.rc;
     }

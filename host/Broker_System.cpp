@@ -1,4 +1,4 @@
-// The table of operating system services: thin covers over POSIX threads.
+// The extension_table of operating system services: thin covers over POSIX threads.
 #include "host/Broker.h"
 
 #include <cstring>
@@ -138,32 +138,32 @@ int signal_condition(void* condition)
     return pthread_cond_signal(as_condition(condition));
 }
 
-constexpr CMPIBrokerExtFT level_100 = {CMPIVersion100,
-                                       resolve_file_name,
-                                       new_thread,
-                                       join_thread,
-                                       exit_thread,
-                                       cancel_thread,
-                                       thread_sleep,
-                                       thread_once,
-                                       create_thread_key,
-                                       destroy_thread_key,
-                                       get_thread_specific,
-                                       set_thread_specific,
-                                       new_primitive<pthread_mutex_t, pthread_mutex_init>,
-                                       destroy_primitive<pthread_mutex_t, pthread_mutex_destroy>,
-                                       lock_mutex,
-                                       unlock_mutex,
-                                       new_primitive<pthread_cond_t, pthread_cond_init>,
-                                       destroy_primitive<pthread_cond_t, pthread_cond_destroy>,
-                                       cond_wait,
-                                       timed_cond_wait,
-                                       signal_condition};
+constexpr CMPIBrokerExtFT extension_level_100 = {CMPIVersion100,
+                                                 resolve_file_name,
+                                                 new_thread,
+                                                 join_thread,
+                                                 exit_thread,
+                                                 cancel_thread,
+                                                 thread_sleep,
+                                                 thread_once,
+                                                 create_thread_key,
+                                                 destroy_thread_key,
+                                                 get_thread_specific,
+                                                 set_thread_specific,
+                                                 new_primitive<pthread_mutex_t, pthread_mutex_init>,
+                                                 destroy_primitive<pthread_mutex_t, pthread_mutex_destroy>,
+                                                 lock_mutex,
+                                                 unlock_mutex,
+                                                 new_primitive<pthread_cond_t, pthread_cond_init>,
+                                                 destroy_primitive<pthread_cond_t, pthread_cond_destroy>,
+                                                 cond_wait,
+                                                 timed_cond_wait,
+                                                 signal_condition};
 
-constexpr With_Null_Slots<CMPIBrokerExtFT, 4> table = {level_100, {}};
+constexpr With_Null_Slots<CMPIBrokerExtFT, 4> extension_table = {extension_level_100, {}};
 
 } // namespace
 
-const CMPIBrokerExtFT* const broker_ext_table = &table.table;
+const CMPIBrokerExtFT* const broker_ext_table = &extension_table.table;
 
 } // namespace KPRV::host

@@ -1,4 +1,4 @@
-// The table of `getInstance` and its like: requests that a provider sends to its server, and thread
+// The up_call_table of `getInstance` and its like: requests that a provider sends to its server, and thread
 // attachment.
 #include "host/Broker.h"
 #include "host/Convert.h"
@@ -253,33 +253,33 @@ CMPIStatus deliver_indication(const CMPIBroker* mb, const CMPIContext* ctx, cons
     return call.status();
 }
 
-constexpr CMPIBrokerFT level_100 = {CMPI_MB_InstanceManipulation | CMPI_MB_AssociationTraversal |
-                                        CMPI_MB_Indications | CMPI_MB_OSEncapsulationSupport,
-                                    CMPIVersion100,
-                                    "kldrcim",
-                                    prepare_attach_thread,
-                                    attach_current_thread,
-                                    detach_current_thread,
-                                    deliver_indication,
-                                    enumerate_instance_names,
-                                    get_instance,
-                                    create_instance,
-                                    modify_instance,
-                                    delete_instance,
-                                    exec_query,
-                                    enumerate_instances,
-                                    associators,
-                                    associator_names,
-                                    references,
-                                    reference_names,
-                                    invoke_method,
-                                    set_property,
-                                    get_property};
+constexpr CMPIBrokerFT up_call_level_100 = {CMPI_MB_InstanceManipulation | CMPI_MB_AssociationTraversal |
+                                                CMPI_MB_Indications | CMPI_MB_OSEncapsulationSupport,
+                                            CMPIVersion100,
+                                            "kldrcim",
+                                            prepare_attach_thread,
+                                            attach_current_thread,
+                                            detach_current_thread,
+                                            deliver_indication,
+                                            enumerate_instance_names,
+                                            get_instance,
+                                            create_instance,
+                                            modify_instance,
+                                            delete_instance,
+                                            exec_query,
+                                            enumerate_instances,
+                                            associators,
+                                            associator_names,
+                                            references,
+                                            reference_names,
+                                            invoke_method,
+                                            set_property,
+                                            get_property};
 
-constexpr With_Null_Slots<CMPIBrokerFT, 3> table = {level_100, {}};
+constexpr With_Null_Slots<CMPIBrokerFT, 3> up_call_table = {up_call_level_100, {}};
 
 } // namespace
 
-const CMPIBrokerFT* const broker_table = &table.table;
+const CMPIBrokerFT* const broker_table = &up_call_table.table;
 
 } // namespace KPRV::host

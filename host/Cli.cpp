@@ -19,8 +19,6 @@ namespace KPRV::host {
 
 namespace {
 
-constexpr int FAILED = 1;
-
 /// Without its adapter library the module loads and finds nothing, which should not look like "no adapters".
 void warn_without_adapter_library(const Host& host)
 {
@@ -82,11 +80,11 @@ int run_cli(const std::vector<std::string>& arguments)
         // A reader that has had enough is no failure.
         return failure.error == EPIPE
                    ? 0
-                   : complain(std::string("write error: ") + std::strerror(failure.error), FAILED);
+                   : complain(std::string("write error: ") + std::strerror(failure.error), FAILURE);
     } catch (const std::bad_alloc&) {
-        return complain("out of memory", FAILED);
+        return complain("out of memory", FAILURE);
     } catch (const std::exception& error) {
-        return complain(error.what(), FAILED);
+        return complain(error.what(), FAILURE);
     }
 }
 

@@ -9,7 +9,9 @@ namespace KPRV::host {
 
 // What kldrcim says on standard error, one line each.
 
-/// Exit status of wrong usage.
+/// Exit status of what was understood and did not succeed.
+inline constexpr int FAILURE = 1;
+/// That of wrong usage.
 inline constexpr int USAGE_ERROR = 2;
 
 /// "kldrcim: TEXT"; gives the status back.

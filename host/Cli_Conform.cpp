@@ -45,7 +45,7 @@ std::string verdict_text(const Conformance_Finding& finding)
     return text;
 }
 
-std::string table(const std::vector<Conformance_Finding>& findings)
+std::string findings_table(const std::vector<Conformance_Finding>& findings)
 {
     std::vector<std::vector<std::string>> rows;
     for (const Conformance_Finding& finding : findings) {
@@ -68,7 +68,7 @@ std::string json_or_null(const char* text)
     return text ? json_string(text) : "null";
 }
 
-std::string json(const std::vector<Conformance_Finding>& findings)
+std::string findings_json(const std::vector<Conformance_Finding>& findings)
 {
     std::vector<std::string> elements;
     for (const Conformance_Finding& finding : findings) {
@@ -98,7 +98,8 @@ std::string json(const std::vector<Conformance_Finding>& findings)
 int run_conform(const Cli_Options& options, Host& host)
 {
     std::vector<Conformance_Finding> findings = check_conformance(host);
-    std::string text = options.format == Cli_Options::Format::JSON ? json(findings) : table(findings);
+    std::string text =
+        options.format == Cli_Options::Format::JSON ? findings_json(findings) : findings_table(findings);
     put(text);
     return misses_something(findings);
 }

@@ -17,13 +17,12 @@ namespace KPRV::host {
 
 namespace {
 
-constexpr int CIM_STATUS = 1;
 constexpr int REFUSED = 3;
 constexpr std::uint64_t JOB_STARTED = 4096;
 
 int complain_of(const Result& result)
 {
-    return complain(code_text(result.rc), CIM_STATUS);
+    return complain(code_text(result.rc), FAILURE);
 }
 
 const std::string& text_of(const Instance_Value& instance, const char* name)
@@ -179,7 +178,7 @@ int run(const Cli_Options& options, Host& host)
                         REFUSED);
     const Value* const reference = find_value(started.out, "Job");
     if (!reference || !reference->as_path())
-        return complain("the test was started without a job", CIM_STATUS);
+        return complain("the test was started without a job", FAILURE);
     const Path_Value& job = *reference->as_path();
     put(path_text(job) + "\n");
     flush_output();

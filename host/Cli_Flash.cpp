@@ -18,7 +18,6 @@ namespace KPRV::host {
 
 namespace {
 
-constexpr int FAILED = 1;
 constexpr int NO_SUCH_ADAPTER = 2;
 
 constexpr const char* service_class = "KALDERA_HBASoftwareInstallationService";
@@ -116,7 +115,7 @@ int tell(const Cli_Options& options, const Update& update)
         return 0;
     return complain(update.adapter + ": the update failed (return value " +
                         std::to_string(update.return_value) + "); the module's log says why",
-                    FAILED);
+                    FAILURE);
 }
 
 /// What the user answers; only a yes is one.
@@ -141,7 +140,7 @@ int flash(const Cli_Options& options, Host& host)
     const std::string& uri = options.arguments[1];
     const Result controllers = host.enumerate_instance_names(controller_class);
     if (!controllers.ok())
-        return complain(failure_text(controllers), FAILED);
+        return complain(failure_text(controllers), FAILURE);
     const Path_Value* controller = find_controller(controllers.paths, word);
     if (!controller)
         return complain("no adapter \"" + word + "\"; \"kldrcim ein " + controller_class + "\" lists them",
@@ -150,11 +149,11 @@ int flash(const Cli_Options& options, Host& host)
     if (!services.ok() || services.paths.empty())
         return complain(services.ok() ? std::string("the module offers no ") + service_class
                                       : failure_text(services),
-                        FAILED);
+                        FAILURE);
 
     Update update = {visible_text(device_id(*controller)), uri, 0, firmware_version(host, *controller), {}};
     if (!options.yes && isatty(STDIN_FILENO) && !is_wanted(update))
-        return complain(update.adapter + ": not updated", FAILED);
+        return complain(update.adapter + ": not updated", FAILURE);
     flush_output();
     // An image that an adapter has in part may be its end.
     complain(update.adapter + ": updating; SIGINT, SIGTERM and SIGHUP wait for the end of it", 0);
@@ -166,7 +165,7 @@ int flash(const Cli_Options& options, Host& host)
                                               {"Target", Value::path(*controller)},
                                               {"InstallOptions", install_options}});
     if (!answer.ok())
-        return complain(failure_text(answer), FAILED);
+        return complain(failure_text(answer), FAILURE);
     update.return_value = answer.return_value.as_uint();
     update.after = firmware_version(host, *controller);
     const int status = tell(options, update);

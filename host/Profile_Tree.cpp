@@ -24,10 +24,13 @@ constexpr Way subprofiles = {"KALDERA_SubProfileRequiresProfile", "Antecedent", 
 constexpr Way parents = {"KALDERA_SubProfileRequiresProfile", "Dependent", "Antecedent"};
 constexpr Way software = {"KALDERA_ProfileElementSoftwareIdentity", "Dependent", "Antecedent"};
 
-class Walk
+class Profile_Walk
 {
 public:
-    Walk(Association_Index& index, const Class_Catalogue& catalogue) : index_(index), catalogue_(catalogue) {}
+    Profile_Walk(Association_Index& index, const Class_Catalogue& catalogue)
+        : index_(index), catalogue_(catalogue)
+    {
+    }
 
     std::vector<Profile_Branch> run()
     {
@@ -95,7 +98,7 @@ private:
 
 std::vector<Profile_Branch> walk_profiles(Association_Index& index, const Class_Catalogue& catalogue)
 {
-    return Walk(index, catalogue).run();
+    return Profile_Walk(index, catalogue).run();
 }
 
 } // namespace KPRV::host

@@ -14,7 +14,7 @@ struct Word
     int bits;
 };
 
-constexpr Word words[] = {
+constexpr Word type_words[] = {
     {CMPI_boolean, "boolean", 1},   {CMPI_char16, "char16", 16}, {CMPI_real32, "real32", 32},
     {CMPI_real64, "real64", 64},    {CMPI_uint8, "uint8", 8},    {CMPI_uint16, "uint16", 16},
     {CMPI_uint32, "uint32", 32},    {CMPI_uint64, "uint64", 64}, {CMPI_sint8, "sint8", 8},
@@ -25,9 +25,9 @@ constexpr Word words[] = {
 
 const Word* find_word(CMPIType type)
 {
-    auto at =
-        std::find_if(std::begin(words), std::end(words), [&](const Word& word) { return word.type == type; });
-    return at == std::end(words) ? nullptr : at;
+    auto at = std::find_if(std::begin(type_words), std::end(type_words),
+                           [&](const Word& word) { return word.type == type; });
+    return at == std::end(type_words) ? nullptr : at;
 }
 
 int bits_of(CMPIType type)

@@ -17,19 +17,19 @@ enum : size_t
     PRODUCT_ID,
     SERIAL_NUMBER,
     VENDOR,
-    NUM_NAMES
+    NUM_LUN_MEMBERS
 };
-constexpr std::array<std::string_view, NUM_NAMES> names = {
+constexpr std::array<std::string_view, NUM_LUN_MEMBERS> lun_members = {
     "lunDescIdType", "lunDescription", "number", "productID", "productSerialNumber", "vendor",
 };
-static_assert(std::ranges::is_sorted(names));
+static_assert(std::ranges::is_sorted(lun_members));
 
 } // namespace
 
 bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen, _hbaLunInfo& lun)
 {
     constexpr uint32 BY_PRODUCT = 0, UNKNOWN = 10;
-    const Members<NUM_NAMES> members(element, names);
+    const Members<NUM_LUN_MEMBERS> members(element, lun_members);
     if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
         return false;
     copy_text(lun.remoteWWN, remote_wwn);

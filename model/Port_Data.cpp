@@ -19,13 +19,13 @@ enum : size_t
     PORT_TYPE,
     SUPPORTED_SPEEDS,
     WWN,
-    NUM_NAMES
+    NUM_PORT_MEMBERS
 };
-constexpr std::array<std::string_view, NUM_NAMES> names = {
+constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
     "PortSymbolicName", "maxFrameSize",        "nodeWwn", "operatingSpeed", "portStatusValue",
     "portTypeMOFValue", "supportedPortSpeeds", "wwn",
 };
-static_assert(std::ranges::is_sorted(names));
+static_assert(std::ranges::is_sorted(port_members));
 
 sint64 bits_per_second(const Json::Value& gigabits)
 {
@@ -44,7 +44,7 @@ sint64 operating_speed(const Json::Value& gigabits)
 
 void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
-    const Members<NUM_NAMES> members(answer, names);
+    const Members<NUM_PORT_MEMBERS> members(answer, port_members);
     copy_flat(port.localWWN, text_of(members[WWN]));
     copy_text(port.portWWN, port.localWWN);
     copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));

@@ -109,8 +109,10 @@ TEST_F(Child_Program, of_a_server_that_waits_for_all_children_tells_how_it_ended
     programs.program("bad", "exit 9");
     in_child([] {
         set_handler(SIGCHLD, [](int) {
+            const int error = errno;
             while (waitpid(-1, nullptr, WNOHANG) > 0)
                 continue;
+            errno = error;
         });
         for (int i = 0; i < 20; i++) {
             EXPECT_EQ(run({"good"}), 0);

@@ -9,7 +9,7 @@ using namespace KPRV;
 
 namespace {
 
-struct Worker
+struct Delivery_Worker
 {
     Script::Deliver deliver;
     Thread thread;
@@ -18,7 +18,7 @@ struct Worker
 
     static void* run(void* argument)
     {
-        auto* const self = static_cast<Worker*>(argument);
+        auto* const self = static_cast<Delivery_Worker*>(argument);
         if (self->start.valid())
             self->start.wait();
         self->deliver(make_named("from a worker"));
@@ -242,12 +242,12 @@ TEST_F(Indication_Operations, a_delivery_leaves_nothing_behind)
 
 TEST_F(Indication_Operations, a_worker_passes_an_operation_that_waits_for_its_end)
 {
-    Worker worker;
+    Delivery_Worker worker;
     std::promise<void> stopping;
     script.enable_indications = [&](const Script::Deliver& x) {
         worker.deliver = x;
         worker.start = stopping.get_future();
-        return Thread::create_joinable(worker.thread, Worker::run, &worker);
+        return Thread::create_joinable(worker.thread, Delivery_Worker::run, &worker);
     };
     script.disable_indications = [&] {
         // From here on the worker needs the adapter, which this operation holds until the worker has ended.
@@ -265,12 +265,12 @@ TEST_F(Indication_Operations, a_worker_passes_an_operation_that_waits_for_its_en
 
 TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
 {
-    Worker worker;
+    Delivery_Worker worker;
     std::promise<void> go;
     script.enable_indications = [&](const Script::Deliver& x) {
         worker.deliver = x;
         worker.start = go.get_future();
-        return Thread::create_joinable(worker.thread, Worker::run, &worker);
+        return Thread::create_joinable(worker.thread, Delivery_Worker::run, &worker);
     };
     script.disable_indications = [&] {
         void* result;
@@ -336,10 +336,10 @@ TEST_F(Indication_Operations, filters_may_change_during_a_delivery)
 
 TEST_F(Indication_Operations, a_worker_started_in_the_operation_is_attached_to_the_server)
 {
-    Worker worker;
+    Delivery_Worker worker;
     script.enable_indications = [&](const Script::Deliver& x) {
         worker.deliver = x;
-        return Thread::create_joinable(worker.thread, Worker::run, &worker);
+        return Thread::create_joinable(worker.thread, Delivery_Worker::run, &worker);
     };
     activate("root/one");
     server.core->calls.record(true);

@@ -69,13 +69,18 @@ constexpr unsigned MOST = 64;
 constexpr unsigned FAR_TOO_DEEP = 400;
 const Texts TOO_DEEP = {"ERR references nested deeper than 64 levels"};
 
+/// Every level of the nested values, until a test ends: to take one apart at once needs more stack than a
+/// request has.
+std::vector<host::Value> levels;
+
 /// A path with so many others in it, each in a key of the one around it.
 host::Path_Value nested_path(unsigned depth, const char* class_name = "Box")
 {
     host::Path_Value path = path_of(class_name, "innermost");
     for (; depth > 0; depth--) {
         host::Path_Value around = path_of(class_name, "around");
-        around.keys.push_back({"Inside", host::Value::path(std::move(path))});
+        levels.push_back(host::Value::path(std::move(path)));
+        around.keys.push_back({"Inside", levels.back()});
         path = std::move(around);
     }
     return path;
@@ -87,11 +92,11 @@ host::Instance_Value nested_instance(unsigned depth, bool in_arrays)
     host::Instance_Value instance{path_of("Box", "i"), {}};
     for (; depth > 0; depth--) {
         host::Instance_Value around{path_of("Box", "i"), {}};
-        host::Value inner = host::Value::instance(std::move(instance));
+        levels.push_back(host::Value::instance(std::move(instance)));
         if (in_arrays)
-            around.properties.push_back({"Contents", host::Value::array(CMPI_instance, {inner})});
+            around.properties.push_back({"Contents", host::Value::array(CMPI_instance, {levels.back()})});
         else
-            around.properties.push_back({"Content", inner});
+            around.properties.push_back({"Content", levels.back()});
         instance = std::move(around);
     }
     return instance;
@@ -142,6 +147,8 @@ Ref<Box> nested_box(unsigned depth, By by)
 class Nested_References : public testing::Test
 {
 protected:
+    ~Nested_References() override { levels.clear(); }
+
     template <class Body>
     void on_request_thread(Body body)
     {

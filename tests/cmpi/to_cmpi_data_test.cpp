@@ -126,7 +126,7 @@ TEST_F(To_Cmpi_Data, the_flags_tell_embedded_instances_from_references)
     for (const uint32 flag : {FLAG_EMBEDDED_INSTANCE, FLAG_EMBEDDED_OBJECT}) {
         const CMPIData embedded = convert(value, flag | FLAG_OUT);
         EXPECT_EQ(embedded.type, CMPI_instance);
-        EXPECT_EQ(CMGetPropertyCount(embedded.value.inst, nullptr), 9u);
+        EXPECT_EQ(CMGetPropertyCount(embedded.value.inst, nullptr), 8u) << "all but Load, which is null";
     }
     EXPECT_EQ(convert(value, ~(FLAG_EMBEDDED_INSTANCE | FLAG_EMBEDDED_OBJECT)).type, CMPI_ref);
 }

@@ -3,7 +3,7 @@
 
 #include <sstream>
 
-namespace KPRV {
+namespace KPRV::agent_answers {
 namespace {
 
 enum Form
@@ -190,4 +190,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Agent_Answers, testing::ValuesIn(ways), [](const a
 });
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::agent_answers

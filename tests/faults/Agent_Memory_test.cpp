@@ -5,7 +5,7 @@
 
 #include <dlfcn.h>
 
-namespace KPRV {
+namespace KPRV::agent_memory {
 namespace {
 
 using Agent_Memory = Fault_Fixture;
@@ -47,4 +47,4 @@ TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
 }
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::agent_memory

@@ -1,7 +1,7 @@
 // Bad answers of the adapter library to methods of devices.
 #include "tests/faults/Sweep_Fixture.h"
 
-namespace KPRV {
+namespace KPRV::invoked_answers {
 namespace {
 
 struct Way
@@ -97,4 +97,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Invoked_Answers, testing::ValuesIn(ways), [](const
 });
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::invoked_answers

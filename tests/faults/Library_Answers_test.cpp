@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-namespace KPRV {
+namespace KPRV::library_answers {
 namespace {
 
 std::string long_text()
@@ -132,4 +132,4 @@ TEST_F(Library_Answers, TheOtherAdapterStaysWhole)
 }
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::library_answers

@@ -5,7 +5,7 @@
 #include <map>
 #include <set>
 
-namespace KPRV {
+namespace KPRV::listed_answers {
 namespace {
 
 enum Thrown
@@ -196,4 +196,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Listed_Answers, testing::ValuesIn(ways),
                          [](const auto& row) { return std::string(row.param.entry_point); });
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::listed_answers

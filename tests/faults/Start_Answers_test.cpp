@@ -7,7 +7,7 @@
 #include <algorithm>
 #include <dlfcn.h>
 
-namespace KPRV {
+namespace KPRV::start_answers {
 namespace {
 
 enum Thrown
@@ -114,4 +114,4 @@ INSTANTIATE_TEST_SUITE_P(Way, Load_Answers, testing::ValuesIn(load_ways), name_o
 INSTANTIATE_TEST_SUITE_P(Way, Unguarded_Load, testing::ValuesIn(Unguarded_Load::own_ways()), name_of);
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::start_answers

@@ -3,7 +3,7 @@
 #include <set>
 #include <string>
 
-namespace KPRV {
+namespace KPRV::ways_in {
 namespace {
 
 // A new entry point has to be put into the table, and so into the sweep.
@@ -29,4 +29,4 @@ TEST(Ways_In, LeadToEveryEntryPoint)
 }
 
 } // namespace
-} // namespace KPRV
+} // namespace KPRV::ways_in

@@ -7,14 +7,6 @@
 namespace KPRV::host {
 namespace {
 
-const char* const no_library =
-    "kldrcim: warning: the adapter library libdzntj.so is not loaded; no adapters will be seen\n";
-
-Outcome on_fabric(const std::string& arguments, const char* environment = "LC_ALL=C.UTF-8")
-{
-    return kldrcim(arguments, TOY_FABRIC, environment);
-}
-
 // What conforms to another is no root; a circle is entered once; a subprofile stands under its profile, one
 // without a profile under the standard; the software of a subprofile shows where it is another.
 TEST(Cli_Profiles, Tree)

@@ -7,15 +7,8 @@
 namespace KPRV::host {
 namespace {
 
-const char* const no_library =
-    "kldrcim: warning: the adapter library libdzntj.so is not loaded; no adapters will be seen\n";
-const std::string the_system = "'KALDERA_ComputerSystem.Name=\"10.0.0.5\"' ";
-const std::string tape = "'KALDERA_TapeDrive.DeviceID=\"tape_only\"' ";
-
-Outcome on_fabric(const std::string& arguments, const char* environment = "LC_ALL=C.UTF-8")
-{
-    return kldrcim(arguments, TOY_FABRIC, environment);
-}
+const std::string system_argument = "'KALDERA_ComputerSystem.Name=\"10.0.0.5\"' ";
+const std::string tape_argument = "'KALDERA_TapeDrive.DeviceID=\"tape_only\"' ";
 
 TEST(Cli_Topology, Tree)
 {
@@ -155,7 +148,7 @@ TEST(Cli_Topology, Graph)
 
 TEST(Cli_Topology, AssociatorsAndReferences)
 {
-    Outcome names = on_fabric("ain " + the_system);
+    Outcome names = on_fabric("ain " + system_argument);
     EXPECT_EQ("root/kaldera:KALDERA_PortController.DeviceID=\"2000024b4c100000\"\n"
               "root/kaldera:KALDERA_PortController.DeviceID=\"00024b4c2000\"\n"
               "root/kaldera:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
@@ -163,34 +156,35 @@ TEST(Cli_Topology, AssociatorsAndReferences)
     EXPECT_EQ(0, names.status);
     EXPECT_EQ("Name         Caption\n-----------  --------------\nKLDR00A1001  Kaldera FC HBA\n"
               "KLDR00C2001  Kaldera CNA\n",
-              on_fabric("ai " + the_system + "--assoc TOY_Scope --properties Name,Caption").out);
+              on_fabric("ai " + system_argument + "--assoc TOY_Scope --properties Name,Caption").out);
     EXPECT_EQ("root/kaldera:KALDERA_FCPort.DeviceID=\"1000024b4c100000\"\n",
-              on_fabric("ain " + the_system +
+              on_fabric("ain " + system_argument +
                         "--assoc TOY_Component --result TOY_Port --role groupcomponent "
                         "--result-role PartComponent")
                   .out);
     std::string link = "root/kaldera:TOY_PortSystemDevice.GroupComponent="
                        "\"root/kaldera:KALDERA_ComputerSystem.Name=\\\"10.0.0.5\\\"\",PartComponent="
                        "\"root/kaldera:KALDERA_FCPort.DeviceID=\\\"1000024b4c100000\\\"\"\n";
-    EXPECT_EQ(link, on_fabric("rin " + the_system + "--assoc TOY_PortSystemDevice").out);
-    EXPECT_EQ("", on_fabric("rin " + the_system + "--assoc TOY_PortSystemDevice --role PartComponent").out);
+    EXPECT_EQ(link, on_fabric("rin " + system_argument + "--assoc TOY_PortSystemDevice").out);
+    EXPECT_EQ("",
+              on_fabric("rin " + system_argument + "--assoc TOY_PortSystemDevice --role PartComponent").out);
     Json::Value parsed;
-    ASSERT_TRUE(Json::Reader().parse(on_fabric("--format json ri " + the_system).out, parsed));
+    ASSERT_TRUE(Json::Reader().parse(on_fabric("--format json ri " + system_argument).out, parsed));
     EXPECT_EQ(5u, parsed.size());
 }
 
 TEST(Cli_Topology, SomeFailuresAreWarningsAndOnlyFailuresAreFailure)
 {
-    Outcome some = on_fabric("ain " + tape);
+    Outcome some = on_fabric("ain " + tape_argument);
     EXPECT_EQ(0, some.status);
     EXPECT_EQ(std::string(no_library) +
                   "kldrcim: warning: no answer from TOY_Broken: CIM_ERR_FAILED (1): out of order\n",
               some.error);
     EXPECT_FALSE(some.out.empty());
-    Outcome all = on_fabric("ain " + tape + "--assoc TOY_Broken");
+    Outcome all = on_fabric("ain " + tape_argument + "--assoc TOY_Broken");
     EXPECT_EQ(1, all.status);
     EXPECT_EQ(std::string(no_library) + "kldrcim: CIM_ERR_FAILED (1): out of order\n", all.error);
-    Outcome unknown = on_fabric("ain " + tape + "--assoc TOY_Unheard");
+    Outcome unknown = on_fabric("ain " + tape_argument + "--assoc TOY_Unheard");
     EXPECT_EQ(1, unknown.status);
     EXPECT_NE(std::string::npos, unknown.error.find("the module has no class TOY_Unheard;")) << unknown.error;
 }

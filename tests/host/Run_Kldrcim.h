@@ -41,4 +41,14 @@ inline Outcome kldrcim(const std::string& arguments, const char* library = TOY_D
             read_file("cli_test.err")};
 }
 
+/// What is said first of a module that passes for the product's own.
+inline constexpr const char* no_library =
+    "kldrcim: warning: the adapter library libdzntj.so is not loaded; no adapters will be seen\n";
+
+/// Over the small host with adapters.
+inline Outcome on_fabric(const std::string& arguments, const char* environment = "LC_ALL=C.UTF-8")
+{
+    return kldrcim(arguments, TOY_FABRIC, environment);
+}
+
 } // namespace KPRV::host

@@ -17,7 +17,7 @@ const AdapterHelper& helper()
     return *AdapterHelper::getAdapterHelperInstance();
 }
 
-_adapterData hba()
+_adapterData an_hba()
 {
     _adapterData adapter = {};
     copy_text(adapter.nodeWWN, "20008c7cff000001");
@@ -37,9 +37,9 @@ _adapterData hba()
     return adapter;
 }
 
-_adapterData cna()
+_adapterData a_cna()
 {
-    _adapterData adapter = hba();
+    _adapterData adapter = an_hba();
     copy_text(adapter.mac, "8c7cff000002");
     adapter.isCNA = true;
     return adapter;
@@ -71,35 +71,35 @@ Set_Properties software(const _adapterData& adapter, softwareType_t type, bool n
 
 TEST(Adapter_Instances, controller_of_an_hba)
 {
-    EXPECT_EQ(controller(hba()), (Set_Properties{
-                                     {"CreationClassName", "KALDERA_PortController"},
-                                     {"SystemName", "10.0.0.1"},
-                                     {"SystemCreationClassName", "KALDERA_ComputerSystem"},
-                                     {"Name", "S1"},
-                                     {"ElementName", "S1"},
-                                     {"DeviceID", "20008c7cff000001"},
-                                     {"OperationalStatus", "{11}"},
-                                     {"StatusDescriptions", "{The adapter is in service}"},
-                                     {"EnabledState", "2"},
-                                     {"Caption", "Kaldera FC HBA"},
-                                     {"Description", "Kaldera FC HBA"},
-                                     {"ControllerType", "4"},
-                                 }));
+    EXPECT_EQ(controller(an_hba()), (Set_Properties{
+                                        {"CreationClassName", "KALDERA_PortController"},
+                                        {"SystemName", "10.0.0.1"},
+                                        {"SystemCreationClassName", "KALDERA_ComputerSystem"},
+                                        {"Name", "S1"},
+                                        {"ElementName", "S1"},
+                                        {"DeviceID", "20008c7cff000001"},
+                                        {"OperationalStatus", "{11}"},
+                                        {"StatusDescriptions", "{The adapter is in service}"},
+                                        {"EnabledState", "2"},
+                                        {"Caption", "Kaldera FC HBA"},
+                                        {"Description", "Kaldera FC HBA"},
+                                        {"ControllerType", "4"},
+                                    }));
 }
 
 TEST(Adapter_Instances, controller_of_a_cna)
 {
-    Set_Properties expected = controller(hba());
+    Set_Properties expected = controller(an_hba());
     expected["DeviceID"] = "8c7cff000002";
     expected["Caption"] = expected["Description"] = "Kaldera CNA";
     expected["ControllerType"] = "1";
     expected["OtherControllerType"] = "CNA - FC and Ethernet types";
-    EXPECT_EQ(controller(cna()), expected);
+    EXPECT_EQ(controller(a_cna()), expected);
 }
 
 TEST(Adapter_Instances, controller_that_is_stopped)
 {
-    _adapterData adapter = hba();
+    _adapterData adapter = an_hba();
     adapter.status = 10;
     Set_Properties set = controller(adapter);
     EXPECT_EQ(set["OperationalStatus"], "{10}");
@@ -113,26 +113,26 @@ TEST(Adapter_Instances, controller_that_is_stopped)
 
 TEST(Adapter_Instances, package_of_an_hba)
 {
-    EXPECT_EQ(package(hba()), (Set_Properties{
-                                  {"CreationClassName", "KALDERA_PhysicalPackage"},
-                                  {"Tag", "10000000-0000-0000-2000-8c7cff000001"},
-                                  {"Manufacturer", "KLDR"},
-                                  {"Caption", "Kaldera FC HBA"},
-                                  {"ElementName", "Kaldera FC HBA"},
-                                  {"Description", "Kaldera FC HBA"},
-                                  {"Model", "825"},
-                                  {"SerialNumber", "S1"},
-                                  {"PartNumber", "P1"},
-                                  {"SKU", "F1"},
-                                  {"Name", "KLDR Fiber Channel Adapter S1"},
-                                  {"PackageType", "9"},
-                              }));
+    EXPECT_EQ(package(an_hba()), (Set_Properties{
+                                     {"CreationClassName", "KALDERA_PhysicalPackage"},
+                                     {"Tag", "10000000-0000-0000-2000-8c7cff000001"},
+                                     {"Manufacturer", "KLDR"},
+                                     {"Caption", "Kaldera FC HBA"},
+                                     {"ElementName", "Kaldera FC HBA"},
+                                     {"Description", "Kaldera FC HBA"},
+                                     {"Model", "825"},
+                                     {"SerialNumber", "S1"},
+                                     {"PartNumber", "P1"},
+                                     {"SKU", "F1"},
+                                     {"Name", "KLDR Fiber Channel Adapter S1"},
+                                     {"PackageType", "9"},
+                                 }));
 }
 
 TEST(Adapter_Instances, package_of_a_cna)
 {
-    _adapterData adapter = cna();
-    Set_Properties expected = package(hba());
+    _adapterData adapter = a_cna();
+    Set_Properties expected = package(an_hba());
     expected["Tag"] = "10000000-0000-0000-0000-8c7cff000002";
     expected["Caption"] = expected["ElementName"] = expected["Description"] = "Kaldera CNA";
     expected["Name"] = "KLDR Ethernet Adapter S1";
@@ -147,9 +147,9 @@ TEST(Adapter_Instances, a_tag_gives_the_address_back_unless_it_is_a_uuid)
     const auto address = [](const std::string& tag) {
         return std::string(ProviderUtil::getNodeMACOrWWNFromTag(tag.c_str(), "").c_str());
     };
-    EXPECT_EQ(address(package(hba())["Tag"]), "20008c7cff000001");
-    EXPECT_EQ(address(package(cna())["Tag"]), "8c7cff000002");
-    _adapterData adapter = cna();
+    EXPECT_EQ(address(package(an_hba())["Tag"]), "20008c7cff000001");
+    EXPECT_EQ(address(package(a_cna())["Tag"]), "8c7cff000002");
+    _adapterData adapter = a_cna();
     copy_text(adapter.uuid, "0123456789abcdef0123456789abcdef");
     EXPECT_EQ(package(adapter)["Tag"], "0123456789abcdef0123456789abcdef");
     EXPECT_NE(address(package(adapter)["Tag"]), "8c7cff000002");
@@ -164,26 +164,26 @@ TEST(Adapter_Instances, product)
         {"Name", "KALDERA CIM Provider"},  {"Vendor", "KLDR"},
         {"IdentifyingNumber", "S1"},
     };
-    EXPECT_EQ(product(hba()), expected);
+    EXPECT_EQ(product(an_hba()), expected);
     expected["Caption"] = expected["ElementName"] = expected["Description"] = "Kaldera CNA";
-    EXPECT_EQ(product(cna()), expected);
+    EXPECT_EQ(product(a_cna()), expected);
 }
 
 TEST(Adapter_Instances, firmware)
 {
-    EXPECT_EQ(software(hba(), SOFTWARE_FIRMWARE), (Set_Properties{
-                                                      {"InstanceID", "20008c7cff000001_firmware"},
-                                                      {"VersionString", "FW 1"},
-                                                      {"Classifications", "{10}"},
-                                                      {"ElementName", "Firmware for Kaldera FC HBA"},
-                                                      {"Caption", "Firmware for Kaldera FC HBA"},
-                                                      {"Description", "Firmware for Kaldera FC HBA"},
-                                                      {"Name", "KLDR Fiber Channel Adapter S1 Firmware"},
-                                                      {"Manufacturer", "KLDR"},
-                                                      {"IdentityInfoType", "{SoftwareID, SoftwareStatus}"},
-                                                      {"IdentityInfoValue", "{825, Primary}"},
-                                                  }));
-    _adapterData adapter = cna();
+    EXPECT_EQ(software(an_hba(), SOFTWARE_FIRMWARE), (Set_Properties{
+                                                         {"InstanceID", "20008c7cff000001_firmware"},
+                                                         {"VersionString", "FW 1"},
+                                                         {"Classifications", "{10}"},
+                                                         {"ElementName", "Firmware for Kaldera FC HBA"},
+                                                         {"Caption", "Firmware for Kaldera FC HBA"},
+                                                         {"Description", "Firmware for Kaldera FC HBA"},
+                                                         {"Name", "KLDR Fiber Channel Adapter S1 Firmware"},
+                                                         {"Manufacturer", "KLDR"},
+                                                         {"IdentityInfoType", "{SoftwareID, SoftwareStatus}"},
+                                                         {"IdentityInfoValue", "{825, Primary}"},
+                                                     }));
+    _adapterData adapter = a_cna();
     copy_text(adapter.serialNumber, "");
     Set_Properties set = software(adapter, SOFTWARE_FIRMWARE, true);
     EXPECT_EQ(set["InstanceID"], "8c7cff000002_firmware");
@@ -193,13 +193,13 @@ TEST(Adapter_Instances, firmware)
 
 TEST(Adapter_Instances, bios)
 {
-    Set_Properties expected = software(cna(), SOFTWARE_FIRMWARE);
+    Set_Properties expected = software(a_cna(), SOFTWARE_FIRMWARE);
     expected["InstanceID"] = "8c7cff000002_bios";
     expected["VersionString"] = "BIOS 2";
     expected["Classifications"] = "{32770}";
     expected["ElementName"] = expected["Caption"] = expected["Description"] = "BIOS for Kaldera CNA";
     expected["Name"] = "KLDR Ethernet Adapter S1 BIOS";
-    EXPECT_EQ(software(cna(), SOFTWARE_BIOS), expected);
+    EXPECT_EQ(software(a_cna(), SOFTWARE_BIOS), expected);
 }
 
 TEST(Adapter_Instances, drivers)
@@ -216,38 +216,38 @@ TEST(Adapter_Instances, drivers)
         {"IdentityInfoType", "{SoftwareID, SoftwareStatus}"},
         {"IdentityInfoValue", "{Network driver for Kaldera adapter, Primary}"},
     };
-    EXPECT_EQ(software(cna(), SOFTWARE_DRIVER, true), expected);
+    EXPECT_EQ(software(a_cna(), SOFTWARE_DRIVER, true), expected);
     expected["InstanceID"] = "sdrv";
     expected["VersionString"] = "3.2.3";
     expected["ElementName"] = expected["Caption"] = expected["Description"] = "Storage driver";
     expected["Name"] = "Storage driver for Kaldera adapter";
     expected["IdentityInfoValue"] = "{Storage driver for Kaldera adapter, Primary}";
-    EXPECT_EQ(software(cna(), SOFTWARE_DRIVER, false), expected);
+    EXPECT_EQ(software(a_cna(), SOFTWARE_DRIVER, false), expected);
 }
 
 TEST(Adapter_Instances, software_of_no_known_type_has_empty_texts)
 {
     Log_Capture log("INFO");
-    EXPECT_EQ(software(hba(), softwareType_t(5)), (Set_Properties{
-                                                      {"InstanceID", ""},
-                                                      {"VersionString", ""},
-                                                      {"Classifications", "{5}"},
-                                                      {"ElementName", ""},
-                                                      {"Caption", ""},
-                                                      {"Description", ""},
-                                                      {"Name", ""},
-                                                      {"Manufacturer", "KLDR"},
-                                                      {"IdentityInfoType", "{SoftwareID, SoftwareStatus}"},
-                                                      {"IdentityInfoValue", "{, Primary}"},
-                                                  }));
+    EXPECT_EQ(software(an_hba(), softwareType_t(5)), (Set_Properties{
+                                                         {"InstanceID", ""},
+                                                         {"VersionString", ""},
+                                                         {"Classifications", "{5}"},
+                                                         {"ElementName", ""},
+                                                         {"Caption", ""},
+                                                         {"Description", ""},
+                                                         {"Name", ""},
+                                                         {"Manufacturer", "KLDR"},
+                                                         {"IdentityInfoType", "{SoftwareID, SoftwareStatus}"},
+                                                         {"IdentityInfoValue", "{, Primary}"},
+                                                     }));
     EXPECT_EQ(log.said(), Lines{"INFO Default case . Other software types"});
 }
 
 TEST(Adapter_Instances, builders_are_traced)
 {
     Log_Capture log;
-    controller(hba());
-    software(hba(), SOFTWARE_BIOS);
+    controller(an_hba());
+    software(an_hba(), SOFTWARE_BIOS);
     EXPECT_EQ(log.traces(),
               (Lines{"DBG Entering: getPortControllerInstance", "DBG Returning: getPortControllerInstance",
                      "DBG Entering: getAdapterSoftwareIdentityInstance",

@@ -152,7 +152,7 @@ const char* const calls[] = {
     "diagnostics.getOpticsSFP " FC,
 };
 
-struct Outcome
+struct Rpc_Outcome
 {
     int status;
     std::string out;
@@ -164,7 +164,7 @@ class rpc_test : public Module_Fixture
 protected:
     rpc_test() { simulator.load_file(inventory("demo.json")); }
 
-    static Outcome run(std::vector<std::string> arguments)
+    static Rpc_Outcome run(std::vector<std::string> arguments)
     {
         arguments.insert(arguments.begin(), {"--module", KLDR_MODULE, "rpc"});
         testing::internal::CaptureStdout();
@@ -174,7 +174,7 @@ protected:
         return {status, testing::internal::GetCapturedStdout(), testing::internal::GetCapturedStderr()};
     }
 
-    static Outcome run_words(const std::string& line)
+    static Rpc_Outcome run_words(const std::string& line)
     {
         std::istringstream words(line);
         return run({std::istream_iterator<std::string>(words), {}});
@@ -193,7 +193,7 @@ TEST_F(rpc_test, the_demo_host_answers_every_method)
         words.insert(words.end(), std::istream_iterator<std::string>(text), {});
         called.insert(words[first]);
     }
-    const Outcome all = run(words);
+    const Rpc_Outcome all = run(words);
     EXPECT_EQ(0, all.status) << all.out;
     EXPECT_EQ("", all.error);
     EXPECT_EQ(std::string::npos, all.out.find("\"error\"")) << all.out;
@@ -203,7 +203,7 @@ TEST_F(rpc_test, the_demo_host_answers_every_method)
 
 TEST_F(rpc_test, a_result_is_written_in_lines)
 {
-    const Outcome host = run_words("discovery.getHost");
+    const Rpc_Outcome host = run_words("discovery.getHost");
     EXPECT_EQ(0, host.status);
     EXPECT_EQ("{\n  \"result\": \n  {\n    \"hostManufacturer\": \"KLDR Systems\",\n    \"hostModel\": "
               "\"R200\"\n  }\n}\n",
@@ -225,7 +225,7 @@ TEST_F(rpc_test, an_error_is_told_with_its_code)
         {"diagnostics.startTests 77 true", "7 no such request: \"77\""},
     };
     for (const auto& [line, error] : wrong) {
-        const Outcome refused = run_words(line);
+        const Rpc_Outcome refused = run_words(line);
         EXPECT_EQ(1, refused.status) << line;
         EXPECT_EQ("kldrcim: " + std::string(error) + "\n", refused.error) << line;
         EXPECT_EQ("", refused.out) << line;
@@ -240,13 +240,14 @@ TEST_F(rpc_test, what_the_library_throws_is_an_error_too)
 
 TEST_F(rpc_test, calls_of_one_line_are_made_in_order_up_to_the_first_error)
 {
-    const Outcome line = run_words("discovery.getVPort " FC " " FC " + discovery.getHost");
+    const Rpc_Outcome line = run_words("discovery.getVPort " FC " " FC " + discovery.getHost");
     EXPECT_EQ(1, line.status);
     EXPECT_EQ("", line.out);
     EXPECT_EQ(0u, simulator.requests("getHost").size());
 
-    const Outcome kept = run_words("configuration.createVPort " FC " 20:01:02:4b:4c:10:00:00 " VPORT " guest"
-                                   " + discovery.getAllVPorts " FC " + discovery.getVPort " FC " nowhere");
+    const Rpc_Outcome kept =
+        run_words("configuration.createVPort " FC " 20:01:02:4b:4c:10:00:00 " VPORT " guest"
+                  " + discovery.getAllVPorts " FC " + discovery.getVPort " FC " nowhere");
     EXPECT_EQ(1, kept.status);
     EXPECT_EQ(0u, kept.out.find("{\n  \"status\": 0\n}\n[\n  {\n")) << kept.out;
     EXPECT_EQ("kldrcim: 2 no such address: \"nowhere\"\n", kept.error);
@@ -264,12 +265,12 @@ TEST_F(rpc_test, a_request_carries_what_the_words_say)
 
 TEST_F(rpc_test, a_raw_text_is_sent_as_it_is_and_its_reply_written_as_it_is)
 {
-    const Outcome broken = run({"--raw", "{"});
+    const Rpc_Outcome broken = run({"--raw", "{"});
     EXPECT_EQ(0, broken.status);
     EXPECT_EQ(0u,
               broken.out.find("There was an error parsing the JSON text comprising the Procedure Call:\n"));
     EXPECT_EQ("", broken.error);
-    const Outcome unknown = run({"--raw", R"({"id": [7], "method": "nothing"})"});
+    const Rpc_Outcome unknown = run({"--raw", R"({"id": [7], "method": "nothing"})"});
     EXPECT_EQ(0, unknown.status);
     EXPECT_EQ("{\n   \"error\" : {\n      \"code\" : 105,\n      \"message\" : \"Procedure not found\",\n"
               "      \"name\" : \"JSONRPCError\"\n   },\n   \"id\" : [ 7 ],\n   \"version\" : \"1.1\"\n}\n",
@@ -279,7 +280,7 @@ TEST_F(rpc_test, a_raw_text_is_sent_as_it_is_and_its_reply_written_as_it_is)
 
 TEST_F(rpc_test, the_product_road_leaves_nothing_behind)
 {
-    const Outcome host = run({"--leaks", "discovery.getHost"});
+    const Rpc_Outcome host = run({"--leaks", "discovery.getHost"});
     EXPECT_NE(std::string::npos, host.error.find("Objects lost: 0")) << host.error;
     EXPECT_EQ(std::string::npos, host.error.find("warning")) << host.error;
 }

@@ -3,7 +3,7 @@
 namespace KPRV {
 namespace {
 
-struct Row
+struct Join_Row
 {
     const char* association;
     const char* roles;
@@ -15,7 +15,7 @@ struct Row
 // clang-format off
 
 // Every element of one list with every element of another.
-constexpr Row of_all[] = {
+constexpr Join_Row of_all[] = {
 //   association, roles                                                                      lists                                                           fetched                                     pairs in these roles
     {"FCPortSystemDevice", "GroupComponent PartComponent",                                   "ComputerSystem: s; FCPort: p1, p2",                            "ComputerSystem, FCPort",                   "s p1, s p2"},
     {"EthernetPortSystemDevice", "GroupComponent PartComponent",                             "ComputerSystem: s; EthernetPort: p1, p2",                      "ComputerSystem, EthernetPort",             "s p1, s p2"},
@@ -51,7 +51,7 @@ constexpr Row of_all[] = {
 };
 
 // Those whose texts are equal.
-constexpr Row of_equals[] = {
+constexpr Join_Row of_equals[] = {
     // One index over both lists: what stands elsewhere gets no link.
     {"Realizes", "Antecedent Dependent",                 "PortController: a1 ElementName=x, a2 ElementName=y; PhysicalPackage: k1 SerialNumber=x, k2 SerialNumber=Y", "PortController, PhysicalPackage", "k1 a1, k2 a2"},
     {"Realizes", "Antecedent Dependent",                 "PortController: a1 ElementName=x, a2 ElementName=y; PhysicalPackage: k2 SerialNumber=y, k1 SerialNumber=x", "PortController, PhysicalPackage", ""},
@@ -92,7 +92,7 @@ constexpr Row of_equals[] = {
 class Association_Joins : public Association_Fixture
 {
 protected:
-    void check(const Row& row)
+    void check(const Join_Row& row)
     {
         SCOPED_TRACE(std::string(row.association) + " over " + row.lists);
         // One says the same in its own words.
@@ -110,13 +110,13 @@ protected:
 
 TEST_F(Association_Joins, PairEachWithEach)
 {
-    for (const Row& row : of_all)
+    for (const Join_Row& row : of_all)
         check(row);
 }
 
 TEST_F(Association_Joins, PairEqualTextsWhateverTheirCase)
 {
-    for (const Row& row : of_equals)
+    for (const Join_Row& row : of_equals)
         check(row);
 }
 

@@ -8,7 +8,7 @@ class Exactly_One : public Association_Fixture
 {
 };
 
-struct Row
+struct One_Row
 {
     const char* class_name;
     const char* elements;
@@ -18,7 +18,7 @@ struct Row
 };
 
 // clang-format off
-constexpr Row rows[] = {
+constexpr One_Row one_rows[] = {
 //   class                                         elements   delivered  line of the log                                                      status
     {"ComputerSystem",                             "a",       1,         "DBG Returning instances",                                           0},
     {"ComputerSystem",                             "",        0,         "ERR Error: Invalid mapping information",                            70},
@@ -41,7 +41,7 @@ constexpr Row rows[] = {
 
 TEST_F(Exactly_One, OrTheWordsAndTheStatusOfTheClass)
 {
-    for (const Row& row : rows) {
+    for (const One_Row& row : one_rows) {
         SCOPED_TRACE(std::string(row.class_name) + " of " + row.elements);
         lists(*row.elements ? std::string(row.class_name) + ": " + row.elements : "");
         const Enumeration result = enumerate(row.class_name, "");

@@ -3,7 +3,7 @@
 namespace KPRV {
 namespace {
 
-struct Row
+struct Pair_Row
 {
     const char* association;
     const char* first_role;
@@ -13,7 +13,7 @@ struct Row
 };
 
 // clang-format off
-constexpr Row rows[] = {
+constexpr Pair_Row pair_rows[] = {
 //   association                         first role         its class                      second role         its class
     {"AffectedJobElement",               "AffectedElement", "FCPort",                      "AffectingElement", "ConcreteJob"},
     {"ServiceRecordAppliesToElement",    "Antecedent",      "DiagnosticServiceRecord",     "Dependent",        "FCPort"},
@@ -30,7 +30,7 @@ protected:
         cell_at<Instance*>(association, static_cast<const Meta_Reference*>(feature)->offset) = end;
     }
     /// One more association in its list, and its ends in a list of their own.
-    static void add(const Row& row, const std::string& first, const std::string& second)
+    static void add(const Pair_Row& row, const std::string& first, const std::string& second)
     {
         Instance* const association = create(class_named(row.association), true);
         for (const auto& [role, name, label] : {std::tuple(row.first_role, row.first_class, first),
@@ -45,7 +45,7 @@ protected:
 
 TEST_F(Paired_Lists, ArriveAndGoAsTheyAre)
 {
-    for (const Row& row : rows) {
+    for (const Pair_Row& row : pair_rows) {
         SCOPED_TRACE(row.association);
         managers_script.clear();
         add(row, "b", "x");

@@ -22,9 +22,9 @@ std::set<std::string> selected(const Instance* instance)
     return result;
 }
 
-using Names = std::set<std::string>;
-const Names ALL_OF_PORT = {"Name",  "EnabledState", "Caption", "Timeout", "Codes",
-                           "Words", "Pauses",       "Number",  "Load"};
+using Name_Set = std::set<std::string>;
+const Name_Set ALL_OF_PORT = {"Name",  "EnabledState", "Caption", "Timeout", "Codes",
+                              "Words", "Pauses",       "Number",  "Load"};
 
 } // namespace
 
@@ -33,11 +33,11 @@ TEST(Instance_set_null_flags, ReachesTheChosenProperties)
     const Ref<Sample_Port> x(create<Sample_Port>(false));
     EXPECT_EQ(ALL_OF_PORT, selected(x.ptr()));
     __set_null_flags(x.ptr(), false, true, 1);
-    EXPECT_EQ((Names{"Name", "Number"}), selected(x.ptr()));
+    EXPECT_EQ((Name_Set{"Name", "Number"}), selected(x.ptr()));
     __set_null_flags(x.ptr(), true, false, 1);
-    EXPECT_EQ(Names{}, selected(x.ptr()));
+    EXPECT_EQ(Name_Set{}, selected(x.ptr()));
     __set_null_flags(x.ptr(), false, false, 0);
-    EXPECT_EQ(Names{}, selected(x.ptr()));
+    EXPECT_EQ(Name_Set{}, selected(x.ptr()));
     __set_null_flags(x.ptr(), true, true, 0);
     EXPECT_EQ(ALL_OF_PORT, selected(x.ptr()));
 }
@@ -65,9 +65,9 @@ TEST(Instance_filter_properties, AnEmptyListSelectsKeysWhenTheyAreKept)
     const char* const names[] = {nullptr};
     const Ref<Sample_Port> x(create<Sample_Port>(false));
     EXPECT_EQ(0, filter_properties(x.ptr(), names, true));
-    EXPECT_EQ((Names{"Name", "Number"}), selected(x.ptr()));
+    EXPECT_EQ((Name_Set{"Name", "Number"}), selected(x.ptr()));
     EXPECT_EQ(0, filter_properties(x.ptr(), names, false));
-    EXPECT_EQ(Names{}, selected(x.ptr()));
+    EXPECT_EQ(Name_Set{}, selected(x.ptr()));
 }
 
 TEST(Instance_filter_properties, SelectsTheNamedInAnyCaseAndSkipsTheUnknown)
@@ -75,7 +75,7 @@ TEST(Instance_filter_properties, SelectsTheNamedInAnyCaseAndSkipsTheUnknown)
     const char* const names[] = {"words", "Unknown", "LOAD", "", nullptr};
     const Ref<Sample_Port> x(create<Sample_Port>(false));
     EXPECT_EQ(0, filter_properties(x.ptr(), names, true));
-    EXPECT_EQ((Names{"Name", "Number", "Words", "Load"}), selected(x.ptr()));
+    EXPECT_EQ((Name_Set{"Name", "Number", "Words", "Load"}), selected(x.ptr()));
 }
 
 // Keys follow keep_keys alone.
@@ -84,7 +84,7 @@ TEST(Instance_filter_properties, ANamedKeyIsNotSelected)
     const char* const names[] = {"Name", nullptr};
     const Ref<Sample_Port> x(create<Sample_Port>(false));
     EXPECT_EQ(0, filter_properties(x.ptr(), names, false));
-    EXPECT_EQ(Names{}, selected(x.ptr()));
+    EXPECT_EQ(Name_Set{}, selected(x.ptr()));
 }
 
 TEST(Instance_filter_properties, AMethodEndsTheWalk)
@@ -92,7 +92,7 @@ TEST(Instance_filter_properties, AMethodEndsTheWalk)
     const char* const names[] = {"Load", "Reset", "Words", nullptr};
     const Ref<Sample_Port> x(create<Sample_Port>(false));
     EXPECT_EQ(-1, filter_properties(x.ptr(), names, true));
-    EXPECT_EQ((Names{"Name", "Number", "Load"}), selected(x.ptr()));
+    EXPECT_EQ((Name_Set{"Name", "Number", "Load"}), selected(x.ptr()));
 }
 
 TEST(Instance_filter_properties, ANamedReferenceIsCreated)

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "runtime/Provider_Dispatch.h"
-#include "tests/runtime/sample_classes.h"
+#include "tests/runtime/sample_values.h"
 
 #include <functional>
 #include <string>
@@ -164,14 +164,6 @@ T* make_named(const char* name)
     T* const instance = create<T>(false);
     instance->Name.set(name);
     return instance;
-}
-
-/// A port has its number for a second key.
-inline Sample_Port* make_port(const char* name, uint64 number = 0)
-{
-    Sample_Port* const port = make_named<Sample_Port>(name);
-    port->Number.set(number);
-    return port;
 }
 
 /// Takes over both ends.

@@ -13,8 +13,6 @@ namespace KPRV {
 
 namespace {
 
-const Meta_Class* const ELEMENT = &Sample_Element::static_meta_class;
-
 Owned_Class made(const char* name, const Meta_Class* super, uint32 flags = 0)
 {
     return Owned_Class(create_meta_class(name, super, flags));

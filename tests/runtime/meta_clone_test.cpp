@@ -12,10 +12,6 @@ namespace KPRV {
 
 namespace {
 
-const Meta_Class* const ELEMENT = &Sample_Element::static_meta_class;
-const Meta_Class* const PORT = &Sample_Port::static_meta_class;
-const Meta_Class* const LINK = &Sample_Link::static_meta_class;
-
 } // namespace
 
 // The address sanitizer tells that each copy is freed whole, and once.

@@ -11,9 +11,6 @@ namespace KPRV {
 namespace {
 
 const Meta_Class* const NONE = nullptr;
-const Meta_Class* const ELEMENT = &Sample_Element::static_meta_class;
-const Meta_Class* const PORT = &Sample_Port::static_meta_class;
-const Meta_Class* const LINK = &Sample_Link::static_meta_class;
 
 /// True if a copy of the class is still identical to it after the change, from both sides.
 template <class Change>

@@ -14,6 +14,10 @@ namespace KPRV {
 
 // Metadata records built at run time, for tests of what works on such.
 
+inline constexpr const Meta_Class* ELEMENT = &Sample_Element::static_meta_class;
+inline constexpr const Meta_Class* PORT = &Sample_Port::static_meta_class;
+inline constexpr const Meta_Class* LINK = &Sample_Link::static_meta_class;
+
 /// A value for a qualifier or a default: a text, a number of 32 bits, or a list of texts.
 inline Meta_Value* text_value(const char* text)
 {

@@ -10,9 +10,6 @@ namespace KPRV {
 
 namespace {
 
-const Meta_Class* const ELEMENT = &Sample_Element::static_meta_class;
-const Meta_Class* const PORT = &Sample_Port::static_meta_class;
-
 template <class... Arguments>
 std::string printed(const Arguments&... arguments)
 {
@@ -34,11 +31,11 @@ std::string printed_qualifier(Meta_Qualifier* owned)
     return printed(static_cast<const Meta_Qualifier*>(owned));
 }
 
-const char* const RESET = "    uint32 Reset(\n"
-                          "        boolean Force = NULL,\n"
-                          "        Sample_Element ref Target,\n"
-                          "        uint32 Count = NULL,\n"
-                          "        string Message = NULL);\n";
+const char* const RESET_TEXT = "    uint32 Reset(\n"
+                               "        boolean Force = NULL,\n"
+                               "        Sample_Element ref Target,\n"
+                               "        uint32 Count = NULL,\n"
+                               "        string Message = NULL);\n";
 
 } // namespace
 
@@ -53,7 +50,7 @@ TEST(print_meta_class, AClassOfEveryFeature)
                           "    string Words[] = { \"OK\", \"Up\" };\n"
                           "    datetime Pauses[] = { \"00000000000001.000000:000\", "
                           "\"00000000000002.000000:000\" };\n") +
-                  RESET + "};\n",
+                  RESET_TEXT + "};\n",
               printed(ELEMENT, false, false));
 }
 

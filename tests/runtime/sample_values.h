@@ -55,7 +55,8 @@ inline Sample_Element* make_element(const char* name)
     return result;
 }
 
-inline Sample_Port* make_port(const char* name, uint64 number)
+/// A port has its number for a second key.
+inline Sample_Port* make_port(const char* name, uint64 number = 0)
 {
     Sample_Port* result = create<Sample_Port>(true);
     result->Name.set(String(name));

@@ -34,7 +34,7 @@ public:
         // Ends when the child has closed its side.
         close(up[1]);
         char none;
-        EXPECT_EQ(read(up[0], &none, 1), 0);
+        EXPECT_EQ(::read(up[0], &none, 1), 0);
         close(up[0]);
     }
     ~Named_Process()
