@@ -66,12 +66,13 @@ function(kldr_library name)
 endfunction()
 
 set(KLDR_TEST_OPTIONS -O0)
+set(KLDR_OWN_PROCESSES ${CMAKE_SOURCE_DIR}/tests/support/own_processes.sh)
 if(KLDR_SANITIZE MATCHES "undefined")
   list(APPEND KLDR_TEST_OPTIONS -fno-sanitize=undefined)
 endif()
 
 # kldr_test(<name> SOURCES ... LIBS ... [ENV K=V ...] [DEPENDS target ...]): a GoogleTest program, run by CTest in its build
-# folder.
+# folder, among no processes but its own.
 function(kldr_test name)
   cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV;DEPENDS" ${ARGN})
   add_executable(${name} ${ARG_SOURCES})
@@ -83,7 +84,7 @@ function(kldr_test name)
   if(ARG_DEPENDS)
     add_dependencies(${name} ${ARG_DEPENDS})
   endif()
-  add_test(NAME ${name} COMMAND ${name})
+  add_test(NAME ${name} COMMAND ${KLDR_OWN_PROCESSES} $<TARGET_FILE:${name}>)
   if(KLDR_SANITIZE MATCHES "address")
     list(APPEND ARG_ENV "LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0")
   endif()

@@ -9,6 +9,7 @@
 
 #include <arpa/inet.h>
 
+#include <atomic>
 #include <cerrno>
 #include <chrono>
 #include <condition_variable>
@@ -85,7 +86,7 @@ struct ProviderUtil_Host : testing::Test
     static inline ProviderUtil_Host* current;
     const Host_Calls old = host_calls;
     const char* name = "alpha";
-    int names_left = 9;
+    std::atomic<int> names_left = 9;
     const char* domain = "example.org";
     bool resolves = true;
     int uname_result = 0;

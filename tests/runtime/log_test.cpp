@@ -298,6 +298,8 @@ TEST(log, a_line_without_memory_is_cut)
 }
 #endif
 
+// The sanitizer does not see the scopes that a cancelled thread leaves, and takes its stack for poisoned.
+#ifndef __SANITIZE_ADDRESS__
 TEST(log, is_no_place_to_be_cancelled_at)
 {
     Home home;
@@ -333,6 +335,7 @@ TEST(log, is_no_place_to_be_cancelled_at)
     log(Log_Level::ERR, "F", 1, "the mutex is free");
     EXPECT_EQ(split(home.messages()).size(), 4u);
 }
+#endif
 
 TEST(log, a_failing_lock_does_not_stop_the_line)
 {
