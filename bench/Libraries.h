@@ -25,6 +25,7 @@ public:
 
     // The entry points, for the plain twins.
     const JsonReqFP get_adapters;
+    const JsonReqFP get_adapter;
     const JsonReqFP get_fc_ports;
     const JsonReqFP get_port;
     const JsonReqFP get_remote_ports;

@@ -35,8 +35,9 @@ void add(const Twins& twins);
 
 // Each adds the twins of one question. With `tiny`, only sizes that take no time.
 
-void add_fc_ports(bool tiny);
+void add_instances(bool tiny);
 void add_paths(bool tiny);
+void add_controlled_by(bool tiny);
 void add_tunnel(bool tiny);
 void add_agent_detection(bool tiny);
 

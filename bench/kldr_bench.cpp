@@ -14,8 +14,9 @@ int main(int argc, char** argv)
     // The module finds its log's settings there; without them it would look for them with every line.
     const Home_Folder home("LOG_LEVEL=ERR\n");
     benchmark::Initialize(&argc, argv);
-    add_fc_ports(tiny);
+    add_instances(tiny);
     add_paths(tiny);
+    add_controlled_by(tiny);
     add_tunnel(tiny);
     add_agent_detection(tiny);
     benchmark::RunSpecifiedBenchmarks();

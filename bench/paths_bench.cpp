@@ -1,9 +1,6 @@
-#include "bench/Libraries.h"
-#include "bench/Plain_Provider.h"
-#include "bench/Twins.h"
-#include "bench/plain_support.h"
+#include "bench/requests.h"
 
-#include <cstdio>
+#include <vector>
 
 namespace KPRV::bench {
 
@@ -17,55 +14,51 @@ std::string words(const Storage_Size& size)
            std::to_string(size.luns);
 }
 
-/// The first logical unit, whose id all sizes have.
-CMPIObjectPath* first_unit(Lean_Broker& server)
+bool is_slow(const Storage_Size& size)
 {
-    char host[256];
-    plain_host_name(host, sizeof host);
-    CMPIObjectPath* const path = server.path("KALDERA_StorageExtent");
-    server.add_key(path, "CreationClassName", "KALDERA_StorageExtent");
-    server.add_key(path, "SystemCreationClassName", "KALDERA_ComputerSystem");
-    server.add_key(path, "SystemName", host);
-    server.add_key(path, "DeviceID", "20008c7c00000000_5006016000000000_ACME_Array 9000_LUN_0");
-    return path;
+    return size.all_paths() > 10000;
 }
 
-Twins paths(const Storage_Size& size, plain_ends rival_ends)
+const char* words(plain_join join)
 {
-    CMPIInstanceMI* const mi = Module::get().instances(PATH_CLASS);
-    const char* const rival = rival_ends == plain_ends::once ? " against ends made once" : "";
-    return {
-        .name = std::string("B3 enumerate paths") + rival + "/" + words(size),
-        .prepare = [size] { Fast_Library::get().prepare(size); },
-        .ours =
-            [mi](Lean_Broker& server) {
-                mi->ft->enumerateInstances(mi, server.context(), server.result(), server.path(PATH_CLASS),
-                                           nullptr);
-            },
-        .plain =
-            [rival_ends](Lean_Broker& server) {
-                plain_enumerate_paths(server.broker(), server.result(), server.path(PATH_CLASS), rival_ends);
-            },
-        .slow = size.all_paths() > 10000,
-    };
+    switch (join) {
+    case plain_join::loops:
+        return "nested loops";
+    case plain_join::loops_outer_ends_once:
+        return "nested loops, outer ends once";
+    case plain_join::index:
+        break;
+    }
+    return "index";
 }
 
-Twins ends(const Storage_Size& size)
+Twins paths(const Storage_Size& size, plain_join join)
 {
-    CMPIAssociationMI* const mi = Module::get().associations(PATH_CLASS);
+    Twins twins =
+        enumeration(std::string("B3 enumerate paths, ") + words(join) + "/" + words(size), PATH_CLASS, size,
+                    [join](auto... request) { return plain_enumerate_paths(request..., join); });
+    twins.slow = is_slow(size);
+    return twins;
+}
+
+Twins ends(const Storage_Size& size, plain_join join)
+{
+    // The first, whose id all sizes have.
+    const char* const unit = "20008c7c00000000_5006016000000000_ACME_Array 9000_LUN_0";
+    Twins twins =
+        associator_names(std::string("B3 ends of one logical unit, ") + words(join) + "/" + words(size),
+                         PATH_CLASS, "KALDERA_StorageExtent", unit, size,
+                         [join](auto... request) { return plain_path_associator_names(request..., join); });
+    twins.slow = is_slow(size);
+    return twins;
+}
+
+std::vector<Twins> all_forms(const Storage_Size& size)
+{
     return {
-        .name = "B3 ends of one logical unit/" + words(size),
-        .prepare = [size] { Fast_Library::get().prepare(size); },
-        .ours =
-            [mi](Lean_Broker& server) {
-                mi->ft->associatorNames(mi, server.context(), server.result(), first_unit(server), PATH_CLASS,
-                                        nullptr, nullptr, nullptr);
-            },
-        .plain =
-            [](Lean_Broker& server) {
-                plain_path_associator_names(server.broker(), server.result(), first_unit(server));
-            },
-        .slow = size.all_paths() > 10000,
+        paths(size, plain_join::loops), paths(size, plain_join::loops_outer_ends_once),
+        paths(size, plain_join::index), ends(size, plain_join::loops_outer_ends_once),
+        ends(size, plain_join::index),
     };
 }
 
@@ -79,18 +72,18 @@ void add_paths(bool tiny)
         {.adapters = 8, .ports = 2, .targets = 32, .luns = 32},
         {.adapters = 8, .ports = 2, .targets = 64, .luns = 64},
     };
-    for (const Twins& twins :
-         {paths(smallest, plain_ends::of_each_path), paths(smallest, plain_ends::once), ends(smallest)}) {
+    for (const Twins& twins : all_forms(smallest)) {
         check_equal(twins);
         if (tiny)
             add(twins);
     }
+    if (tiny)
+        return;
+    for (const Twins& twins : all_forms(sizes[0]))
+        check_equal(twins);
     for (const Storage_Size& size : sizes) {
-        if (tiny)
-            break;
-        add(paths(size, plain_ends::of_each_path));
-        add(paths(size, plain_ends::once));
-        add(ends(size));
+        for (const Twins& twins : all_forms(size))
+            add(twins);
     }
 }
 

@@ -1,209 +1,250 @@
 #include "bench/Plain_Provider.h"
-#include "bench/plain_support.h"
+#include "bench/plain_lun.h"
 
-#include <cstdio>
-#include <cstring>
+#include <cctype>
 #include <string>
 #include <strings.h>
+#include <unordered_map>
 #include <vector>
 
 namespace KPRV::bench {
 
 namespace {
 
-/// An initiator is named by its port, a target by its port, "_" and its own address.
-struct endpoint
+/// What is joined, by names that begin with the name of what stands before it on the path: a target's with
+/// its initiator's, a unit's with its target's.
+struct named
 {
-    char name[48];
-    size_t initiator_size;
-};
+    std::string name;
+    /// Of the name before it; an initiator's is all its own.
+    size_t head_size;
 
-/// A unit's id begins with the name of the target behind which it stands, and "_".
-struct unit
-{
-    std::string id;
-    size_t target_size;
+    std::string_view head() const { return std::string_view(name).substr(0, head_size); }
 };
 
 struct storage
 {
     char host[256];
-    std::vector<endpoint> initiators, targets;
-    std::vector<unit> units;
+    std::vector<named> initiators, targets, units;
 };
 
-template <class Callback>
-void for_each_port(Callback callback)
+/// `visit(target, names)` for each unit of the tape drives or of all others.
+template <class Visit>
+void for_each_unit(bool tapes, Visit visit)
 {
-    const Fast_Library& library = Fast_Library::get();
-    const Json::Value adapters = library.get_adapters(Json::Value());
-    for (const Json::Value& adapter : adapters["indexStrings"]) {
-        Json::Value request;
-        request["indexStr"] = adapter;
-        const Json::Value ports = library.get_fc_ports(request);
-        for (const Json::Value& wwn : ports["indexStrings"]) {
-            Json::Value port_request;
-            port_request["wwn"] = wwn;
-            const Json::Value answer = library.get_port(port_request);
-            if (!plain_is_bad(answer))
-                callback(answer["wwn"].asCString());
-        }
-    }
-}
-
-template <class Callback>
-void for_each_remote_port(const char* port, Callback callback)
-{
-    const Fast_Library& library = Fast_Library::get();
-    Json::Value request;
-    request["pPortWwn"] = port;
-    request["lPortWwn"] = port;
-    const Json::Value remotes = library.get_remote_ports(request);
-    for (const Json::Value& remote : remotes) {
-        request["rPortWwn"] = remote["remotePortWwn"];
-        const Json::Value answer = library.get_remote_port(request);
-        if (!plain_is_bad(answer) && answer["deviceData"]["isTarget"].asBool())
-            callback(remote["remotePortWwn"].asCString(), answer);
-    }
-}
-
-std::string target_name(const char* port, const char* remote)
-{
-    char local_flat[24], remote_flat[24];
-    plain_flat(local_flat, sizeof local_flat, port);
-    plain_flat(remote_flat, sizeof remote_flat, remote);
-    return std::string(local_flat) + "_" + remote_flat;
-}
-
-/// The units of tape drives or of all others.
-void read_units(bool tapes, std::vector<unit>& units)
-{
-    for_each_port([&](const char* port) {
-        for_each_remote_port(port, [&](const char* remote, const Json::Value& answer) {
-            if ((strcmp(answer["deviceData"]["type"].asCString(), "Tape") == 0) != tapes)
-                return;
-            const std::string target = target_name(port, remote);
-            for (const Json::Value& lun : answer["lunList"]) {
-                char rest[64];
-                snprintf(rest, sizeof rest, "_%s_%s_LUN_%u", lun["vendor"].asCString(),
-                         lun["productID"].asCString(), lun["number"].asUInt());
-                units.push_back({target + rest, target.size()});
-            }
+    plain_for_each_port([&](int, const Json::Value& port) {
+        plain_for_each_target(port["wwn"], [&](const plain_target& target) {
+            if (target.is_tape() == tapes)
+                plain_for_each_lun(
+                    target, [&](const Json::Value&, const plain_lun_names& names) { visit(target, names); });
         });
     });
 }
 
-void read_endpoints(storage& all)
+/// `on_initiator(name)` for each port, and `on_target(target)` for each target that it sees.
+template <class On_Initiator, class On_Target>
+void for_each_endpoint(On_Initiator on_initiator, On_Target on_target)
 {
-    for_each_port([&](const char* port) {
-        endpoint initiator;
-        plain_flat(initiator.name, sizeof initiator.name, port);
-        initiator.initiator_size = strlen(initiator.name);
-        all.initiators.push_back(initiator);
-        for_each_remote_port(port, [&](const char* remote, const Json::Value&) {
-            endpoint target;
-            snprintf(target.name, sizeof target.name, "%s", target_name(port, remote).c_str());
-            target.initiator_size = initiator.initiator_size;
-            all.targets.push_back(target);
-        });
+    plain_for_each_port([&](int, const Json::Value& port) {
+        char name[24];
+        plain_flat(name, sizeof name, port["wwn"].asCString());
+        on_initiator(name);
+        plain_for_each_target(port["wwn"], on_target);
     });
 }
 
 void read_storage(storage& all)
 {
     plain_host_name(all.host, sizeof all.host);
-    read_units(false, all.units);
-    read_units(true, all.units);
-    read_endpoints(all);
+    for (const bool tapes : {false, true})
+        for_each_unit(tapes, [&](const plain_target& target, const plain_lun_names& names) {
+            all.units.push_back({names.id(), target.size});
+        });
+    for_each_endpoint(
+        [&](const char* name) {
+            all.initiators.push_back({name, strlen(name)});
+        },
+        [&](const plain_target& target) {
+            all.targets.push_back({target.name, target.port_size});
+        });
 }
 
-CMPIObjectPath* path_to(const CMPIBroker* broker, const storage& all, const endpoint& endpoint)
+CMPIObjectPath* endpoint_path(const CMPIBroker* broker, const char* host, const char* name)
 {
-    return plain_device_path(broker, "KALDERA_SCSIProtocolEndpoint", all.host, "Name", endpoint.name);
+    return plain_device_path(broker, "KALDERA_SCSIProtocolEndpoint", host, "Name", name);
 }
 
-CMPIObjectPath* path_to(const CMPIBroker* broker, const storage& all, const unit& unit)
+/// What a join delivers, one of the two below.
+struct delivery
 {
-    return plain_device_path(broker, "KALDERA_StorageExtent", all.host, "DeviceID", unit.id.c_str());
+    const CMPIBroker* broker;
+    const CMPIResult* result;
+    const char* host;
+
+    CMPIObjectPath* end(const named& endpoint) const
+    {
+        return endpoint_path(broker, host, endpoint.name.c_str());
+    }
+};
+
+/// The paths, whole.
+struct whole_paths : delivery
+{
+    const char* name_space;
+
+    void deliver(CMPIObjectPath* initiator, CMPIObjectPath* target, const named& unit) const
+    {
+        const plain_end ends[] = {
+            {"Initiator", initiator},
+            {"Target", target},
+            {"LogicalUnit",
+             plain_device_path(broker, "KALDERA_StorageExtent", host, "DeviceID", unit.name.c_str())},
+        };
+        CMReturnInstance(result, plain_association(broker, name_space,
+                                                   "KALDERA_SCSIInitiatorTargetLogicalUnitPath", ends));
+    }
+};
+
+/// The names of the outer ends of one unit's paths.
+struct ends_of_unit : delivery
+{
+    const char* wanted;
+
+    void deliver(CMPIObjectPath* initiator, CMPIObjectPath* target, const named& unit) const
+    {
+        if (unit.name != wanted)
+            return;
+        CMReturnObjectPath(result, initiator);
+        CMReturnObjectPath(result, target);
+    }
+};
+
+bool stands_behind(const named& one, const named& other)
+{
+    return one.head_size == other.name.size() &&
+           strncasecmp(one.name.c_str(), other.name.c_str(), one.head_size) == 0;
 }
 
 /// The three loops. Sizes are compared before texts.
-template <class On_Path>
-void join(const CMPIBroker* broker, const storage& all, plain_ends ends, On_Path on_path)
+template <class Delivery>
+void join_by_loops(const storage& all, const Delivery& to, bool outer_ends_once)
 {
-    for (const endpoint& initiator : all.initiators) {
-        CMPIObjectPath* from = path_to(broker, all, initiator);
-        for (const endpoint& target : all.targets) {
-            if (target.initiator_size != initiator.initiator_size ||
-                strncasecmp(target.name, initiator.name, initiator.initiator_size) != 0)
+    for (const named& initiator : all.initiators) {
+        CMPIObjectPath* from = to.end(initiator);
+        for (const named& target : all.targets) {
+            if (!stands_behind(target, initiator))
                 continue;
-            CMPIObjectPath* through = path_to(broker, all, target);
-            const size_t size = strlen(target.name);
-            for (const unit& unit : all.units) {
-                if (unit.target_size != size || strncasecmp(unit.id.c_str(), target.name, size) != 0)
+            CMPIObjectPath* through = to.end(target);
+            for (const named& unit : all.units) {
+                if (!stands_behind(unit, target))
                     continue;
-                if (ends == plain_ends::of_each_path) {
-                    from = path_to(broker, all, initiator);
-                    through = path_to(broker, all, target);
+                if (!outer_ends_once) {
+                    from = to.end(initiator);
+                    through = to.end(target);
                 }
-                on_path(from, through, unit);
+                to.deliver(from, through, unit);
             }
         }
     }
 }
 
-void add_end(CMPIObjectPath* path, const char* role, CMPIObjectPath* end)
+/// What stands behind a name, whatever the name's case.
+class name_index
 {
-    CMPIValue value = {};
-    value.ref = end;
-    CMAddKey(path, role, &value, CMPI_ref);
+public:
+    explicit name_index(const std::vector<named>& list)
+    {
+        std::string_view last;
+        std::vector<const named*>* behind_last = nullptr;
+        for (const named& each : list) {
+            // Those behind one name stand together.
+            if (!behind_last || each.head() != last) {
+                last = each.head();
+                behind_last = &_behind[folded(last)];
+            }
+            behind_last->push_back(&each);
+        }
+    }
+
+    const std::vector<const named*>& behind(const named& one) const
+    {
+        static const std::vector<const named*> none;
+        const auto found = _behind.find(folded(one.name));
+        return found == _behind.end() ? none : found->second;
+    }
+
+private:
+    static std::string folded(std::string_view name)
+    {
+        std::string key(name);
+        for (char& letter : key)
+            letter = static_cast<char>(tolower(static_cast<unsigned char>(letter)));
+        return key;
+    }
+
+    std::unordered_map<std::string, std::vector<const named*>> _behind;
+};
+
+void join_by_index(const storage& all, const whole_paths& to)
+{
+    const name_index targets(all.targets), units(all.units);
+    for (const named& initiator : all.initiators) {
+        CMPIObjectPath* const from = to.end(initiator);
+        for (const named* target : targets.behind(initiator)) {
+            CMPIObjectPath* const through = to.end(*target);
+            for (const named* unit : units.behind(*target))
+                to.deliver(from, through, *unit);
+        }
+    }
 }
 
-void set_end(CMPIInstance* instance, const char* role, CMPIObjectPath* end)
+/// A unit is joined to the one target in whose name its own begins: nothing else needs to be kept.
+void look_up_ends(const CMPIBroker* broker, const CMPIResult* result, const char* wanted)
 {
-    CMPIValue value = {};
-    value.ref = end;
-    CMSetProperty(instance, role, &value, CMPI_ref);
+    char host[256];
+    plain_host_name(host, sizeof host);
+    std::string target_name, initiator_name;
+    for (const bool tapes : {false, true})
+        for_each_unit(tapes, [&](const plain_target& target, const plain_lun_names& names) {
+            if (strcmp(names.id(), wanted) == 0)
+                target_name = target.name;
+        });
+    for_each_endpoint([&](const char* name) { initiator_name = name; },
+                      [&](const plain_target& target) {
+                          if (strcasecmp(target.name, target_name.c_str()) != 0)
+                              return;
+                          CMReturnObjectPath(result, endpoint_path(broker, host, initiator_name.c_str()));
+                          CMReturnObjectPath(result, endpoint_path(broker, host, target.name));
+                      });
 }
 
 } // namespace
 
 CMPIStatus plain_enumerate_paths(const CMPIBroker* broker, const CMPIResult* result,
-                                 const CMPIObjectPath* cop, plain_ends ends)
+                                 const CMPIObjectPath* cop, plain_join join)
 {
     storage all = {};
     read_storage(all);
-    const char* const name_space = CMGetCharPtr(CMGetNameSpace(cop, nullptr));
-    join(broker, all, ends, [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
-        CMPIObjectPath* const to = path_to(broker, all, unit);
-        CMPIObjectPath* const path =
-            CMNewObjectPath(broker, name_space, "KALDERA_SCSIInitiatorTargetLogicalUnitPath", nullptr);
-        add_end(path, "Initiator", initiator);
-        add_end(path, "Target", target);
-        add_end(path, "LogicalUnit", to);
-        CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
-        set_end(instance, "Initiator", initiator);
-        set_end(instance, "Target", target);
-        set_end(instance, "LogicalUnit", to);
-        CMReturnInstance(result, instance);
-    });
+    const whole_paths paths = {{broker, result, all.host}, CMGetCharPtr(CMGetNameSpace(cop, nullptr))};
+    if (join == plain_join::index)
+        join_by_index(all, paths);
+    else
+        join_by_loops(all, paths, join == plain_join::loops_outer_ends_once);
     CMReturnDone(result);
     return {CMPI_RC_OK, nullptr};
 }
 
 CMPIStatus plain_path_associator_names(const CMPIBroker* broker, const CMPIResult* result,
-                                       const CMPIObjectPath* cop)
+                                       const CMPIObjectPath* cop, plain_join join)
 {
-    storage all = {};
-    read_storage(all);
     const char* const wanted = plain_key(cop, "DeviceID");
-    join(broker, all, plain_ends::once,
-         [&](CMPIObjectPath* initiator, CMPIObjectPath* target, const unit& unit) {
-             if (unit.id != wanted)
-                 return;
-             CMReturnObjectPath(result, initiator);
-             CMReturnObjectPath(result, target);
-         });
+    if (join == plain_join::index) {
+        look_up_ends(broker, result, wanted);
+    } else {
+        storage all = {};
+        read_storage(all);
+        join_by_loops(all, ends_of_unit{{broker, result, all.host}, wanted}, true);
+    }
     return {CMPI_RC_OK, nullptr};
 }
 

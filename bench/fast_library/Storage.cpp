@@ -29,6 +29,7 @@ Storage::Storage(const Storage_Size& size) : adapters(list()), adapter_count(siz
     for (unsigned a = 0; a < size.adapters; a++) {
         const std::string adapter = address("10:00:8c:7c", a);
         adapters["indexStrings"].append(adapter);
+        add_adapter(adapter, size);
         Json::Value ports = list();
         for (unsigned p = 0; p < size.ports; p++) {
             const std::string port = address("20:00:8c:7c", a * size.ports + p);
@@ -37,6 +38,26 @@ Storage::Storage(const Storage_Size& size) : adapters(list()), adapter_count(siz
         }
         _ports_of[adapter] = ports;
     }
+}
+
+void Storage::add_adapter(const std::string& wwn, const Storage_Size& size)
+{
+    Json::Value adapter;
+    Json::Value& data = adapter["hbaData"];
+    data["wwn"] = wwn;
+    data["portCount"] = size.ports;
+    data["hbaStatus"] = true;
+    data["model"] = "825";
+    data["serialNumber"] = "KLDR00A" + wwn.substr(18, 2) + wwn.substr(21, 2);
+    data["oem"] = "KLDR";
+    data["oemSerialNum"] = "";
+    data["partNum"] = "KF-0825";
+    data["fruNum"] = "FRU-0825";
+    data["uuid"] = "";
+    adapter["driver"]["storageDriverName"] = "kldrfc";
+    adapter["driver"]["storageDriverVersion"] = "3.2.1.0";
+    adapter["firmware"]["version"] = "3.2.1.0";
+    _adapters[wwn] = adapter;
 }
 
 void Storage::add_port(const std::string& wwn, const Storage_Size& size)

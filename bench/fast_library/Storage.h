@@ -21,6 +21,7 @@ public:
     unsigned adapter_count;
 
     /// Prepared answers by the address in the request; a null value for an unknown one.
+    const Json::Value& adapter(const Json::Value& wwn) const { return find(_adapters, wwn); }
     const Json::Value& ports_of(const Json::Value& adapter) const { return find(_ports_of, adapter); }
     const Json::Value& port(const Json::Value& wwn) const { return find(_ports, wwn); }
     const Json::Value& remote_ports_of(const Json::Value& port) const { return find(_remote_ports_of, port); }
@@ -29,10 +30,11 @@ public:
 private:
     using Answers = std::unordered_map<std::string, Json::Value>;
     static const Json::Value& find(const Answers& answers, const Json::Value& address);
+    void add_adapter(const std::string& wwn, const Storage_Size& size);
     void add_port(const std::string& wwn, const Storage_Size& size);
     void add_remote_port(const std::string& wwn, unsigned luns);
 
-    Answers _ports_of, _ports, _remote_ports_of, _remote_ports;
+    Answers _adapters, _ports_of, _ports, _remote_ports_of, _remote_ports;
 };
 
 } // namespace KPRV::bench

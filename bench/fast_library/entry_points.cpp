@@ -89,6 +89,11 @@ Json::Value getAllAdaptersIndexString(const Json::Value&)
     return storage->adapters;
 }
 
+Json::Value getHbaByWwn(const Json::Value& request)
+{
+    return storage->adapter(request["wwn"]);
+}
+
 Json::Value getFcPhyPortIndicesByAdapter(const Json::Value& request)
 {
     return storage->ports_of(request["indexStr"]);
