@@ -12,7 +12,7 @@ namespace KPRV::bench {
 
 // A `plain_get_...` enumerates and compares the keys of the path.
 
-/// What each of them is but for the paths, which have more than one form.
+/// The type of each but those over paths, which come in more than one form.
 using plain_operation = CMPIStatus(const CMPIBroker* broker, const CMPIResult* result,
                                    const CMPIObjectPath* cop);
 
