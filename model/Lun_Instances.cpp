@@ -53,8 +53,7 @@ std::string_view trimmed(const char* text)
     return ProviderUtil::trimmed(text);
 }
 
-/// Texts and single characters one behind the other, up to 255 characters: more than the fields that name a
-/// LUN hold together.
+/// Texts one behind the other, in more room than the fields that name a LUN fill together.
 class Joined
 {
 public:
@@ -67,13 +66,8 @@ public:
 
 private:
     void add(std::string_view part) { _size += copy_cut(_text + _size, sizeof _text - _size, part); }
-    void add(char part)
-    {
-        if (_size < sizeof _text)
-            _text[_size++] = part;
-    }
 
-    char _text[255];
+    char _text[sizeof(_hbaPortInfo::portWWN) + sizeof(_hbaLunInfo)];
     size_t _size = 0;
 };
 
@@ -81,7 +75,7 @@ String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {
     case Named_By::PRODUCT:
-        return Joined(trimmed(lun.vendor), '+', trimmed(lun.productID), '+', trimmed(lun.serialNumber));
+        return Joined(trimmed(lun.vendor), "+", trimmed(lun.productID), "+", trimmed(lun.serialNumber));
     case Named_By::DESCRIPTION:
         return lun.description;
     case Named_By::NOTHING:
@@ -93,8 +87,8 @@ String name(Named_By source, const _hbaLunInfo& lun)
 /// A LUN goes by the path on which it is seen.
 String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const String& element)
 {
-    return Joined(port.portWWN, '_', lun.remoteWWN, '_', trimmed(lun.vendor), '_', trimmed(lun.productID),
-                  '_', std::string_view(element.c_str(), element.size()));
+    return Joined(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
+                  "_", std::string_view(element.c_str(), element.size()));
 }
 
 /// Signed: a number beyond the positive range shows as a negative one.

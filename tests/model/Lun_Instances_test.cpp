@@ -107,6 +107,24 @@ TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
     }
 }
 
+TEST_F(Lun_Instances, names_of_full_fields_are_whole)
+{
+    const auto fill = [](auto& field, char with) {
+        const std::string text(sizeof field - 1, with);
+        copy_text(field, text);
+        return text;
+    };
+    const std::string vendor = fill(lun.vendor, 'v');
+    const std::string product = fill(lun.productID, 'p');
+    const std::string serial = fill(lun.serialNumber, 's');
+    const std::string remote = fill(lun.remoteWWN, 'r');
+    const std::string local = fill(port.portWWN, 'l');
+    lun.number = 2147483648;
+    Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
+    EXPECT_EQ(extent["Name"], vendor + "+" + product + "+" + serial);
+    EXPECT_EQ(extent["DeviceID"], local + "_" + remote + "_" + vendor + "_" + product + "_LUN_-2147483648");
+}
+
 TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
 {
     lun.number = 1;
