@@ -1,10 +1,14 @@
 #include "runtime/File_Lock.h"
 #include "tests/support/Temp_Folder.h"
 
+#include <chrono>
+#include <csignal>
 #include <fcntl.h>
 #include <gtest/gtest.h>
+#include <pthread.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
+#include <thread>
 #include <unistd.h>
 
 using namespace KPRV;
@@ -51,31 +55,82 @@ TEST(File_Lock, keeps_other_processes_out)
     EXPECT_EQ(try_in_child(path), 0);
 }
 
-TEST(File_Lock, waits_for_another_process)
+/// A process that holds the lock until it is told to give it back; before it does it writes the file "done".
+class Holder
 {
-    Temp_Folder folder;
-    const std::string path = folder.path("lock");
-    int ready[2];
-    ASSERT_EQ(pipe(ready), 0);
-    const pid_t child = fork();
-    if (child == 0) {
-        File_Lock lock(path.c_str());
+public:
+    explicit Holder(const Temp_Folder& folder)
+    {
+        EXPECT_EQ(pipe(_ready), 0);
+        EXPECT_EQ(pipe(_release), 0);
+        _child = fork();
+        if (_child == 0)
+            hold(folder);
+        char byte;
+        EXPECT_EQ(read(_ready[0], &byte, 1), 1);
+    }
+    ~Holder()
+    {
+        waitpid(_child, nullptr, 0);
+        for (const int fd : {_ready[0], _ready[1], _release[0], _release[1]})
+            close(fd);
+    }
+    Holder(const Holder&) = delete;
+    Holder& operator=(const Holder&) = delete;
+
+    void release() { EXPECT_EQ(write(_release[1], "x", 1), 1); }
+
+private:
+    [[noreturn]] void hold(const Temp_Folder& folder)
+    {
+        File_Lock lock(folder.path("lock").c_str());
         lock.lock();
-        (void)!write(ready[1], "x", 1);
-        usleep(50000);
-        folder.write("done", "x");
+        char byte = 'x';
+        if (write(_ready[1], &byte, 1) == 1 && read(_release[0], &byte, 1) == 1)
+            folder.write("done", "x");
         lock.unlock();
         _exit(0);
     }
-    char byte;
-    ASSERT_EQ(read(ready[0], &byte, 1), 1);
-    File_Lock lock(path.c_str());
+
+    int _ready[2];
+    int _release[2];
+    pid_t _child;
+};
+
+TEST(File_Lock, waits_for_another_process)
+{
+    Temp_Folder folder;
+    Holder holder(folder);
+    std::thread releasing([&] {
+        std::this_thread::sleep_for(std::chrono::milliseconds(50));
+        holder.release();
+    });
+    File_Lock lock(folder.path("lock").c_str());
     EXPECT_EQ(lock.lock(), 0);
     EXPECT_EQ(folder.read("done"), "x") << "the child still held the lock";
-    int status;
-    waitpid(child, &status, 0);
-    close(ready[0]);
-    close(ready[1]);
+    releasing.join();
+}
+
+TEST(File_Lock, goes_on_waiting_after_a_signal)
+{
+    Temp_Folder folder;
+    Holder holder(folder);
+    // Without SA_RESTART: the wait ends with each.
+    struct sigaction noted = {}, old;
+    noted.sa_handler = [](int) {};
+    ASSERT_EQ(sigaction(SIGUSR1, &noted, &old), 0);
+    std::thread signalling([&, waiter = pthread_self()] {
+        for (int i = 0; i < 50; i++) {
+            pthread_kill(waiter, SIGUSR1);
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+        holder.release();
+    });
+    File_Lock lock(folder.path("lock").c_str());
+    EXPECT_EQ(lock.lock(), 0);
+    EXPECT_EQ(folder.read("done"), "x") << "the child still held the lock";
+    signalling.join();
+    sigaction(SIGUSR1, &old, nullptr);
 }
 
 TEST(File_Lock, is_not_taken_for_what_is_no_regular_file)

@@ -57,6 +57,11 @@ TEST(log_configuration, rules_of_the_rc_file)
         {"", std::nullopt},
         {"\n", std::nullopt},
         {long_line + "\nLOG_LEVEL=INFO\n", INFO},
+        // A line that is too long counts as several, also where it begins as a comment.
+        {std::string(1022, 'x') + "LOG_LEVEL=INFO\n", std::nullopt},
+        {std::string(1023, 'x') + "LOG_LEVEL=INFO\n", INFO},
+        {std::string(1024, 'x') + "LOG_LEVEL=INFO\n", std::nullopt},
+        {'#' + std::string(1022, 'x') + "LOG_LEVEL=INFO\n", INFO},
         {long_line, std::nullopt},
     };
     for (const auto& row : rows)
@@ -87,17 +92,33 @@ TEST(log_configuration, nothing_without_home_or_file)
     EXPECT_FALSE(read_log_configuration(configuration));
 }
 
+/// The folder by another name, of the given size.
+static std::string lengthened(std::string folder, size_t size)
+{
+    if ((size - folder.size()) % 2)
+        folder += '/';
+    while (folder.size() < size)
+        folder += "/.";
+    return folder;
+}
+
 TEST(log_configuration, a_path_that_does_not_fit_is_not_shortened)
 {
     Temp_Folder home;
-    // The rc file's own path fits, the lock file's does not.
-    std::string long_home = home.path() + "/";
-    while (long_home.size() + 2 + strlen("/.cimplerc") < LOG_PATH_SIZE)
-        long_home += "./";
     home.write(".cimplerc", "LOG_LEVEL=DBG\n");
-    const Environment_Override override("HOME", long_home);
+    // The lock file's is the longest; with its end it fills its room exactly.
+    const size_t longest = 1023 - strlen("/.cimple/messages.lock");
+    const std::string folder = home.path();
     Log_Configuration configuration;
-    EXPECT_FALSE(read_log_configuration(configuration));
-    setenv("HOME", std::string(3000, 'x').c_str(), 1);
-    EXPECT_FALSE(read_log_configuration(configuration));
+    for (const size_t size : {longest - 1, longest}) {
+        const Environment_Override override("HOME", lengthened(folder, size));
+        ASSERT_TRUE(read_log_configuration(configuration));
+        EXPECT_EQ(configuration.lock, lengthened(folder, size) + "/.cimple/messages.lock");
+    }
+    // The rc file's fits also in the next ones, for as long as it is no longer than the lock file's may be.
+    for (const size_t size :
+         {longest + 1, longest + 2, 1023 - strlen("/.cimplerc"), 1024 - strlen("/.cimplerc"), size_t(3000)}) {
+        const Environment_Override override("HOME", lengthened(folder, size));
+        EXPECT_FALSE(read_log_configuration(configuration)) << size;
+    }
 }
