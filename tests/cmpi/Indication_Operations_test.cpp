@@ -89,6 +89,8 @@ protected:
         return texts;
     }
 
+    void expect_that_a_delivery_waits_for_an_operation();
+
     Test_Server server;
     Served_Provider provider{server, alert_registration};
     Script::Deliver deliver;
@@ -263,7 +265,8 @@ TEST_F(Indication_Operations, a_worker_passes_an_operation_that_waits_for_its_en
     provider.adapter()->adapter_mutex.unlock();
 }
 
-TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
+/// Enables with a worker that delivers while an operation holds the adapter, and disables.
+void Indication_Operations::expect_that_a_delivery_waits_for_an_operation()
 {
     Delivery_Worker worker;
     std::promise<void> go;
@@ -286,6 +289,29 @@ TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
     }
     disable();
     EXPECT_EQ(delivered_to(), Texts{"root/one"});
+}
+
+TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
+{
+    expect_that_a_delivery_waits_for_an_operation();
+}
+
+TEST_F(Indication_Operations, a_delivery_waits_also_after_a_disabling)
+{
+    enable();
+    disable();
+    expect_that_a_delivery_waits_for_an_operation();
+}
+
+TEST_F(Indication_Operations, a_delivery_waits_also_after_a_disabling_that_threw)
+{
+    script.disable_indications = []() -> int { throw std::runtime_error("disable"); };
+    enable();
+    EXPECT_THROW(disable(), std::runtime_error);
+    EXPECT_FALSE(provider.adapter()->is_disabling);
+    script.disable_indications = {};
+    disable();
+    expect_that_a_delivery_waits_for_an_operation();
 }
 
 TEST_F(Indication_Operations, without_filters_an_indication_is_dropped)
