@@ -306,6 +306,22 @@ TEST_F(Test_Start, IsReadWhileItRuns)
     }
 }
 
+// Nobody waits for its end, which must give back its stack.
+TEST_F(Test_Start, RunsADetachedThread)
+{
+    int state = PTHREAD_CREATE_JOINABLE;
+    library.answers("diagPCILoopbackTest", [&state](const Json::Value&) {
+        pthread_attr_t attributes;
+        EXPECT_EQ(0, pthread_getattr_np(pthread_self(), &attributes));
+        pthread_attr_getdetachstate(&attributes, &state);
+        pthread_attr_destroy(&attributes);
+        return json("{'failed': false}");
+    });
+    EXPECT_EQ(4096u, code(helper.runPCILoopbackTest(WWN)));
+    wait();
+    EXPECT_EQ(PTHREAD_CREATE_DETACHED, state);
+}
+
 TEST_F(Test_Start, DoesNotNoticeThatThereIsNoThread)
 {
     in_child([&] {
