@@ -4,7 +4,18 @@
 #include "alerts/IndicationManager.h"
 #include "tests/support/Driver_Status_Override.h"
 
+#include <pthread.h>
 #include <thread>
+
+static thread_local unsigned locks_taken = 0;
+
+// The linker puts it in the place of the C library's.
+extern "C" int __real_pthread_mutex_lock(pthread_mutex_t* mutex);
+extern "C" int __wrap_pthread_mutex_lock(pthread_mutex_t* mutex)
+{
+    locks_taken++;
+    return __real_pthread_mutex_lock(mutex);
+}
 
 namespace KPRV {
 namespace {
@@ -153,6 +164,23 @@ TEST_F(Alert_Queue, GivesWhatCameFirst)
     EXPECT_EQ((std::vector<std::string>{"KLDR131073", "PROPKLDR131073", "PROPKLDR589826"}),
               texts_of(take_alerts(helper), "MessageID"));
     EXPECT_FALSE(helper.getIndicationObject(&alert));
+}
+
+TEST_F(Alert_Queue, IsPolledWithoutALockWhileItIsEmpty)
+{
+    const auto locks_of_a_poll = [this](bool expected) {
+        const unsigned before = locks_taken;
+        KALDERA_AlertIndication* alert = nullptr;
+        EXPECT_EQ(expected, helper.getIndicationObject(&alert));
+        const unsigned locks = locks_taken - before;
+        const Alert owner(alert);
+        return locks;
+    };
+    EXPECT_EQ(0u, locks_of_a_poll(false));
+    helper.processEvent(text(2, 1).c_str());
+    EXPECT_EQ(1u, locks_of_a_poll(true));
+    EXPECT_EQ(1u, locks_of_a_poll(true));
+    EXPECT_EQ(0u, locks_of_a_poll(false));
 }
 
 TEST_F(Alert_Queue, NumbersAlertsWithoutAGapAcrossHelpersAndSubscriptions)

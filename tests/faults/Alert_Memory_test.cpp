@@ -3,6 +3,7 @@
 #include "tests/faults/Failing_Allocator.h"
 #include "tests/faults/Fault_Fixture.h"
 #include "tests/support/Eventually.h"
+#include "tests/support/In_Child.h"
 
 #include <condition_variable>
 #include <dlfcn.h>
@@ -76,6 +77,31 @@ private:
     std::vector<std::string> _came;
     std::function<void(const std::string&)> _on_delivery;
 };
+
+using First_Subscription = Fault_Fixture;
+
+// It makes the catalogue known, once and for all: before any other test that subscribes, and in a process of
+// its own.
+TEST_F(First_Subscription, ThatDoesNotComeAboutLeavesNoCallback)
+{
+    ASSERT_EQ(nullptr, dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD));
+    in_child([&] {
+        open("one_cna.json");
+        watch_library("libkldrprovider_Module", true);
+        ASSERT_EQ(CMPI_RC_OK, server->activate_filter(CLASS, "root/kaldera"));
+        unsigned long nth = 0;
+        CMPIrc rc = CMPI_RC_ERR_FAILED;
+        while (rc != CMPI_RC_OK) {
+            fail_allocation(++nth);
+            rc = server->enable_indications(CLASS);
+            mend_memory();
+            EXPECT_EQ(rc == CMPI_RC_OK, simulator.status()["eventCallback"].asBool()) << nth;
+            EXPECT_EQ(CMPI_RC_OK, server->disable_indications(CLASS));
+            server->violations().clear();
+        }
+        EXPECT_LT(100u, nth) << "each text is an allocation at least";
+    });
+}
 
 // What fails goes back to the library, and the next event is whole.
 TEST_F(Alert_Memory, OfTheLibrarysThread)
