@@ -13,9 +13,13 @@ BUILD = Path(os.environ["KLDR_BUILD"])
 CMAKE = os.environ["KLDR_CMAKE"]
 WORD_SIZE = int(os.environ.get("KLDR_WORD_SIZE") or 64)
 
-# The simulator stands in for the adapter library of the machine that runs the test.
+# Nothing of the machine that runs the test but its programs: the tools of a CIM server on PATH are none of ours, and the
+# simulator stands in for the adapter library.
+PROGRAMS = "/usr/bin:/bin"
 ENVIRONMENT = {
-    **os.environ,
+    "PATH": PROGRAMS,
+    "HOME": "/nonexistent",
+    "LC_ALL": "C.UTF-8",
     "LD_LIBRARY_PATH": str(BUILD / "simulator"),
     "KLDR_SIMULATOR_INVENTORY": str(SOURCE / "simulator/inventories/demo.json"),
 }

@@ -1,8 +1,9 @@
 """The folders of CIM servers below a root, and stand-ins for their tools, which do what matters here and keep a record."""
 
-import os
 import textwrap
 from pathlib import Path
+
+from deploy_case import PROGRAMS
 
 REGISTRATION = "KLDRProviderModule"
 
@@ -48,7 +49,7 @@ class Fake_Servers:
         (self.tools / name).unlink()
 
     def environment(self):
-        return {"PATH": f"{self.tools}:{os.environ['PATH']}", "FAKE_ROOT": str(self.root), "LC_ALL": "C"}
+        return {"PATH": f"{self.tools}:{PROGRAMS}", "FAKE_ROOT": str(self.root), "LC_ALL": "C"}
 
     def calls(self):
         """The tools called since the last look, the root taken out."""

@@ -4,14 +4,14 @@ import re
 import subprocess
 import unittest
 
-from deploy_case import BUILD, SOURCE, output_of
+from deploy_case import BUILD, ENVIRONMENT, SOURCE, output_of
 
 PAGES = sorted((SOURCE / "deploy/man").iterdir())
 
 
 class Man(unittest.TestCase):
     def test_mandoc_finds_no_fault(self):
-        done = subprocess.run(["mandoc", "-Tlint", *PAGES], capture_output=True, text=True, check=False)
+        done = subprocess.run(["mandoc", "-Tlint", *PAGES], capture_output=True, text=True, check=False, env=ENVIRONMENT)
         # Which other pages are installed is the machine's affair.
         faults = [line for line in done.stdout.splitlines() if "referenced manual not found" not in line]
         self.assertEqual(faults, [])
@@ -59,5 +59,5 @@ class Man(unittest.TestCase):
 class Scripts(unittest.TestCase):
     def test_shellcheck_accepts_them(self):
         scripts = [SOURCE / "deploy/kldr-register", SOURCE / "deploy/debian/prerm", SOURCE / "dev"]
-        done = subprocess.run(["shellcheck", *scripts], capture_output=True, text=True, check=False)
+        done = subprocess.run(["shellcheck", *scripts], capture_output=True, text=True, check=False, env=ENVIRONMENT)
         self.assertEqual((done.returncode, done.stdout), (0, ""))

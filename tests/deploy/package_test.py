@@ -1,13 +1,14 @@
 """The Debian package of this word size."""
 
 import re
-import shutil
 import tempfile
 import unittest
 from pathlib import Path
 
-from deploy_case import BUILD, WORD_SIZE, output_of
+from deploy_case import BUILD, CMAKE, WORD_SIZE, output_of
 from install_test import FILES
+
+CPACK = Path(CMAKE).with_name("cpack")
 
 
 class Package(unittest.TestCase):
@@ -15,7 +16,7 @@ class Package(unittest.TestCase):
     def setUpClass(cls):
         folder = tempfile.TemporaryDirectory()
         cls.addClassCleanup(folder.cleanup)
-        output_of(shutil.which("cpack"), "-G", "DEB", "-B", folder.name, cwd=BUILD)
+        output_of(CPACK, "-G", "DEB", "-B", folder.name, cwd=BUILD)
         packages = list(Path(folder.name).glob("*.deb"))
         assert len(packages) == 1, packages
         cls.package = packages[0]

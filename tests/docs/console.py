@@ -12,7 +12,6 @@ Usage: console.py --source DIR --build DIR FILE...
 
 import argparse
 import difflib
-import os
 import re
 import subprocess
 import sys
@@ -121,7 +120,7 @@ def checkout(source, build, folder):
 
 def environment_of(build, folder):
     return {
-        "PATH": f"{build}:{build / 'deploy'}:{os.environ['PATH']}",
+        "PATH": f"{build}:{build / 'deploy'}:/usr/bin:/bin",
         "HOME": str(folder / "home"),
         "LANG": "C.UTF-8",
         "LC_ALL": "C.UTF-8",

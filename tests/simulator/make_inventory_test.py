@@ -10,7 +10,7 @@ PROGRAM = Path(__file__).resolve().parents[2] / "simulator" / "make_inventory.py
 
 
 def run(*arguments):
-    return subprocess.run([sys.executable, "-B", PROGRAM, *arguments], capture_output=True, text=True, check=False)
+    return subprocess.run([sys.executable, "-B", PROGRAM, *arguments], capture_output=True, text=True, check=False, env={})
 
 
 def inventory(*arguments):
@@ -82,7 +82,7 @@ class Refusal_Test(unittest.TestCase):
 
     def test_a_reader_that_has_seen_enough_gets_no_complaint(self):
         with subprocess.Popen([sys.executable, "-B", PROGRAM, "--targets", "500"], stdout=subprocess.PIPE,
-                              stderr=subprocess.PIPE) as program:
+                              stderr=subprocess.PIPE, env={}) as program:
             program.stdout.readline()
             program.stdout.close()
             self.assertEqual(program.stderr.read(), b"")
