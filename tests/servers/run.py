@@ -1,0 +1,127 @@
+"""Runs the cases and checks of this folder in real CIM servers, each in a machine of its own.
+
+run.py [--long] --build BITS=FOLDER... PATH...
+
+PATH is an archive, an unpacked server or a folder of them; FOLDER the build of that word size, with its package in FOLDER/servers.
+"""
+
+import argparse
+import json
+import os
+import subprocess
+import sys
+import time
+import unittest
+from concurrent.futures import ThreadPoolExecutor
+from dataclasses import dataclass
+from pathlib import Path
+
+import archives
+
+HERE = Path(__file__).resolve().parent
+SOURCE = HERE.parent.parent
+#: In seconds, for one machine.
+QUICK, LONG = 300, 3600
+
+
+@dataclass
+class Job:
+    server: archives.Found
+    title: str
+    command: list
+
+    def __str__(self):
+        return f"{self.server.name}: {self.title}"
+
+
+def cases():
+    """Module, name and length of each test method, found without a server."""
+    sys.path.insert(0, str(HERE))
+    found = []
+
+    def walk(suite):
+        for each in suite:
+            if isinstance(each, unittest.TestSuite):
+                walk(each)
+            else:
+                method = getattr(each, each.id().rpartition(".")[2])
+                found.append((type(each).__module__, each.id(), getattr(method, "long", False)))
+
+    walk(unittest.defaultTestLoader.discover(str(HERE), "*_test.py"))
+    return found
+
+
+def belongs(module, server):
+    """Files whose names begin with a kind of server are for that kind alone."""
+    kind = module.partition("_")[0]
+    return kind not in archives.PROGRAMS or kind == server.kind
+
+
+def jobs(servers, long):
+    for server in servers:
+        for module, case, is_long in cases():
+            if belongs(module, server) and (long or not is_long):
+                yield Job(server, case, ["python3", "-B", "-m", "unittest", case])
+        for file in sorted(HERE.glob("*_check.py")):
+            if belongs(file.stem, server):
+                options = ["--long"] if long else []
+                yield Job(server, file.stem, ["python3", "-B", "checked.py", f"/mnt/source/tests/servers/{file.name}", *options])
+
+
+def run(job, builds, long):
+    """Status and output of a job, with the seconds that it took."""
+    build = builds[job.server.word_size]
+    packages = build / "servers"
+    room = {
+        "name": job.server.name,
+        "kind": job.server.kind,
+        "word_size": job.server.word_size,
+        "long": long,
+        "package": "/mnt/packages/kldrprovider.deb",
+        "adapter_library": "/mnt/packages/libdzntj.so",
+    }
+    inside = "cd /mnt/source/tests/servers && exec \"$@\""
+    begin = time.monotonic()
+    try:
+        done = subprocess.run(
+            [HERE / "machine.sh", job.server.path, SOURCE, packages, "bash", "-c", inside, "machine", *job.command],
+            env={**os.environ, "KLDR_ROOM": json.dumps(room)}, stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
+            stderr=subprocess.STDOUT, text=True, errors="replace", check=False, timeout=LONG if long else QUICK,
+        )  # fmt: skip
+        status, output = done.returncode, done.stdout
+    except subprocess.TimeoutExpired as late:
+        status, output = 124, f"{late.stdout or ''}\nnot done within {late.timeout:.0f} s"
+    return status, output, time.monotonic() - begin
+
+
+def main():
+    parser = argparse.ArgumentParser(description="Runs the module in real CIM servers.")
+    parser.add_argument("--long", action="store_true", help="all that takes time too")
+    parser.add_argument("--build", action="append", default=[], metavar="BITS=FOLDER")
+    parser.add_argument("--needs", action="store_true", help="print the word sizes of the servers, and end")
+    parser.add_argument("--only", default="", metavar="TEXT", help="cases and checks with this in their name")
+    parser.add_argument("paths", nargs="+", metavar="PATH")
+    options = parser.parse_args()
+    servers = [server for path in options.paths for server in archives.find(path)]
+    if options.needs:
+        print(*sorted({server.word_size for server in servers}, reverse=True))
+        return 0
+    if not servers:
+        print(f"no CIM server in {', '.join(options.paths)}", file=sys.stderr)
+        return 1
+    builds = {int(bits): Path(folder).resolve() for bits, folder in (each.split("=", 1) for each in options.build)}
+    planned = [job for job in jobs(servers, options.long) if options.only in job.title]
+    failed = 0
+    with ThreadPoolExecutor(2) as pool:
+        for job, (status, output, seconds) in zip(planned, pool.map(lambda job: run(job, builds, options.long), planned)):
+            word = "FAILED" if status else "ok"
+            print(f"{word:6} {seconds:5.1f} s  {job}", flush=True)
+            failed += bool(status)
+            if status:
+                print("    " + output.rstrip().replace("\n", "\n    "), flush=True)
+    print(f"{len(servers)} servers, {len(planned)} machines, {failed} failures")
+    return 1 if failed or not planned else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

@@ -1,0 +1,117 @@
+"""A CIM server inside a machine of its own: how it is started, asked, killed, and what it knows."""
+
+import json
+import os
+import signal
+import socket
+import subprocess
+import time
+from pathlib import Path
+
+import cim_question
+
+#: What each kind's processes are called.
+PROCESSES = {"sfcb": ("sfcbd",), "pegasus": ("cimserver", "cimprovagt")}
+NAMESPACE = "root/kaldera"
+INVENTORY = "/mnt/source/simulator/inventories/demo.json"
+#: The administrator's search path, and the one that package managers give to their scripts.
+ADMINISTRATOR = "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin"
+MAINTAINER = "/usr/sbin:/usr/bin:/sbin:/bin"
+
+
+def room():
+    """What the one who made the machine says of it: the server's name, kind and word size, and the file of the package."""
+    return json.loads(os.environ["KLDR_ROOM"])
+
+
+def processes(names):
+    """Those that run under one of these names, zombies left out."""
+    found = []
+    for entry in Path("/proc").iterdir():
+        if not entry.name.isdigit():
+            continue
+        try:
+            status = (entry / "stat").read_text(encoding="utf-8", errors="replace")
+        except OSError:
+            continue
+        name, _, rest = status.partition("(")[2].rpartition(")")
+        if name in names and rest.split()[0] != "Z":
+            found.append(int(entry.name))
+    return found
+
+
+class Server:
+    def __init__(self, port=5988):
+        self.room = room()
+        self.kind = self.room["kind"]
+        self.word_size = self.room["word_size"]
+        self.home = Path("/opt/cim-servers") / self.room["name"]
+        self.port = port
+        #: The module's own settings in the server's environment.
+        self.module_environment = {"KLDR_SIMULATOR_INVENTORY": INVENTORY, "HOME": "/root"}
+
+    @property
+    def url(self):
+        return f"http://127.0.0.1:{self.port}"
+
+    def environment(self):
+        return {"PATH": ADMINISTRATOR, "LC_ALL": "C.UTF-8", **self.module_environment}
+
+    def start(self):
+        """Starts it, and returns when it listens."""
+        done = subprocess.run(
+            [self.home / "start", str(self.port)], env=self.environment(), start_new_session=True, check=False,
+            stdin=subprocess.DEVNULL, stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True, timeout=120,
+        )  # fmt: skip
+        if done.returncode:
+            raise AssertionError(f"{self.kind} does not start: {done.stdout}")
+        self._wait(self.listens, "it does not listen")
+
+    def stop(self):
+        """Stops it as its administrator does, and returns when all its processes have ended."""
+        subprocess.run([self.home / "stop"], env=self.environment(), check=False, capture_output=True, timeout=120)
+        self._wait(lambda: not self.running(), "its processes do not end")
+
+    def kill(self):
+        """Ends all its processes at once."""
+        for process in processes(PROCESSES[self.kind]):
+            try:
+                os.kill(process, signal.SIGKILL)
+            except ProcessLookupError:
+                pass
+        self._wait(lambda: not self.running(), "its processes do not end")
+
+    def restart(self):
+        self.stop()
+        self.start()
+
+    def running(self):
+        return bool(processes(PROCESSES[self.kind]))
+
+    def listens(self):
+        with socket.socket() as probe:
+            return probe.connect_ex(("127.0.0.1", self.port)) == 0
+
+    def _wait(self, condition, words, seconds=60):
+        end = time.monotonic() + seconds
+        while not condition():
+            if time.monotonic() > end:
+                raise AssertionError(f"{self.kind}: {words} within {seconds} s")
+            time.sleep(0.05)
+
+    def ask(self, method, class_name, namespace=NAMESPACE):
+        return cim_question.ask(self.port, namespace, method, class_name)
+
+    def instances(self, class_name, namespace=NAMESPACE):
+        """How many instances it names."""
+        return cim_question.count(self.ask("EnumerateInstanceNames", class_name, namespace), "INSTANCENAME")
+
+    def prepare(self):
+        """Brings the server's files to the places where an installation has them, by a first start, and stops it again."""
+        settings = self.home / "etc/sfcb/sfcb.cfg"
+        if settings.exists():
+            # Else the titles of provider processes are written over their environment.
+            text = settings.read_text(encoding="utf-8")
+            settings.write_text(text.replace("argvDebug: true", "argvDebug: false"), encoding="utf-8")
+        self.start()
+        self.stop()
