@@ -40,6 +40,17 @@ def processes(names):
     return found
 
 
+def padded(environment):
+    """sfcb writes the titles of its provider processes over the first variables of their environment. Variables of no use take
+    the blow; which ones come first is decided by the shell that starts the server, and so it is asked."""
+    for count in range(50, 2000, 50):
+        tried = {**{f"PADDING_{number}": "." * 50 for number in range(count)}, **environment}
+        listed = subprocess.run(["bash", "-c", "exec env"], env=tried, capture_output=True, text=True, check=True).stdout
+        if all(line.startswith("PADDING_") for line in listed.splitlines()[:8]):
+            return tried
+    raise AssertionError("other variables come first")
+
+
 class Server:
     def __init__(self, port=5988):
         self.room = room()
@@ -55,7 +66,8 @@ class Server:
         return f"http://127.0.0.1:{self.port}"
 
     def environment(self):
-        return {"PATH": ADMINISTRATOR, "LC_ALL": "C.UTF-8", **self.module_environment}
+        environment = {"PATH": ADMINISTRATOR, "LC_ALL": "C.UTF-8", **self.module_environment}
+        return padded(environment) if self.kind == "sfcb" else environment
 
     def start(self):
         """Starts it, and returns when it listens."""
@@ -108,10 +120,5 @@ class Server:
 
     def prepare(self):
         """Brings the server's files to the places where an installation has them, by a first start, and stops it again."""
-        settings = self.home / "etc/sfcb/sfcb.cfg"
-        if settings.exists():
-            # Else the titles of provider processes are written over their environment.
-            text = settings.read_text(encoding="utf-8")
-            settings.write_text(text.replace("argvDebug: true", "argvDebug: false"), encoding="utf-8")
         self.start()
         self.stop()
