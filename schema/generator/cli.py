@@ -46,12 +46,12 @@ def generate(files, prefix, without=()):
     return output
 
 
-def deployment(files, prefix, without, version, word_size):
+def deployment(files, prefix, without, version):
     """What servers read, in memory: registrations and MOF."""
     declarations = read(files)
     classes = resolve(declarations)
     output = Output()
-    registrations.emit(providers_of(classes, prefix, without), output, version, word_size)
+    registrations.emit(providers_of(classes, prefix, without), output, version)
     loading.emit(classes, [each for each in declarations if isinstance(each, QualifierType)], prefix, output)
     return output
 
@@ -65,14 +65,13 @@ def main(arguments=None):
     parser.add_argument("--without-provider", action="append", default=[], metavar="CLASS")
     parser.add_argument("--deployment", action="store_true", help="generate what CIM servers read, not C++")
     parser.add_argument("--module-version", default="0", metavar="TEXT", help="with --deployment")
-    parser.add_argument("--word-size", type=int, choices=(32, 64), default=64, help="with --deployment")
     options = parser.parse_args(arguments)
     if not options.list and not options.output:
         parser.error("--output or --list is needed")
     try:
         catalogue = (options.mof, options.provider_prefix, options.without_provider)
         if options.deployment:
-            output = deployment(*catalogue, options.module_version, options.word_size)
+            output = deployment(*catalogue, options.module_version)
         else:
             output = generate(*catalogue)
     except MofError as error:

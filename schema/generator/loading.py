@@ -10,30 +10,44 @@ HEADS = {
 }
 
 
-def ancestors(class_):
-    """The class and its superclasses."""
-    while class_:
-        yield class_
-        class_ = class_.superclass
+def elements(class_):
+    """What may name another class: the class's own features, and their parameters."""
+    for feature in class_.own_features:
+        yield feature
+        yield from feature.parameters
 
 
 def loading_order(classes):
-    """The classes in their own order, but each behind its superclass, and behind the targets of its references unless they
-    lead back to it."""
+    """The classes in their own order, but each behind its superclass and the classes of its embedded instances, without which
+    compilers refuse it, and behind the targets of its references unless they lead back to it."""
     by_name = {class_.name: class_ for class_ in classes}
     placed, begun = [], set()
 
+    def needed(class_):
+        """The superclass, and the classes of embedded instances."""
+        found = [class_.superclass] if class_.superclass else []
+        embedded = [each.target for each in elements(class_) if each.qualifiers.get("embeddedinstance")]
+        return found + [by_name[name] for name in embedded if name in by_name]
+
     def can_stand_before(target):
-        return not any(each.name in begun and each not in placed for each in ancestors(target))
+        waiting, seen = [target], set()
+        while waiting:
+            class_ = waiting.pop()
+            if class_.name in begun and class_ not in placed:
+                return False
+            if class_.name not in seen:
+                seen.add(class_.name)
+                waiting += needed(class_)
+        return True
 
     def place(class_):
         if class_.name in begun or class_.name not in by_name:
             return
         begun.add(class_.name)
-        if class_.superclass:
-            place(class_.superclass)
-        for feature in class_.own_features:
-            target = by_name.get(feature.target)
+        for each in needed(class_):
+            place(each)
+        for element in elements(class_):
+            target = by_name.get(element.target)
             if target and can_stand_before(target):
                 place(target)
         placed.append(class_)

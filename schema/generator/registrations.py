@@ -15,8 +15,6 @@ TYPE_CODES = {"instance": 2, "association": 3, "indication": 4, "method": 5}
 #: UserContext of OpenPegasus: the privileged user. With the requestor's own, each user would get a process of his own, and
 #: would not see the jobs that another one has started.
 PRIVILEGED_USER = 4
-#: Bitness of OpenPegasus by word size.
-BITNESS = {32: 2, 64: 3}
 
 
 @dataclass
@@ -62,8 +60,9 @@ def text(value):
     return f'"{value}"'
 
 
-def instances(table, version, word_size):
-    """OpenPegasus: instances of the interop namespace."""
+def instances(table, version):
+    """OpenPegasus: instances of the interop namespace. Without a word about the word size, which means the server's own; only a
+    server that was built to run others takes one."""
     parts = [
         instance(
             "PG_ProviderModule",
@@ -74,7 +73,6 @@ def instances(table, version, word_size):
             InterfaceVersion=text("2.0.0"),
             Location=text(MODULE),
             UserContext=PRIVILEGED_USER,
-            Bitness=BITNESS[word_size],
         )
     ]
     for row in table:
@@ -101,8 +99,8 @@ def lines(table):
     )
 
 
-def emit(providers, output, version, word_size):
+def emit(providers, output, version):
     table = rows(providers)
     output.add("registration/kldrprovider.sfcb", sections(table))
-    output.add("registration/kldrprovider.pegasus.mof", instances(table, version, word_size))
+    output.add("registration/kldrprovider.pegasus.mof", instances(table, version))
     output.add("registration/kldrprovider.registration", lines(table))

@@ -4,7 +4,6 @@ import re
 
 from deploy_case import BUILD, SOURCE, DeployCase, instances_of, output_of
 
-from generator.cli import deployment
 from generator.parser import parse
 from generator.resolver import resolve
 
@@ -31,13 +30,16 @@ class Mof(DeployCase):
         self.assertEqual(described(installed), described(sources))
         self.assertEqual(len(installed), 178)
 
-    def test_targets_of_product_associations_stand_before_them(self):
+    def test_what_a_class_names_stands_before_it(self):
         seen = set()
         for class_ in self.loaded("kldr_qualifiers.mof", "kldr_structure.mof", "kldrprovider.mof"):
             seen.add(class_.name)
             for feature in class_.own_features:
                 if class_.name.startswith("KALDERA_") and feature.kind == "reference":
                     self.assertIn(feature.target, seen)
+                for each in [feature, *feature.parameters]:
+                    if each.qualifiers.get("embeddedinstance"):
+                        self.assertIn(each.target, seen, f"{class_.name}.{feature.name}")
 
     def test_no_file_includes_another(self):
         for file in (self.share / "mof").iterdir():
@@ -51,10 +53,3 @@ class Mof(DeployCase):
             self.assertEqual(len(instances_of(text, class_name)), count)
             self.assertLess(text.index(f"class {class_name} "), text.index(f"instance of {class_name} "))
             self.assertEqual(len(re.findall(rf"^class {class_name} :", text, re.M)), 1)
-
-    def test_word_size_changes_the_bitness_alone(self):
-        files = [str(SOURCE / "schema" / name) for name in ("cim.mof", "kaldera.mof")]
-        wide, narrow = (deployment(files, "KALDERA_", ["KALDERA_DiagnosticTest"], "1", size).files for size in (64, 32))
-        self.assertEqual(
-            {name for name in wide if wide[name] != narrow[name]}, {"registration/kldrprovider.pegasus.mof"}
-        )

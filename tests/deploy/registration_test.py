@@ -3,7 +3,7 @@
 import json
 import re
 
-from deploy_case import BUILD, WORD_SIZE, DeployCase, instances_of, output_of
+from deploy_case import BUILD, DeployCase, instances_of, output_of
 
 CODES = {"2": "instance", "3": "association", "4": "indication", "5": "method"}
 
@@ -61,9 +61,11 @@ class Registrations(DeployCase):
         self.assertEqual(len(modules), 1)
         module = modules[0]
         self.assertEqual(
-            (module["InterfaceType"], module["InterfaceVersion"], module["Location"], module["Bitness"]),
-            ("CMPI", "2.0.0", "kldrprovider_Module", {32: "2", 64: "3"}[WORD_SIZE]),
+            (module["InterfaceType"], module["InterfaceVersion"], module["Location"]),
+            ("CMPI", "2.0.0", "kldrprovider_Module"),
         )
+        # A server that was not built for others refuses even its own word size.
+        self.assertNotIn("Bitness", module)
         self.assertTrue(module["Vendor"] and module["Version"])
         providers = instances_of(text, "PG_Provider")
         self.assertEqual({each["Name"] for each in providers}, {f"{name}_Provider" for name in self.expected})

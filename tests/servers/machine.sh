@@ -36,6 +36,8 @@ mount -t tmpfs tmpfs /run
 echo "127.0.0.1 localhost kldr-test" >/etc/hosts
 # Of a server that the machine itself has, nothing is seen; nor of the package.
 rm -rf /etc/sfcb /etc/Pegasus /var/lib/sfcb /var/lib/Pegasus /var/lib/kldrprovider /opt/cim-servers
+# The index of pages would take seconds at each package, and is nobody's concern here.
+rm -f /var/lib/man-db/auto-update
 ! dpkg-query -s kldrprovider >/dev/null 2>&1 || dpkg --purge --force-all kldrprovider >/dev/null
 
 if [ -e /mnt/archive ]; then

@@ -27,8 +27,8 @@ PEGASUS_LINK = """instance of PG_ProviderCapabilities
 
 
 class Registrations(SchemaCase):
-    def files(self, text=TINY, word_size=64):
-        return deployment([QUALIFIERS, self.file(text)], "P_", (), "1.2.3", word_size).files
+    def files(self, text=TINY):
+        return deployment([QUALIFIERS, self.file(text)], "P_", (), "1.2.3").files
 
     def test_sections_of_sfcb(self):
         text = self.files()["registration/kldrprovider.sfcb"]
@@ -47,8 +47,7 @@ class Registrations(SchemaCase):
         self.assertIn(PEGASUS_LINK, text)
         self.assertIn('    Version = "1.2.3";\n', text)
         self.assertEqual(re.findall(r"ProviderType = (.*);", text), ["{2, 5}", "{2, 3, 5}", "{4}"])
-        self.assertIn("    Bitness = 3;\n", text)
-        self.assertIn("    Bitness = 2;\n", self.files(word_size=32)["registration/kldrprovider.pegasus.mof"])
+        self.assertNotIn("Bitness", text)
 
     def test_neutral_lines(self):
         self.assertEqual(
@@ -61,7 +60,7 @@ class Registrations(SchemaCase):
     def test_mof_keeps_the_words_of_the_sources(self):
         one = self.file("class C_One { [Key] string Name; };\n", "one.mof")
         two = self.file("// Why it is.\nclass P_Two : C_One { [Key, Override(\"Name\")] string Name; };\n", "two.mof")
-        files = deployment([QUALIFIERS, one, two], "P_", (), "1", 64).files
+        files = deployment([QUALIFIERS, one, two], "P_", (), "1").files
         self.assertIn("// Why it is.\nclass P_Two : C_One", files["mof/kldrprovider.mof"])
         self.assertNotIn("class C_One", files["mof/kldrprovider.mof"])
         self.assertIn("class C_One {", files["mof/kldr_structure.mof"])
@@ -82,3 +81,13 @@ class Order(SchemaCase):
 
     def test_a_way_round_does_not_put_a_class_before_its_superclass(self):
         self.assertEqual(self.order("class A { B REF b; }; class B { C REF c; }; class C : A {};"), ["B", "A", "C"])
+
+    def test_classes_of_embedded_instances_stand_before_what_names_them(self):
+        self.assertEqual(
+            self.order('class A { [EmbeddedInstance("B")] string b; }; class B {}; class C { uint32 m([EmbeddedInstance("D")] '
+                       "string d); }; class D {};"),
+            ["B", "A", "D", "C"],
+        )
+
+    def test_a_reference_gives_way_to_an_embedded_instance(self):
+        self.assertEqual(self.order('class A { B REF b; }; class B { [EmbeddedInstance("A")] string a; };'), ["A", "B"])
