@@ -19,6 +19,6 @@ if(word_size EQUAL 32)
   set(CPACK_DEBIAN_PACKAGE_ARCHITECTURE i386)
 endif()
 # Before its files go, the servers are told; registering is the administrator's own decision.
-set(CPACK_DEBIAN_PACKAGE_CONTROL_EXTRA ${CMAKE_CURRENT_SOURCE_DIR}/debian/prerm)
+set(CPACK_DEBIAN_PACKAGE_CONTROL_EXTRA ${CMAKE_CURRENT_SOURCE_DIR}/debian/prerm ${CMAKE_CURRENT_SOURCE_DIR}/debian/postrm)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 include(CPack)

@@ -58,6 +58,12 @@ class Man(unittest.TestCase):
 
 class Scripts(unittest.TestCase):
     def test_shellcheck_accepts_them(self):
-        scripts = [SOURCE / "deploy/kldr-register", SOURCE / "deploy/debian/prerm", SOURCE / "dev"]
+        scripts = [
+            BUILD / "deploy/kldr-register",
+            *sorted((SOURCE / "deploy/debian").iterdir()),
+            SOURCE / "dev",
+            SOURCE / ".ci/run",
+            SOURCE / "tests/servers/machine.sh",
+        ]
         done = subprocess.run(["shellcheck", *scripts], capture_output=True, text=True, check=False, env=ENVIRONMENT)
         self.assertEqual((done.returncode, done.stdout), (0, ""))

@@ -34,11 +34,9 @@ class Package(unittest.TestCase):
         self.assertIn("libjsoncpp", field("Depends"))
         self.assertIn("procps", field("Depends"))
 
-    def test_it_unregisters_before_it_goes(self):
+    def test_an_upgrade_is_no_removal(self):
         with tempfile.TemporaryDirectory() as folder:
             output_of("dpkg-deb", "-e", self.package, folder)
-            script = Path(folder) / "prerm"
-            self.assertIn("kldr-register remove", script.read_text(encoding="utf-8"))
-            self.assertTrue(script.stat().st_mode & 0o111)
-            # An upgrade is no removal, and does nothing.
-            self.assertEqual(output_of(script, "upgrade", "2.0"), "")
+            for script, words in (("prerm", ("upgrade", "2.0")), ("postrm", ("upgrade", "2.0")), ("postrm", ("remove",))):
+                self.assertTrue((Path(folder) / script).stat().st_mode & 0o111)
+                self.assertEqual(output_of(Path(folder) / script, *words), "")
