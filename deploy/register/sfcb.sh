@@ -193,7 +193,7 @@ sfcb_answers() {
     answer=$(enumerate_names "$port") || { echo "no answer on port $port"; return 2; }
     case $answer in
         *"<INSTANCENAME "*) return 0 ;;
-        "HTTP/1.1 401"*) echo "it asks for a name and a password"; return 2 ;;
+        HTTP*" 401"*) echo "it asks for a name and a password"; return 2 ;;
         *"<ERROR "*) sed -n 's/.*<ERROR CODE="\([0-9]*\)" DESCRIPTION="\([^"]*\)".*/error \1, \2/p' <<<"$answer" ;;
         *) echo "no instance" ;;
     esac
@@ -210,16 +210,29 @@ enumerate_names() { # PORT
     body="<?xml version=\"1.0\" encoding=\"utf-8\"?><CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"1\"
  PROTOCOLVERSION=\"1.0\"><SIMPLEREQ><IMETHODCALL NAME=\"EnumerateInstanceNames\"><LOCALNAMESPACEPATH>$path</LOCALNAMESPACEPATH>
 <IPARAMVALUE NAME=\"ClassName\"><CLASSNAME NAME=\"$FIRST_CLASS\"/></IPARAMVALUE></IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>"
-    # In a shell of its own, so that neither a refused connection nor a silent server ends or holds this one.
-    # shellcheck disable=SC2016 # the inner shell's own parameters
-    timeout 30 bash -c 'exec 3<>"/dev/tcp/127.0.0.1/$1" && printf "%s" "$2" >&3 && cat <&3' sh "$1" "POST /cimom HTTP/1.1
+    # In a process of its own, so that neither a refused connection nor a silent server ends or holds this one.
+    (
+        exec 3<>"/dev/tcp/127.0.0.1/$1" && printf '%s' "POST /cimom HTTP/1.1
 Host: localhost
-Connection: close
 Content-Type: application/xml; charset=\"utf-8\"
 Content-Length: ${#body}
 CIMOperation: MethodCall
 CIMMethod: EnumerateInstanceNames
 CIMObject: $NAMESPACE
 
-$body" 2>/dev/null
+$body" >&3 && read_answer <&3
+    ) 2>/dev/null
+}
+
+# The server keeps the connection, so that the end of the answer has to be seen in it.
+read_answer() {
+    local piece
+    IFS= read -r -t 30 piece || return
+    printf '%s\n' "$piece"
+    case $piece in HTTP*" 401"*) return 0 ;; esac
+    while IFS= read -r -t 30 -d '>' piece; do
+        printf '%s>' "$piece"
+        case $piece in *"</CIM") return 0 ;; esac
+    done
+    return 1
 }

@@ -15,7 +15,7 @@ if [ -z "${KLDR_INSIDE:-}" ]; then
 fi
 unset KLDR_INSIDE
 
-hostname kldr-test
+hostname cim-machine
 ip link set lo up
 mount -t tmpfs tmpfs /mnt
 mkdir /mnt/source /mnt/packages /mnt/server
@@ -33,7 +33,7 @@ for folder in etc opt root tmp usr var; do
     mount -t overlay overlay -o "lowerdir=/$folder,upperdir=/mnt/written/$folder,workdir=/mnt/work/$folder" "/$folder"
 done
 mount -t tmpfs tmpfs /run
-echo "127.0.0.1 localhost kldr-test" >/etc/hosts
+echo "127.0.0.1 localhost cim-machine" >/etc/hosts
 # Of a server that the machine itself has, nothing is seen; nor of the package.
 rm -rf /etc/sfcb /etc/Pegasus /var/lib/sfcb /var/lib/Pegasus /var/lib/kldrprovider /opt/cim-servers
 # The index of pages would take seconds at each package, and is nobody's concern here.
