@@ -2,6 +2,7 @@
 
 set(KLDR_WORD_SIZE "" CACHE STRING "32 builds for i386; empty builds for the compiler's own word size")
 set(KLDR_SANITIZE "" CACHE STRING "argument of -fsanitize, empty for none")
+option(KLDR_CONTAIN_EXCEPTIONS "answer an exception with a failure, rather than letting it pass into the CIM server" OFF)
 set(KLDR_CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/cmpi/interface" CACHE PATH
     "folder of cmpidt.h, cmpift.h and cmpimacs.h; a server's own headers may stand in for ours")
 

@@ -1,5 +1,6 @@
 #include "cmpi/CMPI_Static_Data.h"
 #include "cmpi/entries.h"
+#include "cmpi/exception_containment.h"
 #include "runtime/strutil.h"
 
 namespace KPRV {
@@ -47,6 +48,7 @@ void fill(CMPI_Static_Data* data, CMPI_Adapter* adapter, const char* provider_na
     name_slot = set_name(data->association_name, "association", provider_name);
 
     fill_cleanup_operations(*data);
+    contain_exceptions(*data);
 }
 
 } // namespace KPRV

@@ -19,12 +19,11 @@ FACTORY_MACROS = r"""
 #define ARGUMENTS const CMPIBroker *broker, const CMPIContext *context, CMPIStatus *
 #define AREA(C) alignas(16) static char _cmpi_static_data##C##_Provider[2048];
 #define FACTORY(C, KIND, LETTER) \
-    EXPORT CMPI##KIND##MI* C##_Provider_Create_##KIND##MI(ARGUMENTS) \
+    EXPORT CMPI##KIND##MI* C##_Provider_Create_##KIND##MI(ARGUMENTS status) \
     { \
-        void* mi = nullptr; \
-        cimple_cmpi_adapter('C', _cmpi_static_data##C##_Provider, &_cimple_registration_##C##_Provider, \
-                            broker, context, #C "_Provider", LETTER, &mi); \
-        return static_cast<CMPI##KIND##MI*>(mi); \
+        return static_cast<CMPI##KIND##MI*>(create_mi(_cmpi_static_data##C##_Provider, \
+                                                      &_cimple_registration_##C##_Provider, broker, context, \
+                                                      #C "_Provider", LETTER, status)); \
     } \
     EXPORT CMPI##KIND##MI* C##_Create_##KIND##MI(ARGUMENTS status) \
     { \
@@ -65,7 +64,7 @@ def registration(providers):
 
 def factories(providers):
     includes = [
-        "cmpi/cimple_cmpi_adapter.h",
+        "cmpi/exception_containment.h",
         "runtime/Registration.h",
         "runtime/version.h",
     ]
