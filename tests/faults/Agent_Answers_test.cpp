@@ -83,7 +83,7 @@ protected:
             R"({"method": ")" + std::string(method) + R"(", "params": )" + json_text(params) + "}";
         const host::Result result =
             server->invoke_method(service, "executeMethod", {{"request", host::Value::text(request)}});
-        EXPECT_TRUE(result.ok()) << result.rc << " " << result.exception.value_or("");
+        EXPECT_TRUE(result.ok()) << result.rc << " " << thrown_text(result).value_or("");
         EXPECT_EQ(1u, result.done_count);
         const host::Value* const response = find_value(result.out, "response");
         Json::Value reply;

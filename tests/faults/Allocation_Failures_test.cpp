@@ -12,7 +12,7 @@ protected:
     void SetUp() override
     {
         // Kept in memory, so that a report of what was lost can name its places.
-        ASSERT_TRUE(dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NODELETE));
+        ASSERT_TRUE(dlopen(module_under_test(), RTLD_NOW | RTLD_NODELETE));
         open("one_cna.json");
     }
 
@@ -69,11 +69,11 @@ protected:
             // A value that a helper has no room for costs that value alone, and a line that the log has no
             // room for costs nothing.
             EXPECT_TRUE(helpers_too || logs() || !result.ok() || is_less(result, whole));
-            EXPECT_EQ(result.ok(), !result.exception) << "no other failure than that exception";
+            EXPECT_EQ(result.ok(), !thrown_text(result)) << "no other failure than that exception";
             expect_nothing_left();
         }
         const host::Result after = operation();
-        EXPECT_TRUE(after.ok()) << what << ": " << after.rc << " " << after.exception.value_or("");
+        EXPECT_TRUE(after.ok()) << what << ": " << after.rc << " " << thrown_text(after).value_or("");
         EXPECT_FALSE(is_less(after, whole)) << what;
     }
 };

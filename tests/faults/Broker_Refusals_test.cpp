@@ -119,7 +119,7 @@ protected:
     void SetUp() override
     {
         // Alerts stay allocated; the leak checker can tell them only while the module is mapped.
-        ASSERT_TRUE(dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NODELETE));
+        ASSERT_TRUE(dlopen(module_under_test(), RTLD_NOW | RTLD_NODELETE));
         Broker_Refusals::SetUp();
         server->set_sink([this](const std::string&, const host::Instance_Value&) {
             ++came;

@@ -49,13 +49,13 @@ protected:
         restore();
         simulator.add_fault(bad.fault(GetParam().entry_point));
         std::string error;
-        server = host::Host::open(KLDR_MODULE, {}, error);
+        server = host::Host::open(module_under_test(), {}, error);
         EXPECT_TRUE(server) << error;
         Picture picture = elsewhere([&] { return look(); });
         server->unload(true);
         expect_nothing_left();
         server.reset();
-        EXPECT_EQ(nullptr, dlopen(KLDR_MODULE, RTLD_NOW | RTLD_NOLOAD)) << "it is unloaded";
+        EXPECT_EQ(nullptr, dlopen(module_under_test(), RTLD_NOW | RTLD_NOLOAD)) << "it is unloaded";
         return picture;
     }
 };
@@ -100,7 +100,7 @@ TEST_P(Unguarded_Load, EndsTheProcessIfTheLibraryThrows)
             restore();
             simulator.add_fault(bad.fault(GetParam().entry_point));
             std::string error;
-            host::Host::open(KLDR_MODULE, {}, error);
+            host::Host::open(module_under_test(), {}, error);
         });
     }
 }

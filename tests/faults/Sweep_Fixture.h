@@ -5,6 +5,7 @@
 #include "tests/support/Eventually.h"
 #include "tests/support/Module_Picture.h"
 #include "tests/support/Temp_Folder.h"
+#include "tests/support/Thrown_Text.h"
 
 #include <gtest/gtest.h>
 
@@ -29,7 +30,7 @@ protected:
     {
         restore();
         std::string error;
-        server = host::Host::open(KLDR_MODULE, {}, error);
+        server = host::Host::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;
     }
     void close_host()
@@ -57,7 +58,7 @@ protected:
     {
         if (server) {
             for (const std::string& violation : server->violations().list())
-                EXPECT_TRUE(violation.starts_with("MI entry: an exception left the provider: ")) << violation;
+                EXPECT_TRUE(is_passed_exception(violation)) << violation;
             server->violations().clear();
             EXPECT_EQ(0u, server->ledger().live());
         }

@@ -69,7 +69,7 @@ protected:
         const std::size_t before = records().size();
         const host::Result result =
             server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", host::Value::path(element)}});
-        if (result.exception)
+        if (thrown_text(result))
             return LEAVES;
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
         if (result.return_value.as_uint() != STARTED)

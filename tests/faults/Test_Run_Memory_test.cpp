@@ -44,7 +44,7 @@ protected:
     {
         constexpr unsigned OVER = 7;
         const host::Result result = start();
-        ASSERT_EQ(CMPI_RC_OK, result.rc) << result.exception.value_or("");
+        ASSERT_EQ(CMPI_RC_OK, result.rc) << thrown_text(result).value_or("");
         ASSERT_EQ(STARTED, result.return_value.as_uint());
         wait_for_the_end();
         const host::Result jobs = server->enumerate_instances("KALDERA_ConcreteJob");
@@ -77,7 +77,7 @@ TEST_P(Test_Start_Memory, AStartThatFailsKeepsNoTestFromStarting)
                 fail_allocation(nth, once);
                 const host::Result result = start();
                 mend_memory();
-                EXPECT_EQ(result.ok(), !result.exception);
+                EXPECT_EQ(result.ok(), !thrown_text(result));
                 wait_for_the_end();
                 expect_nothing_left();
                 expect_a_good_run();

@@ -33,7 +33,7 @@ protected:
     void open_module(host::Host_Options options = {})
     {
         std::string error;
-        server = host::Host::open(KLDR_MODULE, std::move(options), error);
+        server = host::Host::open(module, std::move(options), error);
         ASSERT_TRUE(server) << error;
     }
     void close()
@@ -86,6 +86,7 @@ protected:
         return !value ? "(absent)" : value->null ? "(null)" : value->as_text();
     }
 
+    const char* module = KLDR_MODULE;
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
     std::unique_ptr<host::Host> server;
 

@@ -110,27 +110,6 @@ TEST_F(Agent_Tunnel, CountsInTheLogWhatDoesNotMatch)
     EXPECT_TRUE(simulator.call_names().empty());
 }
 
-// Nothing in the provider stands between the dispatcher and the server.
-TEST_F(Agent_Tunnel, LetsExceptionsOutToTheServerAndGoesOn)
-{
-    open("empty.json");
-    const std::pair<const char*, const char*> requests[] = {
-        {"[1]", "in Json::Value::find(begin, end): requires objectValue or nullValue"},
-        {R"({"method": 5})", "Type is not convertible to string"},
-        {R"({"method": "discovery.getServerTime", "version": 2.0})", "Type is not convertible to string"},
-    };
-    for (const auto& [request, what] : requests) {
-        const host::Result result = execute(request);
-        EXPECT_EQ(what, result.exception.value_or("none"));
-        EXPECT_TRUE(result.out.empty());
-        EXPECT_EQ(1u, server->violations().count());
-        server->violations().clear();
-        EXPECT_EQ(105, reply("{}")["error"]["code"].asInt()) << "the next request is served";
-    }
-    // No lock is left behind for another thread either.
-    std::thread([this] { EXPECT_EQ(105, reply("{}")["error"]["code"].asInt()); }).join();
-}
-
 TEST_F(Agent_Tunnel, TellsWhatTheLibraryThrows)
 {
     open("empty.json");
