@@ -2,6 +2,7 @@
 
 set(KLDR_WORD_SIZE "" CACHE STRING "32 builds for i386; empty builds for the compiler's own word size")
 set(KLDR_SANITIZE "" CACHE STRING "argument of -fsanitize, empty for none")
+option(KLDR_RELEASE "build as distributions ask it of packages: hardened, with nothing of the build's folder in what is built" OFF)
 option(KLDR_CONTAIN_EXCEPTIONS "answer an exception with a failure, rather than letting it pass into the CIM server" OFF)
 set(KLDR_CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/cmpi/interface" CACHE PATH
     "folder of cmpidt.h, cmpift.h and cmpimacs.h; a server's own headers may stand in for ours")
@@ -32,6 +33,15 @@ include_directories(${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR}/generated)
 if(KLDR_WORD_SIZE STREQUAL "32")
   add_compile_options(-m32)
   add_link_options(-m32)
+endif()
+if(KLDR_RELEASE)
+  # The later map wins, so that a build folder anywhere reads as one in the sources. Whole debug information: it is a package of
+  # its own.
+  include(CheckPIESupported)
+  check_pie_supported()
+  add_compile_options(-g -ffile-prefix-map=${CMAKE_SOURCE_DIR}=. -ffile-prefix-map=${CMAKE_BINARY_DIR}=./build
+                      -U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=2 -fstack-protector-strong -fstack-clash-protection -fcf-protection)
+  add_link_options(-Wl,-z,relro -Wl,-z,now)
 endif()
 if(KLDR_SANITIZE)
   # Less optimisation and no vague promises: a report should name a line.
@@ -66,7 +76,8 @@ function(kldr_library name)
   target_link_libraries(${name} PUBLIC ${ARG_LIBS} Threads::Threads ${CMAKE_DL_LIBS})
 endfunction()
 
-set(KLDR_TEST_OPTIONS -O0)
+# Without optimisation there is nothing to fortify.
+set(KLDR_TEST_OPTIONS -O0 -U_FORTIFY_SOURCE)
 set(KLDR_OWN_PROCESSES ${CMAKE_SOURCE_DIR}/tests/support/own_processes.sh)
 if(KLDR_SANITIZE MATCHES "undefined")
   list(APPEND KLDR_TEST_OPTIONS -fno-sanitize=undefined)
@@ -99,7 +110,7 @@ if(EXISTS ${KLDR_GTEST_ROOT}/src/gtest-all.cc)
   add_library(kldr_gtest STATIC EXCLUDE_FROM_ALL
               ${KLDR_GTEST_ROOT}/src/gtest-all.cc ${KLDR_GTEST_ROOT}/src/gtest_main.cc)
   target_include_directories(kldr_gtest SYSTEM PUBLIC ${KLDR_GTEST_ROOT}/include PRIVATE ${KLDR_GTEST_ROOT})
-  target_compile_options(kldr_gtest PRIVATE -w -O0)
+  target_compile_options(kldr_gtest PRIVATE -w ${KLDR_TEST_OPTIONS})
   target_link_libraries(kldr_gtest PUBLIC Threads::Threads)
 
   # What all tests begin with, read once for all of them: a program like theirs, which is only compiled.
