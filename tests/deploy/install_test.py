@@ -10,6 +10,7 @@ bin/kldrcim
 lib/cim/libkldrprovider_Module.so
 lib/cmpi/libkldrprovider_Module.so
 sbin/kldr-register
+share/doc/kldrprovider/changelog.gz
 share/doc/kldrprovider/copyright
 share/kldrprovider/mof/kldr_interop.mof
 share/kldrprovider/mof/kldr_qualifiers.mof
@@ -18,10 +19,11 @@ share/kldrprovider/mof/kldrprovider.mof
 share/kldrprovider/registration/kldrprovider.pegasus.mof
 share/kldrprovider/registration/kldrprovider.registration
 share/kldrprovider/registration/kldrprovider.sfcb
-share/man/man1/kldrcim.1
-share/man/man5/cimplerc.5
-share/man/man7/kldrprovider.7
-share/man/man8/kldr-register.8
+share/lintian/overrides/kldrprovider
+share/man/man1/kldrcim.1.gz
+share/man/man5/cimplerc.5.gz
+share/man/man7/kldrprovider.7.gz
+share/man/man8/kldr-register.8.gz
 """.split()
 
 

@@ -11,13 +11,18 @@ from install_test import FILES
 CPACK = Path(CMAKE).with_name("cpack")
 
 
+def pack(generator, folder):
+    """The packages that cpack makes of the build."""
+    output_of(CPACK, "-G", generator, "-B", folder, cwd=BUILD)
+    return sorted(Path(folder).glob(f"*.{generator.lower()}"))
+
+
 class Package(unittest.TestCase):
     @classmethod
     def setUpClass(cls):
         folder = tempfile.TemporaryDirectory()
         cls.addClassCleanup(folder.cleanup)
-        output_of(CPACK, "-G", "DEB", "-B", folder.name, cwd=BUILD)
-        packages = list(Path(folder.name).glob("*.deb"))
+        packages = [package for package in pack("DEB", folder.name) if "dbgsym" not in package.name]
         assert len(packages) == 1, packages
         cls.package = packages[0]
 
