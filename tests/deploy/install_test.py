@@ -10,6 +10,8 @@ bin/kldrcim
 lib/cim/libkldrprovider_Module.so
 lib/cmpi/libkldrprovider_Module.so
 sbin/kldr-register
+share/bash-completion/completions/kldr-register
+share/bash-completion/completions/kldrcim
 share/doc/kldrprovider/changelog.gz
 share/doc/kldrprovider/copyright
 share/kldrprovider/mof/kldr_interop.mof
