@@ -1,0 +1,41 @@
+"""What CIM servers themselves add to a provider's answers, each with its reason. Whatever is not named here must be the same
+in every server."""
+
+from dataclasses import dataclass, field
+
+#: Properties with a default in the CIM Schema. Both servers put it where a provider leaves the property null. So they do with
+#: properties that a newer schema has added to a class, and that no provider of ours can know.
+WITH_DEFAULT = {
+    "EnabledDefault",
+    "EnabledState",
+    "IsComposite",
+    "IsEntity",
+    "IsLargeBuildNumber",
+    "NameFormat",
+    "PortAvailability",
+    "Primordial",
+    "RemovalConditions",
+    "RequestedState",
+    "SampleInterval",
+    "TransitioningToState",
+}
+
+
+@dataclass
+class Traits:
+    defaults: set = field(default_factory=lambda: WITH_DEFAULT)
+    #: sfcb compiles into a name space only those classes of its CIM Schema on which others there are built.
+    drops_unneeded_classes: bool = False
+    #: Superclasses that the server's newer CIM Schema has taken out from above ours.
+    removed_superclasses: set = field(default_factory=set)
+
+    def may_lack(self, class_name, subclasses):
+        """`subclasses` are those of the class that have providers."""
+        return class_name in self.removed_superclasses or (self.drops_unneeded_classes and not subclasses)
+
+
+TRAITS = {
+    # In it, CIM_DiagnosticRecord is derived from CIM_RecordForLog directly.
+    "sfcb": Traits(drops_unneeded_classes=True, removed_superclasses={"CIM_LogEntry"}),
+    "pegasus": Traits(),
+}
