@@ -76,7 +76,7 @@ pegasus_with_server() { # COMMAND...
     fi
     [ -z "$root" ] || fail "$SERVER_DOWN" "it must run to forget a registration: start it, and run this again" || return
     need_tools cimserver cimprovider cimcli || return
-    say "only a running server forgets a registration: it is started for this, without network, and stopped again"
+    say "only a running server forgets a registration: it $([ -n "$dry_run" ] && echo "would be" || echo is) started for this, without network"
     run cimserver enableHttpConnection=false enableHttpsConnection=false || return
     local result=0
     if [ -z "$dry_run" ]; then

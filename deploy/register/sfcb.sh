@@ -10,6 +10,7 @@ sfcb_folders() {
     sfcb_schema_folder=$root/usr/share/sfcb/CIM
     sfcb_schema=${schema:-$(remembered schema server)}
     sfcb_interop=${interop:-$(remembered interop root/interop)}
+    sfcb_complete_schema
     sfcb_providers=()
     for folder in $(setting "$sfcb_settings" providerDirs "/usr/lib64 /usr/lib /usr/lib64/cmpi /usr/lib/cmpi"); do
         case $folder in */cmpi) sfcb_providers=("$root$folder" ${sfcb_providers[@]+"${sfcb_providers[@]}"}) ;;
@@ -18,15 +19,24 @@ sfcb_folders() {
     done
 }
 
-# What belongs into the staging folder: the installed file, and its place there.
+# What belongs into the staging folder: the file, and its place there.
 sfcb_staged() {
-    if [ "$sfcb_schema" = own ]; then
-        printf '%s\n' "mof/kldr_qualifiers.mof mofs/$NAMESPACE/10_kldr_qualifiers.mof" \
-            "mof/kldr_structure.mof mofs/$NAMESPACE/11_kldr_structure.mof"
-    fi
-    printf '%s\n' "mof/kldrprovider.mof mofs/$NAMESPACE/20_kldrprovider.mof" \
-        "mof/kldr_interop.mof mofs/$sfcb_interop/60_kldr_interop.mof" \
-        "registration/kldrprovider.sfcb regs/kldrprovider.reg"
+    [ "$sfcb_schema" = server ] || printf '%s\n' "$sfcb_complement mofs/$NAMESPACE/11_kldr_structure.mof"
+    printf '%s\n' "$share/mof/kldrprovider.mof mofs/$NAMESPACE/20_kldrprovider.mof" \
+        "$share/mof/kldr_interop.mof mofs/$sfcb_interop/60_kldr_interop.mof" \
+        "$share/registration/kldrprovider.sfcb regs/kldrprovider.reg"
+}
+
+# sfcbrepos puts the server's schema before whatever is staged, and no class may come twice: of our structure only those classes
+# are staged that it lacks. Sets `sfcb_complement`.
+sfcb_complete_schema() {
+    [ "$sfcb_schema" = own ] || return 0
+    sfcb_complement=$(mktemp) && trap 'rm -f "$sfcb_complement"' EXIT
+    awk -v names=" $(sfcb_schema_lacks "$(classes_in "$share/mof/kldr_structure.mof")" | tr '\n' ' ')" '
+        { block = block $0 "\n" }
+        /^class / { name = $2 }
+        /^};/ { if (index(names, " " name " ")) printf "%s", block; block = "" }' \
+        "$share/mof/kldr_structure.mof" >"$sfcb_complement"
 }
 
 # What of ours stands there, from whichever release and with whichever options.
@@ -37,7 +47,7 @@ sfcb_found_staged() {
 sfcb_stages_all() {
     local file place
     while read -r file place; do
-        same "$share/$file" "$sfcb_stage/$place" || { printf '%s\n' "$place"; return 1; }
+        same "$file" "$sfcb_stage/$place" || { printf '%s\n' "$place"; return 1; }
     done < <(sfcb_staged)
     [ "$(sfcb_found_staged | sort)" = "$(sfcb_staged | cut -d' ' -f2 | sort)" ] || { echo "something else of ours"; return 1; }
 }
@@ -74,22 +84,21 @@ sfcb_is_complete() {
     some_folder_has_library "${sfcb_providers[@]}" && sfcb_stages_all && sfcb_knows_all && sfcb_has_classes
 }
 
-# Superclasses of the product classes that the server's CIM Schema lacks.
-sfcb_schema_gaps() {
-    local needed
-    needed=$(sed -n 's/^class [A-Za-z0-9_]* : \(CIM_[A-Za-z0-9_]*\).*/\1/p' "$share/mof/kldrprovider.mof" | sort -u)
-    names_without "$needed" "$(sed -n 's|^#pragma include *("\(.*/\)*\(CIM_[A-Za-z0-9_]*\)\.mof").*|\2|p' \
-        "$sfcb_schema_folder/CIM_Schema.mof"; classes_in "$sfcb_schema_folder/CIM_Schema.mof")"
+# Of these classes, those that the server's CIM Schema does not have.
+sfcb_schema_lacks() { # NAMES
+    local file=$sfcb_schema_folder/CIM_Schema.mof
+    names_without "$1" "$(sed -n 's|^#pragma include *("\(.*/\)*\(CIM_[A-Za-z0-9_]*\)\.mof").*|\2|p' "$file"; classes_in "$file")"
 }
 
 sfcb_schema_suffices() {
-    local gaps
-    [ "$sfcb_schema" = server ] || return 0
+    local needed gaps
     [ -e "$sfcb_schema_folder/CIM_Schema.mof" ] ||
-        fail "$FAILED" "no CIM Schema in $sfcb_schema_folder: install the server's schema, or use --schema own" || return
-    gaps=$(sfcb_schema_gaps) || return 0
+        fail "$FAILED" "no CIM Schema in $sfcb_schema_folder: install the one that comes with the server" || return
+    [ "$sfcb_schema" = server ] || return 0
+    needed=$(sed -n 's/^class [A-Za-z0-9_]* : \(CIM_[A-Za-z0-9_]*\).*/\1/p' "$share/mof/kldrprovider.mof" | sort -u)
+    gaps=$(sfcb_schema_lacks "$needed") || return 0
     fail "$FAILED" "the CIM Schema in $sfcb_schema_folder lacks $(in_words <<<"$gaps"):" \
-        "use --schema own, or install one that is newer or has the experimental classes"
+        "use --schema own, or install one that is newer or has the experimental classes; nothing was changed"
 }
 
 # Makes repository and registration from a copy of all that is staged, ours included or not, and changes what is in use only
@@ -120,7 +129,7 @@ sfcb_restage() { # STAGE with|without
     done
     if [ "$2" = with ]; then
         while read -r file place; do
-            place "$share/$file" "$1/$place" || return
+            place "$file" "$1/$place" || return
         done < <(sfcb_staged)
     else
         rmdir "$1/mofs/$NAMESPACE" 2>/dev/null || true
@@ -148,8 +157,7 @@ sfcb_install() {
         say "already registered: $(sfcb_known) classes"
         return
     fi
-    need_tools sfcbrepos && sfcb_schema_suffices || return
-    link_library "${sfcb_providers[@]}" && sfcb_rebuild with || return
+    need_tools sfcbrepos && sfcb_schema_suffices && sfcb_rebuild with && link_library "${sfcb_providers[@]}" || return
     remember "tools=$(folders_of_tools sfcbrepos sfcbdump)" "schema=$sfcb_schema" "interop=$sfcb_interop" || return
     sfcb_conclude "registered: the server will know the module when it starts"
 }
@@ -187,17 +195,16 @@ sfcb_check() {
 
 # One real question, as a client asks it. A server that wants a password is not asked twice.
 sfcb_answers() {
-    local port answer
+    local port answer reason="no instance"
     [ "$(setting "$sfcb_settings" enableHttp true)" = true ] || { echo "it takes no HTTP"; return 2; }
     port=$(setting "$sfcb_settings" httpPort 5988)
     answer=$(enumerate_names "$port") || { echo "no answer on port $port"; return 2; }
     case $answer in
         *"<INSTANCENAME "*) return 0 ;;
         HTTP*" 401"*) echo "it asks for a name and a password"; return 2 ;;
-        *"<ERROR "*) sed -n 's/.*<ERROR CODE="\([0-9]*\)" DESCRIPTION="\([^"]*\)".*/error \1, \2/p' <<<"$answer" ;;
-        *) echo "no instance" ;;
+        *"<ERROR "*) reason=$(sed -n 's/.*<ERROR CODE="\([0-9]*\)" DESCRIPTION="\([^"]*\)".*/error \1, \2/p' <<<"$answer") ;;
     esac
-    echo "restart it if it was not restarted since"
+    echo "$reason; restart it if it was not restarted since"
     return 1
 }
 

@@ -80,8 +80,11 @@ class Server:
         self._wait(self.listens, "it does not listen")
 
     def stop(self):
-        """Stops it as its administrator does, and returns when all its processes have ended."""
-        subprocess.run([self.home / "stop"], env=self.environment(), check=False, capture_output=True, timeout=120)
+        """Stops it as its administrator does, and returns when all its processes have ended; sfcb sometimes needs force."""
+        done = subprocess.run([self.home / "stop"], env=self.environment(), check=False, capture_output=True, timeout=120)
+        if done.returncode and self.kind == "sfcb":
+            print(f"{self.kind} does not end, and is killed: {done.stderr.decode()}", flush=True)
+            self.kill()
         self._wait(lambda: not self.running(), "its processes do not end")
 
     def kill(self):
@@ -119,6 +122,7 @@ class Server:
         return cim_question.count(self.ask("EnumerateInstanceNames", class_name, namespace), "INSTANCENAME")
 
     def prepare(self):
-        """Brings the server's files to the places where an installation has them, by a first start, and stops it again."""
+        """Brings the server's files to the places where an installation has them, by a first start, and ends it again."""
         self.start()
-        self.stop()
+        # sfcb, told to end while it is still starting, may hang.
+        self.kill() if self.kind == "sfcb" else self.stop()
