@@ -34,7 +34,9 @@ pegasus_knows() {
     fi
     local instances=$pegasus_repository/${pegasus_interop//\//#}/instances
     [ -d "$instances" ] && [ -r "$instances" ] || { echo "$instances cannot be read"; return 2; }
-    grep -qs "^0 .*Name=\"$SERVER_MODULE\"" "$instances/PG_ProviderModule.idx"
+    [ -e "$instances/PG_ProviderModule.idx" ] || return 1
+    [ -r "$instances/PG_ProviderModule.idx" ] || { echo "$instances/PG_ProviderModule.idx cannot be read"; return 2; }
+    grep -q "^0 .*Name=\"$SERVER_MODULE\"" "$instances/PG_ProviderModule.idx"
 }
 
 # The classes of a namespace, one a line; a namespace that is not there has none.

@@ -10,6 +10,7 @@ sfcb_folders() {
     sfcb_schema_folder=$root/usr/share/sfcb/CIM
     sfcb_schema=${schema:-$(remembered schema server)}
     sfcb_interop=${interop:-$(remembered interop root/interop)}
+    sfcb_complement=
     sfcb_complete_schema
     sfcb_providers=()
     for folder in $(setting "$sfcb_settings" providerDirs "/usr/lib64 /usr/lib /usr/lib64/cmpi /usr/lib/cmpi"); do
@@ -30,7 +31,7 @@ sfcb_staged() {
 # sfcbrepos puts the server's schema before whatever is staged, and no class may come twice: of our structure only those classes
 # are staged that it lacks. Sets `sfcb_complement`.
 sfcb_complete_schema() {
-    [ "$sfcb_schema" = own ] || return 0
+    [ "$sfcb_schema" = own ] && [ -e "$sfcb_schema_folder/CIM_Schema.mof" ] || return 0
     sfcb_complement=$(mktemp) && trap 'rm -f "$sfcb_complement"' EXIT
     awk -v names=" $(sfcb_schema_lacks "$(classes_in "$share/mof/kldr_structure.mof")" | tr '\n' ' ')" '
         { block = block $0 "\n" }
@@ -41,7 +42,7 @@ sfcb_complete_schema() {
 
 # What of ours stands there, from whichever release and with whichever options.
 sfcb_found_staged() {
-    (cd "$sfcb_stage" 2>/dev/null && find mofs regs -name '*_kldr_*.mof' -o -name '*_kldrprovider.mof' -o -name kldrprovider.reg)
+    (cd "$sfcb_stage" && find mofs regs -name '*_kldr_*.mof' -o -name '*_kldrprovider.mof' -o -name kldrprovider.reg) 2>/dev/null
 }
 
 sfcb_stages_all() {

@@ -1,77 +1,53 @@
-"""The folders of CIM servers below a root, and stand-ins for their tools, which do what matters here and keep a record."""
+"""The folders of CIM servers below a root, and tools that fail, in ways that the real ones of tests/servers/ cannot be brought to."""
 
-import textwrap
 from pathlib import Path
 
 from deploy_case import PROGRAMS
 
-REGISTRATION = "KLDRProviderModule"
-
-TOOLS = {
-    # Makes the registration anew from all that is staged.
-    "sfcbrepos": """
-        cat "$FAKE_ROOT"/var/lib/sfcb/stage/default.reg "$FAKE_ROOT"/var/lib/sfcb/stage/regs/*.reg \\
-            >"$FAKE_ROOT/var/lib/sfcb/registration/providerRegister" 2>/dev/null
-        true""",
-    # Both compilers: last argument a file, one argument -nNAMESPACE.
-    "cimmofl": """
-        for word in "$@"; do case $word in -n*) namespace=${word#-n} ;; esac; file=$word; done
-        folder=$FAKE_ROOT/var/lib/Pegasus/repository/$(echo "$namespace" | tr / '#')
-        mkdir -p "$folder"
-        cp "$file" "$folder/"
-        """,
-    "cimprovider": """
-        file=$FAKE_ROOT/var/lib/Pegasus/repository/root#PG_InterOp/kldrprovider.pegasus.mof
-        case $1 in -l) [ -e "$file" ] ;; -r) rm "$file" ;; esac
-        """,
-    "cimcli": "true",
-}
-TOOLS["cimmof"] = TOOLS["cimmofl"]
+TOOLS = ("sfcbrepos", "sfcbdump", "cimmofl", "cimmof", "cimprovider", "cimcli", "cimserver")
 
 
 class Fake_Servers:
     def __init__(self, root):
         self.root = Path(root)
         self.tools = self.root / "tools"
-        self.record = self.root / "calls"
         self.tools.mkdir()
         for name in TOOLS:
             self.tool(name)
 
-    def tool(self, name, status=0, words=""):
-        """Puts the tool there, to succeed or to fail with these words."""
-        body = textwrap.dedent(TOOLS[name]) if not status else f'echo "{words}" >&2; exit {status}'
+    def tool(self, name, status=1, words=""):
+        """Puts the tool there, to say these words and end with this status."""
+        said = self.tools / f"{name}.words"
+        said.write_text(words, encoding="utf-8")
         file = self.tools / name
-        file.write_text(f'#!/bin/bash\necho "{name} $*" >>"$FAKE_ROOT/calls"\n{body}\n', encoding="utf-8")
+        file.write_text(f'#!/bin/sh\necho "$*" >>"{self.tools}/{name}.calls"\ncat "{said}" >&2\nexit {status}\n', encoding="utf-8")
         file.chmod(0o755)
 
-    def without(self, name):
-        (self.tools / name).unlink()
+    def calls(self, name):
+        """How the tool was called, the root taken out."""
+        record = self.tools / f"{name}.calls"
+        return record.read_text(encoding="utf-8").replace(str(self.root), "").splitlines() if record.exists() else []
 
     def environment(self):
-        return {"PATH": f"{self.tools}:{PROGRAMS}", "FAKE_ROOT": str(self.root), "LC_ALL": "C"}
+        return {"PATH": f"{self.tools}:{PROGRAMS}", "LC_ALL": "C.UTF-8"}
 
-    def calls(self):
-        """The tools called since the last look, the root taken out."""
-        if not self.record.exists():
-            return []
-        lines = self.record.read_text(encoding="utf-8").replace(str(self.root), "").splitlines()
-        self.record.unlink()
-        return lines
-
-    def sfcb(self, settings="", schema=True):
+    def sfcb(self, schema):
+        """`schema` are the names of the classes that the server's CIM Schema includes."""
         for folder in ("etc/sfcb", "var/lib/sfcb/registration", "var/lib/sfcb/stage/regs", "usr/share/sfcb/CIM", "usr/lib"):
             (self.root / folder).mkdir(parents=True, exist_ok=True)
-        (self.root / "etc/sfcb/sfcb.cfg").write_text(settings, encoding="utf-8")
-        (self.root / "var/lib/sfcb/stage/default.reg").write_text("[Other]\n   location: other\n", encoding="utf-8")
-        if schema:
-            (self.root / "usr/share/sfcb/CIM/CIM_Schema.mof").touch()
+        (self.root / "etc/sfcb/sfcb.cfg").touch()
+        (self.root / "usr/share/sfcb/CIM/CIM_Schema.mof").write_text(
+            "".join(f'#pragma include ("Core/{name}.mof")\n' for name in schema), encoding="utf-8"
+        )
 
     def pegasus(self):
-        for folder in ("etc/Pegasus", "var/lib/Pegasus/repository/root#PG_InterOp", "usr/lib/Pegasus/providers"):
+        for folder in ("etc/Pegasus", "var/lib/Pegasus/repository/root#PG_InterOp/instances", "usr/lib/Pegasus/providers"):
             (self.root / folder).mkdir(parents=True, exist_ok=True)
 
-    def files(self, folder):
-        """Names of the files and links below a folder of the root."""
-        top = self.root / folder
-        return sorted(str(path.relative_to(top)) for path in top.rglob("*") if path.is_symlink() or path.is_file())
+    def files(self):
+        """Paths of the files and links below the root, those of the tools left out."""
+        return sorted(
+            str(path.relative_to(self.root))
+            for path in self.root.rglob("*")
+            if (path.is_symlink() or path.is_file()) and self.tools not in path.parents
+        )

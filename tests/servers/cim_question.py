@@ -43,6 +43,3 @@ def ask(port, namespace, method, class_name, timeout=30):
         raise Cim_Error(int(error[1]), error[2] or "")
     return answer
 
-
-def count(answer, element):
-    return len(re.findall(rf"<{element}[ />]", answer))

@@ -118,8 +118,8 @@ class Server:
         return cim_question.ask(self.port, namespace, method, class_name)
 
     def instances(self, class_name, namespace=NAMESPACE):
-        """How many instances it names."""
-        return cim_question.count(self.ask("EnumerateInstanceNames", class_name, namespace), "INSTANCENAME")
+        """How many instances of just this class it names."""
+        return self.ask("EnumerateInstanceNames", class_name, namespace).count(f'<INSTANCENAME CLASSNAME="{class_name}"')
 
     def prepare(self):
         """Brings the server's files to the places where an installation has them, by a first start, and ends it again."""

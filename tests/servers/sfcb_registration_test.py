@@ -1,5 +1,6 @@
 """sfcb alone: a CIM Schema that lacks a class, a class repository that lacks ours, and a server that was not restarted."""
 
+import os
 import re
 import shutil
 from pathlib import Path
@@ -39,7 +40,7 @@ class Sfcb(ServerCase):
         self.assertEqual(package.register("install"), ["sfcb: already registered: 76 classes"])
         self.check()
         self.server.start()
-        self.assertEqual(self.server.instances("KALDERA_ProductElementComponent"), 9)
+        self.assertEqual(self.server.instances("KALDERA_ProductElementComponent"), 3)
 
     def test_a_repository_without_our_classes_is_no_registration(self):
         # What is left where sfcbrepos was run by hand, and failed half way.
@@ -65,6 +66,16 @@ class Sfcb(ServerCase):
         self.assertIn("restart it if it was not restarted since", line)
         self.server.restart()
         self.check()
+
+    def test_a_link_of_the_installation_is_used_and_stays(self):
+        link = Path("/usr/lib/cmpi/libkldrprovider_Module.so")
+        with open("/etc/sfcb/sfcb.cfg", "a", encoding="utf-8") as settings:
+            settings.write(f"providerDirs: {self.server.home}/usr/lib/sfcb {self.server.home}/usr/lib {link.parent}\n")
+        self.assertNotIn("ln -s", "\n".join(package.register("install")))
+        self.server.start()
+        self.assertEqual(self.server.instances("KALDERA_PortController"), 3)
+        package.register("remove")
+        self.assertEqual(os.readlink(link), f"../cim/{link.name}")
 
     @long
     def test_static_instances_of_others_stay(self):
