@@ -196,10 +196,15 @@ sfcb_check() {
 
 # One real question, as a client asks it. A server that wants a password is not asked twice.
 sfcb_answers() {
-    local port answer reason="no instance"
+    local port answer="" reason="no instance"
     [ "$(setting "$sfcb_settings" enableHttp true)" = true ] || { echo "it takes no HTTP"; return 2; }
     port=$(setting "$sfcb_settings" httpPort 5988)
-    answer=$(enumerate_names "$port") || { echo "no answer on port $port"; return 2; }
+    # One that has just been started does not listen yet.
+    for _ in {1..10}; do
+        ! answer=$(enumerate_names "$port") || break
+        sleep 0.5
+    done
+    [ -n "$answer" ] || { echo "no answer on port $port"; return 2; }
     case $answer in
         *"<INSTANCENAME "*) return 0 ;;
         HTTP*" 401"*) echo "it asks for a name and a password"; return 2 ;;

@@ -12,15 +12,21 @@ NAME = "kldrprovider"
 LIBRARY_FOLDER = Path("/usr/lib/cim")
 
 
-def run(*command, path=ADMINISTRATOR, status=0, **options):
+def run(*command, path=ADMINISTRATOR, status=0, environment=None, **options):
     """Output and complaints together, of a command that must end with this status."""
-    done = subprocess.run(
-        [str(word) for word in command], env={"PATH": path, "HOME": "/root", "LC_ALL": "C.UTF-8", "DEBIAN_FRONTEND": "noninteractive"},
-        stdout=subprocess.PIPE, stderr=subprocess.STDOUT, stdin=subprocess.DEVNULL, text=True, check=False, timeout=300, **options,
-    )  # fmt: skip
+    # A program that goes on in the background may keep the output: a file ends nevertheless.
+    with tempfile.TemporaryFile(mode="w+", encoding="utf-8") as output:
+        done = subprocess.run(
+            [str(word) for word in command], check=False, timeout=300, stdin=subprocess.DEVNULL, stdout=output,
+            stderr=subprocess.STDOUT,
+            env={"HOME": "/root", "LC_ALL": "C.UTF-8", "DEBIAN_FRONTEND": "noninteractive", "PATH": path, **(environment or {})},
+            **options,
+        )  # fmt: skip
+        output.seek(0)
+        shown = output.read()
     if done.returncode != status:
-        raise AssertionError(f"{' '.join(map(str, command))}: status {done.returncode}, not {status}\n{done.stdout}")
-    return done.stdout
+        raise AssertionError(f"{' '.join(map(str, command))}: status {done.returncode}, not {status}\n{shown}")
+    return shown
 
 
 def install(file=None):
