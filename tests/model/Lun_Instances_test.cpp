@@ -109,20 +109,25 @@ TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
 
 TEST_F(Lun_Instances, names_of_full_fields_are_whole)
 {
-    const auto fill = [](auto& field, char with) {
-        const std::string text(sizeof field - 1, with);
-        copy_text(field, text);
-        return text;
+    // What is longer is cut where the record is filled.
+    const auto fill = [](auto& field, size_t size, char with) {
+        copy_text(field, std::string(size + 1, with));
+        return std::string(size, with);
     };
-    const std::string vendor = fill(lun.vendor, 'v');
-    const std::string product = fill(lun.productID, 'p');
-    const std::string serial = fill(lun.serialNumber, 's');
-    const std::string remote = fill(lun.remoteWWN, 'r');
-    const std::string local = fill(port.portWWN, 'l');
+    const std::string vendor = fill(lun.vendor, 8, 'v');
+    const std::string product = fill(lun.productID, 16, 'p');
+    const std::string serial = fill(lun.serialNumber, 64, 's');
+    const std::string remote = fill(lun.remoteWWN, 23, 'r');
+    const std::string local = fill(port.portWWN, 47, 'l');
+    const std::string description = fill(lun.description, 64, 'd');
+    const std::string device = fill(lun.deviceName, 64, 'n');
     lun.number = 2147483648;
     Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
     EXPECT_EQ(extent["Name"], vendor + "+" + product + "+" + serial);
     EXPECT_EQ(extent["DeviceID"], local + "_" + remote + "_" + vendor + "_" + product + "_LUN_-2147483648");
+    lun.idType = 2;
+    EXPECT_EQ(taken(helper->getStorageExtentInstance(port, lun))["Name"], description);
+    EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["Name"], device);
 }
 
 TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
