@@ -19,13 +19,17 @@ class Cim_Error(Exception):
         self.code = code
 
 
-def ask(port, namespace, method, class_name, timeout=30):
-    """The answer's XML to a method that takes a class name: EnumerateInstanceNames, EnumerateInstances, GetClass and so on.
+def ask(port, namespace, method, class_name, properties=None, timeout=30):
+    """The answer's XML to a method that takes a class name: EnumerateInstanceNames, EnumerateInstances, GetClass and so on, with a
+    list of properties if the method takes one.
 
     Raises Cim_Error if the server answers with an error, and OSError or http.client.HTTPException if it does not answer.
     """
     path = "".join(f'<NAMESPACE NAME="{escape(word)}"/>' for word in namespace.split("/"))
     parameters = f'<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="{escape(class_name)}"/></IPARAMVALUE>'
+    if properties is not None:
+        values = "".join(f"<VALUE>{escape(name)}</VALUE>" for name in properties)
+        parameters += f'<IPARAMVALUE NAME="PropertyList"><VALUE.ARRAY>{values}</VALUE.ARRAY></IPARAMVALUE>'
     connection = http.client.HTTPConnection("127.0.0.1", port, timeout=timeout)
     try:
         connection.request(
