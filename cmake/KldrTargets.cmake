@@ -37,6 +37,10 @@ endif()
 if(KLDR_RELEASE)
   # The later map wins, so that a build folder anywhere reads as one in the sources. Whole debug information: it is a package of
   # its own.
+  # A user of ccache may have it make paths relative to a folder, and the debug information would show that.
+  if(KLDR_CCACHE)
+    list(PREPEND CMAKE_CXX_COMPILER_LAUNCHER ${CMAKE_COMMAND} -E env CCACHE_BASEDIR=)
+  endif()
   include(CheckPIESupported)
   check_pie_supported()
   add_compile_options(-g -ffile-prefix-map=${CMAKE_SOURCE_DIR}=. -ffile-prefix-map=${CMAKE_BINARY_DIR}=./build
