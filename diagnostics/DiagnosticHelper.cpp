@@ -130,9 +130,6 @@ DiagnosticJob DiagnosticHelper::createDiagnosticJob(const DiagnosticTestInput* i
     job.instance_id = job_id_of(ProviderUtil::getDiagTestName(input->test_id), getNextJobID());
     job.start_time = Datetime::now();
     job.elapsed_time = Datetime(uint64(0));
-    Ref<KALDERA_ConcreteJob> instance(create<KALDERA_ConcreteJob>(true));
-    instance->InstanceID.set(job.instance_id);
-    job.instance = instance.steal();
     return job;
 }
 
@@ -142,7 +139,6 @@ void DiagnosticHelper::addDiagnosticJob(const DiagnosticJob& job)
     const Auto_Mutex lock(_jobs.lock);
     _jobs.entries.clear();
     _jobs.entries.push_back(job);
-    _jobs.entries.back().instance = nullptr;
 }
 
 bool DiagnosticHelper::isAnyJobRunning()

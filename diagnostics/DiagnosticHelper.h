@@ -4,6 +4,7 @@
 #include "diagnostics/Diagnostic_Tests.h"
 #include "runtime/Array.h"
 #include "runtime/Mutex.h"
+#include "schema/KALDERA_ConcreteJob.h"
 #include "schema/KALDERA_DiagnosticSoftwareIdentity.h"
 #include "schema/KALDERA_EthLoopbackDiagnosticTest.h"
 #include "schema/KALDERA_LoopbackDiagnosticTest.h"
@@ -99,7 +100,7 @@ public:
 
     // What a run leaves behind.
 
-    /// A new job of the input, with an instance that the caller owns. It is in no list yet.
+    /// A new job of the input. It is in no list yet.
     DiagnosticJob createDiagnosticJob(const DiagnosticTestInput* input);
     /// Puts a job in the place of the one before, whatever the state of that.
     void addDiagnosticJob(const DiagnosticJob& job);

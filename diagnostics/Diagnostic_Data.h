@@ -3,7 +3,6 @@
 #include "adapter/ProviderUtil.h"
 #include "diagnostics/Tested_Element.h"
 #include "runtime/Datetime.h"
-#include "schema/KALDERA_ConcreteJob.h"
 
 namespace KPRV {
 
@@ -42,8 +41,6 @@ struct DiagnosticTestInput : Tested_Element
 /// One run, as clients follow it.
 struct DiagnosticJob : Tested_Element
 {
-    /// For the client that started the run; null in the helper's list, since it belongs to the answer.
-    KALDERA_ConcreteJob* instance = nullptr;
     /// Test name, "-", job number.
     String instance_id;
     uint16 job_state = JOB_RUNNING;

@@ -97,7 +97,8 @@ Run_Result DiagnosticHelper::start(const Diagnostic_Test& test, std::unique_ptr<
     input->helper = this;
     LOG(INFO, "Creating the Job instance.");
     const DiagnosticJob job = createDiagnosticJob(input.get());
-    Ref<KALDERA_ConcreteJob> instance(job.instance);
+    Ref<KALDERA_ConcreteJob> instance(create<KALDERA_ConcreteJob>(true));
+    instance->InstanceID.set(job.instance_id);
     input->job_id = job.instance_id;
     // Between the check for a running test and here no lock is held: two starts at the same moment can both
     // come through. The later job then takes the place of the other, and both tests run.

@@ -46,7 +46,6 @@ protected:
     DiagnosticJob add_job()
     {
         DiagnosticJob job = helper.createDiagnosticJob(&input);
-        unref(job.instance);
         helper.addDiagnosticJob(job);
         return job;
     }

@@ -131,7 +131,6 @@ private:
         input.mode = row.mode;
         input.helper = &helper;
         const DiagnosticJob job = helper.createDiagnosticJob(&input);
-        destroy(job.instance);
         input.job_id = job.instance_id;
         helper.addDiagnosticJob(job);
         return input;
