@@ -5,6 +5,7 @@
 #include "adapter/ProviderUtil_Log.h"
 
 #include <cstdio>
+#include <iterator>
 
 namespace KPRV {
 
@@ -35,7 +36,8 @@ void ProviderUtil::logMsg(int level, const char* file, int line, const char* tex
     // The library's levels 1 to 5; level 5 has no equal here and is worth no more than INFO.
     constexpr Log_Level levels[] = {Log_Level::DBG,  Log_Level::DBG, Log_Level::INFO,
                                     Log_Level::WARN, Log_Level::ERR, Log_Level::INFO};
-    const Log_Level own = level >= 1 && level <= 5 ? levels[level] : Log_Level::DBG;
+    const size_t index = level;
+    const Log_Level own = index < std::size(levels) ? levels[index] : Log_Level::DBG;
 
     char head[32];
     snprintf(head, sizeof head, "%s:%d ", file ? file : "", line);
