@@ -25,32 +25,32 @@ static String string_of(const CMPIString* string)
 }
 
 template <class T>
-static int load_scalar(const CMPIValue& value, T& x)
+static bool load_scalar(const CMPIValue& value, T& x)
 {
     x = load_plain<T>(value);
-    return 0;
+    return true;
 }
 
-static int load_scalar(const CMPIValue& value, String& x)
+static bool load_scalar(const CMPIValue& value, String& x)
 {
     x = string_of(value.string);
-    return 0;
+    return true;
 }
 
-static int load_scalar(const CMPIValue& value, Datetime& x)
+static bool load_scalar(const CMPIValue& value, Datetime& x)
 {
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPIString* const string = value.dateTime ? CMGetStringFormat(value.dateTime, &status) : nullptr;
     const char* const text = string && status.rc == CMPI_RC_OK ? CMGetCharPtr(string) : nullptr;
     if (!text) {
         LOG_CONVERSION(WARN, "CMGetStringFormat() failed");
-        return -1;
+        return false;
     }
     if (!x.set(text)) {
         LOG_CONVERSION(WARN, "conversion error");
-        return -1;
+        return false;
     }
-    return 0;
+    return true;
 }
 
 template <class T>
@@ -75,7 +75,7 @@ struct to_cimple_array_value
                 return -1;
             }
             T x = T();
-            if (load_scalar(element.value, x) != 0)
+            if (!load_scalar(element.value, x))
                 return -1;
             elements.append(x);
         }
@@ -223,7 +223,7 @@ int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* br
         if (type & Value::ARRAY_BIT)
             return to_cimple_array_value<T>::func(repository, data, value);
         T x = T();
-        if (load_scalar(data.value, x) != 0)
+        if (!load_scalar(data.value, x))
             return -1;
         value.set_value(std::move(x));
         return 0;
