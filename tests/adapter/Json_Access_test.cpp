@@ -60,6 +60,24 @@ TEST(Json_Access, texts_are_texts_and_numbers_are_numbers)
         EXPECT_EQ(failure(asUInt, text), "Type is not convertible to uint") << text;
 }
 
+TEST(Json_Access, numbers_reach_to_the_limits_of_their_types)
+{
+    // Each as an integer and as a real number.
+    for (const char* end : {"", ".0"}) {
+        const auto number = [end](const char* digits) { return json(std::string(digits) + end); };
+        EXPECT_EQ(asInt(number("2147483647")), 2147483647);
+        EXPECT_EQ(asInt(number("-2147483648")), -2147483647 - 1);
+        EXPECT_EQ(asUInt(number("4294967295")), 4294967295u);
+        EXPECT_EQ(asUInt(number("0")), 0u);
+        EXPECT_THROW(asInt(number("2147483648")), Not_Convertible);
+        EXPECT_THROW(asInt(number("-2147483649")), Not_Convertible);
+        EXPECT_THROW(asUInt(number("4294967296")), Not_Convertible);
+        EXPECT_THROW(asUInt(number("-1")), Not_Convertible);
+    }
+    EXPECT_EQ(asInt(Json::Value(2147483647u)), 2147483647);
+    EXPECT_THROW(asInt(Json::Value(2147483648u)), Not_Convertible);
+}
+
 TEST(Json_Access, everything_is_true_or_false)
 {
     for (const char* text : {"true", "1", "-1", "0.5", "'x'", "[0]", "{'a': 0}"})

@@ -271,6 +271,13 @@ TEST_F(ProviderUtil_Adapters, adapter_ids)
     EXPECT_EQ(library.told()[2], R"(getAdapterId {"indexStr":"10:00:8c:7c:ff:00:00:01"})");
     EXPECT_EQ(log.said("ERR"), Lines{});
     library.calls.clear();
+    log.clear();
+    ProviderUtil::getAdapterId("8c7cff000002");
+    EXPECT_EQ(log.traces(),
+              (Lines{"DBG Entering: getAdapterId", "DBG Entering: getAdapterIdByIndexStr",
+                     "DBG Returning: getAdapterIdByIndexStr", "DBG Returning: getAdapterId"}));
+    log.clear();
+    library.calls.clear();
     EXPECT_EQ(ProviderUtil::getAdapterId(WWN), -1);
     EXPECT_EQ(log.said("ERR"), Lines{"ERR The address passed is not MAC or WWN"});
     EXPECT_TRUE(library.calls.empty());

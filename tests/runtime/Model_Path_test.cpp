@@ -242,6 +242,21 @@ TEST(Model_Path_read, TheFormIsAsked)
     EXPECT_TRUE(read<Sample_Port>("Sample_Port.Name=\"p\"Number=5"));
 }
 
+TEST(Model_Path_read, NamesAreOfLettersDigitsAndUnderscores)
+{
+    const auto reads_name = [](const char* name) {
+        const Meta_Class named = {
+            {{0, FLAG_CLASS, name, nullptr, 0}}, nullptr, 0, sizeof(Instance), nullptr, nullptr, 0, nullptr};
+        const Ref<Instance> instance(model_path_to_instance(&named, (std::string(name) + ".").c_str()));
+        return bool(instance);
+    };
+    for (const char* name : {"_", "a", "z", "A", "Z", "A_azAZ09", "__9", "_0"})
+        EXPECT_TRUE(reads_name(name)) << name;
+    // Those behind and before the ranges.
+    for (const char* name : {"0", "9", "@A", "A@", "A[", "[A", "A`", "`A", "A{", "{A", "A/", "A:"})
+        EXPECT_FALSE(reads_name(name)) << name;
+}
+
 TEST(Model_Path_read, OnlyKeysAreBound)
 {
     EXPECT_FALSE(element_reads("Sample_Element.Caption=\"c\""));
