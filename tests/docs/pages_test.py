@@ -1,0 +1,95 @@
+"""Whether what the pages name is there, and what they say of the code is what the code says."""
+
+import re
+import unittest
+from pathlib import Path
+
+ROOT = Path(__file__).resolve().parents[2]
+DESIGN = ROOT / "docs/design"
+SOURCES = (".h", ".cpp", ".def", ".py", ".mof", ".md", ".json", ".map", ".sh", ".supp", ".cmake", ".txt", ".svg")
+NO_PART = {"build", ".git"}
+
+
+def read(path):
+    return path.read_text(encoding="utf-8")
+
+
+def tree():
+    return [file for entry in ROOT.iterdir() if entry.name not in NO_PART
+            for file in ([entry] if entry.is_file() else entry.rglob("*")) if file.is_file()]
+
+
+def pages():
+    return [file for file in tree() if file.suffix == ".md"]
+
+
+def prose(text):
+    """A page without its fenced blocks."""
+    return re.sub(r"^ *(```+).*?^ *\1$", "", text, flags=re.M | re.S)
+
+
+def rows(page, *heads):
+    """The rows of the table of a page that has these heads, without their back quotes."""
+    found = None
+    for line in read(page).splitlines():
+        cells = [cell.strip() for cell in line.strip().strip("|").split("|")] if line.startswith("|") else None
+        if cells is None:
+            if found:
+                break
+            found = None
+        elif found is not None:
+            if set("".join(cells)) - set("-: "):
+                found.append([cell.replace("`", "") for cell in cells])
+        elif cells == list(heads):
+            found = []
+    return found or []
+
+
+class Named(unittest.TestCase):
+    def test_links_lead_somewhere(self):
+        for page in pages():
+            for link in re.findall(r"\]\(([^)#\s]+)[^)]*\)", prose(read(page))):
+                if "://" not in link:
+                    self.assertTrue((page.parent / link).exists(), f"{page}: {link}")
+
+    def test_files_of_the_design_pages_exist(self):
+        files = tree()
+        names, paths = {file.name for file in files}, {str(file.relative_to(ROOT)) for file in files}
+        count = 0
+        for page in DESIGN.glob("*.md"):
+            for name in re.findall(r"`([\w./-]+\.\w+)`", prose(read(page))):
+                if name.endswith(SOURCES):
+                    count += 1
+                    self.assertTrue(name in (paths if "/" in name else names), f"{page}: {name}")
+        self.assertGreater(count, 3)
+
+    def test_each_page_is_in_a_list_of_pages(self):
+        lists = read(ROOT / "README.md") + read(ROOT / "CONTRIBUTING.md")
+        for page in (ROOT / "docs").rglob("*.md"):
+            self.assertTrue(f"({page.relative_to(ROOT)})" in lists, page)
+
+
+class Objects(unittest.TestCase):
+    """docs/design/objects.md against the assertions that pin the layouts."""
+
+    @staticmethod
+    def pins():
+        text = read(ROOT / "runtime/layout.cpp")
+        found = {}
+        for record, field, *sizes in re.findall(r"^PIN\(([^,]+), *(\w+), *(\d+), *(\d+)\)", text, re.M):
+            found.setdefault(record, {})[field] = tuple(map(int, sizes))
+        for record, *sizes in re.findall(r"^PIN_SIZE\(([^,]+), *(\d+), *(\d+)\)", text, re.M):
+            found.setdefault(record, {})["sizeof"] = tuple(map(int, sizes))
+        return found
+
+    def test_offsets_are_those_that_are_pinned(self):
+        table = rows(DESIGN / "objects.md", "record", "32 bits", "64 bits")
+        self.assertGreater(len(table), 5)
+        for record, *cells in table:
+            for at, cell in enumerate(cells):
+                told = {name: int(figure) for name, figure in map(str.split, cell.split(","))}
+                self.assertEqual(told, {name: sizes[at] for name, sizes in self.pins()[record].items()}, record)
+
+
+if __name__ == "__main__":
+    unittest.main()
