@@ -29,20 +29,14 @@ def prose(text):
 
 
 def rows(page, *heads):
-    """The rows of the table of a page that has these heads, without their back quotes."""
-    found = None
+    """The rows of the tables of a page that have these heads, without their back quotes."""
+    found, is_inside = [], False
     for line in read(page).splitlines():
-        cells = [cell.strip() for cell in line.strip().strip("|").split("|")] if line.startswith("|") else None
-        if cells is None:
-            if found:
-                break
-            found = None
-        elif found is not None:
-            if set("".join(cells)) - set("-: "):
-                found.append([cell.replace("`", "") for cell in cells])
-        elif cells == list(heads):
-            found = []
-    return found or []
+        cells = [cell.strip().replace("`", "") for cell in line.strip("|").split("|")] if line.startswith("|") else []
+        if is_inside and set("".join(cells)) - set("-"):
+            found.append(cells)
+        is_inside = bool(cells) and (is_inside or cells == list(heads))
+    return found
 
 
 class Named(unittest.TestCase):
@@ -89,6 +83,18 @@ class Objects(unittest.TestCase):
             for at, cell in enumerate(cells):
                 told = {name: int(figure) for name, figure in map(str.split, cell.split(","))}
                 self.assertEqual(told, {name: sizes[at] for name, sizes in self.pins()[record].items()}, record)
+
+
+class Doors(unittest.TestCase):
+    """docs/design/one_request.md: each function stands in the file that is named with it."""
+
+    def test_functions_stand_where_the_page_says(self):
+        table = rows(DESIGN / "one_request.md", "door", "function", "file", "what passes")
+        self.assertGreater(len(table), 30)
+        for _, function, file, _ in table:
+            name = re.escape(function if file.endswith(".cpp") else function.split("::")[-1])
+            # A definition, not a call: at the beginning of a line or behind what it returns.
+            self.assertRegex(read(ROOT / file), rf"(?m)^(?! *return\b)[\w:<>*&, ]*\b{name}\([^;]*({{.*)?$", file)
 
 
 if __name__ == "__main__":
