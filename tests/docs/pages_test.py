@@ -97,5 +97,35 @@ class Doors(unittest.TestCase):
             self.assertRegex(read(ROOT / file), rf"(?m)^(?! *return\b)[\w:<>*&, ]*\b{name}\([^;]*({{.*)?$", file)
 
 
+class Threads(unittest.TestCase):
+    """docs/design/threads.md against the locks in the code."""
+
+    #: What is never part of a running product.
+    ELSEWHERE = {"bench", "cmake", "deploy", "docs", "fuzz", "schema", "tests", "tools"}
+    LOCK = re.compile(
+        r"^\s*(?:(?:mutable|static|constinit) )*(?:std::(?:recursive_|shared_)?mutex|Mutex|pthread_mutex_t)"
+        r"(?: (\w+)(?:;|\(| = PTHREAD)|& (\w+) = \*new)", re.M)
+
+    def test_each_lock_is_told_and_no_other(self):
+        there = set()
+        for file in tree():
+            path = file.relative_to(ROOT)
+            # The class Mutex is none itself.
+            if path.parts[0] not in self.ELSEWHERE and file.suffix in (".h", ".cpp") and file.stem != "Mutex":
+                there |= {(one or other, str(path)) for one, other in self.LOCK.findall(read(file))}
+        told = rows(DESIGN / "threads.md", "lock", "file", "fields under it", "while it is held")
+        self.assertGreater(len(there), 20)
+        self.assertEqual({(lock, file) for lock, file, _, _ in told}, there)
+
+    def test_the_fields_are_there(self):
+        for _, file, fields, _ in rows(DESIGN / "threads.md", "lock", "file", "fields under it", "while it is held"):
+            text = read(ROOT / file)
+            source = (ROOT / file).with_suffix(".cpp")
+            if source.exists():
+                text += read(source)
+            for field in fields.split():
+                self.assertRegex(text, rf"\b{field}\b", file)
+
+
 if __name__ == "__main__":
     unittest.main()
