@@ -29,14 +29,18 @@ def prose(text):
 
 
 def rows(page, *heads):
-    """The rows of the tables of a page that have these heads, without their back quotes."""
+    """The rows of the tables of a page that have these heads."""
     found, is_inside = [], False
     for line in read(page).splitlines():
-        cells = [cell.strip().replace("`", "") for cell in line.strip("|").split("|")] if line.startswith("|") else []
+        cells = [cell.strip() for cell in line.strip("|").split("|")] if line.startswith("|") else []
         if is_inside and set("".join(cells)) - set("-"):
             found.append(cells)
         is_inside = bool(cells) and (is_inside or cells == list(heads))
     return found
+
+
+def bare(cells):
+    return [cell.replace("`", "") for cell in cells]
 
 
 class Named(unittest.TestCase):
@@ -79,7 +83,7 @@ class Objects(unittest.TestCase):
     def test_offsets_are_those_that_are_pinned(self):
         table = rows(DESIGN / "objects.md", "record", "32 bits", "64 bits")
         self.assertGreater(len(table), 5)
-        for record, *cells in table:
+        for record, *cells in map(bare, table):
             for at, cell in enumerate(cells):
                 told = {name: int(figure) for name, figure in map(str.split, cell.split(","))}
                 self.assertEqual(told, {name: sizes[at] for name, sizes in self.pins()[record].items()}, record)
@@ -91,7 +95,7 @@ class Doors(unittest.TestCase):
     def test_functions_stand_where_the_page_says(self):
         table = rows(DESIGN / "one_request.md", "door", "function", "file", "what passes")
         self.assertGreater(len(table), 30)
-        for _, function, file, _ in table:
+        for _, function, file, _ in map(bare, table):
             name = re.escape(function if file.endswith(".cpp") else function.split("::")[-1])
             # A definition, not a call: at the beginning of a line or behind what it returns.
             self.assertRegex(read(ROOT / file), rf"(?m)^(?! *return\b)[\w:<>*&, ]*\b{name}\([^;]*({{.*)?$", file)
@@ -115,16 +119,33 @@ class Threads(unittest.TestCase):
                 there |= {(one or other, str(path)) for one, other in self.LOCK.findall(read(file))}
         told = rows(DESIGN / "threads.md", "lock", "file", "fields under it", "while it is held")
         self.assertGreater(len(there), 20)
-        self.assertEqual({(lock, file) for lock, file, _, _ in told}, there)
+        self.assertEqual({(lock, file) for lock, file, _, _ in map(bare, told)}, there)
 
     def test_the_fields_are_there(self):
         for _, file, fields, _ in rows(DESIGN / "threads.md", "lock", "file", "fields under it", "while it is held"):
-            text = read(ROOT / file)
-            source = (ROOT / file).with_suffix(".cpp")
+            header = ROOT / file.strip("`")
+            text, source = read(header), header.with_suffix(".cpp")
             if source.exists():
                 text += read(source)
-            for field in fields.split():
+            for field in re.findall(r"`(\w+)`", fields):
                 self.assertRegex(text, rf"\b{field}\b", file)
+
+
+class Tried(unittest.TestCase):
+    """docs/design/tried.md against the table of docs/performance.md."""
+
+    def test_a_path_costs_what_the_benchmark_says(self):
+        figures = {}
+        for line in read(ROOT / "docs/performance.md").splitlines():
+            found = re.match(r"\| paths by (index|nested loops), ([^,]*?) +\| +([\d,]+) \| +([\d,]+) \|", line)
+            if found:
+                numbers = list(map(int, re.findall(r"\d+", found[2])))
+                module, rival = (int(text.replace(",", "")) / (numbers[0] * numbers[1] * numbers[2]) for text in found.groups()[2:])
+                figures.setdefault(found[1], []).append((f"{module:.1f}", f"{rival:.1f}"))
+        (index, loops), page = (figures["index"], figures["nested loops"]), DESIGN / "tried.md"
+        told = rows(page, "microseconds a path", "2,048 paths", "16,384 paths", "65,536 paths")
+        self.assertEqual([row[1:] for row in told],
+                         [[module for module, _ in index], [rival for _, rival in index], [rival for _, rival in loops]])
 
 
 if __name__ == "__main__":
