@@ -19,7 +19,7 @@ pegasus_folders() {
 
 # Sums of what `install` loads, with the schema and the namespace.
 pegasus_sum() {
-    { (cd "$share" && cksum mof/*.mof registration/kldrprovider.pegasus.mof); echo "$pegasus_schema $pegasus_interop"; } | cksum
+    { (cd "$share" && cksum mof/*.mof registration/kldrprovider.p*.mof); echo "$pegasus_schema $pegasus_interop"; } | cksum
 }
 
 pegasus_compile() { # NAMESPACE FILE
@@ -49,9 +49,9 @@ pegasus_compile_all() {
     for file in "${pegasus_mof[@]}"; do
         pegasus_compile "$NAMESPACE" "$file" || return
     done
-    pegasus_compile "$pegasus_interop" "$share/mof/kldr_interop.mof" || return
     folder=$(mktemp -d) && pegasus_registration >"$folder/kldrprovider.pegasus.mof" &&
-        pegasus_compile "$pegasus_interop" "$folder/kldrprovider.pegasus.mof"
+        pegasus_compile "$pegasus_interop" "$folder/kldrprovider.pegasus.mof" &&
+        pegasus_compile "$pegasus_interop" "$share/registration/kldrprovider.profiles.mof"
     local result=$?
     rm -rf "$folder"
     return "$result"

@@ -103,20 +103,18 @@ pegasus_forget() {
     pegasus_forget_profiles && pegasus_forget_classes
 }
 
-# The profiles that stand in the interop namespace. Their objects' names are those of the installed file.
+# The profiles that stand in the interop namespace; they stay when the module goes. Their names are those of the installed file.
 pegasus_forget_profiles() {
-    local file=$share/mof/kldr_interop.mof class="" word value
+    local file=$share/registration/kldrprovider.profiles.mof provider="" word value
+    local module="ProviderModuleName=\"$SERVER_MODULE\""
     local -a paths=()
     while read -r word value; do
         case $word in
-            class) class=$value ;;
-            key) paths+=("$class.InstanceID=$value") ;;
+            provider) provider=$value ;;
+            key) paths+=("PG_ProviderProfileCapabilities.CapabilityID=$value,$module,ProviderName=$provider") ;;
         esac
-    done < <(sed -n -e 's/^instance of \(KALDERA_[A-Za-z]*\).*/class \1/p' -e 's/^ *InstanceID = \(".*"\);$/key \1/p' "$file")
+    done < <(sed -n -e 's/^ *ProviderName = \(".*"\);$/provider \1/p' -e 's/^ *CapabilityID = \(".*"\);$/key \1/p' "$file")
     pegasus_delete di "$pegasus_interop" "profile registrations" "${paths[@]}"
-    local -a classes
-    mapfile -t classes < <(classes_in "$file" | tac)
-    pegasus_delete dc "$pegasus_interop" "profile classes" "${classes[@]}"
 }
 
 # A class goes after its subclasses. In a namespace that was there before us, only the product classes are ours.

@@ -22,9 +22,10 @@ sfcb_folders() {
 
 # What belongs into the staging folder: the file, and its place there.
 sfcb_staged() {
-    [ "$sfcb_schema" = server ] || printf '%s\n' "$sfcb_complement mofs/$NAMESPACE/11_kldr_structure.mof"
+    [ "$sfcb_schema" = server ] || printf '%s\n' "$sfcb_complement mofs/$NAMESPACE/11_kldr_structure.mof" \
+        "$sfcb_complement mofs/$sfcb_interop/51_kldr_structure.mof"
     printf '%s\n' "$share/mof/kldrprovider.mof mofs/$NAMESPACE/20_kldrprovider.mof" \
-        "$share/mof/kldr_interop.mof mofs/$sfcb_interop/60_kldr_interop.mof" \
+        "$share/mof/kldrprovider.mof mofs/$sfcb_interop/60_kldrprovider.mof" \
         "$share/registration/kldrprovider.sfcb regs/kldrprovider.reg"
 }
 

@@ -5,6 +5,19 @@ from dataclasses import dataclass
 from .module import INTERFACES, MODULE
 
 NAMESPACE = "root/kaldera"
+#: Where clients look for profiles first. sfcb has the module serve it too, so that all that can be reached from a profile is there.
+INTEROP = "root/interop"
+#: What a server tells of itself there, and the associations that end at it. The module asks its server for the object manager
+#: in that namespace: a provider of its own there would ask itself for ever.
+OF_THE_SERVER = {
+    "KALDERA_CIMXMLCommunicationMechanism",
+    "KALDERA_CommMechHostedAccessPoint",
+    "KALDERA_CommMechanismForManager",
+    "KALDERA_Namespace",
+    "KALDERA_NamespaceInManager",
+    "KALDERA_ObjectManager",
+    "KALDERA_ObjectManagerHostedService",
+}
 #: What the module is called among those of a server, and the process that all its providers share.
 SERVER_MODULE = "KLDRProviderModule"
 GROUP = "kldrprovider"
@@ -27,6 +40,10 @@ class Row:
     def provider(self):
         return f"{self.class_name}_Provider"
 
+    @property
+    def namespaces(self):
+        return [NAMESPACE] if self.class_name in OF_THE_SERVER else [NAMESPACE, INTEROP]
+
 
 def rows(providers):
     """One row a provider. An indication provider has a method interface too, but is not registered for it: one server cleans
@@ -44,7 +61,7 @@ def sections(table):
         f"   provider: {row.provider}\n"
         f"   location: {MODULE}\n"
         f"   type: {' '.join(row.types)}\n"
-        f"   namespace: {NAMESPACE}\n"
+        f"   namespace: {' '.join(row.namespaces)}\n"
         f"   unload: never\n"
         f"   group: {GROUP}\n"
         for row in table

@@ -14,11 +14,11 @@ share/bash-completion/completions/kldr-register
 share/bash-completion/completions/kldrcim
 share/doc/kldrprovider/changelog.gz
 share/doc/kldrprovider/copyright
-share/kldrprovider/mof/kldr_interop.mof
 share/kldrprovider/mof/kldr_qualifiers.mof
 share/kldrprovider/mof/kldr_structure.mof
 share/kldrprovider/mof/kldrprovider.mof
 share/kldrprovider/registration/kldrprovider.pegasus.mof
+share/kldrprovider/registration/kldrprovider.profiles.mof
 share/kldrprovider/registration/kldrprovider.registration
 share/kldrprovider/registration/kldrprovider.sfcb
 share/lintian/overrides/kldrprovider

@@ -28,6 +28,11 @@ def sfcb_sections(text):
     return sections
 
 
+def objects(class_name):
+    """Properties of the instances that the module itself enumerates."""
+    return [each["properties"] for each in json.loads(output_of(BUILD / "kldrcim", "ei", class_name, "--format", "json"))]
+
+
 class Registrations(DeployCase):
     @classmethod
     def setUpClass(cls):
@@ -49,11 +54,48 @@ class Registrations(DeployCase):
             self.assertEqual(section["provider"], f"{name}_Provider")
         for key, value in (
             ("location", "kldrprovider_Module"),
-            ("namespace", "root/kaldera"),
             ("unload", "never"),
             ("group", "kldrprovider"),
         ):
             self.assertEqual({section[key] for section in sections.values()}, {value}, key)
+
+    def test_sfcb_has_the_module_serve_the_interop_namespace(self):
+        """All but what the server tells of itself there, which the module would ask itself for."""
+        sections = sfcb_sections(self.text("kldrprovider.sfcb"))
+        both = {name for name, section in sections.items() if section["namespace"] == "root/kaldera root/interop"}
+        alone = {name for name, section in sections.items() if section["namespace"] == "root/kaldera"}
+        self.assertEqual(both | alone, set(sections))
+        self.assertIn("KALDERA_ElementConformsToProfile", both)
+        ends = "CIMXMLCommunicationMechanism Namespace ObjectManager"
+        joins = "CommMechHostedAccessPoint CommMechanismForManager NamespaceInManager ObjectManagerHostedService"
+        self.assertEqual(alone, {f"KALDERA_{name}" for name in f"{ends} {joins}".split()})
+
+    def test_profiles_for_pegasus_are_those_of_the_module(self):
+        """But for those that the server registers by itself."""
+        profiles = {each["InstanceID"]: each for each in objects("KALDERA_RegisteredProfile")}
+        found = instances_of(self.text("kldrprovider.profiles.mof"), "PG_ProviderProfileCapabilities")
+        self.assertEqual({each["CapabilityID"] for each in found}, set(profiles) - {"SMI-S", "Server"})
+        registered = set()
+        for each in found:
+            profile = profiles[each["CapabilityID"]]
+            self.assertEqual(
+                (each["OtherRegisteredProfile"], each["ProfileVersion"], each["OtherProfileOrganization"]),
+                (profile["RegisteredName"], profile["RegisteredVersion"], "SNIA"),
+            )
+            self.assertEqual(each["ConformingElements"], "KALDERA_ComputerSystem")
+            self.assertEqual(each["ProviderName"], "KALDERA_ComputerSystem_Provider")
+            columns = (
+                each[name].split(", ") if name in each else []
+                for name in ("OtherRegisteredSubProfiles", "SubProfileVersions", "OtherSubProfileOrganizations")
+            )
+            registered |= set(zip(*columns, strict=True))
+        organizations = {2: "DMTF", 11: "SNIA"}
+        expected = {
+            (each["RegisteredName"], each["RegisteredVersion"], organizations[each["RegisteredOrganization"]])
+            for each in objects("KALDERA_RegisteredSubProfile")
+        }
+        # This one belongs to the server's own profile "Server".
+        self.assertEqual(registered, expected - {("Profile Registration", "1.0.0", "SNIA")})
 
     def test_pegasus(self):
         text = self.text("kldrprovider.pegasus.mof")

@@ -28,6 +28,16 @@ class Traits:
     drops_unneeded_classes: bool = False
     #: Superclasses that the server's newer CIM Schema has taken out from above ours.
     removed_superclasses: set = field(default_factory=set)
+    #: What the server tells of itself in the interop name space, where the module tells all else. It names the module's object
+    #: manager there as what conforms to a profile, but finds no provider to read it from.
+    own_in_interop: set = field(default_factory=set)
+    #: A subprofile bears the organization of the profile that it belongs to, whoever has defined it.
+    profile_gives_organization: bool = False
+    #: How the server's own classes begin. It shows profiles as it has registered them beside those of the module.
+    own_prefix: str = ""
+
+    def is_own(self, class_name):
+        return bool(self.own_prefix) and class_name.startswith(self.own_prefix)
 
     def may_lack(self, class_name, subclasses):
         """`subclasses` are those of the class that have providers."""
@@ -35,7 +45,11 @@ class Traits:
 
 
 TRAITS = {
-    # In it, CIM_DiagnosticRecord is derived from CIM_RecordForLog directly.
-    "sfcb": Traits(drops_unneeded_classes=True, removed_superclasses={"CIM_LogEntry"}),
-    "pegasus": Traits(),
+    "sfcb": Traits(
+        drops_unneeded_classes=True,
+        # In its schema, CIM_DiagnosticRecord is derived from CIM_RecordForLog directly.
+        removed_superclasses={"CIM_LogEntry"},
+        own_in_interop={"KALDERA_ObjectManager", "KALDERA_Namespace", "KALDERA_CIMXMLCommunicationMechanism"},
+    ),
+    "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_"),
 }
