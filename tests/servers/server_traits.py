@@ -35,7 +35,11 @@ class Traits:
     profile_gives_organization: bool = False
     #: How the server's own classes begin. It shows profiles as it has registered them beside those of the module.
     own_prefix: str = ""
-
+    #: An operation that gives nothing back is answered with an empty list, which the client library takes for a broken answer.
+    void_is_a_list: bool = False
+    #: The module is registered for alerts in the interop name space too. The server matches what is delivered in one name space
+    #: with the filters of all, so that filters in two of them bring each alert twice.
+    alerts_in_interop: bool = False
     def is_own(self, class_name):
         return bool(self.own_prefix) and class_name.startswith(self.own_prefix)
 
@@ -49,6 +53,8 @@ TRAITS = {
         drops_unneeded_classes=True,
         # In its schema, CIM_DiagnosticRecord is derived from CIM_RecordForLog directly.
         removed_superclasses={"CIM_LogEntry"},
+        void_is_a_list=True,
+        alerts_in_interop=True,
         own_in_interop={"KALDERA_ObjectManager", "KALDERA_Namespace", "KALDERA_CIMXMLCommunicationMechanism"},
     ),
     "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_"),
