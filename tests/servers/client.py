@@ -30,7 +30,7 @@ LINES = 60
 
 def import_pywbem():
     """The installed library, or the one that an archive below KLDR_CLIENTS holds."""
-    warnings.simplefilter("ignore", ResourceWarning)
+    warnings.simplefilter("ignore")
     try:
         return importlib.import_module("pywbem")
     except ImportError:

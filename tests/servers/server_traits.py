@@ -37,6 +37,8 @@ class Traits:
     own_prefix: str = ""
     #: An operation that gives nothing back is answered with an empty list, which the client library takes for a broken answer.
     void_is_a_list: bool = False
+    #: Threads that the server may have taken on for a moment with many requests, and keeps for later ones.
+    thread_pool: int = 0
     #: The module is registered for alerts in the interop name space too. The server matches what is delivered in one name space
     #: with the filters of all, so that filters in two of them bring each alert twice.
     alerts_in_interop: bool = False
@@ -57,5 +59,5 @@ TRAITS = {
         alerts_in_interop=True,
         own_in_interop={"KALDERA_ObjectManager", "KALDERA_Namespace", "KALDERA_CIMXMLCommunicationMechanism"},
     ),
-    "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_"),
+    "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_", thread_pool=80),
 }

@@ -121,7 +121,8 @@ class Alerts:
         wwn = ":".join(self.port[each : each + 2] for each in range(0, len(self.port), 2))
         for turn in range(times):
             key = ENABLED if turn % 2 else DISABLED
-            request = {"method": "configuration.setPortByWwn", "params": [wwn, {"portStatus": bool(turn % 2)}, ["portStatus"]]}
+            change = {"portStatus": bool(turn % 2)}
+            request = {"method": "configuration.setPortByWwn", "params": [wwn, change, list(change)]}
             self.check.connection.InvokeMethod("executeMethod", self.service, request=json.dumps(request))
             expected += [f"KLDR{key}", f"PROPKLDR{key}"]
         return expected
@@ -168,7 +169,7 @@ def check_queries(alerts, listener):
 
 
 def check_two_name_spaces(alerts, listener):
-    """The module delivers once in each name space with a filter; whether a server has it in a second one is the server's affair."""
+    """The module delivers once in each name space with a filter; whether a server has it in a second one is its own affair."""
     other, second = Listener(), alerts.check.interop
     with alerts.subscription(listener):
         if alerts.traits.alerts_in_interop:
