@@ -178,17 +178,21 @@ TEST_F(Diagnostics, RunOneAtATime)
 TEST_F(Diagnostics, AreNotRunThroughAnotherClass)
 {
     on_demo_host([&] {
+        const host::Path_Value path = test("PCILoopback", "PCILoopbackTest"), port = fc_port();
+        mark();
         for (const char* class_name :
              {"CIM_DiagnosticService", "CIM_DiagnosticTest", "KALDERA_MemoryDiagnosticTest"}) {
             host::Request request;
             request.operation = host::Operation::INVOKE_METHOD;
-            request.path = {{}, "root/kaldera", class_name, {}};
+            request.path = path;
+            request.path.class_name = class_name;
             request.method = "RunDiagnostic";
-            request.in = {{"ManagedElement", host::Value::path(fc_port())}};
+            request.in = {{"ManagedElement", host::Value::path(port)}};
             EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED,
                       server->run_at("KALDERA_PCILoopbackDiagnosticTest", request).rc)
                 << class_name;
         }
+        EXPECT_EQ(Lines{}, said_by("KALDERA_PCILoopbackDiagnosticTest_Provider.cpp")) << "not even entered";
         EXPECT_TRUE(enumerate("KALDERA_ConcreteJob").instances.empty());
     });
 }
