@@ -65,6 +65,7 @@ class Places(unittest.TestCase):
         self.body("statement", "    for (int i = 0; i < x; i++)\n        f(i);", "    for (int i = 0; i < x; i++)\n        {}")
         self.body("statement", "    switch (x) {\n    case A::B:\n        g();\n    }",
                   "    switch (x) {\n    case A::B:\n        {}\n    }")
+        self.body("statement", "    switch (x) {\n    default:\n        break;\n    }")
         self.body("statement", "    if (x)\n        g();\n    else\n        h(\n            1);",
                   "    if (x)\n        {}\n    else\n        h(\n            1);",
                   "    if (x)\n        g();\n    else\n        {}")

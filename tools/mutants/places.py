@@ -127,7 +127,7 @@ def opened(code, head, at, scope, parentheses):
 
 
 def statements(code):
-    """Statements that could be missing: no declarations, and no return that ends a function."""
+    """Statements that could be missing: no declarations, no return that ends a function, no break that ends a switch."""
     stack, head, parentheses = [Scope(False)], 0, 0
     for match in re.finditer(r"[(){};]", code):
         at, mark = match.start(), match.group()
@@ -146,10 +146,11 @@ def statements(code):
 
 
 def droppable(code, head, end, is_inner):
-    start, is_guarded = head, is_inner
+    start, is_guarded, ends_switch = head, is_inner, False
     while True:
         if match := LABEL.match(code, start, end):
             start = match.end()
+            ends_switch = match.group().lstrip().startswith("default")
         elif match := CONTROL.match(code, start, end):
             start = match.end() if match.group(1) else closing(code, match.end())
             is_guarded = True
@@ -158,6 +159,8 @@ def droppable(code, head, end, is_inner):
     start += len(code[start:end]) - len(code[start:end].lstrip())
     text = code[start:end]
     if not text or KEYWORDS.match(text) or NAMED.match(text) or (text.startswith("return") and not is_guarded):
+        return
+    if text == "break" and ends_switch:
         return
     # Behind a condition an empty block must stay.
     yield Place("statement", start, end + 1, ("{}",))
