@@ -1,5 +1,6 @@
 """The Debian package of this word size."""
 
+import functools
 import re
 import tempfile
 import unittest
@@ -11,18 +12,21 @@ from install_test import FILES
 CPACK = Path(CMAKE).with_name("cpack")
 
 
-def pack(generator, folder):
-    """The packages that cpack makes of the build."""
-    output_of(CPACK, "-G", generator, "-B", folder, cwd=BUILD)
-    return sorted(Path(folder).glob(f"*.{generator.lower()}"))
+PACKED = tempfile.TemporaryDirectory()
+
+
+@functools.cache
+def pack(generator):
+    """The packages that cpack makes of the build, once for all tests of a run: debug symbols take their time."""
+    folder = Path(PACKED.name) / generator
+    output_of(CPACK, "-G", generator, "-B", str(folder), cwd=BUILD)
+    return sorted(folder.glob(f"*.{generator.lower()}"))
 
 
 class Package(unittest.TestCase):
     @classmethod
     def setUpClass(cls):
-        folder = tempfile.TemporaryDirectory()
-        cls.addClassCleanup(folder.cleanup)
-        packages = [package for package in pack("DEB", folder.name) if "dbgsym" not in package.name]
+        packages = [package for package in pack("DEB") if "dbgsym" not in package.name]
         assert len(packages) == 1, packages
         cls.package = packages[0]
 

@@ -12,7 +12,9 @@ from pathlib import Path
 
 from deploy_case import BUILD, ENVIRONMENT, SOURCE, WORD_SIZE, output_of
 from install_test import FILES
-from package_test import pack
+from package_test import Package, pack
+
+__all__ = ["Package"]  # run here too, so that everything is packed once
 
 BINARIES = [BUILD / "libkldrprovider_Module.so", BUILD / "kldrcim"]
 
@@ -63,9 +65,7 @@ class Binaries(unittest.TestCase):
 class Debian_Packages(unittest.TestCase):
     @classmethod
     def setUpClass(cls):
-        folder = tempfile.TemporaryDirectory()
-        cls.addClassCleanup(folder.cleanup)
-        cls.packages = pack("DEB", folder.name)
+        cls.packages = pack("DEB")
         cls.lintian = subprocess.run(
             ["lintian", "--allow-root", "--show-overrides", "--fail-on", "error,warning", *cls.packages],
             capture_output=True, text=True, check=False, env=ENVIRONMENT,
@@ -157,7 +157,7 @@ class Rpm_Packages(unittest.TestCase):
         folder = tempfile.TemporaryDirectory()
         cls.addClassCleanup(folder.cleanup)
         cls.folder = Path(folder.name)
-        packages = pack("RPM", folder.name)
+        packages = pack("RPM")
         (cls.symbols,) = (package for package in packages if "debuginfo" in package.name)
         (cls.package,) = (package for package in packages if "debuginfo" not in package.name)
 
