@@ -118,9 +118,21 @@ sfcb_rebuild() { # with|without
     done
     sfcb_restage "$work/stage" "$1" >/dev/null &&
         run sfcbrepos -f -s "$work/stage" -r "$work/registration" ${root:+-c "$sfcb_schema_folder"} &&
+        sfcb_carry_over "$work/registration/repository" &&
         sfcb_restage "$sfcb_stage" "$1" && sfcb_take_over "$work/registration" && good=yes
     rm -rf "$work"
     [ -n "$good" ] || fail "$FAILED" "the server's classes and registration are as they were"
+}
+
+# Instances that clients have stored, subscriptions above all: sfcbrepos means to keep them and loses them. Each class's are a file
+# and its index, named after the class in small letters.
+sfcb_carry_over() { # REPOSITORY
+    local file
+    while read -r file; do
+        [ ! -d "$1/$(dirname "$file")" ] || [ -e "$1/$file" ] || cp -a "$sfcb_registration/repository/$file" "$1/$file" ||
+            fail "$FAILED" "cannot write to $1" || return
+    done < <(cd "$sfcb_registration/repository" 2>/dev/null &&
+        find . -type f ! -name 'classSchemas*' ! -name 'qualifiers*' ! -name 'kaldera_*')
 }
 
 # Our files in a staging folder, and no others of ours: those of this release, or none.

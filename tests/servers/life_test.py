@@ -4,7 +4,7 @@ import re
 
 import package
 import traces
-from server_case import ServerCase
+from server_case import ServerCase, long
 
 CHANGED = "KALDERA_DiagnosticTest"
 
@@ -79,6 +79,7 @@ class Life(ServerCase):
     def test_from_installation_to_purge_beside_a_running_server(self):
         self.whole_life(True)
 
+    @long
     def test_from_installation_to_purge_beside_a_server_that_is_down(self):
         self.whole_life(False)
 
@@ -93,6 +94,7 @@ class Life(ServerCase):
         self.assert_as_before()
         self.assertEqual(traces.of_ours(), [])
 
+    @long
     def test_removal_of_the_package_beside_a_running_server(self):
         self.removal(True)
 

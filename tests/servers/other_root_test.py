@@ -20,6 +20,8 @@ LIBRARY = "libkldrprovider_Module.so"
 
 
 class Other_Root(ServerCase):
+    once_a_kind = True
+
     def setUp(self):
         super().setUp()
         package.install()

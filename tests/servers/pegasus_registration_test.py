@@ -15,6 +15,8 @@ SOCKETS = Path("/opt/cim-servers/pegasus/run/socket")
 
 
 class Pegasus(ServerCase):
+    once_a_kind = True
+
     def setUp(self):
         super().setUp()
         package.install()
@@ -69,6 +71,7 @@ class Pegasus(ServerCase):
         os.rename("/opt/instances", instances)
         self.check()
 
+    @long
     def test_a_namespace_that_was_there_stays(self):
         mof = Path("/tmp/site.mof")
         mof.write_text("Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride);\n"
@@ -81,6 +84,7 @@ class Pegasus(ServerCase):
         self.assertIn("SITE_Own", self.server.ask("GetClass", "SITE_Own"))
         self.assertFalse([path for path in (REPOSITORY / "root#kaldera/classes").iterdir() if path.name.startswith("KALDERA")])
 
+    @long
     def test_a_failure_says_why_in_one_line(self):
         file = Path("/usr/share/kldrprovider/mof/kldrprovider.mof")
         file.write_text(file.read_text(encoding="utf-8") + "class Broken : NoSuchClass {};\n", encoding="utf-8")

@@ -35,7 +35,7 @@ class Job:
 
 
 def cases():
-    """Module, name and length of each test method, found without a server."""
+    """Module and name of each test method, and when it is passed over, found without a server."""
     sys.path.insert(0, str(HERE))
     found = []
 
@@ -45,7 +45,7 @@ def cases():
                 walk(each)
             else:
                 method = getattr(each, each.id().rpartition(".")[2])
-                found.append((type(each).__module__, each.id(), getattr(method, "long", False)))
+                found.append((type(each).__module__, each.id(), getattr(method, "long", False), each.once_a_kind))
 
     walk(unittest.defaultTestLoader.discover(str(HERE), "*_test.py"))
     return found
@@ -58,14 +58,17 @@ def belongs(module, server):
 
 
 def jobs(servers, long):
+    kinds = set()
     for server in servers:
-        for module, case, is_long in cases():
-            if belongs(module, server) and (long or not is_long):
+        for module, case, is_long, once_a_kind in cases():
+            too_much = is_long or (once_a_kind and server.kind in kinds)
+            if belongs(module, server) and (long or not too_much):
                 yield Job(server, case, ["python3", "-B", "-m", "unittest", case])
         for file in sorted(HERE.glob("*_check.py")):
             if belongs(file.stem, server):
                 options = ["--long"] if long else []
                 yield Job(server, file.stem, ["python3", "-B", "checked.py", f"/mnt/source/tests/servers/{file.name}", *options])
+        kinds.add(server.kind)
 
 
 def run(job, builds, long):
@@ -119,7 +122,8 @@ def main():
             failed += bool(status)
             if status:
                 print("    " + output.rstrip().replace("\n", "\n    "), flush=True)
-    print(f"{len(servers)} servers, {len(planned)} machines, {failed} failures")
+    form = "" if options.long else " in the short form"
+    print(f"{len(servers)} servers, {len(planned)} machines{form}, {failed} failures")
     return 1 if failed or not planned else 0
 
 

@@ -14,6 +14,8 @@ def long(test):
 
 class ServerCase(unittest.TestCase):
     maxDiff = None
+    #: True for what the word size does not touch: the short form shows it on one server of each kind.
+    once_a_kind = False
 
     def setUp(self):
         self.server = Server()

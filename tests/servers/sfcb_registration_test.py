@@ -7,7 +7,7 @@ from pathlib import Path
 
 import package
 import traces
-from server_case import ServerCase, long
+from server_case import ServerCase
 
 SCHEMA = Path("/usr/share/sfcb/CIM/CIM_Schema.mof")
 STAGE = Path("/var/lib/sfcb/stage")
@@ -16,6 +16,8 @@ LACKING = "CIM_ProductElementComponent"
 
 
 class Sfcb(ServerCase):
+    once_a_kind = True
+
     def setUp(self):
         super().setUp()
         package.install()
@@ -77,16 +79,23 @@ class Sfcb(ServerCase):
         package.register("remove")
         self.assertEqual(os.readlink(link), f"../cim/{link.name}")
 
-    @long
-    def test_static_instances_of_others_stay(self):
-        instance = 'instance of CIM_IndicationFilter { SystemCreationClassName = "a"; SystemName = "b"; CreationClassName = "c"; Name = "d"; };\n'
-        (STAGE / "mofs/root/interop/70_site.mof").write_text(instance, encoding="utf-8")
+    def test_what_clients_have_stored_stays(self):
+        file = STAGE / "mofs/root/interop/70_site.mof"
+        file.write_text(
+            'instance of CIM_IndicationFilter { SystemCreationClassName = "a"; SystemName = "b"; CreationClassName = "c";\n'
+            'Name = "d"; SourceNamespace = "root/cimv2"; QueryLanguage = "WQL"; Query = "SELECT * FROM CIM_AlertIndication"; };\n',
+            encoding="utf-8",
+        )
         package.run("sfcbrepos", "-f")
+        # Now it is like one that a client has made.
+        file.unlink()
+        before = traces.stored("sfcb")
         package.register("install")
-        (STAGE / "mofs/root/interop/70_site.mof").unlink()
-        package.register("remove")
         self.server.start()
         self.assertEqual(self.server.instances("CIM_IndicationFilter", "root/interop"), 1)
+        self.server.kill()
+        package.register("remove")
+        self.assertEqual(traces.stored("sfcb"), before)
 
     def test_a_failure_says_why_in_one_line(self):
         (STAGE / "mofs/root/interop/65_broken.mof").write_text("class Broken {\n  nonsense\n};\n", encoding="utf-8")

@@ -14,6 +14,8 @@ NEEDED = {"sfcb": "sfcbrepos", "pegasus": "cimcli"}
 
 
 class Tools(ServerCase):
+    once_a_kind = True
+
     def setUp(self):
         super().setUp()
         package.install()
@@ -88,7 +90,7 @@ class Tools(ServerCase):
         self.assertFalse(any(os.access(f"/usr/bin/{tool}", os.X_OK) for tool in NEEDED.values()))
 
 
-class Only_The_Other_Users(ServerCase):
+class Another_User(ServerCase):
     @long
     def test_who_may_not_look_hears_unknown(self):
         package.install()
