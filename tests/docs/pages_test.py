@@ -54,7 +54,7 @@ class Named(unittest.TestCase):
         files = tree()
         names, paths = {file.name for file in files}, {str(file.relative_to(ROOT)) for file in files}
         count = 0
-        for page in DESIGN.glob("*.md"):
+        for page in [*DESIGN.glob("*.md"), ROOT / "docs/glossary.md"]:
             for name in re.findall(r"`([\w./-]+\.\w+)`", prose(read(page))):
                 if name.endswith(SOURCES):
                     count += 1
@@ -146,6 +146,13 @@ class Tried(unittest.TestCase):
         told = rows(page, "microseconds a path", "2,048 paths", "16,384 paths", "65,536 paths")
         self.assertEqual([row[1:] for row in told],
                          [[module for module, _ in index], [rival for _, rival in index], [rival for _, rival in loops]])
+
+
+class Glossary(unittest.TestCase):
+    def test_words_stand_once_and_in_order(self):
+        words = [word.lower() for word, _ in rows(ROOT / "docs/glossary.md", "word", "means")]
+        self.assertGreater(len(words), 39)
+        self.assertEqual(words, sorted(set(words)))
 
 
 if __name__ == "__main__":
