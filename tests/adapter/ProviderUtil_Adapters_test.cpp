@@ -223,7 +223,10 @@ TEST_F(ProviderUtil_Adapters, a_model_is_a_prefix_in_any_case)
     EXPECT_EQ(log.traces().front(), "DBG Entering: checkIfThisAdapterModalPresent");
     EXPECT_EQ(ProviderUtil::checkIfThisAdapterModelPresent("1860-2p"), 1);
     EXPECT_EQ(library.count("getHbaByWwn"), 3u);
+    log.clear();
     EXPECT_EQ(ProviderUtil::checkIfThisAdapterModelPresent("82"), 0);
+    EXPECT_EQ(log.said(), Lines{"INFO Number of Adapters: 2"});
+    EXPECT_EQ(library.count("getHbaByWwn"), 5u);
     EXPECT_EQ(ProviderUtil::checkIfThisAdapterModelPresent(""), 0);
 }
 
