@@ -4,7 +4,7 @@
 #include "adapter/Json_Access.h"
 #include "adapter/Json_Reading.h"
 #include "agent/MethodRegistration.h"
-#include "runtime/Mutex.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <algorithm>
 #include <atomic>
@@ -13,13 +13,13 @@
 
 namespace KPRV {
 
-constinit JsonRpcManager* JsonRpcManager::s_instance = nullptr;
-
 namespace {
 
-/// Set when all methods are entered.
-constinit std::atomic<bool> complete = false;
-constinit std::unique_ptr<JsonRpcManager> owner;
+/// Recursive: entering the methods comes back on the same thread, and finds the object that is being filled.
+constinit Standard_Mutex<std::recursive_mutex> owner_mutex;
+constinit std::unique_ptr<JsonRpcManager> owner GUARDED_BY(owner_mutex);
+/// The same, for all to see, when all methods are entered.
+constinit std::atomic<JsonRpcManager*> complete = nullptr;
 
 /// Makes the reply an error. What a method had written of its result goes.
 void fail(Json::Value& reply, const char* name, int code, const std::string& message)
@@ -65,25 +65,21 @@ void check_kind(const Json::Value& root)
 
 JsonRpcManager* JsonRpcManager::instance()
 {
-    if (complete.load(std::memory_order_acquire))
-        return s_instance;
-    // Entering the methods comes back here on the same thread, and finds the object that is being filled.
-    static Mutex mutex(true);
-    const Auto_Mutex lock(mutex);
-    if (!s_instance) {
+    if (JsonRpcManager* const manager = complete.load(std::memory_order_acquire))
+        return manager;
+    const Auto_Lock lock(owner_mutex);
+    if (!owner) {
         owner.reset(new JsonRpcManager);
-        s_instance = owner.get();
         try {
             MethodRegistration::registerMethods();
         } catch (...) {
             // The next call begins anew: a dispatcher that lacks methods would lack them for good.
-            s_instance = nullptr;
             owner.reset();
             throw;
         }
-        complete.store(true, std::memory_order_release);
+        complete.store(owner.get(), std::memory_order_release);
     }
-    return s_instance;
+    return owner.get();
 }
 
 void JsonRpcManager::registerMethod(const std::string& name, Handler handler)

@@ -73,8 +73,6 @@ private:
     sint32 answer(std::string_view request, String& text, Json_Tools& tools) const;
     void call(std::string_view name, const Json::Value& params, Json::Value& reply) const;
 
-    static JsonRpcManager* s_instance;
-
     std::unordered_map<std::string, Handler, Hash, std::equal_to<>> _methods;
     mutable Kept_Json_Tools _tools;
 };

@@ -94,7 +94,7 @@ bool IndicationHelper::updateIndicationObjects(KALDERA_AlertIndication* alert)
 {
     LOG_SCOPE("updateIndicationObjects");
     // Of all alerts of both kinds, across subscriptions.
-    static sint32 evtSeqId = 0;
+    static sint32 evtSeqId GUARDED_BY(_queue_lock) = 0;
     const Auto_Mutex lock(_queue_lock);
     alert->SequenceNumber.set(++evtSeqId);
     _queue.push_back(alert);

@@ -62,7 +62,7 @@ private:
     Event_Texts _causes;
     Event_Texts _actions;
     Event_Texts _message_ids;
-    std::deque<KALDERA_AlertIndication*> _queue;
+    std::deque<KALDERA_AlertIndication*> _queue GUARDED_BY(_queue_lock);
     /// Size of the queue, for a look without the lock.
     std::atomic<size_t> _queued = 0;
     Mutex _queue_lock;

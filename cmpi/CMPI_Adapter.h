@@ -48,10 +48,10 @@ public:
     /// Cleared and set by `cimom::allow_unload`.
     bool unload_allowed;
     /// Name spaces with active filters, in order of first activation.
-    Array<Name_Space_Entry> name_spaces;
+    Array<Name_Space_Entry> name_spaces GUARDED_BY(adapter_mutex);
     /// The provider's own class.
     const Meta_Class* model_meta_class;
-    bool indications_enabled;
+    bool indications_enabled GUARDED_BY(adapter_mutex);
     /// An operation that holds the mutex waits for the provider's worker to end.
     std::atomic<bool> is_disabling = false;
     /// Recursive. One provider runs one operation at a time; an up-call may come back on the same thread.

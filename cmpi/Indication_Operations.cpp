@@ -72,15 +72,16 @@ namespace {
 /// Holds the adapter for one delivery. An operation that disables indications keeps the mutex while it waits
 /// for the worker to end; a worker that waited for the mutex meanwhile would never end. It delivers under the
 /// operation's hold instead: the operation does nothing but wait for it.
-class Delivery_Hold
+class SCOPED_CAPABILITY Delivery_Hold
 {
 public:
-    explicit Delivery_Hold(CMPI_Adapter& adapter) : _mutex(adapter.adapter_mutex)
+    explicit Delivery_Hold(CMPI_Adapter& adapter) ACQUIRE(adapter.adapter_mutex)
+        : _mutex(adapter.adapter_mutex)
     {
         while (!(_is_own = _mutex.try_lock() == 0) && !adapter.is_disabling)
             Time::sleep(Time::MSEC);
     }
-    ~Delivery_Hold()
+    ~Delivery_Hold() RELEASE()
     {
         if (_is_own)
             _mutex.unlock();
@@ -136,8 +137,8 @@ static bool _indication_proc(Instance* instance, void* client_data)
 
 static CMPIStatus enableIndications(CMPIIndicationMI* mi, const CMPIContext* context)
 {
-    const Operation_Scope scope(_adapter(mi), context, "enableIndications", LOG_HERE);
-    CMPI_Adapter* const adapter = scope.adapter();
+    CMPI_Adapter* const adapter = _adapter(mi);
+    const Operation_Scope scope(adapter, context, "enableIndications", LOG_HERE);
     if (adapter->indications_enabled)
         return scope.ret(LOG_HERE, CMPI_RC_OK);
 
@@ -149,8 +150,8 @@ static CMPIStatus enableIndications(CMPIIndicationMI* mi, const CMPIContext* con
 
 static CMPIStatus disableIndications(CMPIIndicationMI* mi, const CMPIContext* context)
 {
-    const Operation_Scope scope(_adapter(mi), context, "disableIndications", LOG_HERE);
-    CMPI_Adapter* const adapter = scope.adapter();
+    CMPI_Adapter* const adapter = _adapter(mi);
+    const Operation_Scope scope(adapter, context, "disableIndications", LOG_HERE);
     if (!adapter->indications_enabled)
         return {CMPI_RC_OK, nullptr};
 

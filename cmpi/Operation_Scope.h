@@ -9,11 +9,15 @@ namespace KPRV {
 /// The frame of an operation: the thread's context is pushed, then the provider is locked, then the entry is
 /// traced; the end of the scope unlocks and pops, also when an exception passes. What an operation creates
 /// is declared behind its scope and so released before the lock.
-class Operation_Scope
+class SCOPED_CAPABILITY Operation_Scope
 {
 public:
     /// `function` is the name in the trace.
-    Operation_Scope(CMPI_Adapter* adapter, const CMPIContext* context, const char* function, Call_Site site);
+    Operation_Scope(CMPI_Adapter* adapter, const CMPIContext* context, const char* function, Call_Site site)
+        ACQUIRE(adapter->adapter_mutex);
+    ~Operation_Scope() RELEASE() {}
+    Operation_Scope(const Operation_Scope&) = delete;
+    Operation_Scope& operator=(const Operation_Scope&) = delete;
 
     CMPI_Adapter* adapter() const { return _adapter; }
     const CMPIBroker* broker() const { return _adapter->broker; }

@@ -121,7 +121,7 @@ private:
     struct List
     {
         Mutex lock;
-        std::vector<T> entries;
+        std::vector<T> entries GUARDED_BY(lock);
     };
 
     Instance* test_instance(diag_test_id_t id) const;

@@ -1,10 +1,10 @@
 #include "runtime/Class_Plan.h"
 
 #include "runtime/Atomic.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <algorithm>
 #include <atomic>
-#include <mutex>
 
 namespace KPRV {
 
@@ -25,14 +25,14 @@ Cell_Kind kind_of(const Meta_Property* meta)
 // Plans live in the module's own zeroed pages and are never given back: there is nothing that could fail, be
 // released under a thread that still walks, or outlive the module.
 constexpr size_t ROOM = 8192 * sizeof(Cell);
-alignas(Class_Plan) constinit char room[ROOM] = {};
-constinit size_t room_used = 0;
-constinit std::mutex room_mutex;
+constinit Standard_Mutex<> room_mutex;
+alignas(Class_Plan) constinit char room[ROOM] GUARDED_BY(room_mutex) = {};
+constinit size_t room_used GUARDED_BY(room_mutex) = 0;
 
 /// Open addressing; twice as many places as there are classes and methods.
 constexpr size_t PLACES = 512;
 constinit std::atomic<const Class_Plan*> places[PLACES] = {};
-constinit size_t places_used = 0;
+constinit size_t places_used GUARDED_BY(room_mutex) = 0;
 
 size_t place_of(const Meta_Class* meta_class)
 {
@@ -40,7 +40,7 @@ size_t place_of(const Meta_Class* meta_class)
 }
 
 template <class T>
-T* take(size_t count)
+T* take(size_t count) REQUIRES(room_mutex)
 {
     const size_t begin = (room_used + alignof(T) - 1) / alignof(T) * alignof(T);
     if (begin + count * sizeof(T) > ROOM)
@@ -49,7 +49,7 @@ T* take(size_t count)
     return reinterpret_cast<T*>(room + begin);
 }
 
-bool fill_group(const Meta_Class* meta_class, Cells cells, Class_Plan& plan)
+bool fill_group(const Meta_Class* meta_class, Cells cells, Class_Plan& plan) REQUIRES(room_mutex)
 {
     size_t count = 0;
     for (const Meta_Feature* feature : features_of(meta_class))
@@ -66,7 +66,7 @@ bool fill_group(const Meta_Class* meta_class, Cells cells, Class_Plan& plan)
     return true;
 }
 
-const Class_Plan* make_plan(const Meta_Class* meta_class)
+const Class_Plan* make_plan(const Meta_Class* meta_class) REQUIRES(room_mutex)
 {
     Class_Plan* const plan = take<Class_Plan>(1);
     if (!plan)
@@ -94,7 +94,7 @@ std::atomic<const Class_Plan*>& find_place(const Meta_Class* meta_class)
 /// Once a class: apart, so that finding a plan needs few registers.
 [[gnu::noinline]] const Class_Plan* add_plan(const Meta_Class* meta_class)
 {
-    const std::lock_guard lock(room_mutex);
+    const Auto_Lock lock(room_mutex);
     std::atomic<const Class_Plan*>& place = find_place(meta_class);
     if (const Class_Plan* const earlier = place.load(std::memory_order_relaxed))
         return earlier;

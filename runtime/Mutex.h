@@ -1,11 +1,13 @@
 #pragma once
 
+#include "runtime/Auto_Lock.h"
+
 #include <pthread.h>
 
 namespace KPRV {
 
 /// A POSIX mutex.
-class Mutex
+class CAPABILITY("mutex") Mutex
 {
 public:
     explicit Mutex(bool recursive = true);
@@ -14,26 +16,16 @@ public:
     Mutex& operator=(const Mutex&) = delete;
 
     /// A failure is fatal.
-    void lock();
+    void lock() ACQUIRE();
     /// 0 when locked, 16 (`EBUSY`) when held elsewhere, -1 on any other error.
-    int try_lock();
-    void unlock();
+    int try_lock() TRY_ACQUIRE(0);
+    void unlock() RELEASE();
 
 private:
     pthread_mutex_t _mutex;
 };
 
-/// Holds a mutex for a scope.
-class Auto_Mutex
-{
-public:
-    explicit Auto_Mutex(Mutex& mutex) : _mutex(mutex) { _mutex.lock(); }
-    ~Auto_Mutex() { _mutex.unlock(); }
-    Auto_Mutex(const Auto_Mutex&) = delete;
-    Auto_Mutex& operator=(const Auto_Mutex&) = delete;
-
-private:
-    Mutex& _mutex;
-};
+/// Holds one for a scope.
+using Auto_Mutex = Auto_Lock<Mutex>;
 
 } // namespace KPRV

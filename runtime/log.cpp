@@ -2,6 +2,7 @@
 #include "runtime/Buffer.h"
 #include "runtime/File_Lock.h"
 #include "runtime/Regular_File.h"
+#include "runtime/Standard_Mutex.h"
 #include "runtime/Time.h"
 #include "runtime/log_configuration.h"
 
@@ -21,30 +22,30 @@ const char* const _log_level_strings[5] = {"FATAL", "ERR", "WARN", "INFO", "DBG"
 
 constinit std::atomic<bool> _log_enabled_state = true;
 
-// All of this is guarded by the mutex. It is a plain one: nothing inside calls back into the logger.
-static pthread_mutex_t _mutex = PTHREAD_MUTEX_INITIALIZER;
-static bool _initialized;
-static Log_Level _level;
+/// A plain one: nothing inside calls back into the logger.
+static constinit Standard_Mutex<> _mutex;
+static bool _initialized GUARDED_BY(_mutex);
+static Log_Level _level GUARDED_BY(_mutex);
 /// What is above needs neither the mutex nor a look at the rest: the level while the log is open, otherwise
 /// the highest, since each line is then an attempt to open it.
 static constinit std::atomic<Log_Level> _threshold = Log_Level::DBG;
-static FILE* _log_file_handle;
-static File_Lock* _lock;
+static FILE* _log_file_handle GUARDED_BY(_mutex);
+static File_Lock* _lock GUARDED_BY(_mutex);
 
 namespace {
 
 /// Nobody cancels a thread that holds it: the unwinding would meet destructors that log.
-class Auto_Log_Mutex
+class SCOPED_CAPABILITY Auto_Log_Mutex
 {
 public:
-    Auto_Log_Mutex()
+    Auto_Log_Mutex() ACQUIRE(_mutex)
     {
         pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &_cancel_state);
-        pthread_mutex_lock(&_mutex);
+        _mutex.lock();
     }
-    ~Auto_Log_Mutex()
+    ~Auto_Log_Mutex() RELEASE()
     {
-        pthread_mutex_unlock(&_mutex);
+        _mutex.unlock();
         pthread_setcancelstate(_cancel_state, nullptr);
     }
     Auto_Log_Mutex(const Auto_Log_Mutex&) = delete;
@@ -68,7 +69,7 @@ static FILE* open_messages(const char* path)
 }
 
 /// Tried anew by every call until it succeeds: a user may put the rc file in place while the server runs.
-static void configure()
+static void configure() REQUIRES(_mutex)
 {
     Log_Configuration configuration;
     if (!read_log_configuration(configuration))
@@ -88,7 +89,7 @@ static void configure()
     }
 }
 
-static void write(const char* text, size_t size)
+static void write(const char* text, size_t size) REQUIRES(_mutex)
 {
     // A lock that cannot be had does not keep the line out of the log.
     _lock->lock();
@@ -109,7 +110,7 @@ static void write_head(char (&head)[256], Log_Level level, const char* file, siz
 }
 
 /// What fits of a line for which there is no memory.
-static void write_cut_line(const char* head, const char* format, va_list arguments)
+static void write_cut_line(const char* head, const char* format, va_list arguments) REQUIRES(_mutex)
 {
     char text[512];
     constexpr size_t ROOM = sizeof text - 1;
@@ -122,6 +123,7 @@ static void write_cut_line(const char* head, const char* format, va_list argumen
 }
 
 static void write_line(Log_Level level, const char* file, size_t line, const char* format, va_list arguments)
+    REQUIRES(_mutex)
 {
     char head[256];
     write_head(head, level, file, line);
