@@ -22,10 +22,12 @@ if(KLDR_CCACHE)
 endif()
 
 # Records are walked through their metadata, from addresses: no compiler may reason about their types. Unique symbols would
-# keep the library mapped after its last close. To clang, which fuzzes, a name in an enumeration of its own shadows too.
+# keep the library mapped after its last close. To clang, which fuzzes and follows the locks, a name in an enumeration of its own
+# shadows too.
 set(gnu $<CXX_COMPILER_ID:GNU>)
+set(clang $<CXX_COMPILER_ID:Clang>)
 add_compile_options(-Wall -Wextra $<${gnu}:-Wshadow> -Wnon-virtual-dtor -Wpedantic -Werror -Wno-invalid-offsetof
-                    -fno-strict-aliasing $<${gnu}:-fno-gnu-unique>)
+                    -fno-strict-aliasing $<${gnu}:-fno-gnu-unique> $<${clang}:-Wthread-safety>)
 # 64-bit offsets and times also where a word is 32 bits: a log grows without limit, and so does time.
 add_compile_definitions(_GNU_SOURCE _FILE_OFFSET_BITS=64 _TIME_BITS=64)
 include_directories(${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR}/generated)
@@ -58,7 +60,7 @@ endif()
 macro(kldr_share_runs)
   set(CMAKE_UNITY_BUILD ON)
   set(CMAKE_UNITY_BUILD_BATCH_SIZE 16)
-  add_compile_options(-Wno-shadow -Wno-subobject-linkage)
+  add_compile_options(-Wno-shadow $<${gnu}:-Wno-subobject-linkage>)
 endmacro()
 
 # kldr_apart(<file> ...): files with a run of their own, where they must be linked or left out by themselves.
