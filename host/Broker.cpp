@@ -1,15 +1,16 @@
 #include "host/Broker.h"
 
-#include <mutex>
+#include "runtime/Standard_Mutex.h"
+
 #include <set>
 
 namespace KPRV::host {
 
 namespace {
 
-std::mutex brokers_mutex;
+constinit Standard_Mutex<> brokers_mutex;
 
-std::set<const Broker*>& brokers()
+std::set<const Broker*>& brokers() REQUIRES(brokers_mutex)
 {
     static std::set<const Broker*> all;
     return all;
@@ -20,19 +21,19 @@ std::set<const Broker*>& brokers()
 Broker::Broker(std::shared_ptr<Core> core, Up_Calls& up_calls) : core_(std::move(core)), up_calls_(up_calls)
 {
     level_100_ = {this, broker_table, broker_enc_table, broker_ext_table};
-    std::lock_guard lock(brokers_mutex);
+    const Auto_Lock lock(brokers_mutex);
     brokers().insert(this);
 }
 
 Broker::~Broker()
 {
-    std::lock_guard lock(brokers_mutex);
+    const Auto_Lock lock(brokers_mutex);
     brokers().erase(this);
 }
 
 Broker* Broker::find(const CMPIBroker* address)
 {
-    std::lock_guard lock(brokers_mutex);
+    const Auto_Lock lock(brokers_mutex);
     for (const Broker* broker : brokers())
         if (&broker->level_100_ == address)
             return const_cast<Broker*>(broker);

@@ -6,7 +6,7 @@ namespace KPRV::host {
 
 std::vector<std::string> Call_Log::calls() const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return calls_;
 }
 
@@ -21,27 +21,27 @@ std::vector<std::string> Call_Log::calls(std::string_view name) const
 
 void Call_Log::clear()
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     calls_.clear();
 }
 
 void Call_Log::fail(const std::string& call, unsigned nth, CMPIrc rc)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     faults_.insert({call, {nth, rc, false}});
     faulty_ = true;
 }
 
 void Call_Log::throw_at(const std::string& call, unsigned nth)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     faults_.insert({call, {nth, CMPI_RC_ERR_FAILED, true}});
     faulty_ = true;
 }
 
 void Call_Log::mend()
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     faults_.clear();
     faulty_ = false;
 }
@@ -50,7 +50,7 @@ CMPIrc Call_Log::enter(const char* call, std::string_view argument)
 {
     if (!recording_ && !faulty_)
         return CMPI_RC_OK;
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     if (recording_) {
         std::string text = call;
         if (!argument.empty())

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "cmpi/interface/cmpidt.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <atomic>
 #include <map>
-#include <mutex>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -46,9 +46,9 @@ private:
 
     std::atomic<bool> recording_ = false;
     std::atomic<bool> faulty_ = false;
-    mutable std::mutex mutex_;
-    std::vector<std::string> calls_;
-    std::multimap<std::string, Fault, std::less<>> faults_;
+    mutable Standard_Mutex<> mutex_;
+    std::vector<std::string> calls_ GUARDED_BY(mutex_);
+    std::multimap<std::string, Fault, std::less<>> faults_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

@@ -6,9 +6,9 @@
 #include "host/Interruption.h"
 #include "host/Output.h"
 #include "host/Subscription.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <deque>
-#include <mutex>
 
 namespace KPRV::host {
 
@@ -25,7 +25,7 @@ public:
     void put(const std::string& name_space, const Instance_Value& indication)
     {
         {
-            std::lock_guard lock(mutex_);
+            const Auto_Lock lock(mutex_);
             indications_.push_back(indication);
             indications_.back().path.name_space = name_space;
         }
@@ -36,7 +36,7 @@ public:
     {
         for (;;) {
             interruption_.wait();
-            std::lock_guard lock(mutex_);
+            const Auto_Lock lock(mutex_);
             if (interruption_.count() != 0)
                 return false;
             if (indications_.empty())
@@ -49,8 +49,8 @@ public:
 
 private:
     Interruption& interruption_;
-    std::mutex mutex_;
-    std::deque<Instance_Value> indications_;
+    Standard_Mutex<> mutex_;
+    std::deque<Instance_Value> indications_ GUARDED_BY(mutex_);
 };
 
 /// Where the host's indications go, for a scope.

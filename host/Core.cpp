@@ -16,21 +16,21 @@ public:
     void add(Object* object)
     {
         Shard& shard = at(object->address());
-        std::unique_lock lock(shard.mutex);
+        const Auto_Lock lock(shard.mutex);
         shard.objects[object->address()] = object;
     }
 
     void remove(const Object* object)
     {
         Shard& shard = at(object->address());
-        std::unique_lock lock(shard.mutex);
+        const Auto_Lock lock(shard.mutex);
         shard.objects.erase(object->address());
     }
 
     Object* find(const void* address)
     {
         Shard& shard = at(address);
-        std::shared_lock lock(shard.mutex);
+        const Auto_Shared_Lock lock(shard.mutex);
         auto found = shard.objects.find(address);
         return found == shard.objects.end() ? nullptr : found->second;
     }
@@ -38,8 +38,8 @@ public:
 private:
     struct Shard
     {
-        std::shared_mutex mutex;
-        std::unordered_map<const void*, Object*> objects;
+        Standard_Mutex<std::shared_mutex> mutex;
+        std::unordered_map<const void*, Object*> objects GUARDED_BY(mutex);
     };
 
     Shard& at(const void* address)
@@ -77,7 +77,7 @@ void Core::adopt(std::unique_ptr<Object> object)
     address_book().add(known);
     if (known->owner != Owner::HOST)
         ledger.made(known->kind, known->maker);
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     objects_[known] = std::move(object);
 }
 
@@ -85,7 +85,7 @@ void Core::retire(Object& object)
 {
     object.live = false;
     object.drop();
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     auto at = objects_.find(&object);
     if (at == objects_.end())
         return;

@@ -7,6 +7,7 @@
 #include "host/Ledger.h"
 #include "host/Object.h"
 #include "host/Violations.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <deque>
 #include <functional>
@@ -38,9 +39,9 @@ public:
     void retire(Object& object);
 
 private:
-    std::mutex mutex_;
-    std::unordered_map<Object*, std::unique_ptr<Object>> objects_;
-    std::deque<std::unique_ptr<Object>> retired_;
+    Standard_Mutex<> mutex_;
+    std::unordered_map<Object*, std::unique_ptr<Object>> objects_ GUARDED_BY(mutex_);
+    std::deque<std::unique_ptr<Object>> retired_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

@@ -2,6 +2,7 @@
 
 #include "host/Mi_Call.h"
 #include "host/Server_Store.h"
+#include "runtime/Standard_Mutex.h"
 
 namespace KPRV::host {
 
@@ -105,8 +106,8 @@ private:
     std::unique_ptr<Broker> broker_;
     std::unique_ptr<Provider_Set> providers_;
     Server_Store store_;
-    std::mutex sink_mutex_;
-    Sink sink_;
+    Standard_Mutex<> sink_mutex_;
+    Sink sink_ GUARDED_BY(sink_mutex_);
 };
 
 } // namespace KPRV::host

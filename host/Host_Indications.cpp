@@ -74,7 +74,7 @@ CMPIrc Host::disable_indications(const std::string& provider_class)
 
 void Host::set_sink(Sink sink)
 {
-    std::lock_guard lock(sink_mutex_);
+    const Auto_Lock lock(sink_mutex_);
     sink_ = std::move(sink);
 }
 
@@ -82,7 +82,7 @@ CMPIrc Host::deliver(const std::string& name_space, const Instance_Value& indica
 {
     Sink sink;
     {
-        std::lock_guard lock(sink_mutex_);
+        const Auto_Lock lock(sink_mutex_);
         sink = sink_;
     }
     return sink ? sink(name_space, indication) : CMPI_RC_OK;

@@ -14,19 +14,19 @@ Ledger::Entry& Ledger::at(Object_Kind kind, const char* maker)
 
 void Ledger::made(Object_Kind kind, const char* maker)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     ++at(kind, maker).made;
 }
 
 void Ledger::released(Object_Kind kind, const char* maker)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     ++at(kind, maker).released;
 }
 
 void Ledger::freed_by_frame(Object_Kind kind, const char* maker)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     ++at(kind, maker).freed_by_frame;
 }
 
@@ -48,7 +48,7 @@ std::size_t Ledger::live(Object_Kind kind) const
 
 std::vector<Ledger::Entry> Ledger::entries() const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     std::vector<Entry> list;
     for (const auto& [key, entry] : entries_)
         list.push_back(entry);
@@ -73,7 +73,7 @@ void Ledger::report(std::FILE* out) const
 
 void Ledger::clear()
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     entries_.clear();
 }
 

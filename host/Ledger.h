@@ -1,11 +1,11 @@
 #pragma once
 
 #include "host/Object_Kind.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <cstddef>
 #include <cstdio>
 #include <map>
-#include <mutex>
 #include <string>
 #include <vector>
 
@@ -47,10 +47,10 @@ public:
     void clear();
 
 private:
-    Entry& at(Object_Kind kind, const char* maker);
+    Entry& at(Object_Kind kind, const char* maker) REQUIRES(mutex_);
 
-    mutable std::mutex mutex_;
-    std::map<std::pair<Object_Kind, std::string>, Entry> entries_;
+    mutable Standard_Mutex<> mutex_;
+    std::map<std::pair<Object_Kind, std::string>, Entry> entries_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

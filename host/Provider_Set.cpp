@@ -49,7 +49,7 @@ CMPIIndicationMI* Provider_Set::indication(const std::string& class_name)
 
 void* Provider_Set::get(const std::string& class_name, Mi_Kind kind)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     auto at = made_.find({class_name, kind});
     if (at != made_.end())
         return at->second;
@@ -98,7 +98,7 @@ CMPIrc Provider_Set::cleanup_one(void* mi, Mi_Kind kind, bool terminating)
 template <class Wanted>
 CMPIrc Provider_Set::cleanup_if(Wanted wanted, bool terminating)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     CMPIrc highest = CMPI_RC_OK;
     for (Mi_Kind kind : mi_kinds) {
         for (auto at = made_.begin(); at != made_.end();) {
@@ -127,7 +127,7 @@ CMPIrc Provider_Set::cleanup(const std::string& class_name, bool terminating)
 
 std::size_t Provider_Set::count() const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return made_.size();
 }
 

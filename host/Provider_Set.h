@@ -2,9 +2,9 @@
 
 #include "host/Broker.h"
 #include "host/Module.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <map>
-#include <mutex>
 
 namespace KPRV::host {
 
@@ -46,8 +46,8 @@ private:
 
     const Module& module_;
     Broker& broker_;
-    mutable std::recursive_mutex mutex_;
-    std::map<Key, void*> made_;
+    mutable Standard_Mutex<std::recursive_mutex> mutex_;
+    std::map<Key, void*> made_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

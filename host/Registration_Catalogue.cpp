@@ -138,6 +138,7 @@ std::unique_ptr<Class_Info> class_info(const Meta_Class* meta_class, bool has_pr
 
 Registration_Catalogue::Registration_Catalogue(const Registration* head)
 {
+    const Auto_Lock lock(mutex_);
     if (head && head->module_name)
         module_name_ = head->module_name;
     for (const Registration* entry = head; entry; entry = entry->next) {
@@ -162,7 +163,7 @@ void Registration_Catalogue::add(const Meta_Class* meta_class)
 
 const Class_Info* Registration_Catalogue::find(std::string_view name) const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     auto at = slots_.find(lower_name(name));
     if (at == slots_.end())
         return nullptr;

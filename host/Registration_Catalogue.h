@@ -2,10 +2,10 @@
 
 #include "host/Class_Catalogue.h"
 #include "runtime/Registration.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <map>
 #include <memory>
-#include <mutex>
 
 namespace KPRV::host {
 
@@ -29,12 +29,12 @@ private:
         std::unique_ptr<Class_Info> info;
     };
 
-    void add(const Meta_Class* meta_class);
+    void add(const Meta_Class* meta_class) REQUIRES(mutex_);
 
     std::string module_name_;
     std::vector<std::string> names_;
-    mutable std::mutex mutex_;
-    mutable std::map<std::string, Slot, std::less<>> slots_;
+    mutable Standard_Mutex<> mutex_;
+    mutable std::map<std::string, Slot, std::less<>> slots_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

@@ -25,21 +25,21 @@ Result failed(CMPIrc rc)
 
 void Server_Store::add_name_space(const std::string& name_space)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     spaces_[lower_name(name_space)];
 }
 
 void Server_Store::add(const std::string& name_space, Instance_Value instance)
 {
     instance.path.name_space = name_space;
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     spaces_[lower_name(name_space)].instances.push_back(std::move(instance));
 }
 
 void Server_Store::add_class(const std::string& name_space, const std::string& class_name,
                              const std::string& superclass)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     std::string& known = spaces_[lower_name(name_space)].classes[lower_name(class_name)];
     if (!superclass.empty())
         known = lower_name(superclass);
@@ -47,7 +47,7 @@ void Server_Store::add_class(const std::string& name_space, const std::string& c
 
 void Server_Store::refuse(const std::string& name_space, CMPIrc rc)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     spaces_[lower_name(name_space)].refusal = rc;
 }
 
@@ -68,19 +68,19 @@ bool Server_Store::Name_Space::is_a(const Class_Catalogue& catalogue, const std:
 void Server_Store::on_method(const std::string& name_space, const std::string& class_name,
                              const std::string& method, Method answer)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     spaces_[lower_name(name_space)].methods[method_key(class_name, method)] = std::move(answer);
 }
 
 bool Server_Store::has_name_space(const std::string& name_space) const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return spaces_.count(lower_name(name_space)) != 0;
 }
 
 bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& path) const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     auto found = spaces_.find(lower_name(path.name_space));
     if (found == spaces_.end())
         return false;
@@ -102,7 +102,7 @@ bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& pa
 
 std::vector<Instance_Value> Server_Store::instances(const std::string& name_space) const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     auto space = spaces_.find(lower_name(name_space));
     return space == spaces_.end() ? std::vector<Instance_Value>() : space->second.instances;
 }
@@ -115,7 +115,15 @@ std::vector<Instance_Value>::iterator Server_Store::find(Name_Space& space, cons
 
 Result Server_Store::run(const Class_Catalogue& catalogue, const Request& request)
 {
-    std::unique_lock lock(mutex_);
+    std::optional<Method> method;
+    Result result = look_up(catalogue, request, method);
+    return method ? (*method)(request) : result;
+}
+
+Result Server_Store::look_up(const Class_Catalogue& catalogue, const Request& request,
+                             std::optional<Method>& method)
+{
+    const Auto_Lock lock(mutex_);
     Name_Space& space = spaces_[lower_name(request.path.name_space)];
     if (space.refusal)
         return failed(*space.refusal);
@@ -124,12 +132,11 @@ Result Server_Store::run(const Class_Catalogue& catalogue, const Request& reques
     case Operation::ENUMERATE_INSTANCE_NAMES:
         return enumerate(catalogue, space, request);
     case Operation::INVOKE_METHOD: {
-        auto method = space.methods.find(method_key(request.path.class_name, request.method));
-        if (method == space.methods.end())
+        auto known = space.methods.find(method_key(request.path.class_name, request.method));
+        if (known == space.methods.end())
             return failed(CMPI_RC_ERR_METHOD_NOT_FOUND);
-        Method answer = method->second;
-        lock.unlock();
-        return answer(request);
+        method = known->second;
+        return {};
     }
     case Operation::GET_INSTANCE:
     case Operation::CREATE_INSTANCE:

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "host/Request.h"
+#include "runtime/Standard_Mutex.h"
 
 #include <functional>
 #include <map>
-#include <mutex>
 
 namespace KPRV::host {
 
@@ -53,12 +53,14 @@ private:
                   const std::string& ancestor) const;
     };
 
+    /// All of `run` but a method, which is put into `method` for a call without the lock.
+    Result look_up(const Class_Catalogue& catalogue, const Request& request, std::optional<Method>& method);
     static std::vector<Instance_Value>::iterator find(Name_Space& space, const Path_Value& path);
     Result change(Name_Space& space, const Request& request);
     Result enumerate(const Class_Catalogue& catalogue, const Name_Space& space, const Request& request) const;
 
-    mutable std::mutex mutex_;
-    std::map<std::string, Name_Space, std::less<>> spaces_;
+    mutable Standard_Mutex<> mutex_;
+    std::map<std::string, Name_Space, std::less<>> spaces_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

@@ -4,25 +4,25 @@ namespace KPRV::host {
 
 void Violations::add(const char* call, const std::string& what)
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     list_.push_back(std::string(call) + ": " + what);
 }
 
 std::vector<std::string> Violations::list() const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return list_;
 }
 
 std::size_t Violations::count() const
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return list_.size();
 }
 
 void Violations::clear()
 {
-    std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     list_.clear();
 }
 

@@ -1,7 +1,8 @@
 #pragma once
 
+#include "runtime/Standard_Mutex.h"
+
 #include <cstddef>
-#include <mutex>
 #include <string>
 #include <vector>
 
@@ -24,8 +25,8 @@ public:
     std::string text() const;
 
 private:
-    mutable std::mutex mutex_;
-    std::vector<std::string> list_;
+    mutable Standard_Mutex<> mutex_;
+    std::vector<std::string> list_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::host

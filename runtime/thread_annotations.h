@@ -16,6 +16,8 @@
 #define PT_GUARDED_BY(mutex) KPRV_THREAD_ANNOTATION(pt_guarded_by(mutex)) // what a pointer points to
 #define REQUIRES(...) KPRV_THREAD_ANNOTATION(requires_capability(__VA_ARGS__))
 
+#define UNCHECKED KPRV_THREAD_ANNOTATION(no_thread_safety_analysis) // say why
+
 // For what locks: a class of mutexes, a class that holds one for a scope, and what its functions do. Without
 // an argument it is the object itself, or what it holds.
 #define CAPABILITY(kind) KPRV_THREAD_ANNOTATION(capability(kind))

@@ -1,5 +1,6 @@
 #include "simulator/Entry_Points.h"
 
+#include "runtime/Standard_Mutex.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Simulator.h"
 
@@ -37,12 +38,12 @@ std::int32_t integer_of(const Json::Value& answer)
 // The caller may keep the text for ever.
 const char* lasting_text(const Json::Value& answer)
 {
-    static std::mutex& mutex = *new std::mutex;
-    static std::set<std::string>& texts = *new std::set<std::string>;
+    static constinit Standard_Mutex<> mutex;
+    static std::set<std::string>* const texts PT_GUARDED_BY(mutex) = new std::set<std::string>;
     if (!answer.isString())
         return nullptr;
-    const std::lock_guard lock(mutex);
-    return texts.insert(answer.asString()).first->c_str();
+    const Auto_Lock lock(mutex);
+    return texts->insert(answer.asString()).first->c_str();
 }
 
 Json::Value registration(bool registers)

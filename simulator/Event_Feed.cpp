@@ -18,7 +18,7 @@ thread_local unsigned calls_here = 0;
 
 void Event_Feed::want(bool drop_old_events)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     if (drop_old_events)
         events_.clear();
     wanted_ = true;
@@ -32,7 +32,7 @@ void Event_Feed::want(bool drop_old_events)
 
 void Event_Feed::want_no_more()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     wanted_ = false;
     is_script_due_ = false;
     changed_.notify_all();
@@ -40,15 +40,16 @@ void Event_Feed::want_no_more()
 
 void Event_Feed::set_callback(Event_Callback callback)
 {
-    std::unique_lock lock(mutex_);
+    const Auto_Lock lock(mutex_);
     callback_ = callback;
     changed_.notify_all();
-    changed_.wait(lock, [this] { return calls_ <= calls_here; });
+    while (calls_ > calls_here)
+        changed_.wait(mutex_);
 }
 
 void Event_Feed::reset()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     callback_ = nullptr;
     wanted_ = false;
     is_script_due_ = false;
@@ -58,14 +59,14 @@ void Event_Feed::reset()
 
 void Event_Feed::set_script(std::vector<Scripted_Event> script)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     script_ = std::move(script);
     is_script_due_ = false;
 }
 
 void Event_Feed::occur(std::string text)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     events_.push_back(std::move(text));
     if (!wanted_ && events_.size() > most_kept)
         events_.pop_front();
@@ -75,22 +76,22 @@ void Event_Feed::occur(std::string text)
 
 bool Event_Feed::tell_here(const char* text)
 {
-    std::unique_lock lock(mutex_);
+    const Auto_Lock lock(mutex_);
     if (!is_told())
         return false;
-    call(lock, text);
+    call(text);
     return true;
 }
 
 bool Event_Feed::is_wanted()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return wanted_;
 }
 
 bool Event_Feed::has_callback()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return callback_ != nullptr;
 }
 
@@ -112,7 +113,7 @@ void Event_Feed::end_thread()
     if (std::this_thread::get_id() == thread_.get_id())
         return;
     {
-        const std::lock_guard lock(mutex_);
+        const Auto_Lock lock(mutex_);
         ends_ = true;
     }
     changed_.notify_all();
@@ -121,13 +122,13 @@ void Event_Feed::end_thread()
 
 void Event_Feed::run()
 {
-    std::unique_lock lock(mutex_);
+    const Auto_Lock lock(mutex_);
     while (!ends_) {
         std::string text;
-        if (!take_event(lock, text))
+        if (!take_event(text))
             continue;
         try {
-            call(lock, text.c_str());
+            call(text.c_str());
         } catch (const std::exception& error) {
             std::fprintf(stderr, "simulator: the receiver of an event threw: %s\n", error.what());
         } catch (...) {
@@ -137,7 +138,7 @@ void Event_Feed::run()
 }
 
 // Waits until there may be something to tell.
-bool Event_Feed::take_event(std::unique_lock<std::mutex>& lock, std::string& text)
+bool Event_Feed::take_event(std::string& text)
 {
     if (is_told() && !events_.empty()) {
         text = std::move(events_.front());
@@ -146,10 +147,11 @@ bool Event_Feed::take_event(std::unique_lock<std::mutex>& lock, std::string& tex
     }
     if (is_told() && is_script_due_ && Clock::now() >= due_.at)
         return take_scripted(text);
-    if (is_told() && is_script_due_)
-        changed_.wait_until(lock, due_.at);
+    // A copy: the time may change while this waits.
+    if (const Clock::time_point at = due_.at; is_told() && is_script_due_)
+        changed_.wait_until(mutex_, at);
     else
-        changed_.wait(lock);
+        changed_.wait(mutex_);
     return false;
 }
 
@@ -177,29 +179,30 @@ void Event_Feed::schedule(std::size_t line, Clock::time_point from)
     is_script_due_ = true;
 }
 
-void Event_Feed::call(std::unique_lock<std::mutex>& lock, const char* text)
+void Event_Feed::call(const char* text)
 {
-    // Counted to the end, also when the callback throws.
-    struct In_Call
+    // Without the lock, and counted to the end, also when the callback throws.
+    struct SCOPED_CAPABILITY In_Call
     {
-        explicit In_Call(Event_Feed& owner, std::unique_lock<std::mutex>& held) : feed(owner), lock(held)
+        explicit In_Call(Event_Feed& owner) RELEASE(owner.mutex_) : feed(owner)
         {
             ++feed.calls_;
             ++calls_here;
-            lock.unlock();
+            feed.mutex_.unlock();
         }
-        ~In_Call()
+        ~In_Call() RELEASE() // of the release: it is held again
         {
-            lock.lock();
+            feed.mutex_.lock();
             --feed.calls_;
             --calls_here;
             feed.changed_.notify_all();
         }
+        In_Call(const In_Call&) = delete;
+        In_Call& operator=(const In_Call&) = delete;
         Event_Feed& feed;
-        std::unique_lock<std::mutex>& lock;
     };
     const Event_Callback callback = callback_;
-    const In_Call in_call(*this, lock);
+    const In_Call in_call(*this);
     callback(text);
 }
 

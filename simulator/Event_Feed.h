@@ -1,9 +1,10 @@
 #pragma once
 
+#include "runtime/Standard_Mutex.h"
+
 #include <chrono>
 #include <condition_variable>
 #include <deque>
-#include <mutex>
 #include <string>
 #include <thread>
 #include <vector>
@@ -61,27 +62,28 @@ private:
         unsigned told;
     };
 
-    bool is_told() const { return wanted_ && callback_; }
-    void start_thread();
+    bool is_told() const REQUIRES(mutex_) { return wanted_ && callback_; }
+    void start_thread() REQUIRES(mutex_);
     void end_thread();
     void run();
-    bool take_event(std::unique_lock<std::mutex>& lock, std::string& text);
-    bool take_scripted(std::string& text);
-    void schedule(std::size_t line, Clock::time_point from);
-    void call(std::unique_lock<std::mutex>& lock, const char* text);
+    bool take_event(std::string& text) REQUIRES(mutex_);
+    bool take_scripted(std::string& text) REQUIRES(mutex_);
+    void schedule(std::size_t line, Clock::time_point from) REQUIRES(mutex_);
+    void call(const char* text) REQUIRES(mutex_);
 
-    std::mutex mutex_;
-    std::condition_variable changed_;
-    Event_Callback callback_ = nullptr;
-    bool wanted_ = false;
-    bool is_script_due_ = false;
-    unsigned calls_ = 0;
-    bool has_thread_ = false;
-    bool ends_ = false;
+    Standard_Mutex<> mutex_;
+    std::condition_variable_any changed_;
+    Event_Callback callback_ GUARDED_BY(mutex_) = nullptr;
+    bool wanted_ GUARDED_BY(mutex_) = false;
+    bool is_script_due_ GUARDED_BY(mutex_) = false;
+    unsigned calls_ GUARDED_BY(mutex_) = 0;
+    bool has_thread_ GUARDED_BY(mutex_) = false;
+    bool ends_ GUARDED_BY(mutex_) = false;
+    /// Set before the process can ask for its end.
     std::thread thread_;
-    std::deque<std::string> events_;
-    std::vector<Scripted_Event> script_;
-    Due due_ = {};
+    std::deque<std::string> events_ GUARDED_BY(mutex_);
+    std::vector<Scripted_Event> script_ GUARDED_BY(mutex_);
+    Due due_ GUARDED_BY(mutex_) = {};
 };
 
 } // namespace KPRV::simulator

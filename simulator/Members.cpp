@@ -1,8 +1,9 @@
 #include "simulator/Members.h"
 
+#include "runtime/Standard_Mutex.h"
+
 #include <algorithm>
 #include <cctype>
-#include <mutex>
 #include <unordered_map>
 
 namespace KPRV::simulator {
@@ -45,12 +46,12 @@ bool is_number(const Json::Value& value)
 // texts are constants, so a text's place names it. Never destroyed: see Simulator::instance.
 const Json::Value& fallback_value(const char* text)
 {
-    static std::mutex& mutex = *new std::mutex;
-    static auto& values = *new std::unordered_map<const char*, Json::Value>;
-    const std::lock_guard lock(mutex);
-    const auto found = values.find(text);
-    return found != values.end() ? found->second
-                                 : values.emplace(text, Json_Text("default", text).parse()).first->second;
+    static constinit Standard_Mutex<> mutex;
+    static auto* const values PT_GUARDED_BY(mutex) = new std::unordered_map<const char*, Json::Value>;
+    const Auto_Lock lock(mutex);
+    const auto found = values->find(text);
+    return found != values->end() ? found->second
+                                  : values->emplace(text, Json_Text("default", text).parse()).first->second;
 }
 
 } // namespace

@@ -34,7 +34,7 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
     run_hardware_test(row, request);
     Json::Value answer;
     {
-        const std::lock_guard lock(mutex_);
+        const Auto_Lock lock(mutex_);
         answer = answer_by_row(state_, row, request);
     }
     for (const Fault& fault : strike.faults)
@@ -45,7 +45,7 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
 
 Simulator::Strike Simulator::record(const Entry_Row& row, const Json::Value& request)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     load_from_environment();
     recorder_.add(row.symbol, request);
     called_.notify_all();
@@ -63,8 +63,9 @@ void Simulator::wait_out(const Strike& strike)
             std::this_thread::sleep_for(std::chrono::milliseconds(fault.words["milliseconds"].asUInt()));
         if (fault.kind != Fault_Kind::HOLD)
             continue;
-        std::unique_lock lock(mutex_);
-        released_.wait(lock, [&] { return releases_ != strike.releases; });
+        const Auto_Lock lock(mutex_);
+        while (releases_ == strike.releases)
+            released_.wait(mutex_);
     }
 }
 
@@ -72,7 +73,7 @@ void Simulator::run_hardware_test(const Entry_Row& row, const Json::Value& reque
 {
     std::chrono::milliseconds duration;
     {
-        const std::lock_guard lock(mutex_);
+        const Auto_Lock lock(mutex_);
         duration = hardware_test_duration(state_, row, request);
     }
     std::this_thread::sleep_for(duration);
@@ -86,13 +87,13 @@ void Simulator::load_from_environment()
     state_.problem.clear();
     state_.inventory = {};
     faults_.clear();
-    state_.events.set_script({});
+    events().set_script({});
     try {
         if (const char* path = std::getenv(inventory_variable))
             put_in_place(Json_Text::of_file(path));
         if (const char* path = std::getenv(events_variable)) {
             const Json_Text source = Json_Text::of_file(path);
-            state_.events.set_script(read_events(source, source.parse()));
+            events().set_script(read_events(source, source.parse()));
         }
     } catch (const Refused& refused) {
         state_.problem = refused.what();
@@ -104,13 +105,13 @@ void Simulator::put_in_place(const Json_Text& source)
 {
     Inventory inventory(source);
     faults_ = read_faults(source, inventory.faults);
-    state_.events.set_script(std::move(inventory.events));
+    events().set_script(std::move(inventory.events));
     state_.inventory = std::move(inventory);
 }
 
 void Simulator::load(const Json_Text& source)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     state_.loaded = true;
     state_.from_environment = false;
     state_.problem.clear();
@@ -119,7 +120,7 @@ void Simulator::load(const Json_Text& source)
     } catch (const Refused& refused) {
         state_.problem = refused.what();
         state_.inventory = {};
-        state_.events.set_script({});
+        events().set_script({});
         faults_.clear();
         throw;
     }
@@ -127,27 +128,27 @@ void Simulator::load(const Json_Text& source)
 
 void Simulator::unload()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     state_.loaded = false;
     state_.from_environment = true;
 }
 
 void Simulator::set_log_callback(Log_Callback callback)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     state_.session.log_callback = callback;
 }
 
 void Simulator::set_event_callback(Event_Callback callback)
 {
     // Not under the lock: this may wait for a receiver that calls the library.
-    state_.events.set_callback(callback);
+    events().set_callback(callback);
 }
 
 void Simulator::add_fault(const Json_Text& source)
 {
     Fault fault = read_fault(source, source.parse());
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     load_from_environment();
     faults_.push_back(std::move(fault));
 }
@@ -155,7 +156,7 @@ void Simulator::add_fault(const Json_Text& source)
 void Simulator::clear_faults()
 {
     {
-        const std::lock_guard lock(mutex_);
+        const Auto_Lock lock(mutex_);
         faults_.clear();
     }
     release();
@@ -163,44 +164,48 @@ void Simulator::clear_faults()
 
 void Simulator::release()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     ++releases_;
     released_.notify_all();
 }
 
 bool Simulator::wait_for_calls(const std::string& symbol, std::size_t count, std::chrono::milliseconds limit)
 {
-    std::unique_lock lock(mutex_);
-    return called_.wait_for(lock, limit, [&] { return recorder_.count(symbol) >= count; });
+    const auto end = std::chrono::steady_clock::now() + limit;
+    const Auto_Lock lock(mutex_);
+    while (recorder_.count(symbol) < count)
+        if (called_.wait_until(mutex_, end) == std::cv_status::timeout)
+            return recorder_.count(symbol) >= count;
+    return true;
 }
 
 Json::Value Simulator::calls()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     return recorder_.calls();
 }
 
 void Simulator::clear_calls()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     recorder_.clear();
 }
 
 void Simulator::keep_calls(std::size_t most)
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     recorder_.keep(most);
 }
 
 Json::Value Simulator::status()
 {
-    const std::lock_guard lock(mutex_);
+    const Auto_Lock lock(mutex_);
     load_from_environment();
     Json::Value status;
     status["initialised"] = state_.session.initialised;
-    status["wantsEvents"] = state_.events.is_wanted();
+    status["wantsEvents"] = events().is_wanted();
     status["logCallback"] = state_.session.log_callback != nullptr;
-    status["eventCallback"] = state_.events.has_callback();
+    status["eventCallback"] = events().has_callback();
     status["problem"] = state_.problem;
     return status;
 }
@@ -209,7 +214,7 @@ bool Simulator::log(int level, const char* file, int line, const char* text)
 {
     Log_Callback callback = nullptr;
     {
-        const std::lock_guard lock(mutex_);
+        const Auto_Lock lock(mutex_);
         callback = state_.session.log_callback;
     }
     if (callback)
@@ -219,12 +224,12 @@ bool Simulator::log(int level, const char* file, int line, const char* text)
 
 bool Simulator::event(const char* text)
 {
-    return state_.events.tell_here(text);
+    return events().tell_here(text);
 }
 
 void Simulator::queue_event(const char* text)
 {
-    state_.events.occur(text);
+    events().occur(text);
 }
 
 } // namespace KPRV::simulator

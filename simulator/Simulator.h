@@ -1,5 +1,6 @@
 #pragma once
 
+#include "runtime/Standard_Mutex.h"
 #include "simulator/Entry_Points.h"
 #include "simulator/Faults.h"
 #include "simulator/Recorder.h"
@@ -8,7 +9,6 @@
 #include <chrono>
 #include <condition_variable>
 #include <json/json.h>
-#include <mutex>
 #include <string>
 #include <vector>
 
@@ -62,8 +62,10 @@ public:
     void queue_event(const char* text);
 
 private:
-    void load_from_environment();
-    void put_in_place(const Json_Text& source);
+    void load_from_environment() REQUIRES(mutex_);
+    void put_in_place(const Json_Text& source) REQUIRES(mutex_);
+    /// They have a lock of their own.
+    Event_Feed& events() UNCHECKED { return state_.events; }
 
     // The faults that strike a call, and the count of releases when it came in: the next one is its.
     struct Strike
@@ -77,13 +79,13 @@ private:
     /// Takes the time of a hardware test; other calls go on.
     void run_hardware_test(const Entry_Row& row, const Json::Value& request);
 
-    std::mutex mutex_;
-    std::condition_variable called_;
-    std::condition_variable released_;
-    unsigned releases_ = 0;
-    State state_;
-    std::vector<Fault> faults_;
-    Recorder recorder_;
+    Standard_Mutex<> mutex_;
+    std::condition_variable_any called_;
+    std::condition_variable_any released_;
+    unsigned releases_ GUARDED_BY(mutex_) = 0;
+    State state_ GUARDED_BY(mutex_);
+    std::vector<Fault> faults_ GUARDED_BY(mutex_);
+    Recorder recorder_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::simulator

@@ -35,8 +35,8 @@ BESIDE = {
     "fuzz": None,
 }
 
-# Tables without code, which a folder beside the house may read although it may not include their room.
-DATA = {"host": {"agent/Methods.def"}}
+# What a folder beside the house may read although it may not include their room: tables without code, and locks.
+LENT = {"host": {"agent/Methods.def"}, "simulator": {"runtime/Standard_Mutex.h"}}
 
 LONGEST = 600
 
@@ -67,7 +67,7 @@ def check_arrows(path, lines, complain):
     room = path.parts[0]
     for number, line in enumerate(lines, 1):
         match = re.match(r'\s*#\s*include\s*"(([^"/]+)/[^"]*)"', line)
-        if not match or match.group(1) in DATA.get(room, ()):
+        if not match or match.group(1) in LENT.get(room, ()):
             continue
         target = match.group(2)
         if target == room or (target not in FLOORS and target not in BESIDE):
