@@ -101,7 +101,7 @@ def check_mutexes(path, lines, complain):
     text = "\n".join(lines)
     for number, line in enumerate(lines, 1):
         match = re.search(r"\b(?:Mutex|Standard_Mutex<[^>]*>)\s+(\w+)\s*;", line)
-        if match and not re.search(rf"\b(GUARDED_BY|REQUIRES)\({match.group(1)}\)", text):
+        if match and not re.search(rf"\b(?:(?:PT_)?GUARDED_BY|REQUIRES)\({match.group(1)}\)", text):
             complain(path, number, f"{match.group(1)} guards nothing: GUARDED_BY or REQUIRES is missing")
 
 
