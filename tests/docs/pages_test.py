@@ -148,6 +148,28 @@ class Tried(unittest.TestCase):
                          [[module for module, _ in index], [rival for _, rival in index], [rival for _, rival in loops]])
 
 
+class Failure(unittest.TestCase):
+    """The table of CONTRIBUTING.md against what the folders throw."""
+
+    THROW = re.compile(r"(?m)^(?:(?!//).)*?\bthrow (?:std::)?(\w+)[({]")
+    #: In every folder, as the page says before the table.
+    ANYWHERE = {"bad_alloc"}
+
+    def test_what_is_thrown_is_told(self):
+        page = ROOT / "CONTRIBUTING.md"
+        table = rows(page, "folder", "returns on failure", "may throw", "logs", "owns")
+        self.assertGreater(len(table), 10)
+        # What the agent throws inside stands below.
+        below = {"agent/": re.search(r"^The methods of the agent throw.*?\n\n", read(page), re.M | re.S)[0]}
+        for folder, _, throws, _, _ in map(bare, table):
+            files = [file for file in (ROOT / folder).rglob("*") if file.suffix in (".h", ".cpp")]
+            self.assertTrue((ROOT / folder).is_dir(), folder)
+            # The program's own parts may throw at each other.
+            if folder not in ("host/", "simulator/"):
+                for name in {name for file in files for name in self.THROW.findall(read(file))} - self.ANYWHERE:
+                    self.assertRegex(throws + below.get(folder, ""), rf"\b{name}\b", folder)
+
+
 class Glossary(unittest.TestCase):
     def test_words_stand_once_and_in_order(self):
         words = [word.lower() for word, _ in rows(ROOT / "docs/glossary.md", "word", "means")]

@@ -35,7 +35,7 @@ class Registrations(SchemaCase):
         self.assertTrue(
             text.startswith(
                 "[P_Port]\n   provider: P_Port_Provider\n   location: kldrprovider_Module\n   type: instance method\n"
-                "   namespace: root/kaldera\n   unload: never\n   group: kldrprovider\n"
+                "   namespace: root/kaldera root/interop\n   unload: never\n   group: kldrprovider\n"
             )
         )
         self.assertEqual(
