@@ -20,6 +20,8 @@ import time
 import warnings
 from pathlib import Path
 
+from server_traits import traits_of
+
 NAMESPACE = "root/kaldera"
 INTEROP = {"sfcb": "root/interop", "pegasus": "root/PG_InterOp"}
 #: Seconds in which a server answers; its own limit for a provider is shorter.
@@ -64,6 +66,7 @@ class Check:
         self.long = self.options.long
         self.interop = INTEROP[self.server]
         self.connection = self.connect()
+        self.traits = traits_of(self.server, pywbem.WBEMServer(self.connection).version)
         self.begun = time.monotonic()
         self.compared = 0
         self.differences = []

@@ -1,7 +1,6 @@
 """Objects of both sides in one form, and what they differ in."""
 
 from client import NAMESPACE, pywbem
-from server_traits import TRAITS
 
 
 def path_of(name):
@@ -39,7 +38,7 @@ class Comparison:
     def __init__(self, check, catalogue):
         self.check = check
         self.catalogue = catalogue
-        self.traits = TRAITS[check.server]
+        self.traits = check.traits
         self.server_classes = {}
         self.namesakes = {}
 

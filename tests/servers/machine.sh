@@ -10,7 +10,7 @@ shift 3
 if [ -z "${KLDR_INSIDE:-}" ]; then
     # The command gets a clean environment: what it needs, it is given.
     exec env -i KLDR_INSIDE=yes PATH=/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin HOME=/root LC_ALL=C.UTF-8 \
-        KLDR_ROOM="${KLDR_ROOM:-}" \
+        KLDR_ROOM="${KLDR_ROOM:-}" KLDR_CLIENTS="${KLDR_CLIENTS:-}" \
         unshare --mount --net --ipc --uts --pid --fork --kill-child --mount-proc "$0" "$server" "$source" "$packages" "$@"
 fi
 unset KLDR_INSIDE
@@ -21,6 +21,11 @@ mount -t tmpfs tmpfs /mnt
 mkdir /mnt/source /mnt/packages /mnt/server
 mount --bind -o ro "$source" /mnt/source
 mount --bind -o ro "$packages" /mnt/packages
+if [ -n "$KLDR_CLIENTS" ]; then
+    mkdir /mnt/clients
+    mount --bind -o ro "$KLDR_CLIENTS" /mnt/clients
+    export KLDR_CLIENTS=/mnt/clients
+fi
 if [ -d "$server" ]; then
     mount --bind -o ro "$server" /mnt/server
 else

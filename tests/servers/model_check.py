@@ -52,6 +52,8 @@ def check_property_list(check, comparison, kldrcim, name):
     if not expected:
         return
     asked = list(expected[0]["properties"])[-2:]
+    if comparison.traits.list_takes_keys:
+        asked += pywbem.CIMInstanceName.from_wbem_uri(expected[0]["path"]).keybindings
     what = f"enumerate {asked} of {name}"
     found = check.attempt(what, check.connection.EnumerateInstances, name, PropertyList=asked) or []
     comparison.names(what, [each.path for each in found], [each["path"] for each in expected])

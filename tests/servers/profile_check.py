@@ -9,7 +9,6 @@ from catalogue import Catalogue
 from client import NAMESPACE, Check, pywbem
 from comparison import Comparison, path_of, path_of_text, shown
 from kldrcim import Kldrcim
-from server_traits import TRAITS
 
 CONFORMS = {"AssocClass": "CIM_ElementConformsToProfile", "Role": "ConformantStandard", "ResultRole": "ManagedElement"}
 REQUIRES = {"AssocClass": "CIM_SubProfileRequiresProfile"}
@@ -25,7 +24,7 @@ def identity(profile):
 class Walk:
     def __init__(self, check):
         self.check = check
-        self.traits = TRAITS[check.server]
+        self.traits = check.traits
         self.catalogue, self.kldrcim = Catalogue(), Kldrcim(check)
         self.comparison = Comparison(check, self.catalogue)
         self.connection = check.connect(check.interop)
@@ -39,8 +38,9 @@ class Walk:
         server = pywbem.WBEMServer(self.connection)
         self.check.expect("interop name space", server.interop_ns, self.check.interop)
         found = self.check.attempt("CIM_RegisteredProfile", self.connection.EnumerateInstances, "CIM_RegisteredProfile") or []
-        for profile in found:
-            self.profiles.setdefault(identity(profile), profile)
+        # Where the server has one of the same name, ours is what the rest is about.
+        for profile in sorted(found, key=lambda each: each.classname in self.catalogue.kinds):
+            self.profiles[identity(profile)] = profile
         for profile in self.ours("KALDERA_RegisteredProfile") + self.ours("KALDERA_RegisteredSubProfile"):
             name = identity(profile)
             if not self.check.expect_that(f"profile {name}", name in self.profiles, "not registered"):

@@ -5,8 +5,6 @@ import time
 from dataclasses import dataclass
 from pathlib import Path
 
-from server_traits import TRAITS
-
 MODULE = "libkldrprovider_Module.so"
 
 
@@ -67,6 +65,6 @@ class Provider_Process:
         """Descriptors and threads stay; memory may grow by so much."""
         after = self.figures()
         self.check.expect_that("descriptors", after.descriptors <= before.descriptors, before, after)
-        pool = TRAITS[self.check.server].thread_pool
+        pool = self.check.traits.thread_pool
         self.check.expect_that("threads", after.threads <= before.threads + 2 + pool, before, after)
         self.check.expect_that("memory", after.megabytes <= before.megabytes + megabytes, before, after)

@@ -1,7 +1,8 @@
 """What CIM servers themselves add to a provider's answers, each with its reason. Whatever is not named here must be the same
 in every server."""
 
-from dataclasses import dataclass, field
+import re
+from dataclasses import dataclass, field, replace
 
 #: Properties with a default in the CIM Schema. Both servers put it where a provider leaves the property null. So they do with
 #: properties that a newer schema has added to a class, and that no provider of ours can know.
@@ -37,6 +38,8 @@ class Traits:
     own_prefix: str = ""
     #: An operation that gives nothing back is answered with an empty list, which the client library takes for a broken answer.
     void_is_a_list: bool = False
+    #: A property list without the keys takes them out of the paths, too.
+    list_takes_keys: bool = False
     #: Threads that the server may have taken on for a moment with many requests, and keeps for later ones.
     thread_pool: int = 0
     #: The module is registered for alerts in the interop name space too. The server matches what is delivered in one name space
@@ -61,3 +64,10 @@ TRAITS = {
     ),
     "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_", thread_pool=80),
 }
+
+
+def traits_of(server, version):
+    """`version` is the server's own word, such as "1.3.18-preview"."""
+    numbers = tuple(int(each) for each in re.findall(r"\d+", version or "")[:3])
+    old = server == "sfcb" and numbers < (1, 3, 18)
+    return replace(TRAITS[server], list_takes_keys=True) if old else TRAITS[server]

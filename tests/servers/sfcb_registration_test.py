@@ -49,7 +49,7 @@ class Sfcb(ServerCase):
         self.take_from_schema()
         (STAGE / "mofs/root/kaldera").mkdir()
         shutil.copy(SHARE / "mof/kldrprovider.mof", STAGE / "mofs/root/kaldera/20_kldrprovider.mof")
-        shutil.copy(SHARE / "mof/kldr_interop.mof", STAGE / "mofs/root/interop/60_kldr_interop.mof")
+        shutil.copy(SHARE / "mof/kldrprovider.mof", STAGE / "mofs/root/interop/60_kldrprovider.mof")
         shutil.copy(SHARE / "registration/kldrprovider.sfcb", STAGE / "regs/kldrprovider.reg")
         package.run("sfcbrepos", "-f", status=1)
         shown = self.check(status=1)
