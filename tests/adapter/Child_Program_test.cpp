@@ -172,6 +172,18 @@ TEST_F(Child_Program, finds_no_descriptor_but_standard_ones_and_no_input)
     EXPECT_EQ(seen(), (Lines{"0", "1", "2", "no input"}));
 }
 
+TEST_F(Child_Program, writes_where_the_server_writes)
+{
+    programs.program("program", "echo output; echo errors >&2");
+    in_child([&] {
+        const int both = open(folder.path("seen").c_str(), O_WRONLY | O_CREAT | O_APPEND, 0600);
+        dup2(both, STDOUT_FILENO);
+        dup2(both, STDERR_FILENO);
+        EXPECT_EQ(run({"program"}), 0);
+    });
+    EXPECT_EQ(seen(), (Lines{"output", "errors"}));
+}
+
 TEST_F(Child_Program, of_a_server_without_standard_descriptors_has_them)
 {
     programs.program("program", "echo lost; echo lost >&2; { [ -e /proc/$$/fd/1 ] && [ -e /proc/$$/fd/2 ] && "
