@@ -7,7 +7,7 @@ namespace KPRV {
 /// Names what the managers can build. `ProviderUtil::getClassName` gives the class.
 enum classId_t : uint32
 {
-    NO_CLASS = 0,
+    NO_CLASS,
 #define CLASS_ID(id, enumerator, name) enumerator = id,
 #include "adapter/Class_Ids.def"
 #undef CLASS_ID
