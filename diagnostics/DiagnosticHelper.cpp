@@ -6,7 +6,6 @@
 #include "runtime/log.h"
 
 #include <algorithm>
-#include <cstdio>
 #include <new>
 #include <string>
 
@@ -28,13 +27,11 @@ String job_id_of(const char* test_name, uint32 number)
     return String(test_name, "-", std::to_string(number).substr(0, 7).c_str());
 }
 
+/// Cut to 49 characters. A number above 2147483647 prints as a negative one.
 String getInstanceIDForRecord(const String& job_id, uint32 number)
 {
-    char id[50];
-    // Cut to the buffer; a number above 2147483647 prints as a negative one.
-    if (snprintf(id, sizeof id, "%s:%d", job_id.c_str(), static_cast<int>(number)) < 0)
-        id[0] = '\0';
-    return id;
+    const std::string id = job_id.c_str() + (":" + std::to_string(static_cast<int>(number)));
+    return id.substr(0, 49).c_str();
 }
 
 } // namespace
