@@ -221,6 +221,9 @@ TEST(Datetime, CopiesShareUntilOneIsWritten)
     b.clear();
     EXPECT_EQ(1, rep_of(a)->refs);
     EXPECT_EQ(5u, a.usec());
+    const auto* const own = rep_of(a);
+    a.set(7, 60);
+    EXPECT_EQ(own, rep_of(a)) << "nobody else sees it";
 }
 
 TEST(Datetime, ZeroIntervalsStayZeroWhateverOthersWrite)
