@@ -18,7 +18,7 @@ std::string read(const std::string& text)
     return "refused";
 }
 
-bool is_too_deep(const std::string& text)
+bool is_too_deep(std::string_view text)
 {
     Json::Value value;
     std::string errors;
@@ -94,6 +94,9 @@ TEST(Json_Reading, NothingHidesDepth)
         EXPECT_TRUE(is_too_deep(before + nested(257)));
         EXPECT_FALSE(is_too_deep(before + nested(256)));
     }
+    // What lies behind the end is no part of the text.
+    EXPECT_FALSE(is_too_deep(std::string_view(deep).substr(0, 256)));
+    EXPECT_TRUE(is_too_deep(std::string_view(deep).substr(0, 257)));
     // What is open to the end hides what is not read either.
     EXPECT_FALSE(is_too_deep("/* " + nested(257)));
     EXPECT_FALSE(is_too_deep("// " + nested(257)));
