@@ -95,8 +95,9 @@ TEST(Json_Reading, NothingHidesDepth)
         EXPECT_FALSE(is_too_deep(before + nested(256)));
     }
     // What lies behind the end is no part of the text.
-    EXPECT_FALSE(is_too_deep(std::string_view(deep).substr(0, 256)));
-    EXPECT_TRUE(is_too_deep(std::string_view(deep).substr(0, 257)));
+    const std::string behind_a_blank = " " + deep;
+    EXPECT_FALSE(is_too_deep(std::string_view(behind_a_blank).substr(0, 257)));
+    EXPECT_TRUE(is_too_deep(std::string_view(behind_a_blank).substr(0, 258)));
     // What is open to the end hides what is not read either.
     EXPECT_FALSE(is_too_deep("/* " + nested(257)));
     EXPECT_FALSE(is_too_deep("// " + nested(257)));
