@@ -135,6 +135,7 @@ uint32 Buffer::vformat(const char* format, va_list arguments)
         const int n = vsnprintf(_data + _size, room, format, copy);
         va_end(copy);
         if (n < 0) {
+            // Either way (boundary): one doubling more in vain shows nowhere.
             if (room >= GIVE_UP)
                 return 0;
             room *= 2;

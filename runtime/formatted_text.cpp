@@ -32,6 +32,7 @@ char* str_vprintf(const char* format, va_list arguments)
         va_end(copy);
         if (n >= 0 && static_cast<size_t>(n) < size)
             return text;
+        // Either way (boundary): one doubling more in vain shows nowhere, and an empty text is done above.
         if (n < 0 && size >= GIVE_UP)
             break;
         size = n < 0 ? 2 * size : static_cast<size_t>(n) + 1;
