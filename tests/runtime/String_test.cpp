@@ -133,6 +133,18 @@ TEST(String, MutatorsLeaveOtherHandlesAlone)
     }
 }
 
+TEST(String, WhatFitsExactlyIsAddedInPlace)
+{
+    String x("a");
+    const String_Rep* const rep = rep_of(x);
+    x.reserve(32);
+    x.append(letters(31).c_str());
+    EXPECT_EQ(rep, rep_of(x));
+    EXPECT_EQ(32u, x.size());
+    x.append("b");
+    EXPECT_NE(rep, rep_of(x));
+}
+
 TEST(String, AppendOfACharacterGrows)
 {
     String x;
