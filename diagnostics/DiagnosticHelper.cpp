@@ -183,7 +183,7 @@ void DiagnosticHelper::addDiagnosticRecord(const DiagnosticRecord& record)
     const Auto_Mutex lock(list.lock);
     list.entries.push_back(record);
     if (list.entries.size() > MOST_RECORDS)
-        list.entries.erase(list.entries.begin(), list.entries.end() - MOST_RECORDS);
+        list.entries.erase(list.entries.begin());
 }
 
 } // namespace KPRV

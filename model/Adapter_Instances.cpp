@@ -4,6 +4,9 @@
 #include "runtime/Ref.h"
 #include "runtime/log.h"
 
+#include <algorithm>
+#include <string>
+
 namespace KPRV {
 
 namespace {
@@ -27,7 +30,7 @@ std::string tag(const _adapterData& adapter)
     if (adapter.isCNA)
         return std::string("10000000-0000-0000-0000-") + adapter.mac;
     const std::string wwn = adapter.nodeWWN;
-    const size_t head = wwn.size() < 4 ? wwn.size() : 4;
+    const size_t head = std::min(wwn.size(), size_t(4));
     return "10000000-0000-0000-" + wwn.substr(0, head) + "-" + wwn.substr(head);
 }
 

@@ -133,6 +133,19 @@ TEST(String, MutatorsLeaveOtherHandlesAlone)
     }
 }
 
+TEST(String, RemovingNothingCopiesNothing)
+{
+    String empty;
+    empty.remove(0, 1);
+    EXPECT_EQ(&String::_empty, rep_of(empty));
+    const String a("abc");
+    String b(a);
+    b.remove(3, 1);
+    b.remove(4, 1);
+    b.remove(0, 0);
+    EXPECT_EQ(rep_of(a), rep_of(b));
+}
+
 TEST(String, WhatFitsExactlyIsAddedInPlace)
 {
     String x("a");
