@@ -122,6 +122,8 @@ pegasus_forget_classes() {
     local -a files=("$share/mof/kldr_structure.mof" "$share/mof/kldrprovider.mof") classes qualifiers
     [ "$pegasus_namespace_is" = made ] || files=("$share/mof/kldrprovider.mof")
     mapfile -t classes < <(classes_in "${files[@]}" | tac)
+    # The server itself puts these into the namespace of what conforms to a profile.
+    [ "$pegasus_namespace_is" != made ] || classes=(PG_ElementConformsToProfile PG_RegisteredProfile "${classes[@]}")
     pegasus_delete dc "$NAMESPACE" "classes" "${classes[@]}"
     [ "$pegasus_namespace_is" = made ] || return 0
     mapfile -t qualifiers < <(sed -n 's/^Qualifier \([A-Za-z]*\) .*/\1/p' "$share/mof/kldr_qualifiers.mof")
