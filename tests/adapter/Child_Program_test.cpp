@@ -176,10 +176,14 @@ TEST_F(Child_Program, writes_where_the_server_writes)
 {
     programs.program("program", "echo output; echo errors >&2");
     in_child([&] {
+        const int output = fcntl(STDOUT_FILENO, F_DUPFD, 50), errors = fcntl(STDERR_FILENO, F_DUPFD, 50);
         const int both = open(folder.path("seen").c_str(), O_WRONLY | O_CREAT | O_APPEND, 0600);
         dup2(both, STDOUT_FILENO);
         dup2(both, STDERR_FILENO);
-        EXPECT_EQ(run({"program"}), 0);
+        const int status = run({"program"});
+        dup2(output, STDOUT_FILENO);
+        dup2(errors, STDERR_FILENO);
+        EXPECT_EQ(status, 0);
     });
     EXPECT_EQ(seen(), (Lines{"output", "errors"}));
 }

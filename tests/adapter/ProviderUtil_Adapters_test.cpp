@@ -276,9 +276,8 @@ TEST_F(ProviderUtil_Adapters, adapter_ids)
     library.calls.clear();
     log.clear();
     ProviderUtil::getAdapterId("8c7cff000002");
-    EXPECT_EQ(log.traces(),
-              (Lines{"DBG Entering: getAdapterId", "DBG Entering: getAdapterIdByIndexStr",
-                     "DBG Returning: getAdapterIdByIndexStr", "DBG Returning: getAdapterId"}));
+    EXPECT_EQ(log.traces(), (Lines{"DBG Entering: getAdapterId", "DBG Entering: getAdapterIdByIndexStr",
+                                   "DBG Returning: getAdapterIdByIndexStr", "DBG Returning: getAdapterId"}));
     log.clear();
     library.calls.clear();
     EXPECT_EQ(ProviderUtil::getAdapterId(WWN), -1);
