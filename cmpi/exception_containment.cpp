@@ -28,13 +28,14 @@ auto run_contained(Function function, Otherwise otherwise) -> decltype(function(
 {
     try {
         return function();
-    } catch (const abi::__forced_unwind&) {
-        throw;
     } catch (const std::exception& error) {
         return otherwise(error.what());
     } catch (const HbaAgentError& error) {
         return otherwise(error.message.c_str());
     } catch (...) {
+        // Only an exception has a type.
+        if (!abi::__cxa_current_exception_type())
+            throw;
         return otherwise("an exception of unknown type");
     }
 }
