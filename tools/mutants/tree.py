@@ -61,12 +61,27 @@ def run(command, limit=None, **options):
             pass
 
 
+def own_processes():
+    """The head of a command that sees no processes but its own; nothing where the system does not allow it. The shell stays in
+    between: the first process of all would be treated as no other is."""
+    for rights in ([], ["--user", "--map-root-user"]):
+        head = ["unshare", *rights, "--pid", "--fork", "--kill-child", "--mount-proc", "sh", "-c", '"$0" "$@"; exit $?']
+        try:
+            if run([*head, "true"])[0] == 0:
+                return head
+        except FileNotFoundError:
+            break
+    return []
+
+
 class Broken(Exception):
     """The tree does not build, or its tests do not pass, without any mutation."""
 
 
 class Tree:
-    # Tests that look at the whole machine's processes must not meet those of another tree.
+    # Tests that look at the whole machine's processes must not meet those of others, and where they may, not those of another
+    # tree.
+    _alone = own_processes()
     _resources = {}
     _guard = threading.Lock()
 
@@ -108,12 +123,15 @@ class Tree:
         properties = {each["name"]: each["value"] for each in self.tests[name].get("properties", [])}
         environment = dict(self.environment)
         environment.update(each.split("=", 1) for each in properties.get("ENVIRONMENT", []) if "=" in each)
-        locks = [self.resource(each) for each in properties.get("RESOURCE_LOCK", [])]
+        wanted = properties.get("RESOURCE_LOCK", [])
+        is_alone = self._alone and "process_list" in wanted
+        command = (self._alone if is_alone else []) + self.tests[name]["command"]
+        locks = [self.resource(each) for each in wanted if not (is_alone and each == "process_list")]
         for lock in locks:
             lock.acquire()
         begin = time.monotonic()
         try:
-            status, output = run(self.tests[name]["command"], limit, cwd=properties["WORKING_DIRECTORY"], env=environment)
+            status, output = run(command, limit, cwd=properties["WORKING_DIRECTORY"], env=environment)
             return status, output, time.monotonic() - begin
         finally:
             for lock in locks:
