@@ -200,6 +200,7 @@ TEST(Instance_identical, FollowsReferencesAndArraysOfThem)
     EXPECT_TRUE(differs([](Sample_Group& b) { b.Members.null = 1; }));
     EXPECT_TRUE(differs([](Sample_Group& b) { b.Members.value.append(nullptr); }));
     EXPECT_TRUE(differs([](Sample_Group& b) { b.Members.value[1] = make_port("member", 3); }));
+    EXPECT_TRUE(differs([](Sample_Group& b) { b.Members.value[0]->__name_space = "root"; }));
     EXPECT_TRUE(differs([](Sample_Group& b) { b.Members.value[2]->__name_space = "root"; }));
 }
 
