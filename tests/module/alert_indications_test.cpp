@@ -2,6 +2,8 @@
 #include "host/Path_Parser.h"
 #include "host/Subscription.h"
 #include "tests/module/Alert_Fixture.h"
+#include "tests/module/Golden.h"
+#include "tests/module/Traces.h"
 #include "tests/support/Eventually.h"
 
 #include <atomic>
@@ -75,6 +77,24 @@ TEST_F(Alert_Indications, ReachASubscriberAsStandardAndProprietaryAlert)
     EXPECT_EQ(5u, both[1].property("PerceivedSeverity")->as_uint());
     EXPECT_EQ(both[0].property("SequenceNumber")->as_sint() + 1,
               both[1].property("SequenceNumber")->as_sint());
+}
+
+TEST_F(Alert_Indications, TraceWhatTheyEnter)
+{
+    mark();
+    {
+        host::Subscription subscription(*server, CLASS);
+        ASSERT_EQ(CMPI_RC_OK, subscription.add("root/kaldera"));
+        // One event of each category, since each has a path of its own.
+        for (int category = 1; category <= 20; category++)
+            simulator.event(event(category, 1));
+        simulator.event(event(9, 2, R"(, "eventMsg": "the last")"));
+        EXPECT_TRUE(eventually([&] {
+            const std::vector<host::Instance_Value> all = alerts();
+            return !all.empty() && text_of(all.back(), "Message") == "the last";
+        }));
+    }
+    expect_golden("traces_of_alerts", as_sorted_text(traces_of(log_lines())), ".txt");
 }
 
 TEST_F(Alert_Indications, NameAnInstanceThatAClientCanGet)

@@ -1,6 +1,8 @@
 // A program of its own, each test in a process of its own: a test run pins the module, so that it is not
 // loaded anew.
+#include "tests/module/Golden.h"
 #include "tests/module/Module_Fixture.h"
+#include "tests/module/Traces.h"
 #include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
 
@@ -194,6 +196,31 @@ TEST_F(Diagnostics, AreNotRunThroughAnotherClass)
         }
         EXPECT_EQ(Lines{}, said_by("KALDERA_PCILoopbackDiagnosticTest_Provider.cpp")) << "not even entered";
         EXPECT_TRUE(enumerate("KALDERA_ConcreteJob").instances.empty());
+    });
+}
+
+TEST_F(Diagnostics, TraceWhatTheyEnter)
+{
+    on_demo_host([&] {
+        std::string text;
+        const auto run = [&](const char* kind, const char* name, const host::Path_Value& element) {
+            const host::Path_Value path = test(kind, name);
+            mark();
+            EXPECT_EQ(4096u, code(path, element));
+            wait();
+            text += std::string(name) + "\n" + as_sorted_text(traces_of(log_lines()));
+        };
+        run("Loopback", "ExternalLoopbackTest", fc_port());
+        run("EthLoopback", "SerdesEthLoopbackTest", eth_port());
+        run("PCILoopback", "PCILoopbackTest", fc_port());
+        run("Memory", "MemoryTest", adapter());
+        mark();
+        for (const char* name :
+             {"KALDERA_ConcreteJob", "KALDERA_DiagnosticServiceRecord", "KALDERA_DiagnosticCompletionRecord",
+              "KALDERA_AffectedJobElement", "KALDERA_ServiceRecordAppliesToElement"})
+            enumerate(name);
+        text += "what they leave\n" + as_sorted_text(traces_of(log_lines()));
+        expect_golden("traces_of_tests", text, ".txt");
     });
 }
 

@@ -1,5 +1,6 @@
 #include "tests/module/Golden.h"
 #include "tests/module/Module_Fixture.h"
+#include "tests/module/Traces.h"
 #include "tests/support/Module_Picture.h"
 
 #include <algorithm>
@@ -8,28 +9,6 @@ namespace KPRV {
 namespace {
 
 using Traces = Module_Fixture;
-
-/// What a walk enters (>) and leaves (<), each where it comes first. How often it comes is a matter of the
-/// host.
-std::string traces_of(const std::vector<Log_Line>& lines)
-{
-    const std::string entering = "Entering: ", returning = "Returning: ";
-    Lines seen;
-    for (const Log_Line& line : lines) {
-        if (!line.is_trace())
-            continue;
-        EXPECT_EQ("DBG", line.level);
-        const bool enters = line.text.starts_with(entering);
-        const std::string name = line.text.substr((enters ? entering : returning).size());
-        const std::string trace = (enters ? "  > " : "  < ") + line.file + " " + name + "\n";
-        if (std::ranges::find(seen, trace) == seen.end())
-            seen.push_back(trace);
-    }
-    std::string text;
-    for (const std::string& trace : seen)
-        text += trace;
-    return text;
-}
 
 // Of each class over a host that has every kind of thing: support reads a log by them.
 TEST_F(Traces, OfEveryEnumeration)
@@ -41,7 +20,7 @@ TEST_F(Traces, OfEveryEnumeration)
     for (const std::string& name : names) {
         mark();
         server->enumerate_instances(name);
-        text += name + "\n" + traces_of(log_lines());
+        text += name + "\n" + as_text(traces_of(log_lines()));
     }
     expect_golden("traces", text, ".txt");
 }
