@@ -27,6 +27,7 @@ bool listed_name_ends_in(const char* process_id, std::string_view ending)
     char text[512];
     const ssize_t size = read(file, text, sizeof text);
     close(file);
+    // Either way (boundary): an empty line is none of the form below.
     if (size <= 0)
         return false;
 
@@ -35,7 +36,7 @@ bool listed_name_ends_in(const char* process_id, std::string_view ending)
     const size_t open_bracket = line.find('(');
     const size_t close_bracket = line.rfind(") ");
     if (open_bracket == line.npos || close_bracket == line.npos || close_bracket + 2 >= line.size())
-        return false;
+        return false; // Either way (statement): the kernel writes no other form.
     const char state = line[close_bracket + 2];
     const std::string_view name =
         line.substr(open_bracket + 1, close_bracket - open_bracket - 1).substr(0, LISTED);
