@@ -5,6 +5,7 @@ import os
 import signal
 import socket
 import subprocess
+import tempfile
 import time
 from pathlib import Path
 
@@ -24,8 +25,8 @@ def room():
     return json.loads(os.environ["KLDR_ROOM"])
 
 
-def processes(names):
-    """Those that run under one of these names, zombies left out."""
+def processes(names, zombies=False):
+    """Those that run under one of these names, zombies left out unless they are wanted too."""
     found = []
     for entry in Path("/proc").iterdir():
         if not entry.name.isdigit():
@@ -35,7 +36,7 @@ def processes(names):
         except OSError:
             continue
         name, _, rest = status.partition("(")[2].rpartition(")")
-        if name in names and rest.split()[0] != "Z":
+        if name in names and (zombies or rest.split()[0] != "Z"):
             found.append(int(entry.name))
     return found
 
@@ -71,19 +72,28 @@ class Server:
 
     def start(self):
         """Starts it, and returns when it listens."""
-        done = subprocess.run(
-            [self.home / "start", str(self.port)], env=self.environment(), start_new_session=True, check=False,
-            stdin=subprocess.DEVNULL, stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True, timeout=120,
-        )  # fmt: skip
-        if done.returncode:
-            raise AssertionError(f"{self.kind} does not start: {done.stdout}")
+        # A provider that is loaded at once, for a stored subscription, may keep the output: a file ends nevertheless.
+        with tempfile.TemporaryFile(mode="w+", encoding="utf-8") as output:
+            done = subprocess.run(
+                [self.home / "start", str(self.port)], env=self.environment(), start_new_session=True, check=False,
+                stdin=subprocess.DEVNULL, stdout=output, stderr=subprocess.STDOUT, timeout=120,
+            )  # fmt: skip
+            output.seek(0)
+            if done.returncode:
+                raise AssertionError(f"{self.kind} does not start: {output.read()}")
         self._wait(self.listens, "it does not listen")
 
-    def stop(self):
-        """Stops it as its administrator does, and returns when all its processes have ended; sfcb sometimes needs force."""
-        done = subprocess.run([self.home / "stop"], env=self.environment(), check=False, capture_output=True, timeout=120)
-        if done.returncode and self.kind == "sfcb":
-            print(f"{self.kind} does not end, and is killed: {done.stderr.decode()}", flush=True)
+    def stop(self, seconds=120):
+        """Stops it as its administrator does, and returns when all its processes have ended; sfcb sometimes needs force, at the
+        latest after so many seconds."""
+        try:
+            words = [self.home / "stop"]
+            done = subprocess.run(words, env=self.environment(), check=False, capture_output=True, timeout=seconds)
+            ended, shown = done.returncode == 0, done.stderr.decode()
+        except subprocess.TimeoutExpired:
+            ended, shown = False, f"not within {seconds} s"
+        if not ended and self.kind == "sfcb":
+            print(f"{self.kind} does not end, and is killed: {shown}", flush=True)
             self.kill()
         self._wait(lambda: not self.running(), "its processes do not end")
 

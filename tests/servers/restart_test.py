@@ -1,0 +1,100 @@
+"""A server that is started again, or gives the module up in between: clients find all as it was."""
+
+import importlib
+import json
+import time
+from pathlib import Path
+
+import package
+from provider_process import holders
+from server import PROCESSES, processes
+from server_case import ServerCase, long
+
+#: Each brings two alerts.
+EVENTS = 20
+SCRIPT = Path("/tmp/events.json")
+#: In seconds, in which a parent hears of a child's end.
+MOMENT = 5
+
+
+class Restart(ServerCase):
+    def setUp(self):
+        super().setUp()
+        package.install()
+        package.register("install")
+        self.server.start()
+        # The client library is in the machine alone, so that nothing of it may be needed to find these cases.
+        client = importlib.import_module("client")
+        self.check = client.Check(
+            __doc__, ["--url", self.server.url, "--server", self.server.kind, "--kldrcim", "/usr/bin/kldrcim"]
+        )
+
+    def assert_no_differences(self):
+        self.assertGreater(self.check.compared, 0)
+        self.assertEqual(self.check.differences, [])
+
+    def settled(self):
+        """Processes of the server, zombies too; but those that await their parent get a moment."""
+        names = PROCESSES[self.server.kind]
+        end = time.monotonic() + MOMENT
+        while processes(names, zombies=True) != processes(names) and time.monotonic() < end:
+            time.sleep(0.05)
+        return processes(names, zombies=True)
+
+    def assert_gone(self):
+        """Nothing of the server or of the module, which a process may also hold that nobody knows any more."""
+        self.assertEqual(holders(), [])
+        self.assertEqual(self.settled(), [])
+
+
+class Subscriptions(Restart):
+    """What happens after the restart, nobody has asked for: the adapter library tells of events by itself."""
+
+    def write_script(self, events, port):
+        """Ports that are taken out of service and put back, told to the server that is started next; returns the identities of
+        the alerts."""
+        keys = [sorted(events)[number % 2] for number in range(EVENTS)]
+        lines = [
+            {
+                "eventCategory": int(key) >> 16,
+                "eventId": int(key) & 0xFFFF,
+                "eventSeverity": 3,
+                "eventIdValue": events[key],
+                "eventMsg": "told by the library",
+                "portIndexString": port,
+            }
+            for key in keys
+        ]
+        SCRIPT.write_text(json.dumps([{"after": 20, "event": line} for line in lines]), encoding="utf-8")
+        self.server.module_environment["KLDR_SIMULATOR_EVENTS"] = str(SCRIPT)
+        return [f"{prefix}{key}" for key in keys for prefix in ("KLDR", "PROPKLDR")]
+
+    def survives(self, end):
+        subscriptions = importlib.import_module("subscriptions_check")
+        alerts, listener = subscriptions.Alerts(self.check), subscriptions.Listener()
+        self.addCleanup(listener.listener.stop)
+        with alerts.subscription(listener):
+            before = alerts.switch(2)
+            alerts.compare("before", listener.take(len(before)), before)
+            # For a client that keeps its connection, sfcb waits 15 seconds.
+            self.check.connection.close()
+            alerts.interop.close()
+            self.check.connection, alerts.interop = self.check.connect(), self.check.connect(self.check.interop)
+            end()
+            self.assert_gone()
+            scripted = self.write_script(subscriptions.EVENTS, alerts.port)
+            self.server.start()
+            alerts.compare("afterwards", listener.take(len(scripted)), scripted)
+            self.check.expect("one more", listener.stays_silent(), None)
+            asked = alerts.switch(2)
+            alerts.compare("asked for", listener.take(len(asked)), asked)
+        alerts.switch(2)
+        self.check.expect("after the end", listener.stays_silent(), None)
+        self.assert_no_differences()
+
+    def test_a_stored_subscription_survives_a_restart(self):
+        self.survives(self.server.stop)
+
+    @long
+    def test_a_stored_subscription_survives_the_death_of_the_server(self):
+        self.survives(self.server.kill)
