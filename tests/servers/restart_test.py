@@ -13,6 +13,8 @@ from server_case import ServerCase, long
 #: Each brings two alerts.
 EVENTS = 20
 SCRIPT = Path("/tmp/events.json")
+#: In seconds, for a server to end that is busy; OpenPegasus needs some.
+UNDER_LOAD = 5
 #: In seconds, in which a parent hears of a child's end.
 MOMENT = 5
 
@@ -45,6 +47,14 @@ class Restart(ServerCase):
         """Nothing of the server or of the module, which a process may also hold that nobody knows any more."""
         self.assertEqual(holders(), [])
         self.assertEqual(self.settled(), [])
+
+    def assert_one_process(self):
+        """Of this server, and none but it."""
+        found = holders()
+        self.assertEqual(len(found), 1, found)
+        self.assertIn(found[0], self.settled())
+        self.assertEqual(self.settled(), processes(PROCESSES[self.server.kind]), "zombies")
+        return found[0]
 
 
 class Subscriptions(Restart):
@@ -98,3 +108,21 @@ class Subscriptions(Restart):
     @long
     def test_a_stored_subscription_survives_the_death_of_the_server(self):
         self.survives(self.server.kill)
+
+
+class Load(Restart):
+    def test_clients_outlast_a_restart_under_load(self):
+        clients = importlib.import_module("lasting_clients").Lasting_Clients(self.check)
+        clients.wait_for_answers()
+        first = self.assert_one_process()
+        # sfcb's own processes that serve a request wait for ever for those that have ended before them.
+        self.server.stop(UNDER_LOAD)
+        self.assert_gone()
+        self.server.start()
+        clients.wait_for_answers()
+        clients.end()
+        self.assertNotEqual(self.assert_one_process(), first)
+        self.assert_no_differences()
+        self.check.connection.close()
+        self.server.stop()
+        self.assert_gone()
