@@ -1,4 +1,4 @@
-"""A server that is started again, or gives the module up in between: clients find all as it was."""
+"""A server that is started again: clients find all as it was."""
 
 import importlib
 import json
