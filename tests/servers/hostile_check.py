@@ -1,6 +1,7 @@
 #!/usr/bin/env python3
 """Requests that no honest client makes: each is answered, the module's process stays, and holds no more than before."""
 
+import re
 import sys
 from pathlib import Path
 
@@ -19,6 +20,22 @@ def contains_exceptions(kldrcim):
     """Whether the module turns what it throws into a status by itself: the command line says so if not."""
     answer = kldrcim.run("cm", kldrcim.ask("ein", "KALDERA_AgentService")[0], "executeMethod", "request=[1]")
     return "an exception left the provider" not in str(answer)
+
+
+def check_words(check, hostile):
+    """A contained exception is a failure that says in which method, and what it was."""
+    for text in Hostile.THROWN:
+        try:
+            hostile.execute(text)
+        except pywbem.CIMError as error:
+            check.expect(f"{text}: status", error.status_code, pywbem.CIM_ERR_FAILED)
+            words = str(error.status_description)
+            found = re.search(r"invokeMethod\(executeMethod\): \w.*", words)
+            check.expect_that(f"{text}: words", found is not None, words)
+        except pywbem.Error as error:
+            check.expect_that(text, False, error)
+        else:
+            check.expect_that(text, False, "an answer instead of a failure")
 
 
 def one_round(check, requests, process, long):
@@ -51,6 +68,9 @@ def main():
         before = before or process.figures()
     check.expect_that("kinds of hostile requests", count >= 46, count)
     process.has_not_grown(before, GROWTH)
+    if contained:
+        check_words(check, hostile)
+        process.is_the_same("after what was thrown")
     check.expect("commands run", TRACE.exists(), False)
     hosts = check.attempt("afterwards", check.connection.EnumerateInstances, "KALDERA_ComputerSystem")
     check.expect("hosts afterwards", len(hosts or []), 1)

@@ -160,6 +160,7 @@ class Hostile:
         yield from self.methods()
         texts = list(self.requests()) + [(text, text) for text in self.THROWN if with_thrown]
         for title, text in texts:
-            yield f"executeMethod: {title}", lambda text=text: self.connection.InvokeMethod(
-                "executeMethod", self.service, request=text
-            )
+            yield f"executeMethod: {title}", lambda text=text: self.execute(text)
+
+    def execute(self, text):
+        return self.connection.InvokeMethod("executeMethod", self.service, request=text)
