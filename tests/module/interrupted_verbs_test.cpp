@@ -1,4 +1,5 @@
 // kldrcim under signals, and asked on a terminal: over the built module and the simulator, as users run it.
+#include "tests/support/Eventually.h"
 #include "tests/support/Kldrcim_Process.h"
 
 namespace KPRV {
@@ -77,6 +78,7 @@ TEST_F(Interrupted_Verbs, ASecondSignalSaysWhatIsLeft)
     host(R"({"diagMemoryTest": {"milliseconds": 60000}})");
     Kldrcim_Process run = diag("MemoryTest", ADAPTER);
     ASSERT_TRUE(run.says("running, "));
+    ASSERT_TRUE(eventually([&] { return logged(SWITCHED) == 1; }));
     run.send(SIGINT);
     ASSERT_TRUE(run.says("interrupted: waiting"));
     run.send(SIGTERM);
