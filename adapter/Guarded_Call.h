@@ -1,9 +1,8 @@
 #pragma once
 
 #include "adapter/CIMProviderZntj.h"
+#include "runtime/forced_unwinding.h"
 #include "runtime/log.h"
-
-#include <cxxabi.h>
 
 namespace KPRV {
 
@@ -36,9 +35,7 @@ bool guarded(Call_Site site, const Guarded_Entry& entry, Body&& body)
         body();
         return true;
     } catch (...) {
-        // Without a type it is no exception of C++: the thread is being cancelled, which nothing may stop.
-        if (!abi::__cxa_current_exception_type())
-            throw;
+        rethrow_forced_unwinding();
         log_caught(entry, site);
         return false;
     }
@@ -53,8 +50,7 @@ inline Json::Value guarded_answer(Call_Site site, const Guarded_Entry& entry, Js
     try {
         return call(request);
     } catch (...) {
-        if (!abi::__cxa_current_exception_type())
-            throw;
+        rethrow_forced_unwinding();
         log_caught(entry, site);
         answered = false;
         return Json::Value();

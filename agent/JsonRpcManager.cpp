@@ -5,10 +5,11 @@
 #include "adapter/Json_Reading.h"
 #include "agent/MethodRegistration.h"
 #include "runtime/Standard_Mutex.h"
+#include "runtime/forced_unwinding.h"
 
 #include <algorithm>
 #include <atomic>
-#include <cxxabi.h>
+#include <exception>
 #include <memory>
 
 namespace KPRV {
@@ -154,9 +155,7 @@ void JsonRpcManager::call(std::string_view name, const Json::Value& params, Json
     } catch (const std::exception& error) {
         fail(reply, "JSONRPCError", 200, error.what());
     } catch (...) {
-        // Without a type it is no exception of C++: the thread is being cancelled, which nothing may stop.
-        if (!abi::__cxa_current_exception_type())
-            throw;
+        rethrow_forced_unwinding();
         fail(reply, "UnCaughtError", 5000, "Unknown error that was not caught");
     }
 }

@@ -4,6 +4,7 @@
 #include "cmpi/cmpi_types.h"
 #include "cmpi/to_cimple_value.h"
 #include "cmpi/to_cmpi_data.h"
+#include "runtime/forced_unwinding.h"
 #include "runtime/log.h"
 #include "runtime/type_dispatch.h"
 
@@ -138,6 +139,7 @@ const char* CMPIInstance_Container::peek_name(uint32 index, String&)
         }
         return text_of(string);
     } catch (...) {
+        rethrow_forced_unwinding();
         LOG_CONVERSION(WARN, "CMGetPropertyAt() threw exception: index=%u size=%u", index, get_size());
         return nullptr;
     }

@@ -5,9 +5,9 @@
 #include "cmpi/cmpi_text.h"
 #include "cmpi/to_cimple_value.h"
 #include "runtime/Instance_Enumerator.h"
+#include "runtime/forced_unwinding.h"
 #include "runtime/log.h"
 
-#include <cxxabi.h>
 #include <memory>
 
 namespace KPRV {
@@ -63,9 +63,7 @@ static void _on_own_thread(Call call)
     try {
         call();
     } catch (...) {
-        // Without a type it is no exception of C++: the thread is being cancelled, which nothing may stop.
-        if (!abi::__cxa_current_exception_type())
-            throw;
+        rethrow_forced_unwinding();
     }
 }
 

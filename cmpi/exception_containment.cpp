@@ -5,11 +5,11 @@
 #include "adapter/HbaAgentError.h"
 #include "cmpi/CMPI_Adapter.h"
 #include "cmpi/entries.h"
+#include "runtime/forced_unwinding.h"
 
 #include <algorithm>
 #include <cmpimacs.h>
 #include <cstdio>
-#include <cxxabi.h>
 #include <exception>
 #include <string_view>
 #include <tuple>
@@ -33,9 +33,7 @@ auto run_contained(Function function, Otherwise otherwise) -> decltype(function(
     } catch (const HbaAgentError& error) {
         return otherwise(error.message.c_str());
     } catch (...) {
-        // Only an exception has a type.
-        if (!abi::__cxa_current_exception_type())
-            throw;
+        rethrow_forced_unwinding();
         return otherwise("an exception of unknown type");
     }
 }

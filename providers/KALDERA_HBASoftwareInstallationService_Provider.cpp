@@ -2,14 +2,13 @@
 #include "providers/deliver.h"
 #include "providers/managers.h"
 #include "providers/proc.h"
+#include "runtime/forced_unwinding.h"
 #include "schema/CIM_ManagedElement.h"
 #include "schema/KALDERA_HBASoftwareInstallationService_Skeleton.h"
 #include "schema/KALDERA_PortController.h"
 #include "update/Firmware_Uri.h"
 #include "update/Install_Failure.h"
 #include "update/SoftwareUpdateHelper.h"
-
-#include <cxxabi.h>
 
 namespace KPRV {
 
@@ -110,10 +109,7 @@ public:
         } catch (const Install_Failure& failure) {
             LOG(DBG, "InstallFromURI : ERROR - %s", failure.text);
         } catch (...) {
-            // Without a type it is no exception of C++: the thread is being cancelled, which nothing may
-            // stop.
-            if (!abi::__cxa_current_exception_type())
-                throw;
+            rethrow_forced_unwinding();
             LOG(DBG, "InstallFromURI : ERROR - unknown Exception");
         }
         LOG(DBG, "return value = %d\n", int(return_value.value));

@@ -1,10 +1,12 @@
 #include "adapter/Guarded_Call.h"
 
+#include "tests/support/Eventually.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <pthread.h>
 
 using namespace KPRV;
@@ -73,6 +75,36 @@ TEST_F(Guarded_Call, the_third_text_can_end_in_its_address)
     EXPECT_EQ(log.said(), (Lines{"ERR libGetPortByWwn got default exception for 10:00",
                                  "ERR libSetAdapterState got default exception for 10:00",
                                  "ERR 10:00 - libGetPortByWwn got User exception 7: 100 % busy"}));
+}
+
+// As hardware tests run: what the C library keeps of such a thread is not what it keeps of one that is
+// joined.
+TEST_F(Guarded_Call, does_not_hold_up_a_detached_thread_that_ends)
+{
+    static std::atomic<bool> is_unwound;
+    is_unwound = false;
+    struct Told
+    {
+        ~Told() { is_unwound = true; }
+    };
+    static std::atomic<bool> has_come_back;
+    has_come_back = false;
+    library.answers("getPortByWwn", [](const Json::Value&) -> Json::Value { pthread_exit(nullptr); });
+    pthread_t thread;
+    ASSERT_EQ(pthread_create(
+                  &thread, nullptr,
+                  [](void* test) -> void* {
+                      pthread_detach(pthread_self());
+                      const Told told;
+                      static_cast<Guarded_Call*>(test)->call({"libGetPortByWwn"});
+                      has_come_back = true;
+                      return nullptr;
+                  },
+                  this),
+              0);
+    EXPECT_TRUE(eventually([] { return is_unwound.load(); }));
+    EXPECT_FALSE(has_come_back);
+    EXPECT_EQ(log.said(), Lines{});
 }
 
 TEST_F(Guarded_Call, does_not_hold_up_a_cancelled_thread)
