@@ -1,6 +1,6 @@
 #include "simulator/Entry_Points.h"
 
-#include "runtime/Standard_Mutex.h"
+#include "module/runtime/Standard_Mutex.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Simulator.h"
 

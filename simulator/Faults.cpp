@@ -1,6 +1,6 @@
 #include "simulator/Faults.h"
 
-#include "adapter/HbaAgentError.h"
+#include "contracts/adapter/HbaAgentError.h"
 #include "simulator/Address.h"
 #include "simulator/Answers.h"
 #include "simulator/Entry_Points.h"

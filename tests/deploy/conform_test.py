@@ -84,8 +84,8 @@ class Conform(unittest.TestCase):
         from generator.parser import parse
         from generator.resolver import resolve
 
-        classes = {c.name: c for c in resolve(parse([str(SOURCE / "schema" / f) for f in ("cim.mof", "kaldera.mof")]))}
-        text = (SOURCE / "host/Conformance_Plan.cpp").read_text(encoding="utf-8")
+        classes = {c.name: c for c in resolve(parse([str(SOURCE / "module/schema" / f) for f in ("cim.mof", "kaldera.mof")]))}
+        text = (SOURCE / "kldrcim/walks/Conformance_Plan.cpp").read_text(encoding="utf-8")
         constants = dict(re.findall(r'(\w+) =\s+"([^"]*)";', text))
         names = set()
         rows = [re.findall(r'"[^"]*"|\w+', line) for line in text.splitlines() if re.match(r"    \{(\"|nullptr)", line)]

@@ -24,7 +24,7 @@ ENVIRONMENT = {
     "KLDR_SIMULATOR_INVENTORY": str(SOURCE / "simulator/inventories/demo.json"),
 }
 
-sys.path.insert(0, str(SOURCE / "schema"))
+sys.path.insert(0, str(SOURCE / "module/schema"))
 
 
 def output_of(*command, **options):

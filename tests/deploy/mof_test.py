@@ -24,7 +24,7 @@ class Mof(DeployCase):
 
     def test_the_three_files_are_the_catalogue(self):
         installed = self.loaded("kldr_qualifiers.mof", "kldr_structure.mof", "kldrprovider.mof")
-        sources = resolve(parse([str(SOURCE / "schema" / name) for name in ("cim.mof", "kaldera.mof")]))
+        sources = resolve(parse([str(SOURCE / "module/schema" / name) for name in ("cim.mof", "kaldera.mof")]))
         self.assertEqual(described(installed), described(sources))
         self.assertEqual(len(installed), 178)
 

@@ -1,7 +1,7 @@
 // The example of docs/design/objects.md: what the page draws is what the compiler makes of it.
 
-#include "runtime/Class_Plan.h"
-#include "runtime/Property.h"
+#include "module/runtime/Class_Plan.h"
+#include "module/runtime/Property.h"
 
 // Other files of the program may have an example, too.
 namespace KPRV::objects_page {

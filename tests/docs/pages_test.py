@@ -72,7 +72,7 @@ class Objects(unittest.TestCase):
 
     @staticmethod
     def pins():
-        text = read(ROOT / "runtime/layout.cpp")
+        text = read(ROOT / "module/runtime/layout.cpp")
         found = {}
         for record, field, *sizes in re.findall(r"^PIN\(([^,]+), *(\w+), *(\d+), *(\d+)\)", text, re.M):
             found.setdefault(record, {})[field] = tuple(map(int, sizes))
@@ -105,7 +105,7 @@ class Threads(unittest.TestCase):
     """docs/design/threads.md against the locks in the code."""
 
     #: What is never part of a running product.
-    ELSEWHERE = {"bench", "cmake", "deploy", "docs", "fuzz", "schema", "tests", "tools"}
+    ELSEWHERE = {"deploy", "docs", "tests", "tools"}
     LOCK = re.compile(
         r"^\s*(?:(?:mutable|static|constinit) )*(?:std::(?:recursive_|shared_)?mutex|Mutex|Standard_Mutex<[\w:]*>)"
         r" (\w+)(?:;|\(|{)", re.M)
@@ -161,12 +161,12 @@ class Failure(unittest.TestCase):
         table = rows(page, "folder", "returns on failure", "may throw", "logs", "owns")
         self.assertGreater(len(table), 10)
         # What the agent throws inside stands below.
-        below = {"agent/": re.search(r"^The methods of the agent throw.*?\n\n", read(page), re.M | re.S)[0]}
+        below = {"module/agent/": re.search(r"^The methods of the agent throw.*?\n\n", read(page), re.M | re.S)[0]}
         for folder, _, throws, _, _ in map(bare, table):
             files = [file for file in (ROOT / folder).rglob("*") if file.suffix in (".h", ".cpp")]
             self.assertTrue((ROOT / folder).is_dir(), folder)
             # The program's own parts may throw at each other.
-            if folder not in ("host/", "simulator/"):
+            if folder not in ("kldrcim/", "simulator/"):
                 for name in {name for file in files for name in self.THROW.findall(read(file))} - self.ANYWHERE:
                     self.assertRegex(throws + below.get(folder, ""), rf"\b{name}\b", folder)
 

@@ -74,18 +74,18 @@ protected:
 
     Json::Value ask(const char* method, const char* params)
     {
-        static const host::Path_Value service = {
+        static const broker::Path_Value service = {
             {},
             "root/kaldera",
             "KALDERA_AgentService",
-            {{"Name", host::Value::text("Kaldera Agent Service Provider")}}};
+            {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
         const std::string request =
             R"({"method": ")" + std::string(method) + R"(", "params": )" + json_text(params) + "}";
-        const host::Result result =
-            server->invoke_method(service, "executeMethod", {{"request", host::Value::text(request)}});
+        const broker::Result result =
+            server->invoke_method(service, "executeMethod", {{"request", broker::Value::text(request)}});
         EXPECT_TRUE(result.ok()) << result.rc << " " << thrown_text(result).value_or("");
         EXPECT_EQ(1u, result.done_count);
-        const host::Value* const response = find_value(result.out, "response");
+        const broker::Value* const response = find_value(result.out, "response");
         Json::Value reply;
         EXPECT_TRUE(response && !response->null);
         if (response && !response->null)

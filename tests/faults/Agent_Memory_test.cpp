@@ -10,16 +10,16 @@ namespace {
 
 using Agent_Memory = Fault_Fixture;
 
-host::Result call(host::Host& server)
+broker::Result call(broker::Host& server)
 {
-    const host::Path_Value service = {{},
-                                      "root/kaldera",
-                                      "KALDERA_AgentService",
-                                      {{"Name", host::Value::text("Kaldera Agent Service Provider")}}};
+    const broker::Path_Value service = {{},
+                                        "root/kaldera",
+                                        "KALDERA_AgentService",
+                                        {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
     // The last method that is entered.
     return server.invoke_method(
         service, "executeMethod",
-        {{"request", host::Value::text(R"({"method": "diagnostics.getDPortTestResults", "params": []})")}});
+        {{"request", broker::Value::text(R"({"method": "diagnostics.getDPortTestResults", "params": []})")}});
 }
 
 TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
@@ -30,7 +30,7 @@ TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
         watch_library("libkldrprovider_Module", true);
         for (unsigned long nth = 1, asked = nth; asked >= nth; nth++) {
             fail_allocation(nth);
-            const host::Result result = call(*server);
+            const broker::Result result = call(*server);
             asked = mend_memory();
             EXPECT_EQ(asked >= nth, thrown_text(result).has_value()) << nth;
             expect_nothing_left();
@@ -39,8 +39,8 @@ TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
             }
         }
         // Found, since it complains of its parameters.
-        const host::Result whole = call(*server);
-        const host::Value* const response = host::find_value(whole.out, "response");
+        const broker::Result whole = call(*server);
+        const broker::Value* const response = broker::find_value(whole.out, "response");
         ASSERT_TRUE(response);
         EXPECT_NE(std::string::npos, response->as_text().find("Mismatch in number of parameters"));
     });

@@ -22,7 +22,7 @@ protected:
         // Alerts stay allocated; the leak checker can tell them only while the module is mapped.
         ASSERT_TRUE(dlopen(module_under_test(), RTLD_NOW | RTLD_NODELETE));
         open("one_cna.json");
-        server->set_sink([this](const std::string&, const host::Instance_Value& alert) {
+        server->set_sink([this](const std::string&, const broker::Instance_Value& alert) {
             const std::lock_guard lock(_mutex);
             _came.push_back(alert.property("EventID")->as_text());
             if (_on_delivery)

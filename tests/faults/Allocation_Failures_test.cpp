@@ -18,15 +18,15 @@ protected:
 
     /// Where the module guards a call of the adapter library, the failure costs no more than the element at
     /// hand.
-    static bool is_less(const host::Result& result, const host::Result& whole)
+    static bool is_less(const broker::Result& result, const broker::Result& whole)
     {
         return result.instances.size() < whole.instances.size() ||
                !(result.return_value == whole.return_value) || !(texts(result.out) == texts(whole.out));
     }
-    static std::vector<std::string> texts(const std::vector<host::Named_Value>& values)
+    static std::vector<std::string> texts(const std::vector<broker::Named_Value>& values)
     {
         std::vector<std::string> all;
-        for (const host::Named_Value& each : values)
+        for (const broker::Named_Value& each : values)
             all.push_back(each.name + (each.value.null ? "" : " " + each.value.as_text()));
         return all;
     }
@@ -56,14 +56,14 @@ protected:
         operation(); // makes what is kept from one call to the next
         watch_library("libkldrprovider_Module", helpers_too);
         fail_allocation(~0ul);
-        const host::Result whole = operation();
+        const broker::Result whole = operation();
         const unsigned long count = mend_memory();
         ASSERT_TRUE(whole.ok()) << what;
         ASSERT_LT(0u, count) << what;
         for (unsigned long nth = 1; nth <= count; nth = next(nth, count)) {
             SCOPED_TRACE(what + ": allocation " + std::to_string(nth) + " of " + std::to_string(count));
             fail_allocation(nth, once);
-            const host::Result result = operation();
+            const broker::Result result = operation();
             const unsigned long asked = mend_memory();
             EXPECT_LE(nth, asked);
             // A value that a helper has no room for costs that value alone, and a line that the log has no
@@ -72,7 +72,7 @@ protected:
             EXPECT_EQ(result.ok(), !thrown_text(result)) << "no other failure than that exception";
             expect_nothing_left();
         }
-        const host::Result after = operation();
+        const broker::Result after = operation();
         EXPECT_TRUE(after.ok()) << what << ": " << after.rc << " " << thrown_text(after).value_or("");
         EXPECT_FALSE(is_less(after, whole)) << what;
     }
@@ -88,26 +88,29 @@ TEST_F(Allocation_Failures, OfEnumerations)
 
 TEST_F(Allocation_Failures, OfAMethod)
 {
-    const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
+    const broker::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
     // The library agrees, and stays as it is.
     simulator.add_fault(R"({"call": "setPortByWwn", "do": "answer", "answer": {"status": 0}})");
     constexpr unsigned ON = 3;
     starve("SetAlarmState", [&] {
         return server->invoke_method(
-            alarm, "SetAlarmState", {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, ON)}});
+            alarm, "SetAlarmState",
+            {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, ON)}});
     });
 }
 
 TEST_F(Allocation_Failures, OfTheAgent)
 {
-    const host::Path_Value service = server->enumerate_instances("KALDERA_AgentService").instances.at(0).path;
+    const broker::Path_Value service =
+        server->enumerate_instances("KALDERA_AgentService").instances.at(0).path;
     const std::string list = R"({"method": "discovery.getAllHbasByHost", "params": []})";
     // For a long one nothing is kept.
     for (const std::string& request :
          {list, list + std::string(5000, ' '),
           std::string(R"({"method": "discovery.getPortByWwn", "params": ["10:00:02:4b:4c:20:00:00"]})")})
         starve(request, [&] {
-            return server->invoke_method(service, "executeMethod", {{"request", host::Value::text(request)}});
+            return server->invoke_method(service, "executeMethod",
+                                         {{"request", broker::Value::text(request)}});
         });
 }
 
@@ -116,17 +119,17 @@ TEST_F(Allocation_Failures, OfAFirmwareUpdate)
     const auto first = [this](const char* name) {
         return server->enumerate_instance_names(name).paths.at(0);
     };
-    const host::Path_Value service = first("KALDERA_HBASoftwareInstallationService");
-    const host::Path_Value controller = first("KALDERA_PortController");
+    const broker::Path_Value service = first("KALDERA_HBASoftwareInstallationService");
+    const broker::Path_Value controller = first("KALDERA_PortController");
     // The library agrees, and stays as it is.
     simulator.add_fault(R"({"call": "adapterUpdateFlash", "do": "answer",
                             "answer": {"status": 0, "message": "done"}})");
-    const host::Value update = host::Value::unsigned_number(CMPI_uint16, 5);
+    const broker::Value update = broker::Value::unsigned_number(CMPI_uint16, 5);
     const auto install = [&] {
         return server->invoke_method(service, "InstallFromURI",
-                                     {{"URI", host::Value::text("file:///firmware/image")},
-                                      {"Target", host::Value::path(controller)},
-                                      {"InstallOptions", host::Value::array(CMPI_uint16, {update})}});
+                                     {{"URI", broker::Value::text("file:///firmware/image")},
+                                      {"Target", broker::Value::path(controller)},
+                                      {"InstallOptions", broker::Value::array(CMPI_uint16, {update})}});
     };
     // The last text is for the log alone, so that its loss changes no answer.
     for (const bool once : {false, true})
@@ -135,7 +138,7 @@ TEST_F(Allocation_Failures, OfAFirmwareUpdate)
 
 TEST_F(Allocation_Failures, OfAssociations)
 {
-    const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
+    const broker::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
     starve("associators", [&] { return server->associators("KALDERA_FCPortSystemDevice", port, {}); });
 }
 

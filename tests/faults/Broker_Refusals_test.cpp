@@ -75,16 +75,16 @@ TEST_F(Broker_Refusals, OfAnEnumerationOfAnyClass)
 
 TEST_F(Broker_Refusals, OfTheOtherOperations)
 {
-    const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
+    const broker::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
     refuse_each("names", [&] { server->enumerate_instance_names("KALDERA_FCPort"); });
     refuse_each("get", [&] { server->get_instance(port); });
     refuse_each("get with a property list", [&] {
-        server->get_instance(port, host::Property_List{{"DeviceID", "Speed"}});
+        server->get_instance(port, broker::Property_List{{"DeviceID", "Speed"}});
     });
     refuse_each("delete", [&] { server->delete_instance(port); });
-    host::Instance_Value changed;
+    broker::Instance_Value changed;
     changed.path = port;
-    host::set_value(changed.properties, "ElementName", host::Value::text("x"));
+    broker::set_value(changed.properties, "ElementName", broker::Value::text("x"));
     refuse_each("modify", [&] { server->modify_instance(changed); });
     refuse_each("create", [&] { server->create_instance(changed); });
     EXPECT_LT(50u, refused);
@@ -92,7 +92,7 @@ TEST_F(Broker_Refusals, OfTheOtherOperations)
 
 TEST_F(Broker_Refusals, OfAssociations)
 {
-    const host::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
+    const broker::Path_Value port = server->enumerate_instances("KALDERA_FCPort").instances.at(0).path;
     const std::string association = "KALDERA_FCPortSystemDevice";
     refuse_each("associators", [&] { server->associators(association, port, {}); });
     refuse_each("associator names", [&] { server->associator_names(association, port, {}); });
@@ -103,10 +103,10 @@ TEST_F(Broker_Refusals, OfAssociations)
 
 TEST_F(Broker_Refusals, OfAMethod)
 {
-    const host::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
+    const broker::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
     refuse_each("SetAlarmState", [&] {
         server->invoke_method(alarm, "SetAlarmState",
-                              {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, 1)}});
+                              {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, 1)}});
     });
     EXPECT_LT(10u, refused);
 }
@@ -121,7 +121,7 @@ protected:
         // Alerts stay allocated; the leak checker can tell them only while the module is mapped.
         ASSERT_TRUE(dlopen(module_under_test(), RTLD_NOW | RTLD_NODELETE));
         Broker_Refusals::SetUp();
-        server->set_sink([this](const std::string&, const host::Instance_Value&) {
+        server->set_sink([this](const std::string&, const broker::Instance_Value&) {
             ++came;
             return CMPI_RC_OK;
         });
@@ -177,7 +177,7 @@ TEST_F(Refused_Deliveries, OfAServerThatAttachesNoThreads)
                     deliver();
                     server->calls().mend();
                     EXPECT_LE(2u, deliver(PATIENCE));
-                    EXPECT_GE(calls, server->ledger().live(host::Object_Kind::CONTEXT));
+                    EXPECT_GE(calls, server->ledger().live(broker::Object_Kind::CONTEXT));
                 }
         EXPECT_EQ(6u, calls);
     });

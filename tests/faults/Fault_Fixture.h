@@ -29,7 +29,7 @@ protected:
     {
         simulator.load_file(std::string(KLDR_INVENTORIES "/") + inventory);
         std::string error;
-        server = host::Host::open(module_under_test(), {}, error);
+        server = broker::Host::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;
         classes = enumerable_classes(*server);
         healthy = look();
@@ -54,7 +54,7 @@ protected:
     {
         Picture picture;
         for (const std::string& name : classes) {
-            const host::Result result = server->enumerate_instances(name);
+            const broker::Result result = server->enumerate_instances(name);
             const std::optional<std::string> thrown = thrown_text(result);
             if (thrown && exceptions)
                 exceptions->insert(*thrown);
@@ -83,7 +83,7 @@ protected:
     }
 
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
-    std::unique_ptr<host::Host> server;
+    std::unique_ptr<broker::Host> server;
     std::vector<std::string> classes;
     Picture healthy;
 

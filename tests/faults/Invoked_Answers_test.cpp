@@ -32,39 +32,39 @@ protected:
     }
     void TearDown() override { close_host(); }
 
-    host::Path_Value find(const char* class_name, const std::string& device)
+    broker::Path_Value find(const char* class_name, const std::string& device)
     {
-        for (const host::Path_Value& path : server->enumerate_instance_names(class_name).paths)
+        for (const broker::Path_Value& path : server->enumerate_instance_names(class_name).paths)
             if (path.key("DeviceID")->as_text() == device)
                 return path;
         throw std::invalid_argument(device);
     }
 
-    host::Result invoke()
+    broker::Result invoke()
     {
         if (GetParam().method == std::string("SetAlarmState")) {
             constexpr unsigned ON = 3;
             return server->invoke_method(
                 alarm, "SetAlarmState",
-                {{"RequestedAlarmState", host::Value::unsigned_number(CMPI_uint16, ON)}});
+                {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, ON)}});
         }
-        const host::Value update = host::Value::unsigned_number(CMPI_uint16, 5);
+        const broker::Value update = broker::Value::unsigned_number(CMPI_uint16, 5);
         return server->invoke_method(service, "InstallFromURI",
-                                     {{"URI", host::Value::text("file://" + firmware.path("image"))},
-                                      {"Target", host::Value::path(controller)},
-                                      {"InstallOptions", host::Value::array(CMPI_uint16, {update})}});
+                                     {{"URI", broker::Value::text("file://" + firmware.path("image"))},
+                                      {"Target", broker::Value::path(controller)},
+                                      {"InstallOptions", broker::Value::array(CMPI_uint16, {update})}});
     }
     /// The return value, of a call that must succeed as such.
     std::uint64_t outcome()
     {
-        const host::Result result = invoke();
+        const broker::Result result = invoke();
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.exception.value_or(result.message);
         EXPECT_FALSE(result.return_value.null);
         return result.return_value.null ? ~0u : result.return_value.as_uint();
     }
 
     Temp_Folder firmware;
-    host::Path_Value alarm, controller, service;
+    broker::Path_Value alarm, controller, service;
 };
 
 TEST_P(Invoked_Answers, AreTheMethodsOutcome)

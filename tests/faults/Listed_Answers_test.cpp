@@ -62,7 +62,7 @@ protected:
     {
         open_host();
         for (const std::string& name : enumerable_classes(*server))
-            if (server->providers().serves(name, host::Mi_Kind::INSTANCE))
+            if (server->providers().serves(name, broker::Mi_Kind::INSTANCE))
                 look_at(name);
     }
     void TearDown() override { close_host(); }
@@ -123,7 +123,7 @@ protected:
     void expect_family(const Bad_Answer& bad, const std::string& address, const std::string& name,
                        const std::vector<std::string>& texts, const std::string& code)
     {
-        const host::Result now = server->enumerate_instances(name);
+        const broker::Result now = server->enumerate_instances(name);
         const bool passes = bad.thrown && asks(name, address) && is_unguarded(name);
         const std::optional<std::string> thrown = thrown_text(now);
         EXPECT_EQ(passes, thrown.has_value()) << name << ": " << thrown.value_or("no exception");

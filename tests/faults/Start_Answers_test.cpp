@@ -36,7 +36,7 @@ protected:
         Picture picture;
         for (const char* name :
              {"KALDERA_ComputerSystem", "KALDERA_PortController", "KALDERA_FCPort", "KALDERA_EthernetPort"}) {
-            const host::Result result = server->enumerate_instances(name);
+            const broker::Result result = server->enumerate_instances(name);
             EXPECT_EQ(CMPI_RC_OK, result.rc) << name;
             picture[name] = lasting_texts(result);
             EXPECT_FALSE(picture[name].empty()) << name;
@@ -49,7 +49,7 @@ protected:
         restore();
         simulator.add_fault(bad.fault(GetParam().entry_point));
         std::string error;
-        server = host::Host::open(module_under_test(), {}, error);
+        server = broker::Host::open(module_under_test(), {}, error);
         EXPECT_TRUE(server) << error;
         Picture picture = elsewhere([&] { return look(); });
         server->unload(true);
@@ -100,7 +100,7 @@ TEST_P(Unguarded_Load, EndsTheProcessIfTheLibraryThrows)
             restore();
             simulator.add_fault(bad.fault(GetParam().entry_point));
             std::string error;
-            host::Host::open(module_under_test(), {}, error);
+            broker::Host::open(module_under_test(), {}, error);
         });
     }
 }

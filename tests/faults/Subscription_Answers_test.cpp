@@ -1,6 +1,6 @@
 // Bad answers of the adapter library while indications are enabled or disabled; each in a process of its own,
 // since alerts stay allocated.
-#include "host/Subscription.h"
+#include "broker/Subscription.h"
 #include "tests/faults/Sweep_Fixture.h"
 #include "tests/support/Eventually.h"
 #include "tests/support/In_Child.h"
@@ -79,7 +79,7 @@ TEST_P(Subscription_Answers, FailTheSubscriptionAtMostAndTheNextOneStands)
 {
     in_child([&] {
         open_host();
-        server->set_sink([&](const std::string&, const host::Instance_Value&) {
+        server->set_sink([&](const std::string&, const broker::Instance_Value&) {
             const std::lock_guard lock(mutex);
             ++came;
             arrived.notify_all();

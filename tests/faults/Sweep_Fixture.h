@@ -30,7 +30,7 @@ protected:
     {
         restore();
         std::string error;
-        server = host::Host::open(module_under_test(), {}, error);
+        server = broker::Host::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;
     }
     void close_host()
@@ -84,7 +84,7 @@ protected:
     }
 
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
-    std::unique_ptr<host::Host> server;
+    std::unique_ptr<broker::Host> server;
 
 private:
     Temp_Folder _home;

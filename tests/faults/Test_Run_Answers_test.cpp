@@ -38,9 +38,9 @@ constexpr Way ways[] = {
 class Test_Run_Answers : public Sweep_Fixture, public testing::TestWithParam<Way>
 {
 protected:
-    host::Path_Value find(const std::string& class_name, const char* key, const std::string& value)
+    broker::Path_Value find(const std::string& class_name, const char* key, const std::string& value)
     {
-        for (const host::Path_Value& path : server->enumerate_instance_names(class_name).paths)
+        for (const broker::Path_Value& path : server->enumerate_instance_names(class_name).paths)
             if (path.key(key)->as_text() == value)
                 return path;
         throw std::invalid_argument("no " + class_name + " " + value);
@@ -57,7 +57,7 @@ protected:
                     std::string("Kaldera:") + GetParam().test);
     }
 
-    std::vector<host::Instance_Value> records()
+    std::vector<broker::Instance_Value> records()
     {
         return server->enumerate_instances("KALDERA_DiagnosticCompletionRecord").instances;
     }
@@ -67,20 +67,20 @@ protected:
         constexpr unsigned STARTED = 4096;
         constexpr unsigned STATE_FAILED = 5;
         const std::size_t before = records().size();
-        const host::Result result =
-            server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", host::Value::path(element)}});
+        const broker::Result result =
+            server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", broker::Value::path(element)}});
         if (thrown_text(result))
             return LEAVES;
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
         if (result.return_value.as_uint() != STARTED)
             return REFUSED;
         EXPECT_TRUE(eventually([&] { return server->ledger().live() == 0; }));
-        const std::vector<host::Instance_Value> all = records();
+        const std::vector<broker::Instance_Value> all = records();
         EXPECT_LT(before, all.size());
         bool failed = false;
         for (std::size_t i = before; i < all.size(); i++)
             failed = failed || all[i].property("CompletionState")->as_uint() == STATE_FAILED;
-        const host::Result job = server->enumerate_instances("KALDERA_ConcreteJob");
+        const broker::Result job = server->enumerate_instances("KALDERA_ConcreteJob");
         EXPECT_EQ(7u, job.instances.at(0).property("JobState")->as_uint());
         return failed ? FAILED : PASSED;
     }
@@ -104,7 +104,7 @@ protected:
         return requests.empty() ? Json::Value() : true_answer(GetParam().entry_point, requests[0]);
     }
 
-    host::Path_Value element, test;
+    broker::Path_Value element, test;
 };
 
 TEST_P(Test_Run_Answers, AreInTheRecordsAndTheNextRunPasses)

@@ -30,9 +30,10 @@ protected:
         watch_library("libkldrprovider_Module", true);
     }
 
-    host::Result start()
+    broker::Result start()
     {
-        return server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", host::Value::path(element)}});
+        return server->invoke_method(test, "RunDiagnostic",
+                                     {{"ManagedElement", broker::Value::path(element)}});
     }
     /// Until the thread of a test has left the server.
     void wait_for_the_end()
@@ -43,18 +44,18 @@ protected:
     void expect_a_good_run()
     {
         constexpr unsigned OVER = 7;
-        const host::Result result = start();
+        const broker::Result result = start();
         ASSERT_EQ(CMPI_RC_OK, result.rc) << thrown_text(result).value_or("");
         ASSERT_EQ(STARTED, result.return_value.as_uint());
         wait_for_the_end();
-        const host::Result jobs = server->enumerate_instances("KALDERA_ConcreteJob");
+        const broker::Result jobs = server->enumerate_instances("KALDERA_ConcreteJob");
         ASSERT_EQ(1u, jobs.instances.size());
         EXPECT_EQ(*jobs.instances[0].property("InstanceID"),
                   *result.out.at(0).value.as_path()->key("InstanceID"));
         EXPECT_EQ(OVER, jobs.instances[0].property("JobState")->as_uint());
     }
 
-    host::Path_Value element, test;
+    broker::Path_Value element, test;
 };
 
 class Test_Start_Memory : public Test_Run_Memory, public testing::WithParamInterface<Way>
@@ -75,7 +76,7 @@ TEST_P(Test_Start_Memory, AStartThatFailsKeepsNoTestFromStarting)
             for (unsigned long nth = 1; nth <= count; nth++) {
                 SCOPED_TRACE("allocation " + std::to_string(nth) + " of " + std::to_string(count));
                 fail_allocation(nth, once);
-                const host::Result result = start();
+                const broker::Result result = start();
                 mend_memory();
                 EXPECT_EQ(result.ok(), !thrown_text(result));
                 wait_for_the_end();
@@ -114,7 +115,7 @@ TEST_P(Test_Thread_Memory, EndsTheRunAlone)
             for (unsigned long nth = 1; nth <= count; nth++) {
                 SCOPED_TRACE("allocation " + std::to_string(nth));
                 fail_allocation_of_new_threads(nth, once);
-                const host::Result result = start();
+                const broker::Result result = start();
                 EXPECT_EQ(STARTED, result.return_value.as_uint());
                 wait_for_the_end();
                 fail_allocation_of_new_threads(0);

@@ -11,7 +11,7 @@ TEST(Ways_In, LeadToEveryEntryPoint)
 {
     const std::set<std::string> entry_points = {
 #define ENTRY_POINT(symbol, variable, signature) #symbol,
-#include "adapter/Entry_Points.def"
+#include "contracts/adapter/Entry_Points.def"
 #undef ENTRY_POINT
     };
     const std::set<std::string> reached = {

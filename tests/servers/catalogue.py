@@ -4,7 +4,7 @@ import sys
 from functools import cached_property
 from pathlib import Path
 
-SCHEMA = Path(__file__).resolve().parents[2] / "schema"
+SCHEMA = Path(__file__).resolve().parents[2] / "module/schema"
 sys.path.insert(0, str(SCHEMA))
 
 from generator.cli import providers_of, read

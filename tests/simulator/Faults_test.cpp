@@ -1,6 +1,6 @@
 #include "tests/simulator/Simulator_Fixture.h"
 
-#include "adapter/HbaAgentError.h"
+#include "contracts/adapter/HbaAgentError.h"
 
 #include <chrono>
 #include <stdexcept>

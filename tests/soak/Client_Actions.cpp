@@ -19,7 +19,7 @@ const auto& any_of(const List& list, Random& random)
 }
 
 /// An adapter that vanishes makes for refusals and short lists, never for an exception.
-void judge(Soak_World& world, const host::Result& result)
+void judge(Soak_World& world, const broker::Result& result)
 {
     world.failures += result.exception.has_value();
 }
@@ -41,8 +41,8 @@ void get(Soak_World& world, Random& random)
 
 void walk(Soak_World& world, Random& random)
 {
-    host::Request request;
-    request.operation = random() % 2 ? host::Operation::ASSOCIATORS : host::Operation::REFERENCE_NAMES;
+    broker::Request request;
+    request.operation = random() % 2 ? broker::Operation::ASSOCIATORS : broker::Operation::REFERENCE_NAMES;
     request.path = any_of(world.paths, random);
     request.filter.association_class = any_of(world.associations, random);
     judge(world, world.server.run(request));
@@ -65,33 +65,33 @@ void call_agent(Soak_World& world, Random& random)
         R"({"method": "no.such.method"})",
         "{\"method\": ",
     };
-    const host::Path_Value service = {
+    const broker::Path_Value service = {
         .name_space = NAME_SPACE,
         .class_name = "KALDERA_AgentService",
-        .keys = {{"Name", host::Value::text("Kaldera Agent Service Provider")}}};
+        .keys = {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
     judge(world, world.server.invoke_method(service, "executeMethod",
-                                            {{"request", host::Value::text(any_of(requests, random))}}));
+                                            {{"request", broker::Value::text(any_of(requests, random))}}));
 }
 
 void run_test(Soak_World& world, Random& random)
 {
     if (world.tests.empty() || world.elements.empty())
         return;
-    const host::Result result =
+    const broker::Result result =
         world.server.invoke_method(any_of(world.tests, random), "RunDiagnostic",
-                                   {{"ManagedElement", host::Value::path(any_of(world.elements, random))}});
+                                   {{"ManagedElement", broker::Value::path(any_of(world.elements, random))}});
     judge(world, result);
     world.test_runs += result.ok() && result.return_value.as_uint() == 4096;
 }
 
 void set_alarm(Soak_World& world, Random& random)
 {
-    for (const host::Path_Value& path : world.paths)
+    for (const broker::Path_Value& path : world.paths)
         if (path.class_name == "KALDERA_AlarmDevice") {
             judge(world,
                   world.server.invoke_method(
                       path, "SetAlarmState",
-                      {{"RequestedState", host::Value::unsigned_number(CMPI_uint16, 2 + random() % 2)}}));
+                      {{"RequestedState", broker::Value::unsigned_number(CMPI_uint16, 2 + random() % 2)}}));
             return;
         }
 }
@@ -166,9 +166,9 @@ constexpr unsigned WEIGHTS =
                     [](unsigned sum, const Client_Action& action) { return sum + action.weight; });
 static_assert(WEIGHTS == 1000);
 
-void add_paths(Soak_World& world, std::vector<host::Path_Value>& paths, const char* class_name)
+void add_paths(Soak_World& world, std::vector<broker::Path_Value>& paths, const char* class_name)
 {
-    for (const host::Instance_Value& instance : world.server.enumerate_instances(class_name).instances)
+    for (const broker::Instance_Value& instance : world.server.enumerate_instances(class_name).instances)
         paths.push_back(instance.path);
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/Host.h"
+#include "broker/Host.h"
 #include "simulator/Simulator_Control.h"
 
 #include <atomic>
@@ -12,7 +12,7 @@ namespace KPRV {
 /// What the clients of a soak share: the server, the adapter library, and what they have found so far.
 struct Soak_World
 {
-    host::Host& server;
+    broker::Host& server;
     simulator::Simulator_Control& simulator;
     std::vector<std::string> classes = {};
     std::vector<std::string> associations = {};
@@ -20,10 +20,10 @@ struct Soak_World
     /// walk along them a hundred times that, so this is done apart and seldom.
     std::vector<std::string> memories = {};
     /// Paths of the device model, from which clients walk on.
-    std::vector<host::Path_Value> paths = {};
+    std::vector<broker::Path_Value> paths = {};
     /// Paths of the elements and of the tests that can be run on them.
-    std::vector<host::Path_Value> elements = {};
-    std::vector<host::Path_Value> tests = {};
+    std::vector<broker::Path_Value> elements = {};
+    std::vector<broker::Path_Value> tests = {};
     std::mutex subscription = {};
     unsigned subscribers = 0;
     std::atomic<unsigned long> indications = 0;

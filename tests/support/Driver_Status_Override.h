@@ -1,6 +1,6 @@
 #pragma once
 
-#include "adapter/ProviderInit.h"
+#include "module/adapter/ProviderInit.h"
 
 namespace KPRV {
 

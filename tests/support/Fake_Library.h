@@ -1,7 +1,7 @@
 #pragma once
 
-#include "adapter/CIMProviderZntj.h"
-#include "adapter/HbaAgentError.h"
+#include "contracts/adapter/HbaAgentError.h"
+#include "module/adapter/CIMProviderZntj.h"
 
 #include <json/reader.h>
 #include <json/value.h>
@@ -60,14 +60,14 @@ public:
     {
         current() = this;
 #define ENTRY_POINT(symbol, variable, signature) stand_in<name_of_##symbol>(variable);
-#include "adapter/Entry_Points.def"
+#include "contracts/adapter/Entry_Points.def"
 #undef ENTRY_POINT
     }
     ~Fake_Library()
     {
         current() = nullptr;
 #define ENTRY_POINT(symbol, variable, signature) variable = &default_##signature;
-#include "adapter/Entry_Points.def"
+#include "contracts/adapter/Entry_Points.def"
 #undef ENTRY_POINT
     }
     Fake_Library(const Fake_Library&) = delete;
@@ -160,7 +160,7 @@ private:
     }
 
 #define ENTRY_POINT(symbol, variable, signature) static constexpr char name_of_##symbol[] = #symbol;
-#include "adapter/Entry_Points.def"
+#include "contracts/adapter/Entry_Points.def"
 #undef ENTRY_POINT
 
     template <const char* NAME>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "adapter/Host_Calls.h"
+#include "module/adapter/Host_Calls.h"
 
 #include <arpa/inet.h>
 

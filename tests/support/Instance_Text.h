@@ -1,9 +1,9 @@
 #pragma once
 
-#include "runtime/Array.h"
-#include "runtime/Datetime.h"
-#include "runtime/Instance.h"
-#include "runtime/features.h"
+#include "module/runtime/Array.h"
+#include "module/runtime/Datetime.h"
+#include "module/runtime/Instance.h"
+#include "module/runtime/features.h"
 
 #include <map>
 #include <stdexcept>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "host/Host.h"
-#include "host/Value_Text.h"
+#include "broker/Host.h"
+#include "broker/Value_Text.h"
 
 #include <map>
 #include <string>
@@ -13,10 +13,10 @@ namespace KPRV {
 using Picture = std::map<std::string, std::vector<std::string>>;
 
 /// An instance as MOF, without the lines that differ from one moment to the next: what tells a time.
-inline std::string lasting_text(const host::Instance_Value& instance)
+inline std::string lasting_text(const broker::Instance_Value& instance)
 {
     std::string kept;
-    const std::string text = host::mof_instance(instance);
+    const std::string text = broker::mof_instance(instance);
     for (std::size_t at = 0, end; at < text.size(); at = end + 1) {
         end = text.find('\n', at);
         const std::string line = text.substr(at, end - at);
@@ -26,22 +26,22 @@ inline std::string lasting_text(const host::Instance_Value& instance)
     return kept;
 }
 
-inline std::vector<std::string> lasting_texts(const host::Result& result)
+inline std::vector<std::string> lasting_texts(const broker::Result& result)
 {
     std::vector<std::string> all;
-    for (const host::Instance_Value& instance : result.instances)
+    for (const broker::Instance_Value& instance : result.instances)
         all.push_back(lasting_text(instance));
     return all;
 }
 
 /// The classes of a module that have instances or associations to give, but for the two that tell whether an
 /// agent runs on the machine: another test may start one at any moment.
-inline std::vector<std::string> enumerable_classes(host::Host& server)
+inline std::vector<std::string> enumerable_classes(broker::Host& server)
 {
     std::vector<std::string> names;
     for (const std::string& name : server.catalogue().class_names()) {
-        const bool serves = server.providers().serves(name, host::Mi_Kind::INSTANCE) ||
-                            server.providers().serves(name, host::Mi_Kind::ASSOCIATION);
+        const bool serves = server.providers().serves(name, broker::Mi_Kind::INSTANCE) ||
+                            server.providers().serves(name, broker::Mi_Kind::ASSOCIATION);
         if (serves && name.find("_RemoteService") == std::string::npos)
             names.push_back(name);
     }

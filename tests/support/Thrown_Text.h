@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/Request.h"
+#include "broker/Request.h"
 
 #include <cstdlib>
 #include <optional>
@@ -31,7 +31,7 @@ inline bool is_passed_exception(const std::string& violation)
 /// What an operation threw: as an exception that left the provider or, from a module that contains
 /// exceptions, in the message behind the name of its entry. The module has no other messages. Nothing for an
 /// operation that did not throw.
-inline std::optional<std::string> thrown_text(const host::Result& result)
+inline std::optional<std::string> thrown_text(const broker::Result& result)
 {
     if (result.exception || result.message.empty())
         return result.exception;

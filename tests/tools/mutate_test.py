@@ -115,7 +115,7 @@ class Equivalents(unittest.TestCase):
 
 class Drawing(unittest.TestCase):
     def draw(self, seed, count=40):
-        drawing = mutate.drawn(mutate.mutants_of(mutate.ROOT, ("runtime/String.cpp", 0)), seed)
+        drawing = mutate.drawn(mutate.mutants_of(mutate.ROOT, ("module/runtime/String.cpp", 0)), seed)
         return [str(next(drawing)) for _ in range(count)]
 
     def test_a_seed_says_all(self):
@@ -125,8 +125,8 @@ class Drawing(unittest.TestCase):
 
     def test_every_room_has_places_and_tests(self):
         found = mutate.mutants_of(mutate.ROOT)
-        rooms = {path.split("/")[0] for places in found.values() for path, _, _ in places}
-        self.assertEqual(rooms | {"module"}, set(mutate.TESTS))
+        rooms = {path.split("/")[1] for places in found.values() for path, _, _ in places}
+        self.assertEqual(rooms | {"exports"}, set(mutate.TESTS))
         self.assertTrue(all(found.values()))
 
 
@@ -134,7 +134,7 @@ class Reports(unittest.TestCase):
     def test_what_does_not_compile_is_replaced_and_the_table_adds_up(self):
         lines = []
         text = "a == 1;\nb == 2; // Either way (comparison): no difference.\nc == 3;\nd == 4;\n"
-        drawing = iter([mutate.Mutant("model/A.cpp", place, place.choices[0], text)
+        drawing = iter([mutate.Mutant("module/model/A.cpp", place, place.choices[0], text)
                         for place in reading.places(text) if place.kind == "comparison"])
         trial = mutate.Trial(drawing, 3, lines.append)
 
@@ -148,7 +148,7 @@ class Reports(unittest.TestCase):
         text = "\n".join(lines)
         self.assertRegex(text, r"(?m)^model +1 +1 +1$")
         self.assertRegex(text, r"(?m)^all +1 +1 +1$")
-        self.assertIn("  model/A.cpp:4: comparison: d == 4; -> d != 4;", text)
+        self.assertIn("  module/model/A.cpp:4: comparison: d == 4; -> d != 4;", text)
         self.assertIn("seed 5: 50.0 % of 2 killed, 95 % is the goal; 1 more did not compile", text)
 
     def test_the_goal_is_reached_without_survivors(self):

@@ -1,7 +1,0 @@
-#include "adapter/ProviderInit.h"
-
-namespace KPRV {
-
-ProviderInit gProviderInit;
-
-} // namespace KPRV

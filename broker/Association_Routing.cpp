@@ -1,0 +1,85 @@
+#include "broker/Association_Routing.h"
+
+#include "broker/Path_Identity.h"
+
+#include <algorithm>
+
+namespace KPRV::broker {
+
+namespace {
+
+bool can_hold(const Class_Catalogue& catalogue, const Class_Info& association, const std::string& class_name)
+{
+    return std::any_of(association.properties.begin(), association.properties.end(),
+                       [&](const Feature_Info& feature) {
+                           return feature.type == CMPI_ref && !feature.target_class.empty() &&
+                                  catalogue.is_a(class_name, feature.target_class);
+                       });
+}
+
+} // namespace
+
+bool is_association_operation(Operation operation)
+{
+    return operation >= Operation::ASSOCIATORS;
+}
+
+const std::string& named_association(const Request& request)
+{
+    bool references =
+        request.operation == Operation::REFERENCES || request.operation == Operation::REFERENCE_NAMES;
+    return references ? request.filter.result_class : request.filter.association_class;
+}
+
+std::vector<std::string> association_classes(const Class_Catalogue& catalogue, const Request& request)
+{
+    const std::string& named = named_association(request);
+    std::vector<std::string> classes;
+    for (const std::string& name : catalogue.class_names()) {
+        const Class_Info* info = catalogue.find(name);
+        if (info->is_association && (named.empty() ? can_hold(catalogue, *info, request.path.class_name)
+                                                   : catalogue.is_a(name, named)))
+            classes.push_back(info->name);
+    }
+    // A module that does not publish its classes can still be asked by name.
+    if (classes.empty() && !named.empty() && !catalogue.find(named))
+        classes.push_back(named);
+    return classes;
+}
+
+void Association_Merge::add(const std::string& provider_class, Result one)
+{
+    sum_.done_count += one.done_count;
+    if (!one.ok()) {
+        sum_.failures.push_back({provider_class, one.rc, one.message});
+        if (!first_failure_)
+            first_failure_ = std::move(one);
+        return;
+    }
+    succeeded_ = true;
+    for (Instance_Value& instance : one.instances)
+        if (is_new(instance.path))
+            sum_.instances.push_back(std::move(instance));
+    for (Path_Value& path : one.paths)
+        if (is_new(path))
+            sum_.paths.push_back(std::move(path));
+}
+
+/// An instance whose path has no keys (some providers return such) cannot be told from its like: it stays.
+bool Association_Merge::is_new(const Path_Value& path)
+{
+    return path.keys.empty() || seen_.insert(lower_name(path.name_space) + ":" + path_identity(path)).second;
+}
+
+Result Association_Merge::settle()
+{
+    if (first_failure_ && !succeeded_) {
+        sum_.rc = first_failure_->rc;
+        sum_.message = first_failure_->message;
+        sum_.exception = first_failure_->exception;
+    }
+    sum_.done = sum_.done_count > 0;
+    return std::move(sum_);
+}
+
+} // namespace KPRV::broker

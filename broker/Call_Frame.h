@@ -1,0 +1,112 @@
+#pragma once
+
+#include "broker/Core.h"
+
+#include <unordered_set>
+
+namespace KPRV::broker {
+
+/// What a thread owes to one MI entry (or to one attachment): the objects made meanwhile, which end with it.
+/// Frames of a thread stack up when an up-call comes back into the module. Used by its own thread only.
+class Call_Frame
+{
+public:
+    Call_Frame(std::shared_ptr<Core> core, const CMPIContext* context);
+    ~Call_Frame();
+    Call_Frame(const Call_Frame&) = delete;
+    Call_Frame& operator=(const Call_Frame&) = delete;
+
+    /// The innermost frame of the calling thread, null if it has none.
+    static Call_Frame* top();
+    /// True if the frame is one of the calling thread's.
+    static bool is_on_this_thread(const Call_Frame* frame);
+
+    Core& core() const { return *core_; }
+    const CMPIContext* context() const { return context_; }
+
+    void record(Object& object);
+    void forget(Object& object) { objects_.erase(&object); }
+
+private:
+    std::shared_ptr<Core> core_;
+    const CMPIContext* context_;
+    std::unordered_set<Object*> objects_;
+    Call_Frame* outer_;
+};
+
+/// Makes an object for the provider under the name of the call that makes it, and records it on the thread's
+/// frame. A thread without a frame has nobody to free it: that is a violation, and the object is lost.
+template <class T, class... Arguments>
+T* make_object(Core& core, const char* maker, Arguments&&... arguments);
+
+/// Makes a clone: not recorded; the provider must release it.
+template <class T, class... Arguments>
+T* make_clone(Core& core, Arguments&&... arguments);
+
+/// Makes an argument of a call: the host's own, ended by the host.
+template <class T, class... Arguments>
+T* make_argument(Core& core, Arguments&&... arguments);
+
+/// `CMRelease`, once the object is known to be good: the rules on who may release what.
+CMPIrc release_by_provider(Object& object);
+
+namespace detail {
+
+void settle_on_frame(Object& object);
+
+template <class T, class... Arguments>
+T* make(Core& core, const char* maker, Owner owner, Arguments&&... arguments)
+{
+    auto object = std::make_unique<T>(core, std::forward<Arguments>(arguments)...);
+    T* made = object.get();
+    made->maker = maker;
+    made->owner = owner;
+    core.adopt(std::move(object));
+    if (owner == Owner::FRAME)
+        settle_on_frame(*made);
+    return made;
+}
+
+} // namespace detail
+
+template <class T, class... Arguments>
+T* make_object(Core& core, const char* maker, Arguments&&... arguments)
+{
+    return detail::make<T>(core, maker, Owner::FRAME, std::forward<Arguments>(arguments)...);
+}
+
+template <class T, class... Arguments>
+T* make_clone(Core& core, Arguments&&... arguments)
+{
+    return detail::make<T>(core, "CMClone", Owner::PROVIDER, std::forward<Arguments>(arguments)...);
+}
+
+template <class T, class... Arguments>
+T* make_argument(Core& core, Arguments&&... arguments)
+{
+    return detail::make<T>(core, "the call", Owner::HOST, std::forward<Arguments>(arguments)...);
+}
+
+/// Keeps an argument alive for the length of a call.
+template <class T>
+class Argument
+{
+public:
+    template <class... Arguments>
+    explicit Argument(Core& core, Arguments&&... arguments)
+        : object_(make_argument<T>(core, std::forward<Arguments>(arguments)...))
+    {
+    }
+    ~Argument() { object_->core.retire(*object_); }
+    Argument(const Argument&) = delete;
+    Argument& operator=(const Argument&) = delete;
+
+    T* operator->() const { return object_; }
+    T& operator*() const { return *object_; }
+    typename T::Cmpi* cmpi() const { return object_->cmpi(); }
+
+private:
+    T* object_;
+};
+
+} // namespace KPRV::broker

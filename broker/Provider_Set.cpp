@@ -1,0 +1,134 @@
+#include "broker/Provider_Set.h"
+
+#include <algorithm>
+
+namespace KPRV::broker {
+
+namespace {
+
+template <class Mi>
+using Factory = Mi* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+
+/// The status is preset to 0; an interface counts only if it is still 0 afterwards.
+template <class Mi>
+void* call_factory(void* factory, const CMPIBroker* broker, const CMPIContext* context)
+{
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    Mi* mi = reinterpret_cast<Factory<Mi>>(factory)(broker, context, &status);
+    return mi && mi->ft && status.rc == CMPI_RC_OK ? mi : nullptr;
+}
+
+template <class Mi>
+CMPIrc call_cleanup(void* mi, const CMPIContext* context, bool terminating)
+{
+    auto* typed = static_cast<Mi*>(mi);
+    return typed->ft->cleanup ? typed->ft->cleanup(typed, context, terminating).rc : CMPI_RC_OK;
+}
+
+} // namespace
+
+CMPIInstanceMI* Provider_Set::instance(const std::string& class_name)
+{
+    return static_cast<CMPIInstanceMI*>(get(class_name, Mi_Kind::INSTANCE));
+}
+
+CMPIAssociationMI* Provider_Set::association(const std::string& class_name)
+{
+    return static_cast<CMPIAssociationMI*>(get(class_name, Mi_Kind::ASSOCIATION));
+}
+
+CMPIMethodMI* Provider_Set::method(const std::string& class_name)
+{
+    return static_cast<CMPIMethodMI*>(get(class_name, Mi_Kind::METHOD));
+}
+
+CMPIIndicationMI* Provider_Set::indication(const std::string& class_name)
+{
+    return static_cast<CMPIIndicationMI*>(get(class_name, Mi_Kind::INDICATION));
+}
+
+void* Provider_Set::get(const std::string& class_name, Mi_Kind kind)
+{
+    const Auto_Lock lock(mutex_);
+    auto at = made_.find({class_name, kind});
+    if (at != made_.end())
+        return at->second;
+    void* mi = make(class_name, kind);
+    if (mi)
+        made_[{class_name, kind}] = mi;
+    return mi;
+}
+
+void* Provider_Set::make(const std::string& class_name, Mi_Kind kind)
+{
+    void* factory = module_.factory(class_name, kind);
+    if (!factory)
+        return nullptr;
+    Core& core = *broker_.core();
+    Argument<Context_Object> context(core);
+    Call_Frame frame(broker_.core(), context.cmpi());
+    switch (kind) {
+    case Mi_Kind::INSTANCE:
+        return call_factory<CMPIInstanceMI>(factory, broker_.cmpi(), context.cmpi());
+    case Mi_Kind::ASSOCIATION:
+        return call_factory<CMPIAssociationMI>(factory, broker_.cmpi(), context.cmpi());
+    case Mi_Kind::METHOD:
+        return call_factory<CMPIMethodMI>(factory, broker_.cmpi(), context.cmpi());
+    default:
+        return call_factory<CMPIIndicationMI>(factory, broker_.cmpi(), context.cmpi());
+    }
+}
+
+CMPIrc Provider_Set::cleanup_one(void* mi, Mi_Kind kind, bool terminating)
+{
+    Argument<Context_Object> context(*broker_.core());
+    Call_Frame frame(broker_.core(), context.cmpi());
+    switch (kind) {
+    case Mi_Kind::INSTANCE:
+        return call_cleanup<CMPIInstanceMI>(mi, context.cmpi(), terminating);
+    case Mi_Kind::ASSOCIATION:
+        return call_cleanup<CMPIAssociationMI>(mi, context.cmpi(), terminating);
+    case Mi_Kind::METHOD:
+        return call_cleanup<CMPIMethodMI>(mi, context.cmpi(), terminating);
+    default:
+        return call_cleanup<CMPIIndicationMI>(mi, context.cmpi(), terminating);
+    }
+}
+
+template <class Wanted>
+CMPIrc Provider_Set::cleanup_if(Wanted wanted, bool terminating)
+{
+    const Auto_Lock lock(mutex_);
+    CMPIrc highest = CMPI_RC_OK;
+    for (Mi_Kind kind : mi_kinds) {
+        for (auto at = made_.begin(); at != made_.end();) {
+            if (at->first.second != kind || !wanted(at->first.first)) {
+                ++at;
+                continue;
+            }
+            CMPIrc rc = cleanup_one(at->second, kind, terminating);
+            highest = std::max(highest, rc);
+            bool kept = rc == CMPI_RC_DO_NOT_UNLOAD || rc == CMPI_RC_NEVER_UNLOAD;
+            at = kept ? std::next(at) : made_.erase(at);
+        }
+    }
+    return highest;
+}
+
+CMPIrc Provider_Set::cleanup(bool terminating)
+{
+    return cleanup_if([](const std::string&) { return true; }, terminating);
+}
+
+CMPIrc Provider_Set::cleanup(const std::string& class_name, bool terminating)
+{
+    return cleanup_if([&](const std::string& name) { return name == class_name; }, terminating);
+}
+
+std::size_t Provider_Set::count() const
+{
+    const Auto_Lock lock(mutex_);
+    return made_.size();
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "broker/Broker.h"
+#include "broker/Module.h"
+#include "module/runtime/Standard_Mutex.h"
+
+#include <map>
+
+namespace KPRV::broker {
+
+/// The management interfaces that the module's factories have handed out. Each is made when it is first
+/// needed, by one thread at a time, and kept until its cleanup.
+class Provider_Set
+{
+public:
+    Provider_Set(const Module& module, Broker& broker) : module_(module), broker_(broker) {}
+
+    /// The interface of that class and kind; null if the module has no such factory or the factory failed.
+    CMPIInstanceMI* instance(const std::string& class_name);
+    CMPIAssociationMI* association(const std::string& class_name);
+    CMPIMethodMI* method(const std::string& class_name);
+    CMPIIndicationMI* indication(const std::string& class_name);
+
+    bool serves(const std::string& class_name, Mi_Kind kind) const
+    {
+        return module_.factory(class_name, kind);
+    }
+
+    /// Calls `cleanup` of all interfaces (or of one class's), kind by kind in the order instance,
+    /// association, method, indication. One that answers 50 or 51 is kept; the highest code is returned.
+    CMPIrc cleanup(bool terminating);
+    CMPIrc cleanup(const std::string& class_name, bool terminating);
+
+    /// Interfaces that are in use.
+    std::size_t count() const;
+
+private:
+    using Key = std::pair<std::string, Mi_Kind>;
+
+    /// Calls the factory unless that has been done; interfaces of all kinds are two pointers.
+    void* get(const std::string& class_name, Mi_Kind kind);
+    void* make(const std::string& class_name, Mi_Kind kind);
+    CMPIrc cleanup_one(void* mi, Mi_Kind kind, bool terminating);
+    template <class Wanted>
+    CMPIrc cleanup_if(Wanted wanted, bool terminating);
+
+    const Module& module_;
+    Broker& broker_;
+    mutable Standard_Mutex<std::recursive_mutex> mutex_;
+    std::map<Key, void*> made_ GUARDED_BY(mutex_);
+};
+
+} // namespace KPRV::broker

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "broker/Class_Catalogue.h"
+#include "module/runtime/Registration.h"
+#include "module/runtime/Standard_Mutex.h"
+
+#include <map>
+#include <memory>
+
+namespace KPRV::broker {
+
+/// Reads the classes out of the metadata tables that a module publishes through `cimple_module`. The tables
+/// must outlive the catalogue; a class is read when it is first asked for. Safe for any thread.
+class Registration_Catalogue final : public Class_Catalogue
+{
+public:
+    explicit Registration_Catalogue(const Registration* head);
+    ~Registration_Catalogue() override;
+
+    std::vector<std::string> class_names() const override { return names_; }
+    const Class_Info* find(std::string_view name) const override;
+    std::string module_name() const override { return module_name_; }
+
+private:
+    struct Slot
+    {
+        const Meta_Class* meta_class = nullptr;
+        bool has_provider = false;
+        std::unique_ptr<Class_Info> info;
+    };
+
+    void add(const Meta_Class* meta_class) REQUIRES(mutex_);
+
+    std::string module_name_;
+    std::vector<std::string> names_;
+    mutable Standard_Mutex<> mutex_;
+    mutable std::map<std::string, Slot, std::less<>> slots_ GUARDED_BY(mutex_);
+};
+
+} // namespace KPRV::broker

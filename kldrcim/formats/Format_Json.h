@@ -1,0 +1,36 @@
+#pragma once
+
+#include "broker/Value.h"
+
+namespace KPRV::broker {
+
+/// JSON with the members in the order of the class, which jsoncpp's sorted objects cannot keep; its quoting
+/// of texts is used. References are object paths as text; a NaN or infinity is null.
+std::string json_text(const Value& value, unsigned indent = 0);
+
+/// `{"class": ..., "path": ..., "properties": {...}}`, nulls included.
+std::string json_instance(const Instance_Value& instance, unsigned indent = 0);
+
+std::string json_string(const std::string& text);
+
+/// Composed texts between brackets, one a line; "[]" or "{}" if there are none.
+std::string json_array(const std::vector<std::string>& elements, unsigned indent = 0);
+std::string json_object(const std::vector<std::pair<std::string, std::string>>& members, unsigned indent = 0);
+
+/// One object of a tree, as `tree` and `profiles` write it.
+struct Json_Branch
+{
+    std::string kind;
+    std::string what;
+    std::string name;
+    std::vector<std::string> facts;
+    std::string path;
+    /// Composed objects.
+    std::vector<std::string> children;
+};
+std::string json_branch(const Json_Branch& branch, unsigned indent = 0);
+
+/// The values as members of an object.
+std::string json_values(const std::vector<Named_Value>& values, unsigned indent = 0);
+
+} // namespace KPRV::broker

@@ -1,0 +1,296 @@
+#include "kldrcim/input/Cli_Options.h"
+
+#include "kldrcim/input/Nearest_Word.h"
+#include "kldrcim/verbs/Cli_Help.h"
+#include "kldrcim/verbs/Cli_Rpc.h"
+#include "kldrcim/verbs/Cli_Verbs.h"
+
+#include <algorithm>
+#include <charconv>
+#include <iterator>
+
+namespace KPRV::broker {
+
+namespace {
+
+std::vector<std::string> split_list(const std::string& text)
+{
+    std::vector<std::string> names;
+    std::size_t from = 0;
+    while (from <= text.size()) {
+        std::size_t comma = std::min(text.find(',', from), text.size());
+        if (comma > from)
+            names.push_back(text.substr(from, comma - from));
+        from = comma + 1;
+    }
+    return names;
+}
+
+constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
+    {"table", Cli_Options::Format::TABLE},
+    {"json", Cli_Options::Format::JSON},
+    {"mof", Cli_Options::Format::MOF},
+};
+constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
+    {"auto", Cli_Options::Color::AUTO},
+    {"always", Cli_Options::Color::ALWAYS},
+    {"never", Cli_Options::Color::NEVER},
+};
+
+/// One of a few words.
+template <auto Member, auto& Words>
+bool set_word(Cli_Options& options, const std::string& value)
+{
+    for (const auto& [name, meaning] : Words)
+        if (value == name) {
+            options.*Member = meaning;
+            return true;
+        }
+    return false;
+}
+
+/// A text of the options.
+template <std::string Cli_Options::*Member>
+bool set_text(Cli_Options& options, const std::string& value)
+{
+    options.*Member = value;
+    return true;
+}
+
+template <std::string Association_Filter::*Member>
+bool set_filter(Cli_Options& options, const std::string& value)
+{
+    options.filter.*Member = value;
+    return true;
+}
+
+bool set_properties(Cli_Options& options, const std::string& value)
+{
+    options.properties = split_list(value);
+    return true;
+}
+
+bool set_user(Cli_Options& options, const std::string& value)
+{
+    options.user = value;
+    return true;
+}
+
+bool add_filter(Cli_Options& options, const std::string& value)
+{
+    options.filters.push_back(value);
+    return !value.empty();
+}
+
+bool set_count(Cli_Options& options, const std::string& value)
+{
+    const char* end = value.data() + value.size();
+    const auto [at, error] = std::from_chars(value.data(), end, options.count);
+    return error == std::errc() && at == end && options.count != 0;
+}
+
+bool set_raw(Cli_Options& options, const std::string& value)
+{
+    options.raw = value;
+    return true;
+}
+
+using Filter = Association_Filter;
+using Options = Cli_Options;
+
+// clang-format off
+constexpr Cli_Option option_table[] = {
+//   name            value             set                                  flag                     takes                     common
+    {"--format",     "table|json|mof", set_word<&Options::format, formats>, nullptr,                 "table, json or mof",     true,
+     "how results are written (default: table)"},
+    {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
+     "ask for these properties only"},
+    {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
+     "namespace of the classes (default: root/kaldera)"},
+    {"--module",     "FILE",           set_text<&Options::module>,          nullptr,                 nullptr,                  true,
+     "provider library (default: libkldrprovider_Module.so beside this program, then in ../lib/cim and /usr/lib/cim, then on "
+     "the library search path)"},
+    {"--user",       "NAME",           set_user,                            nullptr,                 nullptr,                  true,
+     "authenticated user that the provider sees (default: none)"},
+    {"--server-instances", "FILE",     set_text<&Options::server_instances>, nullptr,                nullptr,                  true,
+     "JSON of what the server's own name spaces hold, for providers that ask the server (default: it has none besides "
+     "--namespace)"},
+    {"--assoc",      "CLASS",          set_filter<&Filter::association_class>, nullptr,              nullptr,                  false,
+     "only this association class and its subclasses (default: every one that can hold the class of PATH)"},
+    {"--role",       "ROLE",           set_filter<&Filter::role>,           nullptr,                 nullptr,                  false,
+     "only where PATH stands in this role"},
+    {"--result",     "CLASS",          set_filter<&Filter::result_class>,   nullptr,                 nullptr,                  false,
+     "only results of this class or a subclass"},
+    {"--result-role", "ROLE",          set_filter<&Filter::result_role>,    nullptr,                 nullptr,                  false,
+     "only results that stand in this role"},
+    {"--filter",     "NS",             add_filter,                          nullptr,                 "a namespace",            false,
+     "a filter in this namespace, instead of --namespace; may be given several times"},
+    {"--count",      "N",              set_count,                           nullptr,                 "a number above 0",       false,
+     "end after N indications"},
+    {"--software",   nullptr,          nullptr,                             &Options::software,      nullptr,                  false,
+     "also firmware and drivers"},
+    {"--connectors", nullptr,          nullptr,                             &Options::connectors,    nullptr,                  false,
+     "also cards and transceivers"},
+    {"--ascii",      nullptr,          nullptr,                             &Options::ascii,         nullptr,                  false,
+     "no box-drawing characters (default where the locale is not UTF-8)"},
+    {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,
+     "states in colors: auto, always or never (default: auto, on a terminal and without NO_COLOR)"},
+    {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
+     "the whole text of a call"},
+    {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,
+     "list the methods"},
+    {"--wait",       nullptr,          nullptr,                             &Options::wait,          nullptr,                  false,
+     "show the job while it runs, then its records"},
+    {"--yes",        nullptr,          nullptr,                             &Options::yes,           nullptr,                  false,
+     "do not ask (default where standard input is no terminal)"},
+    {"--leaks",      nullptr,          nullptr,                             &Options::leaks,         nullptr,                  true,
+     "say on standard error which CMPI objects the provider did not release"},
+    {"--help",       nullptr,          nullptr,                             &Options::help,          nullptr,                  true,
+     "this text, or after a verb what there is to know of it"},
+    {"--version",    nullptr,          nullptr,                             &Options::version,       nullptr,                  true,
+     "the program's version"},
+};
+// clang-format on
+
+const Cli_Option* find_option(const std::string& written)
+{
+    const std::string name = written == "-h" ? "--help" : written;
+    const auto at =
+        std::ranges::find_if(option_table, [&](const Cli_Option& option) { return name == option.name; });
+    return at == std::end(option_table) ? nullptr : &*at;
+}
+
+template <class Rows>
+std::vector<std::string> names_of(const Rows& rows)
+{
+    std::vector<std::string> names;
+    for (const auto& row : rows)
+        names.push_back(row.name);
+    return names;
+}
+
+std::string unknown_option(const std::string& argument)
+{
+    return "no option \"" + argument + "\"" +
+           suggestion(argument.substr(0, argument.find('=')), names_of(option_table)) +
+           "; \"kldrcim --help\" lists them";
+}
+
+std::string verbs_with(const Cli_Option& option)
+{
+    std::string names;
+    for (const Cli_Verb& verb : cli_verbs())
+        if (contains_word(verb.options, option.name))
+            names += (names.empty() ? "" : " ") + std::string(verb.name);
+    return names;
+}
+
+/// An option that the verb would ignore is a mistake of the user, who should hear of it.
+bool check_sense(const Cli_Options& options, const Cli_Verb& verb,
+                 const std::vector<const Cli_Option*>& given, std::string& error)
+{
+    for (const Cli_Option* option : given)
+        if (!option->is_common && !contains_word(verb.options, option->name)) {
+            error = std::string(option->name) + " makes no sense for " + verb.name + "; it is for " +
+                    verbs_with(*option);
+            return false;
+        }
+    const char* const format = formats[static_cast<int>(options.format)].first;
+    if (!contains_word(verb.formats, format)) {
+        error = "--format " + std::string(format) + " makes no sense for " + verb.name;
+        return false;
+    }
+    return true;
+}
+
+bool check_verb(const Cli_Options& options, const Cli_Verb* verb, std::string& error)
+{
+    if (options.verb.empty())
+        error = "no verb; \"kldrcim --help\" lists them";
+    else if (!verb)
+        error = "no verb \"" + options.verb + "\"" + suggestion(options.verb, names_of(cli_verbs())) +
+                "; \"kldrcim --help\" lists them";
+    return error.empty();
+}
+
+bool check_arguments(const Cli_Options& options, const Cli_Verb& verb, std::string& error)
+{
+    if (options.arguments.size() < verb.least || options.arguments.size() > verb.most)
+        error = usage_line(verb);
+    return error.empty() && (options.verb != "rpc" || check_rpc(options, error));
+}
+
+} // namespace
+
+std::span<const Cli_Option> cli_options()
+{
+    return option_table;
+}
+
+bool contains_word(const std::string& words, const std::string& word)
+{
+    return (" " + words + " ").find(" " + word + " ") != std::string::npos;
+}
+
+bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error)
+{
+    bool options_end = false;
+    std::vector<const Cli_Option*> given;
+    for (std::size_t i = 0; i < arguments.size(); ++i) {
+        const std::string& argument = arguments[i];
+        if (options_end || argument.size() < 2 || argument[0] != '-') {
+            if (options.verb.empty())
+                options.verb = argument;
+            else
+                options.arguments.push_back(argument);
+            continue;
+        }
+        if (argument == "--") {
+            options_end = true;
+            continue;
+        }
+        std::size_t equals = argument.find('=');
+        const Cli_Option* option = find_option(argument.substr(0, equals));
+        if (!option) {
+            error = unknown_option(argument);
+            return false;
+        }
+        if (option->flag && equals != std::string::npos) {
+            error = std::string(option->name) + " takes no value";
+            return false;
+        }
+        given.push_back(option);
+        if (option->flag) {
+            options.*option->flag = true;
+            continue;
+        }
+        if (equals == std::string::npos && i + 1 == arguments.size()) {
+            error = std::string(option->name) + " wants a value";
+            return false;
+        }
+        std::string value = equals == std::string::npos ? arguments[++i] : argument.substr(equals + 1);
+        if (!option->set(options, value)) {
+            error = std::string(option->name) + " takes " + option->takes + ", not \"" + value + "\"";
+            return false;
+        }
+    }
+    if (options.version || (options.help && options.verb.empty()))
+        return true;
+    const Cli_Verb* const verb = find_verb(options.verb);
+    if (!check_verb(options, verb, error))
+        return false;
+    return options.help ||
+           (check_arguments(options, *verb, error) && check_sense(options, *verb, given, error));
+}
+
+bool split_assignment(const std::string& text, std::string& name, std::string& value)
+{
+    std::size_t equals = text.find('=');
+    if (equals == std::string::npos || equals == 0)
+        return false;
+    name = text.substr(0, equals);
+    value = text.substr(equals + 1);
+    return true;
+}
+
+} // namespace KPRV::broker

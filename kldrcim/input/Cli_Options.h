@@ -1,0 +1,90 @@
+#pragma once
+
+#include "broker/Request.h"
+
+#include <span>
+
+namespace KPRV::broker {
+
+/// What stands on the command line of `kldrcim`.
+struct Cli_Options
+{
+    enum class Format
+    {
+        TABLE,
+        JSON,
+        MOF,
+    };
+    enum class Color
+    {
+        AUTO,
+        ALWAYS,
+        NEVER,
+    };
+
+    Format format = Format::TABLE;
+    /// Of a tree: on a terminal, unless it is said.
+    Color color = Color::AUTO;
+    Property_List properties;
+    std::string name_space = "root/kaldera";
+    /// Empty: look for it.
+    std::string module;
+    std::optional<std::string> user;
+    /// File of what the server's own name spaces hold; empty for none.
+    std::string server_instances;
+    /// As the four options give it; references take the association class as their result class.
+    Association_Filter filter;
+    /// What a tree or graph shows besides ports and storage.
+    bool software = false;
+    bool connectors = false;
+    /// Name spaces of the filters of a watch; empty: that of the classes.
+    std::vector<std::string> filters;
+    /// Indications after which a watch ends; 0: never.
+    unsigned count = 0;
+    /// Lines of a tree without box-drawing characters.
+    bool ascii = false;
+    /// rpc: the whole text of a call, or "-" for standard input.
+    std::optional<std::string> raw;
+    bool list_methods = false;
+    /// Follow the job of a test that was started.
+    bool wait = false;
+    /// Update firmware without asking.
+    bool yes = false;
+    bool leaks = false;
+    bool help = false;
+    bool version = false;
+    std::string verb;
+    /// What follows the verb.
+    std::vector<std::string> arguments;
+};
+
+/// One option, as the table of them has it.
+struct Cli_Option
+{
+    const char* name;
+    /// What its value is, for the help; null if it takes none.
+    const char* value;
+    /// False for a value that is none.
+    bool (*set)(Cli_Options& options, const std::string& value);
+    /// Of an option without value.
+    bool Cli_Options::*flag;
+    /// What its values are, for one that has bad ones; null if it takes any.
+    const char* takes;
+    /// All verbs know it; the others name theirs.
+    bool is_common;
+    const char* summary;
+};
+
+std::span<const Cli_Option> cli_options();
+
+/// Reads the arguments behind the program's name. False with a one-line `error` for what is not understood,
+/// wrong numbers of arguments for the verb included. Options may stand anywhere; "--" ends them.
+bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error);
+
+/// "NAME=VALUE" apart; false if there is no name or no equals sign.
+bool split_assignment(const std::string& text, std::string& name, std::string& value);
+
+/// True if the words, with blanks between them, hold the word.
+bool contains_word(const std::string& words, const std::string& word);
+
+} // namespace KPRV::broker

@@ -1,0 +1,85 @@
+#include "kldrcim/verbs/Cli_Classes.h"
+
+#include "broker/Value_Text.h"
+#include "kldrcim/formats/Format_Json.h"
+#include "kldrcim/formats/Format_Table.h"
+#include "kldrcim/formats/Output.h"
+#include "kldrcim/verbs/Cli_Complaints.h"
+
+#include <algorithm>
+#include <fnmatch.h>
+
+namespace KPRV::broker {
+
+namespace {
+
+std::string joined(const std::vector<std::string>& words)
+{
+    std::string text;
+    for (const std::string& word : words)
+        text += (text.empty() ? "" : ", ") + word;
+    return text;
+}
+
+struct Class_Row
+{
+    std::string name;
+    std::string superclass;
+    std::vector<std::string> kinds;
+    std::vector<std::string> keys;
+};
+
+std::vector<Class_Row> class_rows(const std::string& pattern, const Host& host)
+{
+    std::vector<Class_Row> rows;
+    for (const std::string& name : host.catalogue().class_names()) {
+        const Class_Info* info = host.catalogue().find(name);
+        if (!info->has_provider || fnmatch(pattern.c_str(), name.c_str(), FNM_CASEFOLD) != 0)
+            continue;
+        Class_Row& row = rows.emplace_back(Class_Row{info->name, info->superclass, {}, {}});
+        for (Mi_Kind kind : mi_kinds)
+            if (host.module().factory(name, kind))
+                row.kinds.push_back(lower_name(mi_kind_name(kind)));
+        for (const Feature_Info& property : info->properties)
+            if (property.key)
+                row.keys.push_back(property.name);
+    }
+    std::sort(rows.begin(), rows.end(),
+              [](const Class_Row& a, const Class_Row& b) { return a.name < b.name; });
+    return rows;
+}
+
+std::string json_strings(const std::vector<std::string>& texts)
+{
+    std::vector<std::string> elements;
+    for (const std::string& text : texts)
+        elements.push_back(json_string(text));
+    return json_array(elements, 4);
+}
+
+} // namespace
+
+int list_classes(const Cli_Options& options, Host& host)
+{
+    if (!host.catalogue().is_known())
+        return complain(host.module().path() + " does not publish its classes", 0);
+    std::vector<Class_Row> classes = class_rows(options.arguments.empty() ? "*" : options.arguments[0], host);
+    if (options.format != Cli_Options::Format::JSON) {
+        std::vector<std::vector<std::string>> rows;
+        for (const Class_Row& row : classes)
+            rows.push_back({row.name, row.superclass, joined(row.kinds), joined(row.keys)});
+        put(rows_as_table({"Class", "Superclass", "Provider", "Keys"}, rows));
+        return 0;
+    }
+    std::vector<std::string> elements;
+    for (const Class_Row& row : classes)
+        elements.push_back(json_object({{"class", json_string(row.name)},
+                                        {"superclass", json_string(row.superclass)},
+                                        {"provider", json_strings(row.kinds)},
+                                        {"keys", json_strings(row.keys)}},
+                                       2));
+    put(json_array(elements) + "\n");
+    return 0;
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,12 @@
+#pragma once
+
+#include "broker/Host.h"
+#include "kldrcim/input/Cli_Options.h"
+
+namespace KPRV::broker {
+
+/// `kldrcim classes`: those that have a provider and match the pattern, with superclass, provider kinds,
+/// keys.
+int list_classes(const Cli_Options& options, Host& host);
+
+} // namespace KPRV::broker

@@ -1,0 +1,212 @@
+#include "kldrcim/verbs/Cli_Diag.h"
+
+#include "broker/Value_Text.h"
+#include "kldrcim/formats/Format_Table.h"
+#include "kldrcim/formats/Output.h"
+#include "kldrcim/verbs/Cli_Complaints.h"
+#include "kldrcim/verbs/Cli_Output.h"
+#include "kldrcim/verbs/Interruption.h"
+#include "kldrcim/walks/Diag_Job.h"
+#include "kldrcim/walks/Diag_Names.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <iterator>
+
+namespace KPRV::broker {
+
+namespace {
+
+constexpr int REFUSED = 3;
+constexpr std::uint64_t JOB_STARTED = 4096;
+
+int complain_of(const Result& result)
+{
+    return complain(code_text(result.rc), FAILURE);
+}
+
+const std::string& text_of(const Instance_Value& instance, const char* name)
+{
+    static const std::string none;
+    const Value* const value = instance.property(name);
+    return value ? value->as_text() : none;
+}
+
+/// Of CIM's `Characteristics`.
+constexpr std::uint64_t OUT_OF_SERVICE = 4;
+constexpr std::uint64_t LOOPBACK_PLUG = 10;
+
+bool has_characteristic(const Instance_Value& test, std::uint64_t number)
+{
+    const Value* const value = test.property("Characteristics");
+    return value && std::ranges::any_of(value->elements(),
+                                        [&](const Value& each) { return each.as_uint() == number; });
+}
+
+std::string characteristics_of(const Instance_Value& test)
+{
+    static constexpr std::pair<std::uint64_t, const char*> words[] = {
+        {OUT_OF_SERVICE, "takes it out of service"}, {LOOPBACK_PLUG, "needs a loopback plug"}};
+    std::string text;
+    for (const auto& [number, word] : words)
+        if (has_characteristic(test, number))
+            text += (text.empty() ? "" : ", ") + std::string(word);
+    return text;
+}
+
+int list(const Cli_Options& options, Host& host)
+{
+    const Result tests = host.enumerate_instances(test_class, options.properties);
+    if (!tests.ok())
+        return complain_of(tests);
+    if (options.format != Cli_Options::Format::TABLE || options.properties) {
+        write_instances(options, tests.instances);
+        return 0;
+    }
+    std::vector<std::vector<std::string>> rows;
+    for (const Instance_Value& test : tests.instances)
+        rows.push_back(
+            {text_of(test, "Name"), element_words(test.path.class_name), characteristics_of(test)});
+    put(rows_as_table({"Test", "On", "Remarks"}, rows));
+    rows.clear();
+    for (const Element_Kind& kind : element_kinds())
+        for (const Instance_Value& element : host.enumerate_instances(kind.class_name).instances)
+            rows.push_back({text_of(element, "DeviceID"), kind.words, text_of(element, "ElementName")});
+    put("\n" + rows_as_table({"Element", "Kind", "Name"}, rows));
+    return 0;
+}
+
+/// Why the module does not run the test.
+std::string refusal(std::uint64_t code)
+{
+    static constexpr std::pair<std::uint64_t, const char*> meanings[] = {
+        {1, "not supported: an FCoE port has no internal loopback test"},
+        {4, "failed: another test is running, or the port's details cannot be read"},
+        {5, "invalid parameter: the test is not for such an element, or its address is not one"}};
+    for (const auto& [number, meaning] : meanings)
+        if (code == number)
+            return meaning;
+    return "a value without a meaning";
+}
+
+int report(const Run_Report& outcome)
+{
+    std::vector<std::vector<std::string>> rows;
+    for (const Run_Record& record : outcome.records)
+        rows.push_back({std::to_string(record.number), record.time, record.outcome, record.text});
+    put(rows_as_table({"Record", "Time", "Outcome", "Text"}, rows));
+    put(outcome.passed ? "passed\n" : "failed\n");
+    return outcome.passed ? 0 : 1;
+}
+
+bool takes_out_of_service(Host& host, const Path_Value& test)
+{
+    const Result result = host.get_instance(test, {{"Characteristics"}});
+    return result.ok() && !result.instances.empty() &&
+           has_characteristic(result.instances[0], OUT_OF_SERVICE);
+}
+
+/// The test and its job live in this process: whatever ends the verb, the element is brought back first. A
+/// signal is an order to come to that end, a second one to leave at once.
+class Running_Test
+{
+public:
+    Running_Test(Host& host, bool out_of_service, std::string element)
+        : host_(host), out_of_service_(out_of_service), element_(std::move(element))
+    {
+    }
+    ~Running_Test() { wait_for_end(); }
+    Running_Test(const Running_Test&) = delete;
+    Running_Test& operator=(const Running_Test&) = delete;
+
+    void wait_for_end()
+    {
+        while (is_test_running(host_))
+            wait();
+    }
+    /// For a moment.
+    void wait()
+    {
+        constexpr auto MOMENT = std::chrono::milliseconds(100);
+        interruption_.wait(MOMENT);
+        if (interruption_.count() > 1)
+            leave();
+        if (interruption_.count() == 1 && !told_) {
+            told_ = true;
+            complain(out_of_service_
+                         ? "interrupted: waiting until the test has brought " + element_ +
+                               " back into service; a second signal leaves it as it is"
+                         : "interrupted: waiting for the end of the test; a second signal ends it",
+                     0);
+        }
+    }
+    /// The signal that has come; 0 for none.
+    int signal() const { return interruption_.latest(); }
+
+private:
+    [[noreturn]] void leave()
+    {
+        complain(out_of_service_ ? element_ + " is left out of service: the test was ended while it ran"
+                                 : "the test of " + element_ + " was ended while it ran",
+                 0);
+        // Not by the usual end, which would wait for the provider.
+        std::_Exit(status_of_signal(interruption_.latest()));
+    }
+
+    Host& host_;
+    const bool out_of_service_;
+    const std::string element_;
+    bool told_ = false;
+    Interruption interruption_;
+};
+
+int run(const Cli_Options& options, Host& host)
+{
+    Path_Value test, element;
+    std::string error;
+    if (!find_test(host, options.arguments[1], test, error) ||
+        !find_element(host, test.class_name, options.arguments[2], element, error))
+        return complain(error, USAGE_ERROR);
+    Running_Test running(host, takes_out_of_service(host, test), options.arguments[2]);
+    const Result started =
+        host.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
+    if (!started.ok())
+        return complain_of(started);
+    const std::uint64_t code = started.return_value.as_uint();
+    if (code != JOB_STARTED)
+        return complain("refused, RunDiagnostic returned " + std::to_string(code) + ": " + refusal(code),
+                        REFUSED);
+    const Value* const reference = find_value(started.out, "Job");
+    if (!reference || !reference->as_path())
+        return complain("the test was started without a job", FAILURE);
+    const Path_Value& job = *reference->as_path();
+    put(path_text(job) + "\n");
+    flush_output();
+    int status = 0;
+    if (options.wait) {
+        status = report(follow_job(host, job, [&] { running.wait(); }));
+    } else {
+        // A server would go on; this one is the module's process, and its end would leave the element out of
+        // service.
+        complain("the test and its job live in this process, which waits for the end of the test and then "
+                 "takes the "
+                 "records with it; --wait shows them",
+                 0);
+        running.wait_for_end();
+    }
+    return running.signal() ? status_of_signal(running.signal()) : status;
+}
+
+} // namespace
+
+int diag(const Cli_Options& options, Host& host)
+{
+    const std::vector<std::string>& words = options.arguments;
+    if (words[0] == "list" && words.size() == 1 && !options.wait)
+        return list(options, host);
+    if (words[0] == "run" && words.size() == 3)
+        return run(options, host);
+    return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE_ERROR);
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,167 @@
+#include "kldrcim/verbs/Cli_Operations.h"
+
+#include "broker/Association_Routing.h"
+#include "kldrcim/input/Name_Spaces.h"
+#include "kldrcim/input/Typed_Input.h"
+#include "kldrcim/verbs/Cli_Complaints.h"
+#include "kldrcim/verbs/Cli_Output.h"
+#include "kldrcim/verbs/Cli_Verbs.h"
+
+namespace KPRV::broker {
+
+namespace {
+
+/// One of the plain operations, from the words of the command line.
+class Plain_Operation
+{
+public:
+    Plain_Operation(const Cli_Options& options, Host& host)
+        : options_(options), host_(host), catalogue_(host.catalogue())
+    {
+    }
+
+    int run()
+    {
+        Request request;
+        request.operation = find_verb(options_.verb)->operation;
+        if (!read_request(request))
+            return complain(error_, USAGE_ERROR);
+        Result result = host_.run(request);
+        if (!result.ok())
+            return complain(status_text(request, result), 1);
+        write(request, result);
+        warn_of(result.failures);
+        return 0;
+    }
+
+private:
+    const std::string& argument(std::size_t index) const { return options_.arguments[index]; }
+
+    bool read_request(Request& request)
+    {
+        if (!typed_path(catalogue_, argument(0), request.path, error_) ||
+            (!request.path.name_space.empty() && !is_served(host_, request.path.name_space, error_)))
+            return false;
+        request.properties = options_.properties;
+        if (is_association_operation(request.operation))
+            return read_filter(request);
+        if (request.properties &&
+            !check_properties(catalogue_, request.path.class_name, *request.properties, error_))
+            return false;
+        switch (request.operation) {
+        case Operation::CREATE_INSTANCE:
+            return read_new_instance(request);
+        case Operation::MODIFY_INSTANCE:
+            return read_changes(request);
+        case Operation::INVOKE_METHOD:
+            request.method = argument(1);
+            return read_assignments(request, request.method, 2, request.in);
+        default:
+            return true;
+        }
+    }
+
+    /// The instances that come back are of other classes than the path, so that property names stay
+    /// unchecked.
+    bool read_filter(Request& request)
+    {
+        request.filter = options_.filter;
+        if (request.operation == Operation::REFERENCES || request.operation == Operation::REFERENCE_NAMES)
+            std::swap(request.filter.association_class, request.filter.result_class);
+        if (request.path.keys.empty())
+            error_ = argument(0) + " is a class; " + options_.verb + " wants the path of an instance";
+        return !request.path.keys.empty();
+    }
+
+    bool read_assignments(const Request& request, const std::string& method, std::size_t from,
+                          std::vector<Named_Value>& values)
+    {
+        for (std::size_t i = from; i < options_.arguments.size(); ++i) {
+            Named_Value assignment;
+            if (!typed_assignment(catalogue_, request.path.class_name, method, argument(i), assignment,
+                                  error_))
+                return false;
+            set_value(values, assignment.name, std::move(assignment.value));
+        }
+        return true;
+    }
+
+    bool read_new_instance(Request& request)
+    {
+        Instance_Value& instance = request.instance;
+        if (!read_assignments(request, "", 1, instance.properties))
+            return false;
+        if (const Class_Info* info = catalogue_.find(request.path.class_name))
+            for (const Named_Value& property : instance.properties)
+                if (info->property(property.name)->key && !property.value.null)
+                    set_value(request.path.keys, property.name, property.value);
+        instance.path = request.path;
+        return true;
+    }
+
+    /// Only what is named is modified.
+    bool read_changes(Request& request)
+    {
+        request.instance.path = request.path;
+        if (!read_assignments(request, "", 1, request.instance.properties))
+            return false;
+        request.properties.emplace();
+        for (const Named_Value& property : request.instance.properties)
+            request.properties->push_back(property.name);
+        return true;
+    }
+
+    std::string status_text(const Request& request, const Result& result) const
+    {
+        std::string text = failure_text(result);
+        if (result.exception || !result.message.empty())
+            return text;
+        if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
+            text +=
+                ": the module has no class " + unknown_class(request) + "; \"kldrcim classes\" lists them";
+        else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
+            text += ": " + request.path.class_name + " has no method " + request.method;
+        return text;
+    }
+
+    std::string unknown_class(const Request& request) const
+    {
+        bool named = is_association_operation(request.operation) && !named_association(request).empty();
+        return named ? named_association(request) : request.path.class_name;
+    }
+
+    void write(const Request& request, const Result& result) const
+    {
+        switch (request.operation) {
+        case Operation::ENUMERATE_INSTANCES:
+        case Operation::ASSOCIATORS:
+        case Operation::REFERENCES:
+            return write_instances(options_, result.instances);
+        case Operation::GET_INSTANCE:
+            return write_instance(options_, result.instances);
+        case Operation::INVOKE_METHOD:
+            return write_method(options_, result);
+        case Operation::ENUMERATE_INSTANCE_NAMES:
+        case Operation::CREATE_INSTANCE:
+        case Operation::ASSOCIATOR_NAMES:
+        case Operation::REFERENCE_NAMES:
+            return write_paths(options_, result.paths);
+        default:
+            return;
+        }
+    }
+
+    const Cli_Options& options_;
+    Host& host_;
+    const Class_Catalogue& catalogue_;
+    std::string error_;
+};
+
+} // namespace
+
+int run_operation(const Cli_Options& options, Host& host)
+{
+    return Plain_Operation(options, host).run();
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,72 @@
+#include "kldrcim/verbs/Cli_Output.h"
+
+#include "broker/Value_Text.h"
+#include "kldrcim/formats/Format_Json.h"
+#include "kldrcim/formats/Format_Table.h"
+#include "kldrcim/formats/Output.h"
+#include "kldrcim/formats/Terminal.h"
+
+namespace KPRV::broker {
+
+namespace {
+
+using Format = Cli_Options::Format;
+
+} // namespace
+
+void write_instances(const Cli_Options& options, const std::vector<Instance_Value>& instances)
+{
+    if (options.format == Format::TABLE)
+        return put(instances_as_table(instances, options.properties ? &*options.properties : nullptr,
+                                      terminal_width()));
+    if (options.format == Format::MOF) {
+        for (const Instance_Value& instance : instances)
+            put(mof_instance(instance));
+        return;
+    }
+    std::vector<std::string> elements;
+    for (const Instance_Value& instance : instances)
+        elements.push_back(json_instance(instance, 2));
+    put(json_array(elements) + "\n");
+}
+
+void write_instance(const Cli_Options& options, const std::vector<Instance_Value>& instances)
+{
+    if (instances.empty())
+        return;
+    if (options.format == Format::JSON)
+        put(json_instance(instances.front()) + "\n");
+    else if (options.format == Format::MOF)
+        put(mof_instance(instances.front()));
+    else
+        put(path_text(instances.front().path) + "\n" + values_as_block(instances.front().properties));
+}
+
+void write_paths(const Cli_Options& options, const std::vector<Path_Value>& paths)
+{
+    std::vector<std::string> elements;
+    for (const Path_Value& path : paths) {
+        if (options.format == Format::JSON)
+            elements.push_back(json_string(path_text(path)));
+        else
+            put(path_text(path) + "\n");
+    }
+    if (options.format == Format::JSON)
+        put(json_array(elements) + "\n");
+}
+
+void write_method(const Cli_Options& options, const Result& result)
+{
+    std::vector<Named_Value> values = {{"return_value", result.return_value}};
+    if (options.format == Format::JSON)
+        return put(json_object({{"return_value", json_text(result.return_value, 2)},
+                                {"out", json_values(result.out, 2)}}) +
+                   "\n");
+    values.insert(values.end(), result.out.begin(), result.out.end());
+    if (options.format == Format::TABLE)
+        return put(values_as_block(values));
+    for (const Named_Value& value : values)
+        put(value.name + " = " + mof_text(value.value) + ";\n");
+}
+
+} // namespace KPRV::broker

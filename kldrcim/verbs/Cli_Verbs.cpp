@@ -1,0 +1,91 @@
+#include "kldrcim/verbs/Cli_Verbs.h"
+
+#include "kldrcim/verbs/Cli_Classes.h"
+#include "kldrcim/verbs/Cli_Conform.h"
+#include "kldrcim/verbs/Cli_Diag.h"
+#include "kldrcim/verbs/Cli_Flash.h"
+#include "kldrcim/verbs/Cli_Operations.h"
+#include "kldrcim/verbs/Cli_Profiles.h"
+#include "kldrcim/verbs/Cli_Rpc.h"
+#include "kldrcim/verbs/Cli_Topology.h"
+#include "kldrcim/verbs/Cli_Watch.h"
+
+#include <algorithm>
+
+namespace KPRV::broker {
+
+namespace {
+
+constexpr std::size_t any = ~std::size_t(0);
+
+constexpr const char* all_formats = "table json mof";
+constexpr const char* ends_options = "--assoc --role --result --result-role";
+constexpr const char* links_options = "--assoc --role";
+
+using Op = Operation;
+
+// clang-format off
+constexpr Cli_Verb verbs[] = {
+//   name        arguments                                          body             operation                    formats       options
+    {"ei",       1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCES,     all_formats,  "",
+     "enumerate instances", nullptr},
+    {"ein",      1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCE_NAMES, all_formats, "",
+     "enumerate instance names", nullptr},
+    {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            all_formats,  "",
+     "get one instance", nullptr},
+    {"ci",       2, any, "CLASS NAME=VALUE...",                     run_operation,   Op::CREATE_INSTANCE,         all_formats,  "",
+     "create an instance", nullptr},
+    {"mi",       2, any, "PATH NAME=VALUE...",                      run_operation,   Op::MODIFY_INSTANCE,         all_formats,  "",
+     "modify the named properties of an instance", nullptr},
+    {"di",       1, 1,   "PATH",                                    run_operation,   Op::DELETE_INSTANCE,         all_formats,  "",
+     "delete an instance", nullptr},
+    {"cm",       2, any, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "",
+     "call a method; PATH may name a class alone for a static one", nullptr},
+    {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             all_formats,  ends_options,
+     "instances associated with one (associators)", nullptr},
+    {"ain",      1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATOR_NAMES,        all_formats,  ends_options,
+     "their names", nullptr},
+    {"ri",       1, 1,   "PATH",                                    run_operation,   Op::REFERENCES,              all_formats,  links_options,
+     "associations that refer to an instance (references)", nullptr},
+    {"rin",      1, 1,   "PATH",                                    run_operation,   Op::REFERENCE_NAMES,         all_formats,  links_options,
+     "their names", nullptr},
+    {"tree",     0, 0,   "",                                        draw_tree,       Op{},                        "table json", "--software --connectors --ascii --color",
+     "the host with its adapters, ports, targets and logical units, as a tree", nullptr},
+    {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--software --connectors",
+     "the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg", nullptr},
+    {"profiles", 0, 0,   "",                                        write_profiles,  Op{},                        "table json", "--ascii",
+     "the registered profiles and what conforms to each, as a tree", nullptr},
+    {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",
+     "what a client of the Storage HBA profile expects, beside what it finds", "1 something mandatory is missing."},
+    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        all_formats,  "--filter --count",
+     "subscribe to indications (default: KALDERA_AlertIndication) and write each as it comes, until interrupted", nullptr},
+    {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        all_formats,  "--wait",
+     "the hardware tests, and the ports and adapters that they can be run on\n"
+     "run a test, by its name, on a port or adapter, by its address or PATH; the test takes the element out of service while it runs",
+     "run: 3 the test was refused; 128 and its number after a signal. With --wait: 0 the test passed, 1 it failed."},
+    {"rpc",      0, any, "METHOD [PARAMETER...]\n--list [PATTERN]\n--raw TEXT", run_rpc, Op{},                    "table json", "--list --raw",
+     "call a method of the agent's JSON-RPC protocol; \"+\" stands before a further call\n"
+     "list its methods with their parameters\n"
+     "send TEXT, or with \"-\" standard input, as it is; write the reply as it is", nullptr},
+    {"flash",    2, 2,   "ADAPTER URI",                             flash,           Op{},                        "table json", "--yes",
+     "update an adapter's firmware from file://PATH or tftp://HOST/FILE, through the module's installation service; "
+     "ADAPTER is its DeviceID, with or without colons, or a PATH", "1 the update failed, or was not wanted."},
+    {"classes",  0, 1,   "[PATTERN]",                               list_classes,    Op{},                        all_formats,  "",
+     "list the classes that have a provider; * and ? match as in file names", nullptr},
+};
+// clang-format on
+
+} // namespace
+
+std::span<const Cli_Verb> cli_verbs()
+{
+    return verbs;
+}
+
+const Cli_Verb* find_verb(const std::string& name)
+{
+    const auto found = std::ranges::find_if(verbs, [&](const Cli_Verb& verb) { return name == verb.name; });
+    return found == std::end(verbs) ? nullptr : &*found;
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,39 @@
+#pragma once
+
+#include "broker/Host.h"
+#include "kldrcim/input/Cli_Options.h"
+
+#include <span>
+
+namespace KPRV::broker {
+
+/// What a verb does on an open module; gives the exit status.
+using Verb_Body = int (*)(const Cli_Options& options, Host& host);
+
+/// One word that `kldrcim` understands.
+struct Cli_Verb
+{
+    const char* name;
+    /// How many arguments may follow it.
+    std::size_t least;
+    std::size_t most;
+    /// What they are, a line for each form that the verb has.
+    const char* arguments;
+    Verb_Body body;
+    /// The operation that the plain verbs stand for; the others do not look at it.
+    Operation operation;
+    /// The values of --format that it knows, and its options beside those that all verbs have.
+    const char* formats;
+    const char* options;
+    /// What it does, a line for each form.
+    const char* summary;
+    /// What its exit statuses mean where that is not what they always mean; null for nothing.
+    const char* statuses;
+};
+
+std::span<const Cli_Verb> cli_verbs();
+
+/// Null for a word that is no verb.
+const Cli_Verb* find_verb(const std::string& name);
+
+} // namespace KPRV::broker

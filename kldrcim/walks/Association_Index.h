@@ -1,0 +1,53 @@
+#pragma once
+
+#include "broker/Host.h"
+
+#include <unordered_map>
+
+namespace KPRV::broker {
+
+/// Asks the module for associations and instances, each enumeration once, and answers from what it kept. A
+/// traversal would cost the module one enumeration per object that it starts at, and one more per object
+/// found.
+class Association_Index
+{
+public:
+    explicit Association_Index(Host& host) : host_(host) {}
+
+    /// The far ends of the links of an association whose near role holds the object, each once, in the order
+    /// of the enumeration. With `above_role`, only of links where that role holds `above`.
+    std::vector<Path_Value> far_ends(const char* association, const char* near_role, const Path_Value& object,
+                                     const char* far_role, const char* above_role = nullptr,
+                                     const Path_Value* above = nullptr);
+
+    /// The instances of a class.
+    const std::vector<Instance_Value>& instances(const std::string& class_name);
+
+    /// The instance behind a path. If the module does not have it, the path with its keys as properties.
+    Instance_Value instance(const Path_Value& path);
+
+    /// Enumerations that failed, in the order in which they were made.
+    const std::vector<Provider_Failure>& failures() const { return failures_; }
+
+private:
+    struct Class_Instances
+    {
+        std::vector<Instance_Value> instances;
+        std::unordered_map<std::string, std::size_t> by_path;
+    };
+    using Links = std::vector<Path_Value>;
+    using Positions = std::unordered_map<std::string, std::vector<std::size_t>>;
+
+    const Links& links(const std::string& association);
+    const Class_Instances& class_instances(const std::string& class_name);
+    void note_failure(const std::string& class_name, const Result& result);
+
+    Host& host_;
+    std::unordered_map<std::string, Links> links_;
+    /// By association and near role: positions in the links by the identity of the near end.
+    std::unordered_map<std::string, Positions> positions_;
+    std::unordered_map<std::string, Class_Instances> instances_;
+    std::vector<Provider_Failure> failures_;
+};
+
+} // namespace KPRV::broker

@@ -1,0 +1,112 @@
+#include "kldrcim/walks/Diag_Job.h"
+
+#include "broker/Datetime_Text.h"
+
+#include <algorithm>
+#include <chrono>
+#include <cstdlib>
+#include <unistd.h>
+
+namespace KPRV::broker {
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+constexpr std::uint64_t JOB_OVER = 7;
+constexpr std::uint64_t PASSED = 2;
+
+std::string state_words(const Result& job)
+{
+    const Value* const state =
+        job.ok() && !job.instances.empty() ? job.instances[0].property("JobState") : nullptr;
+    if (!state)
+        return "unknown";
+    return state->as_uint() == JOB_OVER ? "completed" : "running";
+}
+
+/// Shows how a job gets on.
+class Progress
+{
+public:
+    void show(const std::string& state)
+    {
+        const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(Clock::now() - _begin).count();
+        if (_terminal)
+            std::fprintf(stderr, "\r%s, %lld s ", state.c_str(), static_cast<long long>(seconds));
+        else if (state != _shown)
+            std::fprintf(stderr, "%s, %lld s\n", state.c_str(), static_cast<long long>(seconds));
+        _shown = state;
+    }
+    ~Progress()
+    {
+        if (_terminal)
+            std::fputs("\n", stderr);
+    }
+
+private:
+    const Clock::time_point _begin = Clock::now();
+    const bool _terminal = isatty(STDERR_FILENO);
+    std::string _shown;
+};
+
+/// The clock's part of a timestamp that is given in UTC.
+std::string time_of_day(const std::string& datetime)
+{
+    const std::string utc = is_datetime_text(datetime) ? datetime_text(datetime_microseconds(datetime), false)
+                                                       : std::string(25, '0');
+    return utc.substr(8, 2) + ":" + utc.substr(10, 2) + ":" + utc.substr(12, 2) + utc.substr(14, 4);
+}
+
+void collect(Host& host, const char* class_name, const std::string& job_id, Run_Report& report)
+{
+    const std::string head = job_id + ":";
+    for (const Instance_Value& each : host.enumerate_instances(class_name).instances) {
+        const auto text_of = [&](const char* name) {
+            const Value* const value = each.property(name);
+            return value ? value->as_text() : std::string();
+        };
+        const std::string id = text_of("InstanceID");
+        if (!id.starts_with(head))
+            continue;
+        const Value* const state = each.property("CompletionState");
+        const bool passed = state && state->as_uint() == PASSED;
+        report.records.push_back({std::strtoul(id.c_str() + head.size(), nullptr, 10),
+                                  time_of_day(text_of("CreationTimeStamp")),
+                                  !state   ? ""
+                                  : passed ? "passed"
+                                           : "failed",
+                                  text_of("RecordData")});
+    }
+}
+
+} // namespace
+
+bool is_test_running(Host& host)
+{
+    // The thread of a run stays attached to its server until it ends.
+    return host.ledger().live(Object_Kind::CONTEXT) != 0;
+}
+
+Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause)
+{
+    {
+        Progress progress;
+        while (is_test_running(host)) {
+            progress.show(state_words(host.get_instance(job)));
+            pause();
+        }
+        progress.show(state_words(host.get_instance(job)));
+    }
+    Run_Report report;
+    const Value* const id = job.key("InstanceID");
+    for (const char* class_name : {"KALDERA_DiagnosticServiceRecord", "KALDERA_DiagnosticCompletionRecord"})
+        collect(host, class_name, id ? id->as_text() : "", report);
+    std::ranges::sort(report.records, {}, &Run_Record::number);
+    const auto count = [&](const char* outcome) {
+        return std::ranges::count(report.records, outcome, &Run_Record::outcome);
+    };
+    report.passed = count("failed") == 0 && count("passed") > 0;
+    return report;
+}
+
+} // namespace KPRV::broker

@@ -1,0 +1,211 @@
+#include "module/adapter/Host_Calls.h"
+#include "module/adapter/Host_Name.h"
+#include "module/adapter/ProviderUtil.h"
+#include "module/adapter/ProviderUtil_Log.h"
+
+#include <arpa/inet.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+#include <memory>
+#include <new>
+
+namespace KPRV {
+
+namespace {
+
+constexpr size_t NAME_SIZE = 255;
+
+/// A text of the caller's, cut to its room.
+struct Out_Text
+{
+    char* data;
+    size_t size;
+
+    void set(const char* text) const
+    {
+        if (size > 0)
+            data[0] = '\0';
+        append(text);
+    }
+    void append(const char* text) const
+    {
+        const size_t used = strnlen(data, size);
+        if (used + 1 < size)
+            strncat(data, text, size - used - 1);
+    }
+};
+
+/// Asks for a name; false if there is none. The C library may leave a cut name unterminated.
+bool ask_name(int (*call)(char*, size_t), char (&name)[NAME_SIZE])
+{
+    if (call(name, sizeof name) != 0)
+        return false;
+    name[sizeof name - 1] = '\0';
+    return true;
+}
+
+enum class Lookup
+{
+    NONE,
+    LOOPBACK_ONLY,
+    FOUND
+};
+
+/// The resolver's answer in room of its own, so that no thread waits for another's name server.
+class Host_Entry
+{
+public:
+    explicit Host_Entry(const char* host)
+    {
+        constexpr size_t MOST = size_t(1) << 20;
+        size_t size = sizeof _usual;
+        bool wants_more = !ask(host, _usual, size);
+        while (wants_more && size < MOST) {
+            size *= 4;
+            _more.reset(new (std::nothrow) char[size]);
+            if (!_more)
+                return;
+            wants_more = !ask(host, _more.get(), size);
+        }
+    }
+    /// Null if there is none.
+    const hostent* entry() const { return _entry; }
+
+private:
+    /// False if the answer needs more room.
+    bool ask(const char* host, char* room, size_t size)
+    {
+        int error = 0;
+        const int status = host_calls.gethostbyname_r(host, &_record, room, size, &_entry, &error);
+        if (status != 0)
+            _entry = nullptr;
+        return status != ERANGE;
+    }
+
+    hostent _record;
+    hostent* _entry = nullptr;
+    char _usual[1024];
+    std::unique_ptr<char[]> _more;
+};
+
+/// Finds the host's first address that is no loopback address.
+Lookup look_up(const char* host, Out_Text out)
+{
+    const Host_Entry answer(host);
+    const hostent* const entry = answer.entry();
+    if (!entry || !entry->h_addr_list || !entry->h_addr_list[0])
+        return Lookup::NONE;
+    for (char** next = entry->h_addr_list; *next; next++) {
+        char text[INET_ADDRSTRLEN];
+        inet_ntop(AF_INET, *next, text, sizeof text);
+        if (strncmp(text, "127", 3) != 0) {
+            out.set(text);
+            return Lookup::FOUND;
+        }
+    }
+    return Lookup::LOOPBACK_ONLY;
+}
+
+/// The code of `getHostInfo`, and what its caller is to tell the log; null for nothing.
+struct Outcome
+{
+    int code;
+    const char* said;
+};
+
+Outcome ask_for_host(Out_Text out)
+{
+    constexpr Outcome named = {2,
+                               "gethostbyname() FAILED. hostString will have hostname instead of ipAddress"};
+    char host[NAME_SIZE] = {};
+    if (!ask_name(host_calls.gethostname, host)) {
+        out.set("localhost");
+        return {3, "gethostname() FAILED. hostString will be filled with localhost"};
+    }
+    switch (look_up(host, out)) {
+    case Lookup::NONE:
+        out.set(host);
+        return named;
+    case Lookup::FOUND:
+        return {0, nullptr};
+    case Lookup::LOOPBACK_ONLY:
+        break;
+    }
+
+    if (!ask_name(host_calls.gethostname, host))
+        return {2, "gethostname() failed"};
+    out.set(host);
+    char domain[NAME_SIZE] = {};
+    if (!ask_name(host_calls.getdomainname, domain))
+        return {2, "getdomainname() failed"};
+    // The name with its domain is tested and then dropped: callers have always seen the bare name. The test
+    // can only hold where the buffer had no room for the domain.
+    out.append(".");
+    out.append(domain);
+    if (strncmp(out.data, "localhost", out.size) == 0 && strcmp(domain, "(none)") == 0)
+        return {4, nullptr};
+    out.set(host);
+    return named;
+}
+
+void tell(const char* said)
+{
+    if (said)
+        UTIL_LOG(INFO, "%s", said);
+}
+
+Out_Text room(char* buffer, int length)
+{
+    return {buffer, length > 0 ? static_cast<size_t>(length) : 0};
+}
+
+constexpr const char* SCOPE = "getHostInfo";
+
+} // namespace
+
+int ProviderUtil::getHostInfo(char* buffer, int length)
+{
+    UTIL_SCOPE(SCOPE);
+    const Outcome outcome = ask_for_host(room(buffer, length));
+    tell(outcome.said);
+    return outcome.code;
+}
+
+const String& Host_Name::get()
+{
+    UTIL_SCOPE(SCOPE);
+    if (!_asked) {
+        char text[256] = {};
+        _said = ask_for_host(room(text, std::min(_room, int(sizeof text)))).said;
+        _text = text;
+        _asked = true;
+    }
+    tell(_said);
+    return _text;
+}
+
+String ProviderUtil::getHostName()
+{
+    UTIL_SCOPE("getHostName");
+    utsname name = {};
+    const int status = host_calls.uname(&name);
+    if (status < 0) {
+        UTIL_LOG(ERR, "uname() returned error = %d", status);
+        return "localhost";
+    }
+    return name.nodename;
+}
+
+String ProviderUtil::updateNamespacePath(const String& path)
+{
+    UTIL_SCOPE("updateNamespacePath");
+    char host[NAME_SIZE] = {};
+    getHostInfo(host, sizeof host);
+    String full("//", host, "/root/kaldera:");
+    full.append(path);
+    return full;
+}
+
+} // namespace KPRV

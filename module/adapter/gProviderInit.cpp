@@ -1,0 +1,7 @@
+#include "module/adapter/ProviderInit.h"
+
+namespace KPRV {
+
+ProviderInit gProviderInit;
+
+} // namespace KPRV

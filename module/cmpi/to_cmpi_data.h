@@ -1,0 +1,32 @@
+#pragma once
+
+#include "module/runtime/Meta_Repository.h"
+#include "module/runtime/Value.h"
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+namespace KPRV {
+
+class Made_Objects;
+
+/// Translates one value for the server. `flags` are the feature's: they tell an embedded instance from a
+/// reference. 0, or -1 with a log line. The objects made belong to the server; those of texts, datetimes and
+/// arrays are noted in `made`, if given. `depth` is that of the object that the value lies in.
+int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                  const Value& value, uint32 flags, CMPIData& data, Made_Objects* made = nullptr,
+                  unsigned depth = 0);
+
+template <class T>
+struct to_cmpi_scalar;
+
+/// An instance as object path (word `CMPI_ref`) or as a whole (word `CMPI_instance`). One without a name
+/// space takes that of the call.
+template <>
+struct to_cmpi_scalar<Instance*>
+{
+    static int func(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                    const Instance* instance, CMPIType type, CMPIData& data, unsigned depth = 0);
+};
+
+} // namespace KPRV

@@ -1,0 +1,35 @@
+#pragma once
+
+#include "module/adapter/classId_t.h"
+#include "module/runtime/Array.h"
+#include "module/runtime/Instance.h"
+#include "module/runtime/log.h"
+
+#include <span>
+
+namespace KPRV {
+
+/// What a class needs before it is served.
+enum class Needs
+{
+    NOTHING,
+    /// Not a missing or mismatched driver.
+    DRIVER,
+};
+
+/// Gives all instances of a class; the caller owns them.
+using Instances_Source = Array<Instance*> (*)(classId_t id);
+
+/// One class that a manager serves.
+struct Class_Row
+{
+    classId_t id;
+    Needs needs;
+    Instances_Source source;
+};
+
+/// All instances of the class, by the manager's rows; empty for a class without a row. The reason of an empty
+/// result is in the log, as the caller's line.
+Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id);
+
+} // namespace KPRV

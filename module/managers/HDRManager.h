@@ -1,0 +1,23 @@
+#pragma once
+
+#include "module/adapter/classId_t.h"
+#include "module/runtime/Array.h"
+#include "module/runtime/Instance.h"
+
+namespace KPRV {
+
+/// Serves the storage that was discovered behind the ports: extents, tape drives, logical disks.
+class HDRManager
+{
+public:
+    /// Made at first use, gone when the module is unloaded.
+    static HDRManager* getHDRManager();
+
+    /// As `FCHBAManager::getInstances`.
+    Array<Instance*> getInstances(classId_t id) const;
+
+private:
+    HDRManager();
+};
+
+} // namespace KPRV

@@ -1,0 +1,51 @@
+#pragma once
+
+#include "module/runtime/Array.h"
+#include "module/runtime/Instance.h"
+#include "module/runtime/Ref.h"
+
+#include <vector>
+
+namespace KPRV {
+
+/// Instances on their way to a caller. It owns them until `release`, so that nothing is lost when an
+/// exception of the library passes.
+class Fresh_Instances
+{
+public:
+    Fresh_Instances() = default;
+    ~Fresh_Instances()
+    {
+        for (Instance* instance : _instances)
+            destroyer(instance);
+    }
+    Fresh_Instances(const Fresh_Instances&) = delete;
+    Fresh_Instances& operator=(const Fresh_Instances&) = delete;
+
+    /// Takes the instance over.
+    void append(Instance* instance)
+    {
+        Ref<Instance> held(instance);
+        _instances.push_back(instance);
+        held.steal();
+    }
+    void append(const Array<Instance*>& instances)
+    {
+        _instances.insert(_instances.end(), instances.begin(), instances.end());
+    }
+    uint32 size() const { return static_cast<uint32>(_instances.size()); }
+
+    /// Gives the instances away; the receiver owns them.
+    Array<Instance*> release()
+    {
+        Array<Instance*> instances(_instances.data(), size());
+        _instances.clear();
+        return instances;
+    }
+
+private:
+    // An array grows by exactly what is appended, which is too slow for the LUNs of a large host.
+    std::vector<Instance*> _instances;
+};
+
+} // namespace KPRV

@@ -1,0 +1,54 @@
+#pragma once
+
+#include "module/adapter/Class_Names.h"
+#include "module/adapter/ProviderUtil.h"
+#include "module/runtime/Array.h"
+#include "module/runtime/Instance.h"
+#include "module/runtime/Prototype.h"
+
+#include <initializer_list>
+#include <string_view>
+
+namespace KPRV {
+
+/// A fresh instance with a count of 1 in which every property is null, those with a default in the schema
+/// too: what a builder does not set is not known.
+template <class T>
+T* create_null()
+{
+    static const Prototype<T> all_null([] {
+        T* const instance = create<T>(false);
+        clear(instance);
+        return instance;
+    }());
+    return all_null.copy();
+}
+
+template <class T>
+Array<T> array_of(std::initializer_list<T> elements)
+{
+    return Array<T>(elements.begin(), static_cast<uint32>(elements.size()));
+}
+
+/// Of one element, which is not copied on the way.
+template <class T>
+Array<T> array_of(const T& element)
+{
+    return Array<T>(&element, 1);
+}
+
+/// The keys that all that belongs to the host has: its own class, and the host's class and name.
+template <class T>
+void set_system_keys(T& instance, classId_t id, const String& system_name)
+{
+    instance.CreationClassName.set(class_name_text(id));
+    instance.SystemCreationClassName.set(class_name_text(COMPUTERSYSTEM));
+    instance.SystemName.set(system_name);
+}
+
+inline String to_String(std::string_view text)
+{
+    return String(text.data(), text.size());
+}
+
+} // namespace KPRV

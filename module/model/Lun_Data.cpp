@@ -1,0 +1,55 @@
+#include "module/model/Lun_Data.h"
+
+#include "module/model/Record_Filling.h"
+
+#include <algorithm>
+
+namespace KPRV {
+
+namespace {
+
+// What is read of an element, in the order of its members.
+enum : size_t
+{
+    ID_TYPE,
+    DESCRIPTION,
+    NUMBER,
+    PRODUCT_ID,
+    SERIAL_NUMBER,
+    VENDOR,
+    NUM_LUN_MEMBERS
+};
+constexpr std::array<std::string_view, NUM_LUN_MEMBERS> lun_members = {
+    "lunDescIdType", "lunDescription", "number", "productID", "productSerialNumber", "vendor",
+};
+static_assert(std::ranges::is_sorted(lun_members));
+
+} // namespace
+
+bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen, _hbaLunInfo& lun)
+{
+    constexpr uint32 BY_PRODUCT = 0, UNKNOWN = 10;
+    const Members<NUM_LUN_MEMBERS> members(element, lun_members);
+    if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
+        return false;
+    copy_text(lun.remoteWWN, remote_wwn);
+    lun.number = asUInt(members[NUMBER]);
+    copy_text(lun.vendor, asView(members[VENDOR]));
+    copy_text(lun.productID, asView(members[PRODUCT_ID]));
+    lun.idType = asUInt(members[ID_TYPE]);
+
+    if (members.has(DESCRIPTION))
+        copy_text(lun.description, asView(members[DESCRIPTION]));
+    else
+        no_description_seen = true;
+    // One LUN without a description puts all that follow in the same walk under these rules, those with a
+    // description, too: the names of LUNs that clients already keep depend on it.
+    if (no_description_seen) {
+        if (members.has(SERIAL_NUMBER))
+            copy_text(lun.serialNumber, asView(members[SERIAL_NUMBER]));
+        lun.idType = members.has(SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
+    }
+    return true;
+}
+
+} // namespace KPRV

@@ -1,0 +1,178 @@
+#include "module/adapter/ProviderUtil.h"
+#include "module/model/Instance_Building.h"
+#include "module/model/Record_Filling.h"
+#include "module/model/TargetHelper.h"
+#include "module/runtime/Ref.h"
+#include "module/runtime/log.h"
+
+#include <algorithm>
+#include <array>
+#include <iterator>
+#include <utility>
+
+namespace KPRV {
+
+namespace {
+
+enum class Named_By
+{
+    PRODUCT,
+    DESCRIPTION,
+    NOTHING,
+};
+
+struct Name_Row
+{
+    uint32 id_type;
+    Named_By source;
+    uint16 format;
+    uint16 name_space;
+};
+
+// clang-format off
+constexpr Name_Row name_rows[] = {
+//   id type  Name                    NameFormat  NameNamespace
+    { 0,      Named_By::PRODUCT,       7,         7},
+    { 1,      Named_By::DESCRIPTION,  11,         4},
+    { 2,      Named_By::DESCRIPTION,  10,         3},
+    { 3,      Named_By::DESCRIPTION,   9,         2},
+    { 8,      Named_By::DESCRIPTION,   1,         1},
+    {10,      Named_By::NOTHING,       0,         0},
+};
+// clang-format on
+
+/// Null for an id type that is not known.
+const Name_Row* name_row(const _hbaLunInfo& lun)
+{
+    const auto row = std::ranges::find(name_rows, lun.idType, &Name_Row::id_type);
+    return row == std::end(name_rows) ? nullptr : row;
+}
+
+std::string_view trimmed(const char* text)
+{
+    return ProviderUtil::trimmed(text);
+}
+
+/// Texts one behind the other, in more room than the fields that name a LUN fill together.
+class Joined
+{
+public:
+    template <class... Parts>
+    explicit Joined(const Parts&... parts)
+    {
+        (add(parts), ...);
+    }
+    operator String() const { return to_String({_text, _size}); }
+
+private:
+    void add(std::string_view part) { _size += copy_cut(_text + _size, sizeof _text - _size, part); }
+
+    char _text[sizeof(_hbaPortInfo::portWWN) + sizeof(_hbaLunInfo)];
+    size_t _size = 0;
+};
+
+String name(Named_By source, const _hbaLunInfo& lun)
+{
+    switch (source) {
+    case Named_By::PRODUCT:
+        return Joined(trimmed(lun.vendor), "+", trimmed(lun.productID), "+", trimmed(lun.serialNumber));
+    case Named_By::DESCRIPTION:
+        return lun.description;
+    case Named_By::NOTHING:
+        break;
+    }
+    return "Unable To Fetch";
+}
+
+/// A LUN goes by the path on which it is seen.
+String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const String& element)
+{
+    return Joined(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
+                  "_", std::string_view(element.c_str(), element.size()));
+}
+
+/// Signed: a number beyond the positive range shows as a negative one.
+String numbered_name(uint32 number)
+{
+    return to_String("LUN_" + std::to_string(static_cast<sint32>(number)));
+}
+
+/// Most LUNs of a host bear one of the first numbers: those share their names.
+String element_name(uint32 number)
+{
+    static const auto first_names = [] {
+        std::array<String, 64> names;
+        for (uint32 i = 0; i < names.size(); i++)
+            names[i] = numbered_name(i);
+        return names;
+    }();
+    return number < first_names.size() ? first_names[number] : numbered_name(number);
+}
+
+/// What the three classes have in common.
+template <class T>
+T* create_lun(classId_t id, const String& identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
+{
+    String element = element_name(lun.number);
+    String device_id = device_id_of(port, lun, element);
+    Ref<T> instance(create_null<T>());
+    set_system_keys(*instance, id, port.systemName);
+    instance->ElementName.set(std::move(element));
+    instance->OtherIdentifyingInfo.set(array_of(device_id));
+    instance->DeviceID.set(std::move(device_id));
+    instance->IdentifyingDescriptions.set(array_of(identification));
+    instance->OperationalStatus.set(array_of<uint16>({2}));
+    return instance.steal();
+}
+
+} // namespace
+
+KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo& port,
+                                                              const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getStorageExtentInstance");
+    static const String identification = "It is a unique identification for a Storage Extent";
+    auto* extent = create_lun<KALDERA_StorageExtent>(STORAGEEXTENT, identification, port, lun);
+    if (const Name_Row* row = name_row(lun)) {
+        extent->Name.set(name(row->source, lun));
+        extent->NameFormat.set(row->format);
+        extent->NameNamespace.set(row->name_space);
+    } else {
+        LOG(ERR, "Default idType. Should not have reached here. ");
+        extent->Name.set("");
+    }
+    LOG(DBG, "Returned instance of StorageExtent for port WWN= %s", port.portWWN);
+    return extent;
+}
+
+KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getTapeDriveInstance");
+    static const String identification = "It is a unique identification for a Tape Drive";
+    auto* drive = create_lun<KALDERA_TapeDrive>(TAPEDRIVE, identification, port, lun);
+    if (const Name_Row* row = name_row(lun)) {
+        drive->Name.set(name(row->source, lun));
+    } else {
+        LOG(ERR, "Default case for lunInfo.idType. Should not have reached here. ");
+        drive->Name.set("");
+    }
+    LOG(DBG, "Returned instance of TapeDrive for port WWN= %s", port.portWWN);
+    return drive;
+}
+
+KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& port,
+                                                          const _hbaLunInfo& lun) const
+{
+    LOG_SCOPE("getLogicalDiskInstance");
+    static const String identification = "It is a unique identification for a Logical Disk";
+    auto* disk = create_lun<KALDERA_LogicalDisk>(LOGICALDISK, identification, port, lun);
+    const std::string_view device = trimmed(lun.deviceName);
+    const bool by_device = !device.empty();
+    disk->Name.set(by_device ? to_String(device) : String(lun.description));
+    disk->NameFormat.set(by_device ? 12 : 1);
+    disk->NameNamespace.set(by_device ? 8 : 1);
+    LOG(DBG, "Returned instance of logicalDisk for port WWN= %s", port.portWWN);
+    return disk;
+}
+
+} // namespace KPRV

@@ -1,0 +1,68 @@
+#include "module/model/Port_Data.h"
+
+#include "module/model/Record_Filling.h"
+
+#include <algorithm>
+
+namespace KPRV {
+
+namespace {
+
+// What is read of an answer, in the order of its members.
+enum : size_t
+{
+    SYMBOLIC_NAME,
+    MAX_FRAME_SIZE,
+    NODE_WWN,
+    OPERATING_SPEED,
+    STATUS,
+    PORT_TYPE,
+    SUPPORTED_SPEEDS,
+    WWN,
+    NUM_PORT_MEMBERS
+};
+constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
+    "PortSymbolicName", "maxFrameSize",        "nodeWwn", "operatingSpeed", "portStatusValue",
+    "portTypeMOFValue", "supportedPortSpeeds", "wwn",
+};
+static_assert(std::ranges::is_sorted(port_members));
+
+sint64 bits_per_second(const Json::Value& gigabits)
+{
+    constexpr sint64 GIGABIT = 1000000000;
+    return asInt(gigabits) * GIGABIT;
+}
+
+sint64 operating_speed(const Json::Value& gigabits)
+{
+    // What a port without a link says.
+    constexpr int UNKNOWN_SPEED = 99999;
+    return asInt(gigabits) == UNKNOWN_SPEED ? 0 : bits_per_second(gigabits);
+}
+
+} // namespace
+
+void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
+{
+    const Members<NUM_PORT_MEMBERS> members(answer, port_members);
+    copy_flat(port.localWWN, text_of(members[WWN]));
+    copy_text(port.portWWN, port.localWWN);
+    copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
+    copy_text(port.symbolicName, asView(members[SYMBOLIC_NAME]));
+    port.status = asInt(members[STATUS]);
+    port.systemName = host.get();
+    port.portType = asInt(members[PORT_TYPE]);
+    port.maxFrameSize = asInt(members[MAX_FRAME_SIZE]);
+    port.speed = operating_speed(members[OPERATING_SPEED]);
+    port.maxSpeed = bits_per_second(element(members[SUPPORTED_SPEEDS], 0));
+    port.portNumber = port_number;
+}
+
+void name_remote_port(const char* remote_wwn, _hbaPortInfo& port)
+{
+    char remote[sizeof port.localWWN];
+    copy_flat(remote, remote_wwn);
+    copy_text(port.portWWN, std::string(port.localWWN) + "_" + remote);
+}
+
+} // namespace KPRV

@@ -1,0 +1,64 @@
+#pragma once
+
+#include "module/adapter/Json_Access.h"
+#include "module/adapter/ProviderUtil.h"
+
+#include <string_view>
+
+namespace KPRV {
+
+// How the fixed-size records are filled: a text is cut to its field and always terminated, and it ends at its
+// first zero byte. What reads an answer throws `Not_Convertible` for a member of the wrong type; a missing
+// one is the empty text.
+
+/// Copies what there is room for and returns its size; does not terminate it.
+size_t copy_cut(char* to, size_t room, std::string_view text);
+
+/// A zero byte within the text goes along, and ends it where the field is read.
+template <size_t N>
+void copy_text(char (&field)[N], std::string_view text)
+{
+    field[copy_cut(field, N - 1, text)] = '\0';
+}
+
+/// A text where it stands, up to its first zero byte: for what is done to it before it is in a field.
+inline std::string_view text_of(const Json::Value& value)
+{
+    const std::string_view text = asView(value);
+    return text.substr(0, text.find('\0'));
+}
+
+template <size_t N>
+void copy_member(char (&field)[N], const Json::Value& object, const char* name)
+{
+    copy_text(field, asView(member(object, name)));
+}
+
+/// Without blanks around it.
+template <size_t N>
+void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
+{
+    copy_text(field, ProviderUtil::trimmed(text_of(member(object, name))));
+}
+
+/// Flat form of an address.
+template <size_t N>
+void copy_flat(char (&field)[N], std::string_view address)
+{
+    size_t size = 0;
+    for (const char c : address) {
+        if (size == N - 1)
+            break;
+        // No branch on the colons: addresses are read for every port and target.
+        field[size] = c;
+        size += c != ':';
+    }
+    field[size] = '\0';
+}
+template <size_t N>
+void copy_flat(char (&field)[N], const Json::Value& object, const char* name)
+{
+    copy_flat(field, text_of(member(object, name)));
+}
+
+} // namespace KPRV

@@ -1,0 +1,32 @@
+#include "module/model/Remote_Ports.h"
+
+#include "module/adapter/Guarded_Call.h"
+#include "module/adapter/Json_Access.h"
+#include "module/adapter/ProviderUtil.h"
+
+namespace KPRV {
+
+Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json::objectValue)
+{
+    // The index form is made inside the guard: a port without a WWN has no remote ports.
+    const bool answered = guarded(site, {"libGetAllRemotePorts"}, [&] {
+        const String index = ProviderUtil::getIndexInColonFormat(port_wwn);
+        _request["pPortWwn"] = index.c_str();
+        _request["lPortWwn"] = index.c_str();
+        _list = libGetAllRemotePorts(_request);
+    });
+    if (answered && !listed())
+        log(Log_Level::ERR, site.file, site.line, "libGetAllRemotePorts returns NULL.");
+}
+
+bool Remote_Ports::ask(Call_Site site, unsigned index, Json::Value& answer)
+{
+    const Json::Value& remote_wwn = member(element(_list, index), "remotePortWwn");
+    _wwn.clear();
+    if (!guarded(site, {"libGetAllRemotePorts"}, [&] { _wwn = asString(remote_wwn); }))
+        return false;
+    _request["rPortWwn"] = remote_wwn;
+    return guarded_call(site, {"libGetCompleteRemotePort"}, libGetCompleteRemotePort, _request, answer);
+}
+
+} // namespace KPRV

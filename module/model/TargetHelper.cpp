@@ -1,0 +1,111 @@
+#include "module/model/TargetHelper.h"
+
+#include "module/adapter/Guarded_Call.h"
+#include "module/adapter/Json_Access.h"
+#include "module/adapter/ProviderUtil.h"
+#include "module/model/Fresh_Instances.h"
+#include "module/model/Record_Filling.h"
+#include "module/model/Remote_Ports.h"
+
+namespace KPRV {
+
+/// One walk over the targets of a local port.
+struct TargetHelper::Walk
+{
+    const _hbaPortInfo& port;
+    classId_t id;
+    Fresh_Instances instances = {};
+    bool no_description_seen = false;
+};
+
+namespace {
+
+/// What a failed reading of an answer is told as.
+constexpr Guarded_Entry entry = {"libGetCompleteRemotePort"};
+
+/// A media changer is published as a tape drive.
+bool is_tape(const std::string& type)
+{
+    return type == "Tape" || type == "Media Changer";
+}
+
+} // namespace
+
+TargetHelper::TargetHelper() : _life("TargetHelper", LOG_HERE) {}
+
+TargetHelper* TargetHelper::getTargetHelperObject()
+{
+    static TargetHelper helper;
+    return &helper;
+}
+
+Array<Instance*> TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id) const
+{
+    LOG_SCOPE("getTargetInstances");
+    Remote_Ports remotes(LOG_HERE, port.portWWN);
+    if (!remotes.listed())
+        return {};
+    LOG(DBG, "libGetAllRemotePorts. Number of rports -  %d", static_cast<int>(remotes.size()));
+    Walk walk = {.port = port, .id = id};
+    for (unsigned i = 0; i < remotes.size(); i++) {
+        Json::Value answer;
+        if (!remotes.ask(LOG_HERE, i, answer) || !ProviderUtil::isValidJsonResponse(answer)) {
+            LOG(ERR, "libGetCompleteRemotePort response is null or has error");
+            continue;
+        }
+        LOG(DBG, "Loop for the rport index =   %d", static_cast<int>(i));
+        guarded(LOG_HERE, entry, [&] { publish_target(walk, i, remotes.wwn(), answer); });
+    }
+    return walk.instances.release();
+}
+
+void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
+                                  const Json::Value& answer) const
+{
+    const Json::Value& device = member(answer, "deviceData");
+    if (!asBool(member(device, "isTarget"))) {
+        LOG(DBG, "Nothing to do since the its not a Target Rport.");
+        return;
+    }
+    const std::string type = asString(member(device, "type"));
+    LOG(DBG, "Device type = %s", type.c_str());
+    if (is_tape(type) != (walk.id == TAPEDRIVE)) {
+        LOG(INFO, "Continue with next rport. Looking for another device type ");
+        return;
+    }
+    LOG(DBG, "rPortWwns[%d]=%s", static_cast<int>(index), wwn);
+    const Json::Value& luns = member(answer, "lunList");
+    if (!hasMember(answer, "lunList") || !isArrayOrNull(luns)) {
+        LOG(ERR, "No LUN Info is available for Rport %s.", wwn);
+        return;
+    }
+    LOG(DBG, "Number of Luns = %d.", static_cast<int>(luns.size()));
+    char address[sizeof(_hbaLunInfo::remoteWWN)];
+    copy_flat(address, wwn);
+    for (const Json::Value& element : luns)
+        guarded(LOG_HERE, entry, [&] { publish_lun(walk, address, element); });
+}
+
+void TargetHelper::publish_lun(Walk& walk, const char* address, const Json::Value& element) const
+{
+    _hbaLunInfo lun = {};
+    if (!fill_lun(element, address, walk.no_description_seen, lun)) {
+        LOG(ERR, "LUN info is NOT available");
+        return;
+    }
+    switch (walk.id) {
+    case TAPEDRIVE:
+        walk.instances.append(getTapeDriveInstance(walk.port, lun));
+        break;
+    case STORAGEEXTENT:
+        walk.instances.append(getStorageExtentInstance(walk.port, lun));
+        break;
+    case LOGICALDISK:
+        walk.instances.append(getLogicalDiskInstance(walk.port, lun));
+        break;
+    default:
+        break;
+    }
+}
+
+} // namespace KPRV

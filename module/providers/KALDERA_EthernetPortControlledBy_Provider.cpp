@@ -1,0 +1,34 @@
+#include "module/providers/join.h"
+#include "module/providers/managers.h"
+#include "module/providers/proc.h"
+#include "module/schema/CIM_Controller.h"
+#include "module/schema/CIM_LogicalDevice.h"
+#include "module/schema/KALDERA_EthernetPort.h"
+#include "module/schema/KALDERA_EthernetPortControlledBy_Skeleton.h"
+#include "module/schema/KALDERA_PortController.h"
+
+namespace KPRV {
+
+class KALDERA_EthernetPortControlledBy_Provider : public KALDERA_EthernetPortControlledBy_Skeleton
+{
+public:
+    Enum_Instances_Status enum_instances(const KALDERA_EthernetPortControlledBy*,
+                                         Enum_Instances_Handler<KALDERA_EthernetPortControlledBy>* handler)
+    {
+        LOG_SCOPE("enum_instances");
+        List<KALDERA_PortController> adapters(fc_hba_instances(PORTCONTROLLER));
+        TRACE_BUILDING();
+        const Pairs pair(handler, &KALDERA_EthernetPortControlledBy::Antecedent,
+                         &KALDERA_EthernetPortControlledBy::Dependent);
+        for (uint32 i = 0; i < adapters.size(); i++) {
+            List<KALDERA_EthernetPort> ports(ethernet_ports_of(adapters[i]->DeviceID.value));
+            for (uint32 j = 0; j < ports.size(); j++)
+                pair(adapters[i], ports[j]);
+        }
+        return ENUM_INSTANCES_OK;
+    }
+};
+
+PROVIDER_PROC(KALDERA_EthernetPortControlledBy)
+
+} // namespace KPRV

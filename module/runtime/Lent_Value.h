@@ -1,0 +1,48 @@
+#pragma once
+
+#include "module/runtime/Class_Plan.h"
+#include "module/runtime/Value.h"
+
+#include <cstring>
+
+namespace KPRV {
+
+/// What a cell holds, as a value that neither copies nor counts it: for readers that are done before the
+/// instance changes. It stands in the innermost loop of every export, hence inline.
+class Lent_Value
+{
+public:
+    Lent_Value() = default;
+    ~Lent_Value() { _value.type = Value::NONE; }
+    Lent_Value(const Lent_Value&) = delete;
+    Lent_Value& operator=(const Lent_Value&) = delete;
+
+    /// Shows another cell, which is not null.
+    void show(const Instance* instance, const Cell& cell)
+    {
+        const void* const bytes = &cell.in<char>(instance);
+        memset(_value._bytes, 0, sizeof _value._bytes);
+        // A copy of a known size is one instruction.
+        switch (cell.size) {
+        case 1:
+            memcpy(_value._bytes, bytes, 1);
+            break;
+        case 2:
+            memcpy(_value._bytes, bytes, 2);
+            break;
+        case 4:
+            memcpy(_value._bytes, bytes, 4);
+            break;
+        default:
+            memcpy(_value._bytes, bytes, 8);
+        }
+        _value.type = static_cast<Value::Type>(cell.type);
+    }
+
+    const Value& operator*() const { return _value; }
+
+private:
+    Value _value;
+};
+
+} // namespace KPRV

@@ -1,0 +1,118 @@
+// The walk over the small host: what it finds, and what it asks.
+#include "kldrcim/formats/Topology_Text.h"
+#include "kldrcim/walks/Profile_Tree.h"
+
+#include "tests/broker/Toy_Host.h"
+
+namespace KPRV::broker {
+namespace {
+
+class Topology_Test : public Toy_Test
+{
+protected:
+    Topology_Test() { host = open_toy(TOY_FABRIC); }
+
+    unsigned count(const std::string& class_name)
+    {
+        auto* ask = reinterpret_cast<unsigned (*)(const char*)>(host->module().symbol("fabric_count"));
+        return ask(class_name.c_str());
+    }
+
+    static std::size_t nodes(const Topology& topology, Node_Kind kind)
+    {
+        return static_cast<std::size_t>(std::count_if(topology.nodes.begin(), topology.nodes.end(),
+                                                      [&](const auto& node) { return node.kind == kind; }));
+    }
+};
+
+TEST_F(Topology_Test, AsksEachClassOnce)
+{
+    Association_Index index(*host);
+    walk_topology(index, {.software = true, .connectors = true, .cross_links = true});
+    EXPECT_TRUE(index.failures().empty());
+    for (const std::string& name : host->catalogue().class_names()) {
+        // Profiles have a tree of their own.
+        bool of_the_plan = name.starts_with("KALDERA_") && name.find("Profile") == name.npos;
+        EXPECT_EQ(of_the_plan ? 1u : 0u, count(name)) << name;
+    }
+}
+
+TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
+{
+    Association_Index index(*host);
+    walk_profiles(index, host->catalogue());
+    EXPECT_TRUE(index.failures().empty());
+    for (const std::string& name : host->catalogue().class_names()) {
+        bool asked =
+            name == "TOY_Service" || (name.starts_with("KALDERA_") && name.find("Profile") != name.npos);
+        EXPECT_EQ(asked ? 1u : 0u, count(name)) << name;
+    }
+}
+
+TEST_F(Topology_Test, DoesNotAskForWhatIsNotShown)
+{
+    Association_Index index(*host);
+    Topology topology = walk_topology(index, {});
+    for (const char* name :
+         {"KALDERA_AdapterElementSoftwareIdentity", "KALDERA_AdapterSoftwareIdentity", "KALDERA_Realizes",
+          "KALDERA_PhysicalPackage", "KALDERA_HostedDependency", "KALDERA_EthernetPortRealizes"})
+        EXPECT_EQ(0u, count(name)) << name;
+    EXPECT_EQ(0u, nodes(topology, Node_Kind::SOFTWARE));
+    EXPECT_EQ(3u, nodes(topology, Node_Kind::FC_PORT));
+}
+
+TEST_F(Topology_Test, WhatIsSeenThroughTwoPortsIsOneNode)
+{
+    Association_Index index(*host);
+    Topology topology = walk_topology(index, {});
+    EXPECT_EQ(2u, nodes(topology, Node_Kind::TARGET));
+    EXPECT_EQ(3u, nodes(topology, Node_Kind::UNIT));
+    EXPECT_EQ(2, std::count_if(topology.edges.begin(), topology.edges.end(),
+                               [](const auto& edge) { return !edge.in_tree; }));
+    // All nodes but the root have exactly one edge of the tree.
+    EXPECT_EQ(topology.nodes.size() - 1,
+              static_cast<std::size_t>(std::count_if(topology.edges.begin(), topology.edges.end(),
+                                                     [](const auto& edge) { return edge.in_tree; })));
+}
+
+TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
+{
+    Association_Index index(*host);
+    Path_Value initiator = {.class_name = "KALDERA_SCSIProtocolEndpoint",
+                            .keys = {{"Name", Value::text("1000024b4c100000")}}};
+    const char* paths = "KALDERA_SCSIInitiatorTargetLogicalUnitPath";
+    // Three paths, two targets.
+    EXPECT_EQ(2u, index.far_ends(paths, "Initiator", initiator, "Target").size());
+    EXPECT_EQ(0u, index.far_ends(paths, "Target", initiator, "LogicalUnit").size());
+    EXPECT_EQ(0u, index.far_ends(paths, "Initiator", initiator, "NoSuchRole").size());
+    EXPECT_EQ(0u, index.far_ends(paths, "Initiator", initiator, "Target", "Target").size());
+}
+
+TEST_F(Topology_Test, AnInstanceThatTheModuleDoesNotHaveKeepsItsKeys)
+{
+    Association_Index index(*host);
+    Path_Value gone = {.class_name = "KALDERA_FCPort", .keys = {{"DeviceID", Value::text("gone")}}};
+    EXPECT_EQ("gone", index.instance(gone).property("DeviceID")->as_text());
+    EXPECT_TRUE(index.failures().empty());
+}
+
+TEST_F(Topology_Test, FailuresAreToldOnce)
+{
+    Association_Index index(*host);
+    Path_Value tape = {.class_name = "KALDERA_TapeDrive", .keys = {{"DeviceID", Value::text("tape_only")}}};
+    index.far_ends("TOY_Broken", "Antecedent", tape, "Dependent");
+    index.far_ends("TOY_Broken", "Dependent", tape, "Antecedent");
+    index.instance({.class_name = "TOY_Unheard", .keys = {{"K", Value::text("k")}}});
+    ASSERT_EQ(2u, index.failures().size());
+    EXPECT_EQ("out of order", index.failures()[0].message);
+    EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, index.failures()[1].rc);
+}
+
+TEST_F(Topology_Test, NoSystemIsNoTree)
+{
+    EXPECT_EQ("", tree_text({}, false, false));
+    EXPECT_EQ("[]\n", tree_json({}));
+}
+
+} // namespace
+} // namespace KPRV::broker

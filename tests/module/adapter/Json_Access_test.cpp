@@ -1,0 +1,135 @@
+#include "module/adapter/Json_Access.h"
+
+#include "tests/support/Fake_Library.h"
+
+#include <gtest/gtest.h>
+
+using namespace KPRV;
+
+namespace {
+
+template <class Conversion>
+std::string failure(Conversion conversion, const char* text)
+{
+    try {
+        conversion(json(text));
+        return "";
+    } catch (const std::runtime_error& error) {
+        return error.what();
+    }
+}
+
+} // namespace
+
+TEST(Json_Access, null_counts_as_array_and_object)
+{
+    EXPECT_TRUE(isArrayOrNull(json("null")));
+    EXPECT_TRUE(isArrayOrNull(json("[]")));
+    EXPECT_FALSE(isArrayOrNull(json("{}")));
+    EXPECT_FALSE(isArrayOrNull(json("5")));
+    EXPECT_TRUE(isObjectOrNull(json("null")));
+    EXPECT_TRUE(isObjectOrNull(json("{}")));
+    EXPECT_FALSE(isObjectOrNull(json("[]")));
+    EXPECT_FALSE(isObjectOrNull(json("'x'")));
+}
+
+TEST(Json_Access, null_converts_to_nothing)
+{
+    EXPECT_EQ(asString(json("null")), "");
+    EXPECT_EQ(asInt(json("null")), 0);
+    EXPECT_EQ(asUInt(json("null")), 0u);
+    EXPECT_FALSE(asBool(json("null")));
+}
+
+TEST(Json_Access, texts_are_texts_and_numbers_are_numbers)
+{
+    EXPECT_EQ(asString(json("'gr\\u00fcn'")), "gr\xC3\xBCn");
+    EXPECT_EQ(asString(json("true")), "true");
+    EXPECT_EQ(asInt(json("-7")), -7);
+    EXPECT_EQ(asInt(json("7.9")), 7);
+    EXPECT_EQ(asInt(json("true")), 1);
+    EXPECT_EQ(asInt(Json::Value(7u)), 7);
+    EXPECT_EQ(asUInt(json("4294967295")), 4294967295u);
+    EXPECT_EQ(asUInt(json("1.5")), 1u);
+
+    for (const char* text : {"5", "1.5", "[]", "{}"})
+        EXPECT_EQ(failure(asString, text), "Type is not convertible to string") << text;
+    for (const char* text : {"'5'", "[]", "{}", "2147483648", "-2147483649", "1e300", "18446744073709551615"})
+        EXPECT_EQ(failure(asInt, text), "Type is not convertible to int") << text;
+    for (const char* text : {"'5'", "[]", "{}", "-1", "4294967296", "-1.5"})
+        EXPECT_EQ(failure(asUInt, text), "Type is not convertible to uint") << text;
+}
+
+TEST(Json_Access, numbers_reach_to_the_limits_of_their_types)
+{
+    // Each as an integer and as a real number.
+    for (const char* end : {"", ".0"}) {
+        const auto number = [end](const char* digits) { return json(std::string(digits) + end); };
+        EXPECT_EQ(asInt(number("2147483647")), 2147483647);
+        EXPECT_EQ(asInt(number("-2147483648")), -2147483647 - 1);
+        EXPECT_EQ(asUInt(number("4294967295")), 4294967295u);
+        EXPECT_EQ(asUInt(number("0")), 0u);
+        EXPECT_THROW(asInt(number("2147483648")), Not_Convertible);
+        EXPECT_THROW(asInt(number("-2147483649")), Not_Convertible);
+        EXPECT_THROW(asUInt(number("4294967296")), Not_Convertible);
+        EXPECT_THROW(asUInt(number("-1")), Not_Convertible);
+    }
+    EXPECT_EQ(asInt(Json::Value(2147483647u)), 2147483647);
+    EXPECT_THROW(asInt(Json::Value(2147483648u)), Not_Convertible);
+}
+
+TEST(Json_Access, everything_is_true_or_false)
+{
+    for (const char* text : {"true", "1", "-1", "0.5", "'x'", "[0]", "{'a': 0}"})
+        EXPECT_TRUE(asBool(json(text))) << text;
+    EXPECT_TRUE(asBool(Json::Value(1u)));
+    for (const char* text : {"false", "0", "0.0", "''", "[]", "{}"})
+        EXPECT_FALSE(asBool(json(text))) << text;
+}
+
+TEST(Json_Access, reading_adds_nothing_and_never_throws)
+{
+    const Json::Value object = json("{'a': 1, 'n': null}");
+    EXPECT_TRUE(hasMember(object, "n"));
+    EXPECT_FALSE(hasMember(object, "b"));
+    EXPECT_EQ(asInt(member(object, "a")), 1);
+    EXPECT_TRUE(member(object, "b").isNull());
+    EXPECT_EQ(object.size(), 2u);
+    for (const char* text : {"null", "[1]", "5", "'x'"}) {
+        EXPECT_FALSE(hasMember(json(text), "a")) << text;
+        EXPECT_TRUE(member(json(text), "a").isNull()) << text;
+    }
+    EXPECT_EQ(asInt(element(json("[3, 4]"), 1)), 4);
+    EXPECT_TRUE(element(json("[3, 4]"), 2).isNull());
+    EXPECT_TRUE(element(json("{}"), 0).isNull());
+}
+
+TEST(Json_Access, members_in_one_pass)
+{
+    const Members<4>::Names names = {"B", "a", "aa", "c"};
+    const Json::Value object = json("{'c': 3, 'B': 'x', 'aa': null, 'ab': 4, 'A': 5}");
+    const Members<4> members(object, names);
+    EXPECT_EQ(asView(members[0]), "x");
+    EXPECT_FALSE(members.has(1));
+    EXPECT_TRUE(members[1].isNull());
+    EXPECT_TRUE(members.has(2));
+    EXPECT_TRUE(members[2].isNull());
+    EXPECT_EQ(asInt(members[3]), 3);
+    for (const char* text : {"null", "[1]", "5", "{}"}) {
+        const Json::Value other = json(text);
+        const Members<4> none(other, names);
+        for (size_t i = 0; i < names.size(); i++)
+            EXPECT_FALSE(none.has(i)) << text;
+    }
+}
+
+TEST(Json_Access, texts_where_they_stand)
+{
+    EXPECT_EQ(asView(json("''")), "");
+    EXPECT_EQ(asView(json("null")), "");
+    EXPECT_EQ(asView(json("true")), "true");
+    EXPECT_THROW(asView(json("5")), Not_Convertible);
+    EXPECT_EQ(text_value(json("'x'")), Json::Value("x"));
+    EXPECT_EQ(text_value(json("null")), Json::Value(""));
+    EXPECT_THROW(text_value(json("[]")), Not_Convertible);
+}

@@ -1,0 +1,152 @@
+#include "module/model/Record_Filling.h"
+#include "module/model/TargetHelper.h"
+#include "module/runtime/Ref.h"
+#include "tests/module/model/Taken_Instances.h"
+#include "tests/support/Log_Capture.h"
+
+#include <gtest/gtest.h>
+
+#include <map>
+
+using namespace KPRV;
+
+namespace {
+
+struct Lun_Instances : testing::Test
+{
+    const TargetHelper* helper = TargetHelper::getTargetHelperObject();
+    Log_Capture log;
+    _hbaPortInfo port = {};
+    _hbaLunInfo lun = {};
+
+    Lun_Instances()
+    {
+        copy_text(port.portWWN, "W");
+        copy_text(lun.vendor, " V ");
+        copy_text(lun.productID, " P ");
+        copy_text(lun.serialNumber, " S ");
+        copy_text(lun.description, " D ");
+    }
+};
+
+struct Row
+{
+    uint32 id_type;
+    const char* name;
+    const char* format;
+    const char* name_space;
+};
+
+constexpr Row rows[] = {
+    {0, "V+P+S", "7", "7"}, {1, " D ", "11", "4"}, {2, " D ", "10", "3"},
+    {3, " D ", "9", "2"},   {8, " D ", "1", "1"},  {10, "Unable To Fetch", "0", "0"},
+};
+
+} // namespace
+
+TEST_F(Lun_Instances, names_by_id_type)
+{
+    for (const Row& row : rows) {
+        lun.idType = row.id_type;
+        Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
+        EXPECT_EQ(extent["Name"], row.name) << row.id_type;
+        EXPECT_EQ(extent["NameFormat"], row.format) << row.id_type;
+        EXPECT_EQ(extent["NameNamespace"], row.name_space) << row.id_type;
+        EXPECT_EQ(taken(helper->getTapeDriveInstance(port, lun))["Name"], row.name) << row.id_type;
+    }
+    EXPECT_EQ(log.said("ERR"), Lines{});
+}
+
+TEST_F(Lun_Instances, an_id_type_that_is_not_known)
+{
+    for (const uint32 id_type : {4u, 5u, 7u, 9u, 11u, 4294967295u}) {
+        log.clear();
+        lun.idType = id_type;
+        Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
+        EXPECT_EQ(extent.at("Name"), "");
+        EXPECT_FALSE(extent.contains("NameFormat"));
+        EXPECT_FALSE(extent.contains("NameNamespace"));
+        EXPECT_EQ(taken(helper->getTapeDriveInstance(port, lun)).at("Name"), "");
+        EXPECT_EQ(log.said("ERR"),
+                  (Lines{"ERR Default idType. Should not have reached here. ",
+                         "ERR Default case for lunInfo.idType. Should not have reached here. "}));
+    }
+}
+
+TEST_F(Lun_Instances, a_disk_goes_by_its_device_name_if_it_has_one)
+{
+    lun.idType = 5;
+    for (const char* name : {"", "   "}) {
+        copy_text(lun.deviceName, name);
+        Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
+        EXPECT_EQ(disk["Name"], " D ");
+        EXPECT_EQ(disk["NameFormat"], "1");
+        EXPECT_EQ(disk["NameNamespace"], "1");
+    }
+    copy_text(lun.deviceName, " /dev/sdb ");
+    Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
+    EXPECT_EQ(disk["Name"], "/dev/sdb");
+    EXPECT_EQ(disk["NameFormat"], "12");
+    EXPECT_EQ(disk["NameNamespace"], "8");
+    EXPECT_EQ(log.said("ERR"), Lines{});
+}
+
+TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
+{
+    for (const auto& [number, name] : std::map<uint32, std::string>{{0, "LUN_0"},
+                                                                    {1, "LUN_1"},
+                                                                    {63, "LUN_63"},
+                                                                    {64, "LUN_64"},
+                                                                    {2147483647, "LUN_2147483647"},
+                                                                    {2147483648, "LUN_-2147483648"},
+                                                                    {4294967295, "LUN_-1"}}) {
+        lun.number = number;
+        Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
+        EXPECT_EQ(disk["ElementName"], name);
+        EXPECT_EQ(disk["DeviceID"], "W__V_P_" + name);
+    }
+}
+
+TEST_F(Lun_Instances, names_of_full_fields_are_whole)
+{
+    // What is longer is cut where the record is filled.
+    const auto fill = [](auto& field, size_t size, char with) {
+        copy_text(field, std::string(size + 1, with));
+        return std::string(size, with);
+    };
+    const std::string vendor = fill(lun.vendor, 8, 'v');
+    const std::string product = fill(lun.productID, 16, 'p');
+    const std::string serial = fill(lun.serialNumber, 64, 's');
+    const std::string remote = fill(lun.remoteWWN, 23, 'r');
+    const std::string local = fill(port.portWWN, 47, 'l');
+    const std::string description = fill(lun.description, 64, 'd');
+    const std::string device = fill(lun.deviceName, 64, 'n');
+    lun.number = 2147483648;
+    Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
+    EXPECT_EQ(extent["Name"], vendor + "+" + product + "+" + serial);
+    EXPECT_EQ(extent["DeviceID"], local + "_" + remote + "_" + vendor + "_" + product + "_LUN_-2147483648");
+    lun.idType = 2;
+    EXPECT_EQ(taken(helper->getStorageExtentInstance(port, lun))["Name"], description);
+    EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["Name"], device);
+}
+
+TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
+{
+    lun.number = 1;
+    const Ref<KALDERA_LogicalDisk> first(helper->getLogicalDiskInstance(port, lun));
+    first->ElementName.value.append("!");
+    EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["ElementName"], "LUN_1");
+}
+
+TEST_F(Lun_Instances, builders_are_traced)
+{
+    taken(helper->getStorageExtentInstance(port, lun));
+    taken(helper->getTapeDriveInstance(port, lun));
+    taken(helper->getLogicalDiskInstance(port, lun));
+    EXPECT_EQ(log.said(), (Lines{"DBG Returned instance of StorageExtent for port WWN= W",
+                                 "DBG Returned instance of TapeDrive for port WWN= W",
+                                 "DBG Returned instance of logicalDisk for port WWN= W"}));
+    EXPECT_EQ(log.traces()[0], "DBG Entering: getStorageExtentInstance");
+    EXPECT_EQ(log.traces()[2], "DBG Entering: getTapeDriveInstance");
+    EXPECT_EQ(log.traces()[4], "DBG Entering: getLogicalDiskInstance");
+}
