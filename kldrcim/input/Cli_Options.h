@@ -77,9 +77,8 @@ struct Cli_Option
 
 std::span<const Cli_Option> cli_options();
 
-/// Reads the arguments behind the program's name. False with a one-line `error` for what is not understood,
-/// wrong numbers of arguments for the verb included. Options may stand anywhere; "--" ends them.
-bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error);
+/// As --format takes it.
+const char* name_of(Cli_Options::Format format);
 
 /// "NAME=VALUE" apart; false if there is no name or no equals sign.
 bool split_assignment(const std::string& text, std::string& name, std::string& value);

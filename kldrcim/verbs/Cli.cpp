@@ -2,10 +2,10 @@
 
 #include "broker/Host.h"
 #include "kldrcim/formats/Output.h"
-#include "kldrcim/input/Cli_Options.h"
 #include "kldrcim/input/Module_Search.h"
 #include "kldrcim/input/Name_Spaces.h"
 #include "kldrcim/input/Server_Instances_File.h"
+#include "kldrcim/verbs/Cli_Arguments.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Help.h"
 #include "kldrcim/verbs/Cli_Verbs.h"
