@@ -3,6 +3,6 @@
 
 int main(int argc, char** argv)
 {
-    KPRV::broker::begin_output();
-    return KPRV::broker::run_cli({argv + 1, argv + argc});
+    KPRV::kldrcim::begin_output();
+    return KPRV::kldrcim::run_cli({argv + 1, argv + argc});
 }

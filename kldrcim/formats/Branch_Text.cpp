@@ -5,7 +5,7 @@
 #include <langinfo.h>
 #include <locale.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -52,4 +52,4 @@ bool locale_is_utf8()
     return utf8;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// A line with those that hang from it.
 struct Text_Branch
@@ -19,4 +19,4 @@ std::string branch_text(const std::vector<Text_Branch>& roots, bool ascii);
 /// process's: the module should not notice.
 bool locale_is_utf8();
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include <cmath>
 #include <json/writer.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -90,4 +90,4 @@ std::string json_text(const Value& value, unsigned indent)
     return plain_text(value);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

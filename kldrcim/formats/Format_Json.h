@@ -2,7 +2,9 @@
 
 #include "broker/Value.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// JSON with the members in the order of the class, which jsoncpp's sorted objects cannot keep; its quoting
 /// of texts is used. References are object paths as text; a NaN or infinity is null.
@@ -33,4 +35,4 @@ std::string json_branch(const Json_Branch& branch, unsigned indent = 0);
 /// The values as members of an object.
 std::string json_values(const std::vector<Named_Value>& values, unsigned indent = 0);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

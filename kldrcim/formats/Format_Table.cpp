@@ -6,7 +6,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -45,7 +45,7 @@ std::vector<std::size_t> widths_of(const std::vector<std::string>& headings,
     return widths;
 }
 
-std::string line_of(const std::vector<std::string>& cells, const std::vector<std::size_t>& widths)
+std::string row_of(const std::vector<std::string>& cells, const std::vector<std::size_t>& widths)
 {
     std::string line;
     for (std::size_t i = 0; i < cells.size(); ++i) {
@@ -74,9 +74,9 @@ std::string rows_as_table(const std::vector<std::string>& headings,
     std::vector<std::string> rule;
     for (std::size_t width : widths)
         rule.emplace_back(width, '-');
-    std::string text = line_of(headings, widths) + line_of(rule, widths);
+    std::string text = row_of(headings, widths) + row_of(rule, widths);
     for (const auto& row : rows)
-        text += line_of(row, widths);
+        text += row_of(row, widths);
     return text;
 }
 
@@ -116,4 +116,4 @@ std::string instances_as_table(const std::vector<Instance_Value>& instances,
     return width && total > width ? as_blocks(instances) : rows_as_table(headings, rows);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

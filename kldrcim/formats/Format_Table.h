@@ -2,7 +2,9 @@
 
 #include "broker/Value.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// Instances for people. With few properties a table, one column each; otherwise, or where the table is wider
 /// than `width`, a block of `Name = value` lines per instance, nulls left out, under its object path.
@@ -17,4 +19,4 @@ std::string rows_as_table(const std::vector<std::string>& headings,
 /// `Name = value` lines; the names are padded to one width. Nulls are left out.
 std::string values_as_block(const std::vector<Named_Value>& values);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 #include "kldrcim/formats/Node_Label.h"
 #include "kldrcim/formats/Topology_Text.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -94,4 +94,4 @@ std::string graphviz_text(const Topology& topology)
     return text + "}\n";
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

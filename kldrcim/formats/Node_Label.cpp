@@ -7,7 +7,7 @@
 #include <cctype>
 #include <cstdio>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -269,4 +269,4 @@ std::string speed_text(std::uint64_t bits_per_second)
     return text;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

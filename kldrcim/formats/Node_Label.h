@@ -2,7 +2,7 @@
 
 #include "kldrcim/walks/Topology.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// How it is with a node, in one word and as a color.
 enum class Condition
@@ -55,4 +55,4 @@ std::string colon_form(const std::string& address);
 /// Bits per second as "8 Gb/s" or "2.5 Gb/s"; empty for 0, which stands for unknown.
 std::string speed_text(std::uint64_t bits_per_second);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include <fcntl.h>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 void begin_output()
 {
@@ -29,4 +29,4 @@ void flush_output()
         throw Output_Error{errno};
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

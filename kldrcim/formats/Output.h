@@ -2,7 +2,7 @@
 
 #include <string_view>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// What keeps standard output from being written: an errno. EPIPE is a reader that has had enough.
 struct Output_Error
@@ -21,4 +21,4 @@ void put(std::string_view text);
 /// Out to the reader, now: before something that takes long, and at the end.
 void flush_output();
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -97,4 +97,4 @@ std::string profile_json(const std::vector<Profile_Branch>& roots)
     return (one ? objects.front() : json_array(objects)) + "\n";
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include "kldrcim/walks/Profile_Tree.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// The tree for people, one line a branch. The software of a subprofile is shown only where it is not that of
 /// its profile.
@@ -12,4 +12,4 @@ std::string profile_text(const std::vector<Profile_Branch>& roots, bool ascii);
 /// "path" and, unless it is empty, "children"; an array if the roots are not exactly one.
 std::string profile_json(const std::vector<Profile_Branch>& roots);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

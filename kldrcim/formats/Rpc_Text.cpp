@@ -6,7 +6,7 @@
 #include <memory>
 #include <string_view>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -137,4 +137,4 @@ Rpc_Reply read_rpc_reply(const std::string& text)
     return {json_lines(reply["result"], "  "), ""};
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

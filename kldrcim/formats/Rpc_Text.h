@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// The text of a call of the agent's protocol. `words` are the parameters as people write them:
 /// - one word that begins with "[" is the JSON array of all parameters;
@@ -26,4 +26,4 @@ struct Rpc_Reply
 
 Rpc_Reply read_rpc_reply(const std::string& text);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

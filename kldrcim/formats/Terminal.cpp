@@ -5,7 +5,7 @@
 #include <sys/ioctl.h>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 std::size_t terminal_width()
 {
@@ -20,4 +20,4 @@ bool terminal_shows_colors()
     return isatty(STDOUT_FILENO) && (!refusal || !*refusal) && kind && std::string_view(kind) != "dumb";
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include <cstddef>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// Columns of the terminal on standard output; 0 if it is none, or does not say.
 std::size_t terminal_width();
@@ -10,4 +10,4 @@ std::size_t terminal_width();
 /// True if standard output is a terminal whose user has nothing against colors (NO_COLOR, TERM=dumb).
 bool terminal_shows_colors();
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include "kldrcim/walks/Topology.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// The tree for people, one line a node, branches drawn with box-drawing characters or in ASCII. Initiators
 /// have no line: each is the port above it in another role. States are in color if that is wanted.
@@ -16,4 +16,4 @@ std::string tree_json(const Topology& topology);
 /// are dashed and do not pull.
 std::string graphviz_text(const Topology& topology);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -5,7 +5,7 @@
 #include "kldrcim/formats/Node_Label.h"
 #include "kldrcim/formats/Topology_Text.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -63,4 +63,4 @@ std::string tree_json(const Topology& topology)
     return (one ? roots.front() : json_array(roots)) + "\n";
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -1,6 +1,6 @@
 #include "kldrcim/formats/Visible_Text.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -33,4 +33,4 @@ std::string visible_lines(const std::string& text)
     return visible(text, true);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

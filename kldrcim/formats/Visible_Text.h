@@ -2,7 +2,7 @@
 
 #include <string>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// Control characters, which could move a terminal's cursor, made visible: "\n" and "\t" for line breaks and
 /// tabs, "?" for others. The result is one line.
@@ -11,4 +11,4 @@ std::string visible_text(const std::string& text);
 /// The same, but line breaks and tabs stay.
 std::string visible_lines(const std::string& text);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 #include <charconv>
 #include <iterator>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -174,4 +174,4 @@ bool split_assignment(const std::string& text, std::string& name, std::string& v
     return true;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

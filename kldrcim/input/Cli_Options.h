@@ -4,7 +4,9 @@
 
 #include <span>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// What stands on the command line of `kldrcim`.
 struct Cli_Options
@@ -86,4 +88,4 @@ bool split_assignment(const std::string& text, std::string& name, std::string& v
 /// True if the words, with blanks between them, hold the word.
 bool contains_word(const std::string& words, const std::string& word);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include <filesystem>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 std::string default_module()
 {
@@ -16,4 +16,4 @@ std::string default_module()
     return file;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

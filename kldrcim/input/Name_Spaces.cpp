@@ -1,6 +1,6 @@
 #include "kldrcim/input/Name_Spaces.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 bool is_own_module(const Host& host)
 {
@@ -19,4 +19,4 @@ bool is_served(const Host& host, const std::string& name_space, std::string& err
     return false;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,9 @@
 
 #include "broker/Host.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// True of the module that this program comes with, of which more is known than its library says.
 bool is_own_module(const Host& host);
@@ -11,4 +13,4 @@ bool is_own_module(const Host& host);
 /// False with `error`, which names those that there are.
 bool is_served(const Host& host, const std::string& name_space, std::string& error);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <numeric>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -50,4 +50,4 @@ std::string suggestion(const std::string& written, const std::vector<std::string
     return word.empty() ? "" : " (did you mean \"" + word + "\"?)";
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

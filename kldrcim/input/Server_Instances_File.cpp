@@ -13,7 +13,7 @@
 #include <sstream>
 #include <stdexcept>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -245,4 +245,4 @@ bool read_server_instances(const std::string& file, const Class_Catalogue& catal
     }
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

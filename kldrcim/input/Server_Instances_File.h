@@ -3,7 +3,9 @@
 #include "broker/Class_Catalogue.h"
 #include "broker/Server_Store.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// Puts into the store what a JSON file says of the server's own name spaces, a list of entries of three
 /// kinds:
@@ -22,4 +24,4 @@ namespace KPRV::broker {
 bool read_server_instances(const std::string& file, const Class_Catalogue& catalogue, Server_Store& store,
                            std::string& error);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

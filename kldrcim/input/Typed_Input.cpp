@@ -8,7 +8,7 @@
 #include <charconv>
 #include <cstdlib>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -263,4 +263,4 @@ bool check_properties(const Class_Catalogue& catalogue, const std::string& class
     return true;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,9 @@
 
 #include "broker/Class_Catalogue.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// Turns texts of the command line into values of the types that the class declares. Where the class is
 /// unknown, the text decides: true and false, numbers, {lists}, and texts. Each function gives false and a
@@ -28,4 +30,4 @@ bool typed_assignment(const Class_Catalogue& catalogue, const std::string& class
 bool check_properties(const Class_Catalogue& catalogue, const std::string& class_name,
                       const std::vector<std::string>& names, std::string& error);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

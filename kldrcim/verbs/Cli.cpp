@@ -15,7 +15,7 @@
 #include <dlfcn.h>
 #include <new>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -88,4 +88,4 @@ int run_cli(const std::vector<std::string>& arguments)
     }
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -132,4 +132,4 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
            (check_arguments(options, *verb, error) && check_sense(options, *verb, given, error));
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

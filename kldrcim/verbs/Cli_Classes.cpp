@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <fnmatch.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -82,4 +82,4 @@ int list_classes(const Cli_Options& options, Host& host)
     return 0;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,10 +3,12 @@
 #include "broker/Host.h"
 #include "kldrcim/input/Cli_Options.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// `kldrcim classes`: those that have a provider and match the pattern, with superclass, provider kinds,
 /// keys.
 int list_classes(const Cli_Options& options, Host& host);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

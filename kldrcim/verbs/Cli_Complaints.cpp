@@ -4,7 +4,7 @@
 
 #include <cstdio>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 int complain(const std::string& text, int status)
 {
@@ -33,4 +33,4 @@ void warn_of(const std::vector<Provider_Failure>& failures)
                  0);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

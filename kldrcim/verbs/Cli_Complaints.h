@@ -5,7 +5,9 @@
 #include <string>
 #include <vector>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 // What kldrcim says on standard error, one line each.
 
@@ -26,4 +28,4 @@ std::string failure_text(const Result& result);
 /// A warning for each: what is missing from an answer should not look as if it were not there.
 void warn_of(const std::vector<Provider_Failure>& failures);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -104,4 +104,4 @@ int run_conform(const Cli_Options& options, Host& host)
     return misses_something(findings);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

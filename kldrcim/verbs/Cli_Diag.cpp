@@ -13,7 +13,7 @@
 #include <cstdlib>
 #include <iterator>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -209,4 +209,4 @@ int diag(const Cli_Options& options, Host& host)
     return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE_ERROR);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

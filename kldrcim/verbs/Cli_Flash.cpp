@@ -14,7 +14,7 @@
 #include <cstdio>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -173,4 +173,4 @@ int flash(const Cli_Options& options, Host& host)
     return status;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

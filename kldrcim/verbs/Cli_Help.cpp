@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <sstream>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -167,4 +167,4 @@ std::string verb_help(const Cli_Verb& verb)
            paragraphs("Exit status", exit_status + (verb.statuses ? "\n" + std::string(verb.statuses) : ""));
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

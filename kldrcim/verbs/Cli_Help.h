@@ -2,7 +2,7 @@
 
 #include "kldrcim/verbs/Cli_Verbs.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// The text of `--help`: every verb and every option.
 std::string program_help();
@@ -13,4 +13,4 @@ std::string verb_help(const Cli_Verb& verb);
 /// "usage: kldrcim [options] VERB ...", one line.
 std::string usage_line(const Cli_Verb& verb);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -7,7 +7,7 @@
 #include "kldrcim/verbs/Cli_Output.h"
 #include "kldrcim/verbs/Cli_Verbs.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -164,4 +164,4 @@ int run_operation(const Cli_Options& options, Host& host)
     return Plain_Operation(options, host).run();
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Terminal.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -69,4 +69,4 @@ void write_method(const Cli_Options& options, const Result& result)
         put(value.name + " = " + mof_text(value.value) + ";\n");
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,9 @@
 #include "broker/Host.h"
 #include "kldrcim/input/Cli_Options.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// Results on standard output, in the format of the options.
 void write_instances(const Cli_Options& options, const std::vector<Instance_Value>& instances);
@@ -13,4 +15,4 @@ void write_paths(const Cli_Options& options, const std::vector<Path_Value>& path
 /// Return value, then out parameters.
 void write_method(const Cli_Options& options, const Result& result);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -5,7 +5,7 @@
 #include "kldrcim/formats/Profile_Text.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 int write_profiles(const Cli_Options& options, Host& host)
 {
@@ -23,4 +23,4 @@ int write_profiles(const Cli_Options& options, Host& host)
     return 0;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

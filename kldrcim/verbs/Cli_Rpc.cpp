@@ -11,7 +11,7 @@
 #include <cstdio>
 #include <fnmatch.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -172,4 +172,4 @@ int run_rpc(const Cli_Options& options, Host& host)
     return 0;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

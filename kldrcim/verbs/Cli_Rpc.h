@@ -3,7 +3,9 @@
 #include "broker/Host.h"
 #include "kldrcim/input/Cli_Options.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// The verb `rpc`: the agent's JSON-RPC protocol through the CIM method that carries it. Gives the exit
 /// status: 1 if the agent, or the provider, answered an error.
@@ -12,4 +14,4 @@ int run_rpc(const Cli_Options& options, Host& host);
 /// False with a one-line `error` for arguments that make no sense together.
 bool check_rpc(const Cli_Options& options, std::string& error);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include "kldrcim/formats/Topology_Text.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -48,4 +48,4 @@ int draw_graph(const Cli_Options& options, Host& host)
     return draw(options, host, true, graphviz_text);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -12,7 +12,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -88,4 +88,4 @@ const Cli_Verb* find_verb(const std::string& name)
     return found == std::end(verbs) ? nullptr : &*found;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

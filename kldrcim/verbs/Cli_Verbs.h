@@ -5,7 +5,9 @@
 
 #include <span>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// What a verb does on an open module; gives the exit status.
 using Verb_Body = int (*)(const Cli_Options& options, Host& host);
@@ -36,4 +38,4 @@ std::span<const Cli_Verb> cli_verbs();
 /// Null for a word that is no verb.
 const Cli_Verb* find_verb(const std::string& name);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

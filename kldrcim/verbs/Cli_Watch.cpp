@@ -10,7 +10,7 @@
 
 #include <deque>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -108,4 +108,4 @@ int watch(const Cli_Options& options, Host& host)
     return 0;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

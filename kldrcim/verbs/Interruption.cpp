@@ -7,7 +7,7 @@
 #include <iterator>
 #include <semaphore.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -105,4 +105,4 @@ Signals_Held_Back::~Signals_Held_Back()
     pthread_sigmask(SIG_UNBLOCK, &set, nullptr);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include <chrono>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// SIGINT, SIGTERM and SIGHUP for a scope: they are taken note of, and end nothing by themselves. One scope
 /// at a time.
@@ -43,4 +43,4 @@ public:
     Signals_Held_Back& operator=(const Signals_Held_Back&) = delete;
 };
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 
 #include <unordered_set>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -86,4 +86,4 @@ Instance_Value Association_Index::instance(const Path_Value& path)
     return at == kept.by_path.end() ? Instance_Value{path, path.keys} : kept.instances[at->second];
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

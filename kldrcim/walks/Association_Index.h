@@ -4,7 +4,9 @@
 
 #include <unordered_map>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// Asks the module for associations and instances, each enumeration once, and answers from what it kept. A
 /// traversal would cost the module one enumeration per object that it starts at, and one more per object
@@ -50,4 +52,4 @@ private:
     std::vector<Provider_Failure> failures_;
 };
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -8,7 +8,7 @@
 #include <set>
 #include <sstream>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -145,4 +145,4 @@ bool misses_something(const std::vector<Conformance_Finding>& findings)
     });
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,9 @@
 #include "broker/Host.h"
 #include "kldrcim/walks/Conformance_Plan.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// What one step of the walk came to.
 struct Conformance_Finding
@@ -33,4 +35,4 @@ std::vector<Conformance_Finding> check_conformance(Host& host);
 /// True if a finding misses something.
 bool misses_something(const std::vector<Conformance_Finding>& findings);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Conformance_Plan.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -58,4 +58,4 @@ const Conformance_Step conformance_steps[] = {
 };
 // clang-format on
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -1,6 +1,6 @@
 #pragma once
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// What a client of the Storage HBA profile expects at one step of its walk. Objects of a step are known by
 /// its name to the steps behind it.
@@ -32,4 +32,4 @@ constexpr unsigned many = ~0u;
 /// All steps in the order of the walk; the last one has no name.
 extern const Conformance_Step conformance_steps[];
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -7,7 +7,7 @@
 #include <cstdlib>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -109,4 +109,4 @@ Run_Report follow_job(Host& host, const Path_Value& job, const std::function<voi
     return report;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

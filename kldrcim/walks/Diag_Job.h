@@ -4,7 +4,9 @@
 
 #include <functional>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// One record of a run.
 struct Run_Record
@@ -35,4 +37,4 @@ bool is_test_running(Host& host);
 /// called between two looks.
 Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 
 #include <cctype>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -90,4 +90,4 @@ bool find_element(Host& host, const std::string& test_class_name, const std::str
     return false;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

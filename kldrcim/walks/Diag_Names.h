@@ -4,7 +4,9 @@
 
 #include <span>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
+
+using namespace broker;
 
 /// The superclass of all hardware tests.
 inline constexpr const char* test_class = "KALDERA_DiagnosticTest";
@@ -32,4 +34,4 @@ bool find_test(Host& host, const std::string& name, Path_Value& path, std::strin
 bool find_element(Host& host, const std::string& test_class_name, const std::string& text, Path_Value& path,
                   std::string& error);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 
 #include <unordered_set>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 const char* const profile_root_class = "KALDERA_RegisteredProfile";
 
@@ -101,4 +101,4 @@ std::vector<Profile_Branch> walk_profiles(Association_Index& index, const Class_
     return Profile_Walk(index, catalogue).run();
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include "kldrcim/walks/Association_Index.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// A registered profile, or what conforms to one.
 struct Profile_Branch
@@ -33,4 +33,4 @@ extern const char* const profile_root_class;
 /// `index.failures()`.
 std::vector<Profile_Branch> walk_profiles(Association_Index& index, const Class_Catalogue& catalogue);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

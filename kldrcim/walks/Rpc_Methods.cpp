@@ -4,7 +4,7 @@
 #include <iterator>
 #include <sstream>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -87,4 +87,4 @@ const Rpc_Method* find_rpc_method(const std::string& name)
     return found == methods.end() ? nullptr : &*found;
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 enum class Rpc_Type
 {
@@ -37,4 +37,4 @@ const std::vector<Rpc_Method>& rpc_methods();
 /// Null for one that the table does not have; the agent may have it all the same.
 const Rpc_Method* find_rpc_method(const std::string& name);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 
 #include <set>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 namespace {
 
@@ -102,4 +102,4 @@ Topology walk_topology(Association_Index& index, const Topology_Options& options
     return Walk(index, options).run();
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -3,7 +3,7 @@
 #include "kldrcim/walks/Association_Index.h"
 #include "kldrcim/walks/Topology_Plan.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// What the walk along the steps of the plan finds: every object once as a node, every link once as an edge,
 /// and the tree of occurrences. A unit behind two ports is one node that occurs twice.
@@ -48,4 +48,4 @@ struct Topology_Options
 /// Walks. Associations that cannot be asked leave their branches out and are told by `index.failures()`.
 Topology walk_topology(Association_Index& index, const Topology_Options& options);
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Topology_Plan.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 const char* const topology_root_class = "KALDERA_ComputerSystem";
 
@@ -26,4 +26,4 @@ const Topology_Step topology_steps[] = {
 };
 // clang-format on
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

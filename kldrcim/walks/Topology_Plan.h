@@ -1,6 +1,6 @@
 #pragma once
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// What a node of the topology is.
 enum class Node_Kind
@@ -48,4 +48,4 @@ extern const char* const topology_root_class;
 /// association.
 extern const Topology_Step topology_steps[];
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

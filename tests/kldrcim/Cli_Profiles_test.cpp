@@ -4,7 +4,7 @@
 #include <gtest/gtest.h>
 #include <json/json.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 // What conforms to another is no root; a circle is entered once; a subprofile stands under its profile, one
@@ -84,4 +84,4 @@ TEST(Cli_Profiles, WithoutTheClass)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -9,7 +9,7 @@
 
 #include <algorithm>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 TEST(Cli_Rpc, TheListTellsEachMethodWithItsParameters)
@@ -81,4 +81,4 @@ TEST(Cli_Rpc, AModuleWithoutAnAgentAnswersAStatus)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include <pty.h>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 /// What the program writes on a terminal of that width.
@@ -76,4 +76,4 @@ TEST(Cli_Terminal, ATreeHasItsStatesInColor)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -4,7 +4,7 @@
 
 #include <json/json.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 const std::string system_argument = "'KALDERA_ComputerSystem.Name=\"10.0.0.5\"' ";
@@ -226,4 +226,4 @@ TEST(Cli_Topology, OptionsThatMakeNoSense)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

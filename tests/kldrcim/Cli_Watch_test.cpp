@@ -8,7 +8,7 @@
 #include <json/json.h>
 #include <unistd.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 const char* const block = "root/toy:TOY_Alert\n  Text = smoke\n\n";
@@ -131,4 +131,4 @@ TEST(Cli_Watch, SaysWhatTheOutputLacks)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

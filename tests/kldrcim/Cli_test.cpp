@@ -6,7 +6,7 @@
 #include <json/json.h>
 #include <sstream>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 TEST(Cli, EnumeratesNames)
@@ -261,4 +261,4 @@ TEST(Cli, ANameSpaceThatNobodyServes)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

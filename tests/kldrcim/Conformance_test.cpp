@@ -4,7 +4,7 @@
 
 #include "kldrcim/walks/Conformance.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 using Verdict = Conformance_Finding::Verdict;
@@ -52,4 +52,4 @@ TEST(Conformance, TheProgramSaysSoAndFails)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 #include <json/json.h>
 #include <limits>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 Instance_Value sample()
@@ -96,4 +96,4 @@ TEST(Format_Table, NullsAndControlCharactersOfBlocks)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 const std::vector<std::string> words = {"ei",       "ein",          "graph",  "tree",
@@ -40,4 +40,4 @@ TEST(Nearest_Word, IsSuggested)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include "tests/broker/Toy_Host.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 std::string line(Node_Kind kind, const char* class_name, std::vector<Named_Value> properties)
@@ -102,4 +102,4 @@ TEST(Node_Label, ATerminalIsNotMoved)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -5,7 +5,7 @@
 #include <map>
 #include <set>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 std::string parameters(const std::string& name)
@@ -55,4 +55,4 @@ TEST(Rpc_Methods, NamesAreComparedWithCaseAndHandlersAreNone)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 /// The "params" that the words make, as JSON in one line; the error if they make none.
@@ -114,4 +114,4 @@ TEST(Rpc_Text, WhatIsNoReplyIsAnError)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

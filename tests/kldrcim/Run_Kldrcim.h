@@ -5,7 +5,7 @@
 #include <string>
 #include <sys/wait.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 
 /// The program as users run it: its exit status and what it wrote.
 struct Outcome
@@ -51,4 +51,4 @@ inline Outcome on_fabric(const std::string& arguments, const char* environment =
     return kldrcim(arguments, TOY_FABRIC, environment);
 }
 
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 Feature_Info feature(const char* name, CMPIType type, bool key = false)
@@ -209,4 +209,4 @@ TEST_F(Server_Instances_File, AsAnOption)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

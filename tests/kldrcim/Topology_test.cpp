@@ -4,7 +4,7 @@
 
 #include "tests/broker/Toy_Host.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 class Topology_Test : public Toy_Test
@@ -115,4 +115,4 @@ TEST_F(Topology_Test, NoSystemIsNoTree)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

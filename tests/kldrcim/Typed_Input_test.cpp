@@ -2,7 +2,7 @@
 
 #include "kldrcim/input/Typed_Input.h"
 
-namespace KPRV::broker {
+namespace KPRV::kldrcim {
 namespace {
 
 class Typed_Input_Test : public testing::Test
@@ -94,4 +94,4 @@ TEST(Guessed_Value, LooksAtTheText)
 }
 
 } // namespace
-} // namespace KPRV::broker
+} // namespace KPRV::kldrcim

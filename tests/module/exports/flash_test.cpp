@@ -35,7 +35,7 @@ protected:
         arguments.insert(arguments.begin(), {"--module", KLDR_MODULE});
         testing::internal::CaptureStdout();
         testing::internal::CaptureStderr();
-        const int status = broker::run_cli(arguments);
+        const int status = kldrcim::run_cli(arguments);
         std::fflush(stdout);
         return {status, testing::internal::GetCapturedStdout(), testing::internal::GetCapturedStderr()};
     }

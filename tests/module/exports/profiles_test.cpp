@@ -133,8 +133,8 @@ TEST_F(Profiles, TheServersOwnHangTogether)
 
 TEST_F(Profiles, AClientThatKnowsNothingFindsAll)
 {
-    broker::Association_Index index(*server);
-    std::string text = broker::profile_text(broker::walk_profiles(index, server->catalogue()), true);
+    kldrcim::Association_Index index(*server);
+    std::string text = kldrcim::profile_text(kldrcim::walk_profiles(index, server->catalogue()), true);
     EXPECT_TRUE(index.failures().empty());
     replace_all(text, "KALDERA_ComputerSystem " + This_Host::find().name + "\n",
                 "KALDERA_ComputerSystem @HOST@\n");

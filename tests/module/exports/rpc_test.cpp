@@ -169,7 +169,7 @@ protected:
         arguments.insert(arguments.begin(), {"--module", KLDR_MODULE, "rpc"});
         testing::internal::CaptureStdout();
         testing::internal::CaptureStderr();
-        const int status = broker::run_cli(arguments);
+        const int status = kldrcim::run_cli(arguments);
         std::fflush(stdout);
         return {status, testing::internal::GetCapturedStdout(), testing::internal::GetCapturedStderr()};
     }
@@ -197,7 +197,7 @@ TEST_F(rpc_test, the_demo_host_answers_every_method)
     EXPECT_EQ(0, all.status) << all.out;
     EXPECT_EQ("", all.error);
     EXPECT_EQ(std::string::npos, all.out.find("\"error\"")) << all.out;
-    for (const broker::Rpc_Method& method : broker::rpc_methods())
+    for (const kldrcim::Rpc_Method& method : kldrcim::rpc_methods())
         EXPECT_TRUE(called.contains(method.name)) << method.name;
 }
 
