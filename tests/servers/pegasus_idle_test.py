@@ -1,5 +1,6 @@
 """OpenPegasus gives an idle module up, and clients find all as it was; to sfcb the registration forbids it."""
 
+import importlib
 import time
 
 from provider_process import holders
@@ -27,3 +28,16 @@ class Idle(Restart):
         self.assertEqual(holders(), [])
         self.assertEqual(self.answers(), before)
         self.assert_one_process()
+
+    @long
+    def test_a_subscription_keeps_the_module(self):
+        subscriptions = importlib.import_module("subscriptions_check")
+        alerts, listener = subscriptions.Alerts(self.check), subscriptions.Listener()
+        self.addCleanup(listener.listener.stop)
+        with alerts.subscription(listener):
+            process = self.assert_one_process()
+            time.sleep(IDLE)
+            self.assertEqual(self.assert_one_process(), process)
+            asked = alerts.switch(2)
+            alerts.compare("after a long silence", listener.take(len(asked)), asked)
+        self.assert_no_differences()

@@ -2,6 +2,9 @@
 
 import importlib
 import json
+import os
+import re
+import subprocess
 import time
 from pathlib import Path
 
@@ -35,25 +38,26 @@ class Restart(ServerCase):
         self.assertGreater(self.check.compared, 0)
         self.assertEqual(self.check.differences, [])
 
-    def settled(self):
-        """Processes of the server, zombies too; but those that await their parent get a moment."""
+    def zombies(self):
+        """Of the server; but those that await their parent get a moment, and so do processes that begin between two looks."""
         names = PROCESSES[self.server.kind]
         end = time.monotonic() + MOMENT
-        while processes(names, zombies=True) != processes(names) and time.monotonic() < end:
+        while (found := set(processes(names, zombies=True)) - set(processes(names))) and time.monotonic() < end:
             time.sleep(0.05)
-        return processes(names, zombies=True)
+        return sorted(found)
 
     def assert_gone(self):
         """Nothing of the server or of the module, which a process may also hold that nobody knows any more."""
         self.assertEqual(holders(), [])
-        self.assertEqual(self.settled(), [])
+        self.assertEqual(self.zombies(), [])
+        self.assertEqual(processes(PROCESSES[self.server.kind]), [])
 
     def assert_one_process(self):
         """Of this server, and none but it."""
         found = holders()
         self.assertEqual(len(found), 1, found)
-        self.assertIn(found[0], self.settled())
-        self.assertEqual(self.settled(), processes(PROCESSES[self.server.kind]), "zombies")
+        self.assertIn(found[0], processes(PROCESSES[self.server.kind]))
+        self.assertEqual(self.zombies(), [])
         return found[0]
 
 
@@ -79,6 +83,13 @@ class Subscriptions(Restart):
         self.server.module_environment["KLDR_SIMULATOR_EVENTS"] = str(SCRIPT)
         return [f"{prefix}{key}" for key in keys for prefix in ("KLDR", "PROPKLDR")]
 
+    def watched(self, count):
+        """The same alerts, as the command line tells them of the same events."""
+        environment = {**os.environ, **self.server.module_environment}
+        command = ["/usr/bin/kldrcim", "--format", "json", "watch", "--count", str(count)]
+        done = subprocess.run(command, env=environment, capture_output=True, text=True, check=True, timeout=60)
+        return [json.loads(each) for each in re.split(r"(?m)(?<=^})$", done.stdout) if each.strip()]
+
     def survives(self, end):
         subscriptions = importlib.import_module("subscriptions_check")
         alerts, listener = subscriptions.Alerts(self.check), subscriptions.Listener()
@@ -94,7 +105,9 @@ class Subscriptions(Restart):
             self.assert_gone()
             scripted = self.write_script(subscriptions.EVENTS, alerts.port)
             self.server.start()
-            alerts.compare("afterwards", listener.take(len(scripted)), scripted)
+            arrived = listener.take(len(scripted))
+            alerts.compare("afterwards", arrived, scripted)
+            alerts.compare_properties(arrived, self.watched(len(scripted)))
             self.check.expect("one more", listener.stays_silent(), None)
             asked = alerts.switch(2)
             alerts.compare("asked for", listener.take(len(asked)), asked)

@@ -71,11 +71,12 @@ class Server:
         return padded(environment) if self.kind == "sfcb" else environment
 
     def start(self):
-        """Starts it, and returns when it listens."""
+        """Starts it, and returns when it listens. Like an init system in the root folder, where sfcb's processes stay: firmware that
+        is fetched goes into a server's working folder."""
         # A provider that is loaded at once, for a stored subscription, may keep the output: a file ends nevertheless.
         with tempfile.TemporaryFile(mode="w+", encoding="utf-8") as output:
             done = subprocess.run(
-                [self.home / "start", str(self.port)], env=self.environment(), start_new_session=True, check=False,
+                [self.home / "start", str(self.port)], env=self.environment(), cwd="/", start_new_session=True, check=False,
                 stdin=subprocess.DEVNULL, stdout=output, stderr=subprocess.STDOUT, timeout=120,
             )  # fmt: skip
             output.seek(0)
@@ -98,13 +99,17 @@ class Server:
         self._wait(lambda: not self.running(), "its processes do not end")
 
     def kill(self):
-        """Ends all its processes at once."""
-        for process in processes(PROCESSES[self.kind]):
-            try:
-                os.kill(process, signal.SIGKILL)
-            except ProcessLookupError:
-                pass
-        self._wait(lambda: not self.running(), "its processes do not end")
+        """Ends all its processes at once; those again that one of them began between the look and the blow."""
+
+        def are_gone():
+            for process in processes(PROCESSES[self.kind]):
+                try:
+                    os.kill(process, signal.SIGKILL)
+                except ProcessLookupError:
+                    pass
+            return not self.running()
+
+        self._wait(are_gone, "its processes do not end")
 
     def restart(self):
         self.stop()

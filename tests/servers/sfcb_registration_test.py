@@ -11,6 +11,7 @@ from server_case import ServerCase
 
 SCHEMA = Path("/usr/share/sfcb/CIM/CIM_Schema.mof")
 STAGE = Path("/var/lib/sfcb/stage")
+CONFIGURATION = Path("/etc/sfcb/sfcb.cfg")
 SHARE = Path("/usr/share/kldrprovider")
 LACKING = "CIM_ProductElementComponent"
 
@@ -59,6 +60,17 @@ class Sfcb(ServerCase):
         package.register("install", "--schema", "own")
         self.check()
 
+    def test_a_server_that_wants_a_password_is_not_judged(self):
+        package.register("install")
+        text = CONFIGURATION.read_text(encoding="utf-8")
+        asking = re.sub(r"(?m)^doBasicAuth:.*$", "doBasicAuth: true", text)
+        self.assertNotEqual(asking, text)
+        CONFIGURATION.write_text(asking, encoding="utf-8")
+        self.server.start()
+        self.assertEqual(self.server.ask("EnumerateInstanceNames", "KALDERA_ComputerSystem"), "")
+        line = self.check(status=4)[-1]
+        self.assertIn("it asks for a name and a password", line)
+
     def test_a_running_server_that_was_not_restarted(self):
         self.server.start()
         shown = package.register("install")
@@ -71,7 +83,7 @@ class Sfcb(ServerCase):
 
     def test_a_link_of_the_installation_is_used_and_stays(self):
         link = Path("/usr/lib/cmpi/libkldrprovider_Module.so")
-        with open("/etc/sfcb/sfcb.cfg", "a", encoding="utf-8") as settings:
+        with open(CONFIGURATION, "a", encoding="utf-8") as settings:
             settings.write(f"providerDirs: {self.server.home}/usr/lib/sfcb {self.server.home}/usr/lib {link.parent}\n")
         self.assertNotIn("ln -s", "\n".join(package.register("install")))
         self.server.start()
