@@ -1,6 +1,6 @@
 #include "broker/Association_Routing.h"
 
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "broker/Class_Catalogue.h"
-#include "broker/Request.h"
+#include "broker/values/Class_Catalogue.h"
+#include "broker/values/Request.h"
 
 #include <unordered_set>
 

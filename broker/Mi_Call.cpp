@@ -1,7 +1,7 @@
 #include "broker/Mi_Call.h"
 
 #include "broker/Convert.h"
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 namespace KPRV::broker {
 

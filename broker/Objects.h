@@ -1,7 +1,7 @@
 #pragma once
 
 #include "broker/Core.h"
-#include "broker/Value.h"
+#include "broker/values/Value.h"
 
 #include <optional>
 

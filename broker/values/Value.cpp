@@ -1,6 +1,6 @@
-#include "broker/Value.h"
+#include "broker/values/Value.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <algorithm>
 #include <strings.h>
