@@ -233,10 +233,4 @@ std::optional<std::vector<std::string>> read_list(const char** list)
     return names;
 }
 
-bool contains_name(const std::vector<std::string>& list, std::string_view name)
-{
-    return std::any_of(list.begin(), list.end(),
-                       [&](const std::string& entry) { return same_name(entry, name); });
-}
-
 } // namespace KPRV::broker

@@ -208,4 +208,10 @@ std::string lower_name(std::string_view name)
     return lower;
 }
 
+bool contains_name(const std::vector<std::string>& list, std::string_view name)
+{
+    return std::any_of(list.begin(), list.end(),
+                       [&](const std::string& entry) { return same_name(entry, name); });
+}
+
 } // namespace KPRV::broker
