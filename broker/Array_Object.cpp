@@ -1,5 +1,5 @@
 #include "broker/Convert.h"
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 namespace KPRV::broker {
 

@@ -1,6 +1,6 @@
 #include "broker/Association_Routing.h"
 
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include <algorithm>
 
@@ -18,18 +18,6 @@ bool can_hold(const Class_Catalogue& catalogue, const Class_Info& association, c
 }
 
 } // namespace
-
-bool is_association_operation(Operation operation)
-{
-    return operation >= Operation::ASSOCIATORS;
-}
-
-const std::string& named_association(const Request& request)
-{
-    bool references =
-        request.operation == Operation::REFERENCES || request.operation == Operation::REFERENCE_NAMES;
-    return references ? request.filter.result_class : request.filter.association_class;
-}
 
 std::vector<std::string> association_classes(const Class_Catalogue& catalogue, const Request& request)
 {
@@ -50,6 +38,7 @@ std::vector<std::string> association_classes(const Class_Catalogue& catalogue, c
 void Association_Merge::add(const std::string& provider_class, Result one)
 {
     sum_.done_count += one.done_count;
+    sum_.stopped = one.stopped;
     if (!one.ok()) {
         sum_.failures.push_back({provider_class, one.rc, one.message});
         if (!first_failure_)
@@ -63,6 +52,16 @@ void Association_Merge::add(const std::string& provider_class, Result one)
     for (Path_Value& path : one.paths)
         if (is_new(path))
             sum_.paths.push_back(std::move(path));
+}
+
+bool Association_Merge::instance(Instance_Value&& instance)
+{
+    return !is_new(instance.path) || receiver_->instance(std::move(instance));
+}
+
+bool Association_Merge::path(Path_Value&& path)
+{
+    return !is_new(path) || receiver_->path(std::move(path));
 }
 
 /// An instance whose path has no keys (some providers return such) cannot be told from its like: it stays.

@@ -1,18 +1,12 @@
 #pragma once
 
-#include "broker/Class_Catalogue.h"
-#include "broker/Request.h"
+#include "broker/values/Class_Catalogue.h"
+#include "broker/values/Receiver.h"
+#include "broker/values/Request.h"
 
 #include <unordered_set>
 
 namespace KPRV::broker {
-
-/// True for associators, references and their names.
-bool is_association_operation(Operation operation);
-
-/// The association class that the request names: `association_class`, or the result class of references.
-/// Empty if it names none.
-const std::string& named_association(const Request& request);
 
 /// The association classes that a CIM server asks for the request, in the order of the catalogue: the named
 /// one and its subclasses, or, if none is named, each class with a reference that can hold the class of the
@@ -21,16 +15,26 @@ std::vector<std::string> association_classes(const Class_Catalogue& catalogue, c
 
 /// Adds what one provider answered to what others did. An object that several report is kept once. A failed
 /// answer is noted in `failures`; the sum fails only if `settle` finds that nobody succeeded.
-class Association_Merge
+class Association_Merge final : private Receiver
 {
 public:
+    /// With a receiver, objects are not kept: those that nobody has reported before go to it as they come,
+    /// also those of a provider that fails later.
+    explicit Association_Merge(Receiver* receiver = nullptr) : receiver_(receiver) {}
+
+    /// Where the provider that is asked next hands its objects to; null where they come in its answer.
+    Receiver* taker() { return receiver_ ? this : nullptr; }
     void add(const std::string& provider_class, Result one);
+    bool is_stopped() const { return sum_.stopped; }
     /// The sum. If all providers failed, with the status of the first.
     Result settle();
 
 private:
+    bool instance(Instance_Value&& instance) override;
+    bool path(Path_Value&& path) override;
     bool is_new(const Path_Value& path);
 
+    Receiver* const receiver_;
     Result sum_;
     std::optional<Result> first_failure_;
     bool succeeded_ = false;

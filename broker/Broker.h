@@ -2,7 +2,7 @@
 
 #include "broker/Call.h"
 #include "broker/Objects.h"
-#include "broker/Request.h"
+#include "broker/Up_Calls.h"
 
 namespace KPRV::broker {
 

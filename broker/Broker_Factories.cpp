@@ -1,9 +1,9 @@
 // The table of `newInstance` and its like.
 #include "broker/Broker.h"
 #include "broker/Convert.h"
-#include "broker/Datetime_Text.h"
-#include "broker/Type_Words.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Datetime_Text.h"
+#include "broker/values/Type_Words.h"
+#include "broker/values/Value_Text.h"
 
 #include <chrono>
 

@@ -3,7 +3,7 @@
 #include "broker/Broker.h"
 #include "broker/Convert.h"
 #include "broker/Thread_Attachment.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 
 namespace KPRV::broker {
 

@@ -1,6 +1,6 @@
 #include "broker/Convert.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <algorithm>
 
@@ -231,12 +231,6 @@ std::optional<std::vector<std::string>> read_list(const char** list)
     for (; *list; ++list)
         names.emplace_back(*list);
     return names;
-}
-
-bool contains_name(const std::vector<std::string>& list, std::string_view name)
-{
-    return std::any_of(list.begin(), list.end(),
-                       [&](const std::string& entry) { return same_name(entry, name); });
 }
 
 } // namespace KPRV::broker

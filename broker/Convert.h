@@ -32,6 +32,4 @@ bool fits_type(Call_Base& call, Core& core, const Class_Info& info, const Featur
 /// Null-terminated list to vector; nothing for a null list.
 std::optional<std::vector<std::string>> read_list(const char** list);
 
-bool contains_name(const std::vector<std::string>& list, std::string_view name);
-
 } // namespace KPRV::broker

@@ -1,11 +1,11 @@
 #pragma once
 
 #include "broker/Call_Log.h"
-#include "broker/Class_Catalogue.h"
 #include "broker/Host_Options.h"
 #include "broker/Ledger.h"
 #include "broker/Object.h"
 #include "broker/Violations.h"
+#include "broker/values/Class_Catalogue.h"
 #include "contracts/cmpi/cmpift.h"
 #include "module/runtime/Standard_Mutex.h"
 

@@ -1,5 +1,5 @@
 #include "broker/Convert.h"
-#include "broker/Datetime_Text.h"
+#include "broker/values/Datetime_Text.h"
 
 namespace KPRV::broker {
 

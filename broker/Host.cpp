@@ -84,14 +84,14 @@ std::vector<std::string> Host::classes_that_serve(const Request& request) const
     return classes;
 }
 
-Result Host::route(const Request& request)
+Result Host::route(const Request& request, Receiver* receiver)
 {
     Result result;
     std::vector<std::string> classes = classes_that_serve(request);
     if (classes.empty())
         result.rc = CMPI_RC_ERR_NOT_SUPPORTED;
     for (const std::string& class_name : classes) {
-        Result one = call_provider(*broker_, *providers_, class_name, request);
+        Result one = call_provider(*broker_, *providers_, class_name, request, receiver);
         one.done_count += result.done_count;
         one.done = one.done_count > 0;
         one.instances.insert(one.instances.begin(), std::make_move_iterator(result.instances.begin()),
@@ -99,19 +99,19 @@ Result Host::route(const Request& request)
         one.paths.insert(one.paths.begin(), std::make_move_iterator(result.paths.begin()),
                          std::make_move_iterator(result.paths.end()));
         result = std::move(one);
-        if (!result.ok())
+        if (!result.ok() || result.stopped)
             break;
     }
     return result;
 }
 
-Result Host::traverse(const Request& request)
+Result Host::traverse(const Request& request, Receiver* receiver)
 {
-    Association_Merge merge;
+    Association_Merge merge(receiver);
     bool asked = false;
     for (const std::string& class_name : association_classes(*catalogue_, request))
-        if (providers_->serves(class_name, Mi_Kind::ASSOCIATION)) {
-            merge.add(class_name, call_provider(*broker_, *providers_, class_name, request));
+        if (!merge.is_stopped() && providers_->serves(class_name, Mi_Kind::ASSOCIATION)) {
+            merge.add(class_name, call_provider(*broker_, *providers_, class_name, request, merge.taker()));
             asked = true;
         }
     Result result = merge.settle();
@@ -123,7 +123,7 @@ Result Host::traverse(const Request& request)
     return result;
 }
 
-Result Host::run(Request request)
+Result Host::run(Request request, Receiver* receiver)
 {
     if (request.path.name_space.empty())
         request.path.name_space = core_->options.name_space;
@@ -133,15 +133,16 @@ Result Host::run(Request request)
         result.rc = CMPI_RC_ERR_INVALID_CLASS;
         return result;
     }
-    return is_association_operation(request.operation) ? traverse(request) : route(request);
+    return is_association_operation(request.operation) ? traverse(request, receiver)
+                                                       : route(request, receiver);
 }
 
-Result Host::run_at(const std::string& provider_class, Request request)
+Result Host::run_at(const std::string& provider_class, Request request, Receiver* receiver)
 {
     if (request.path.name_space.empty())
         request.path.name_space = core_->options.name_space;
     add_context(request);
-    return call_provider(*broker_, *providers_, provider_class, request);
+    return call_provider(*broker_, *providers_, provider_class, request, receiver);
 }
 
 Result Host::up_call(const Request& request)

@@ -49,9 +49,9 @@ public:
     /// providers of the class that its filter names and of the subclasses, or, without such a filter, to
     /// every association with a role that can hold the path's class; objects that several report come once,
     /// and it fails only if all fail. Rc 5 if the named class is unknown, 7 if it has no provider.
-    Result run(Request request);
+    Result run(Request request, Receiver* receiver = nullptr);
     /// The same, at the provider of one class.
-    Result run_at(const std::string& provider_class, Request request);
+    Result run_at(const std::string& provider_class, Request request, Receiver* receiver = nullptr);
 
     /// The calls of an indication interface. The path of a filter is its name space and class.
     CMPIrc authorize_filter(const std::string& provider_class, const std::string& name_space);
@@ -88,9 +88,9 @@ private:
 
     bool may_be_asked(const Request& request) const;
     /// To one provider, or to all below a class that is enumerated.
-    Result route(const Request& request);
+    Result route(const Request& request, Receiver* receiver = nullptr);
     /// To every association that the request concerns.
-    Result traverse(const Request& request);
+    Result traverse(const Request& request, Receiver* receiver = nullptr);
     std::vector<std::string> classes_that_serve(const Request& request) const;
     bool is_known_class(const std::string& class_name) const;
     void add_context(Request& request) const;

@@ -1,7 +1,7 @@
 #include "broker/Mi_Call.h"
 
 #include "broker/Convert.h"
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 namespace KPRV::broker {
 
@@ -75,14 +75,16 @@ unsigned accepted_by(Operation operation)
 }
 
 /// One request on its way through one provider.
-class Provider_Call
+class Provider_Call final : private Receiver
 {
 public:
     Provider_Call(Broker& broker, Provider_Set& providers, const std::string& class_name,
-                  const Request& request)
-        : providers_(providers), class_name_(class_name), request_(request), frame_(broker, request.context),
+                  const Request& request, Receiver* receiver)
+        : providers_(providers), class_name_(class_name), request_(request),
+          receiver_(receiver ? *receiver : kept_), frame_(broker, request.context),
           path_(frame_.core(), path_of(class_name, request), request.from_client),
-          results_(frame_.core(), accepted_by(request.operation)), list_(request.properties)
+          results_(frame_.core(), accepted_by(request.operation), static_cast<Receiver&>(*this)),
+          list_(request.properties)
     {
     }
 
@@ -240,26 +242,52 @@ private:
 
     void collect()
     {
-        result_.instances = std::move(results_->instances);
-        result_.paths = std::move(results_->paths);
+        if (failure_)
+            std::rethrow_exception(failure_);
+        result_.instances = std::move(kept_.instances);
+        result_.paths = std::move(kept_.paths);
         result_.done_count = results_->done_count;
         result_.done = result_.done_count > 0;
-        if (result_.ok() && request_.operation == Operation::GET_INSTANCE && result_.instances.size() != 1)
-            violation("getInstance answers one instance, not " + std::to_string(result_.instances.size()));
-        if (result_.ok() && request_.operation == Operation::CREATE_INSTANCE && result_.paths.size() != 1)
-            violation("createInstance answers one path, not " + std::to_string(result_.paths.size()));
+        result_.stopped = results_->stopped;
+        if (result_.ok() && request_.operation == Operation::GET_INSTANCE && returned_ != 1)
+            violation("getInstance answers one instance, not " + std::to_string(returned_));
+        if (result_.ok() && request_.operation == Operation::CREATE_INSTANCE && returned_ != 1)
+            violation("createInstance answers one path, not " + std::to_string(returned_));
+    }
+
+    bool instance(Instance_Value&& instance) override
+    {
         // Properties outside the list are the server's to filter, should the provider have set them all the
         // same.
         if (request_.properties)
-            for (Instance_Value& instance : result_.instances)
-                std::erase_if(instance.properties, [&](const Named_Value& property) {
-                    return !contains_name(*request_.properties, property.name);
-                });
+            std::erase_if(instance.properties, [&](const Named_Value& property) {
+                return !contains_name(*request_.properties, property.name);
+            });
+        return take(std::move(instance), &Receiver::instance);
+    }
+
+    bool path(Path_Value&& path) override { return take(std::move(path), &Receiver::path); }
+
+    /// What a receiver throws is none of the provider's business, and must not unwind it.
+    template <class Object>
+    bool take(Object&& object, bool (Receiver::*receive)(Object&&))
+    {
+        ++returned_;
+        try {
+            return (receiver_.*receive)(std::move(object));
+        } catch (...) {
+            failure_ = std::current_exception();
+            return false;
+        }
     }
 
     Provider_Set& providers_;
     const std::string& class_name_;
     const Request& request_;
+    Collected kept_;
+    Receiver& receiver_;
+    std::exception_ptr failure_;
+    std::size_t returned_ = 0;
     Mi_Frame frame_;
     Argument<Path_Object> path_;
     Argument<Result_Object> results_;
@@ -270,9 +298,9 @@ private:
 } // namespace
 
 Result call_provider(Broker& broker, Provider_Set& providers, const std::string& class_name,
-                     const Request& request)
+                     const Request& request, Receiver* receiver)
 {
-    return Provider_Call(broker, providers, class_name, request).run();
+    return Provider_Call(broker, providers, class_name, request, receiver).run();
 }
 
 } // namespace KPRV::broker

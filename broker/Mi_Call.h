@@ -7,8 +7,9 @@ namespace KPRV::broker {
 /// Sends a request into one provider class: opens a call frame, presents the request as CMPI objects, calls
 /// the entry and reads the answer back. What the answer owes by contract and does not have is a violation. An
 /// exception that leaves the provider ends in the result. Rc 7 if the class has no such interface or entry.
+/// With a receiver, instances and paths go there at once, those of a provider that fails later among them.
 Result call_provider(Broker& broker, Provider_Set& providers, const std::string& class_name,
-                     const Request& request);
+                     const Request& request, Receiver* receiver = nullptr);
 
 /// What an entry of an indication interface needs, presented as CMPI objects for the length of the call.
 class Mi_Frame

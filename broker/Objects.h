@@ -1,7 +1,7 @@
 #pragma once
 
 #include "broker/Core.h"
-#include "broker/Value.h"
+#include "broker/values/Receiver.h"
 
 #include <optional>
 
@@ -184,16 +184,20 @@ struct Result_Object final : Object_Of<CMPIResult, Object_Kind::RESULT>
         DATA = 4,
     };
 
-    Result_Object(Core& owner_core, unsigned what) : Object_Of(owner_core, result_table), accepts(what) {}
+    Result_Object(Core& owner_core, unsigned what, Receiver& results)
+        : Object_Of(owner_core, result_table), accepts(what), receiver(results)
+    {
+    }
     Result_Object(Core& owner_core, const Result_Object& other)
-        : Object_Of(owner_core, result_table), accepts(other.accepts)
+        : Object_Of(owner_core, result_table), accepts(other.accepts), receiver(other.receiver)
     {
     }
     void drop() override {}
 
     unsigned accepts;
-    std::vector<Instance_Value> instances;
-    std::vector<Path_Value> paths;
+    Receiver& receiver;
+    /// It has had enough.
+    bool stopped = false;
     std::vector<Value> data;
     unsigned done_count = 0;
 };

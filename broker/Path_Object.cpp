@@ -1,6 +1,6 @@
 #include "broker/Convert.h"
-#include "broker/Type_Words.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Type_Words.h"
+#include "broker/values/Value_Text.h"
 
 namespace KPRV::broker {
 

@@ -1,6 +1,6 @@
 #include "broker/Registration_Catalogue.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 #include "module/runtime/Meta_Value.h"
 
 #include <cstring>

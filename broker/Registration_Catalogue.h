@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Class_Catalogue.h"
+#include "broker/values/Class_Catalogue.h"
 #include "module/runtime/Registration.h"
 #include "module/runtime/Standard_Mutex.h"
 

@@ -27,13 +27,16 @@ CMPIStatus return_data(const CMPIResult* self, const CMPIValue* value, CMPIType 
     return call.status();
 }
 
+/// What is returned to a reader who has had enough is dropped: servers do not tell the provider that its
+/// client has gone.
 CMPIStatus return_instance(const CMPIResult* self, const CMPIInstance* instance)
 {
     Call<Result_Object> call("CMReturnInstance", self, nullptr);
     if (!call || !may_return(call, Result_Object::INSTANCES, "instances"))
         return call.status();
-    if (auto* object = argument_object<Instance_Object>(call, call.core(), instance))
-        call->instances.push_back(object->value());
+    auto* object = argument_object<Instance_Object>(call, call.core(), instance);
+    if (object && !call->stopped)
+        call->stopped = !call->receiver.instance(object->value());
     return call.status();
 }
 
@@ -42,8 +45,9 @@ CMPIStatus return_object_path(const CMPIResult* self, const CMPIObjectPath* path
     Call<Result_Object> call("CMReturnObjectPath", self, nullptr);
     if (!call || !may_return(call, Result_Object::PATHS, "paths"))
         return call.status();
-    if (auto* object = argument_object<Path_Object>(call, call.core(), path))
-        call->paths.push_back(object->content);
+    auto* object = argument_object<Path_Object>(call, call.core(), path);
+    if (object && !call->stopped)
+        call->stopped = !call->receiver.path(Path_Value(object->content));
     return call.status();
 }
 

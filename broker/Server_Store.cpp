@@ -1,7 +1,7 @@
 #include "broker/Server_Store.h"
 
-#include "broker/Class_Catalogue.h"
 #include "broker/Convert.h"
+#include "broker/values/Class_Catalogue.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #include "kldrcim/formats/Format_Json.h"
 
-#include "broker/Type_Words.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Type_Words.h"
+#include "broker/values/Value_Text.h"
 
 #include <cmath>
 #include <json/writer.h>

@@ -1,6 +1,6 @@
 #include "kldrcim/formats/Node_Label.h"
 
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Visible_Text.h"
 
 #include <algorithm>

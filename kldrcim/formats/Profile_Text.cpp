@@ -1,6 +1,6 @@
 #include "kldrcim/formats/Profile_Text.h"
 
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Branch_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Node_Label.h"

@@ -1,5 +1,5 @@
 // The tree of a topology, for people and as JSON.
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Branch_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Node_Label.h"

@@ -1,6 +1,6 @@
 #include "kldrcim/input/Server_Instances_File.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 #include "kldrcim/input/Typed_Input.h"
 
 #include <algorithm>

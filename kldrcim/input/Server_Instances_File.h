@@ -1,7 +1,7 @@
 #pragma once
 
-#include "broker/Class_Catalogue.h"
 #include "broker/Server_Store.h"
+#include "broker/values/Class_Catalogue.h"
 
 namespace KPRV::kldrcim {
 

@@ -1,8 +1,8 @@
 #include "kldrcim/input/Typed_Input.h"
 
-#include "broker/Datetime_Text.h"
-#include "broker/Path_Parser.h"
-#include "broker/Type_Words.h"
+#include "broker/values/Datetime_Text.h"
+#include "broker/values/Path_Parser.h"
+#include "broker/values/Type_Words.h"
 #include "kldrcim/input/Cli_Options.h"
 
 #include <charconv>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Class_Catalogue.h"
+#include "broker/values/Class_Catalogue.h"
 
 namespace KPRV::kldrcim {
 

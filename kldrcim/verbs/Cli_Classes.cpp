@@ -1,6 +1,6 @@
 #include "kldrcim/verbs/Cli_Classes.h"
 
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Format_Table.h"
 #include "kldrcim/formats/Output.h"

@@ -1,6 +1,6 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <cstdio>
 

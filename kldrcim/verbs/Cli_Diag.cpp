@@ -1,6 +1,6 @@
 #include "kldrcim/verbs/Cli_Diag.h"
 
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Format_Table.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/verbs/Cli_Complaints.h"

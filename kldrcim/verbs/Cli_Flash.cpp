@@ -1,7 +1,7 @@
 #include "kldrcim/verbs/Cli_Flash.h"
 
-#include "broker/Path_Parser.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Path_Parser.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Visible_Text.h"

@@ -1,6 +1,5 @@
 #include "kldrcim/verbs/Cli_Watch.h"
 
-#include "broker/Convert.h"
 #include "broker/Subscription.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/verbs/Cli_Complaints.h"

@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Association_Index.h"
 
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include <unordered_set>
 

@@ -1,7 +1,7 @@
 #include "kldrcim/walks/Conformance.h"
 
-#include "broker/Path_Identity.h"
-#include "broker/Type_Words.h"
+#include "broker/values/Path_Identity.h"
+#include "broker/values/Type_Words.h"
 
 #include <algorithm>
 #include <map>

@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Diag_Job.h"
 
-#include "broker/Datetime_Text.h"
+#include "broker/values/Datetime_Text.h"
 
 #include <algorithm>
 #include <chrono>

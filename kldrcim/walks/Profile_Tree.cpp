@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Profile_Tree.h"
 
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include <unordered_set>
 

@@ -1,6 +1,6 @@
 #include "kldrcim/walks/Topology.h"
 
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include <set>
 

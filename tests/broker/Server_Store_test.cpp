@@ -1,6 +1,6 @@
 #include "broker/Server_Store.h"
 
-#include "broker/Class_Catalogue.h"
+#include "broker/values/Class_Catalogue.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Format_Table.h"
 

@@ -1,6 +1,6 @@
 #include "kldrcim/input/Server_Instances_File.h"
 
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "tests/kldrcim/Run_Kldrcim.h"
 #include "tests/support/Temp_Folder.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Request.h"
+#include "broker/values/Request.h"
 
 #include <cstdlib>
 #include <optional>

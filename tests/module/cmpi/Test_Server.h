@@ -114,16 +114,18 @@ public:
         broker::Result result;
         broker::Mi_Frame frame(_server.broker, _server.context_entries);
         const broker::Argument<broker::Path_Object> cop(*_server.core, path, true);
+        broker::Collected kept;
         const broker::Argument<broker::Result_Object> results(
             *_server.core,
-            broker::Result_Object::INSTANCES | broker::Result_Object::PATHS | broker::Result_Object::DATA);
+            broker::Result_Object::INSTANCES | broker::Result_Object::PATHS | broker::Result_Object::DATA,
+            static_cast<broker::Receiver&>(kept));
         frame.run(result, [&] {
             const CMPIStatus status = entry(frame.context(), results.cmpi(), cop.cmpi());
             EXPECT_TRUE(!status.msg || _server.tells_failures);
             return status;
         });
-        result.instances = results->instances;
-        result.paths = results->paths;
+        result.instances = std::move(kept.instances);
+        result.paths = std::move(kept.paths);
         if (!results->data.empty())
             result.return_value = results->data[0];
         result.done_count = results->done_count;

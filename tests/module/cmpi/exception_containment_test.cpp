@@ -248,8 +248,9 @@ TEST_F(Contained_Exceptions, do_not_include_the_end_of_a_thread)
     std::function<void()> call = [&] {
         broker::Mi_Frame frame(server.broker, {});
         const broker::Argument<broker::Path_Object> cop(*server.core, class_path("Sample_Element"), true);
-        const broker::Argument<broker::Result_Object> results(*server.core,
-                                                              unsigned(broker::Result_Object::INSTANCES));
+        broker::Collected kept;
+        const broker::Argument<broker::Result_Object> results(
+            *server.core, unsigned(broker::Result_Object::INSTANCES), static_cast<broker::Receiver&>(kept));
         CMPIInstanceMI* const mi = &provider.data().instance_mi;
         mi->ft->enumerateInstances(mi, frame.context(), results.cmpi(), cop.cmpi(), nullptr);
     };

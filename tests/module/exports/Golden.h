@@ -1,7 +1,7 @@
 #pragma once
 
 #include "broker/Host.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "module/adapter/ProviderUtil.h"
 
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
 // Events of the adapter library on their way through the built module to the subscribers of a server.
-#include "broker/Path_Parser.h"
 #include "broker/Subscription.h"
+#include "broker/values/Path_Parser.h"
 #include "tests/module/exports/Alert_Fixture.h"
 #include "tests/module/exports/Golden.h"
 #include "tests/module/exports/Traces.h"

@@ -1,4 +1,4 @@
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 #include "module/runtime/Registration.h"
 #include "tests/module/exports/Module_Fixture.h"
 

@@ -1,6 +1,6 @@
-#include "broker/Value_Text.h"
+#include "broker/values/Value_Text.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <charconv>
 

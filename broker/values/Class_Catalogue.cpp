@@ -1,4 +1,4 @@
-#include "broker/Class_Catalogue.h"
+#include "broker/values/Class_Catalogue.h"
 
 #include <algorithm>
 

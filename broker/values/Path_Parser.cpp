@@ -1,4 +1,4 @@
-#include "broker/Path_Parser.h"
+#include "broker/values/Path_Parser.h"
 
 #include <charconv>
 

@@ -1,6 +1,6 @@
-#include "broker/Value.h"
+#include "broker/values/Value.h"
 
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <algorithm>
 #include <strings.h>
@@ -206,6 +206,12 @@ std::string lower_name(std::string_view name)
         if (c >= 'A' && c <= 'Z')
             c = static_cast<char>(c - 'A' + 'a');
     return lower;
+}
+
+bool contains_name(const std::vector<std::string>& list, std::string_view name)
+{
+    return std::any_of(list.begin(), list.end(),
+                       [&](const std::string& entry) { return same_name(entry, name); });
 }
 
 } // namespace KPRV::broker

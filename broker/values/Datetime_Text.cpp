@@ -1,4 +1,4 @@
-#include "broker/Datetime_Text.h"
+#include "broker/values/Datetime_Text.h"
 
 #include <chrono>
 #include <cstdio>

@@ -1,4 +1,4 @@
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
 #include "tests/broker/Toy_Host.h"
 

@@ -104,5 +104,6 @@ Value with_integer_type(const Value& value, CMPIType type);
 /// Names of CIM are compared without case.
 bool same_name(std::string_view a, std::string_view b);
 std::string lower_name(std::string_view name);
+bool contains_name(const std::vector<std::string>& list, std::string_view name);
 
 } // namespace KPRV::broker

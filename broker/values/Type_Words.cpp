@@ -1,4 +1,4 @@
-#include "broker/Type_Words.h"
+#include "broker/values/Type_Words.h"
 
 #include <algorithm>
 #include <iterator>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Value.h"
+#include "broker/values/Value.h"
 
 #include <optional>
 
@@ -50,6 +50,13 @@ struct Request
     bool from_client = true;
 };
 
+/// True for associators, references and their names.
+bool is_association_operation(Operation operation);
+
+/// The association class that the request names: `association_class`, or the result class of references.
+/// Empty if it names none.
+const std::string& named_association(const Request& request);
+
 /// A provider that failed while a request went to several.
 struct Provider_Failure
 {
@@ -58,7 +65,8 @@ struct Provider_Failure
     std::string message;
 };
 
-/// The answer: plain values, which outlive the call.
+/// The answer: plain values, which outlive the call. Instances and paths that went to a receiver are not in
+/// it.
 struct Result
 {
     CMPIrc rc = CMPI_RC_OK;
@@ -75,20 +83,12 @@ struct Result
     bool done = false;
     /// Text of an exception that left the provider; rc is 1 then.
     std::optional<std::string> exception = {};
+    /// The receiver has had enough.
+    bool stopped = false;
     /// Of an association request: the providers that failed. If others succeeded, rc is 0.
     std::vector<Provider_Failure> failures = {};
 
     bool ok() const { return rc == CMPI_RC_OK; }
-};
-
-/// Who serves the requests that a provider sends to its server.
-class Up_Calls
-{
-public:
-    virtual ~Up_Calls() = default;
-    virtual Result up_call(const Request& request) = 0;
-    /// `CBDeliverIndication`.
-    virtual CMPIrc deliver(const std::string& name_space, const Instance_Value& indication) = 0;
 };
 
 } // namespace KPRV::broker

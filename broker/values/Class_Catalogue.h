@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Value.h"
+#include "broker/values/Value.h"
 
 namespace KPRV::broker {
 

@@ -1,7 +1,7 @@
-#include "broker/Path_Identity.h"
+#include "broker/values/Path_Identity.h"
 
-#include "broker/Type_Words.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Type_Words.h"
+#include "broker/values/Value_Text.h"
 
 #include <algorithm>
 

@@ -1,5 +1,5 @@
-#include "broker/Path_Parser.h"
-#include "broker/Value_Text.h"
+#include "broker/values/Path_Parser.h"
+#include "broker/values/Value_Text.h"
 
 #include <gtest/gtest.h>
 
