@@ -29,7 +29,7 @@ Json::Value error_answer(Error_Code code, const std::string& message);
 /// The answer to an action that was done: {"status": 0}.
 Json::Value done_answer();
 
-/// The first of the members in `asked` (see Entry_Points.def) that the request lacks, or that is no text
+/// The first of the members in `asked` (see Behaviours.def) that the request lacks, or that is no text
 /// though it names an address; empty if there is none.
 std::string missing_member(const std::string& asked, const Json::Value& request);
 

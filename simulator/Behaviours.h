@@ -8,7 +8,7 @@
 
 namespace KPRV::simulator {
 
-// The behaviours that Entry_Points.def names. Each answers as Entry_Points.h says; an address that
+// The behaviours that Behaviours.def names. Each answers as Entry_Points.h says; an address that
 // the inventory does not have is answered with an "error".
 
 // Life.cpp

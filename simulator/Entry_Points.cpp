@@ -1,22 +1,42 @@
 #include "simulator/Entry_Points.h"
 
+#include "contracts/adapter/Signatures.h"
 #include "module/runtime/Standard_Mutex.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Simulator.h"
 
 #include <algorithm>
+#include <array>
 #include <cstdint>
 #include <set>
+#include <type_traits>
 
 namespace KPRV::simulator {
 
 namespace {
 
-constexpr Entry_Row rows[] = {
-#define ROW(symbol, kind, request, behaviour) {#symbol, request, behaviour},
-#include "simulator/Entry_Points.def"
+constexpr std::size_t entry_count = 0
+#define ENTRY_POINT(symbol, variable, signature) +1
+#include "contracts/adapter/Entry_Points.def"
+#undef ENTRY_POINT
+    ;
+
+// A row of another name, two of one, or one too few: none of it compiles.
+constexpr auto rows = [] {
+    std::array<Entry_Row, entry_count> filled = {};
+    const auto fill = [&](Entry entry, const Entry_Row& row) {
+        Entry_Row& place = filled[static_cast<std::size_t>(entry)];
+        if (place.symbol)
+            throw "an entry point has two rows";
+        place = row;
+    };
+#define ROW(symbol, request, behaviour) fill(Entry::symbol, {#symbol, request, behaviour});
+#include "simulator/Behaviours.def"
 #undef ROW
-};
+    return filled;
+}();
+static_assert(std::ranges::all_of(rows, [](const Entry_Row& row) { return row.symbol != nullptr; }),
+              "an entry point has no row");
 
 Json::Value ask(Entry entry, const Json::Value& request = {})
 {
@@ -55,16 +75,15 @@ Json::Value registration(bool registers)
 
 } // namespace
 
-std::span<const Entry_Row> entry_rows()
+const Entry_Row& row_of(Entry entry)
 {
-    return rows;
+    return rows[static_cast<std::size_t>(entry)];
 }
 
 const Entry_Row* find_entry(std::string_view symbol)
 {
-    const auto found = std::find_if(std::begin(rows), std::end(rows),
-                                    [&](const Entry_Row& row) { return symbol == row.symbol; });
-    return found == std::end(rows) ? nullptr : found;
+    const auto found = std::ranges::find(rows, symbol, &Entry_Row::symbol);
+    return found == rows.end() ? nullptr : &*found;
 }
 
 } // namespace KPRV::simulator
@@ -76,38 +95,39 @@ using simulator::Entry;
     extern "C" __attribute__((visibility("default"))) result symbol arguments;                               \
     result symbol arguments
 
-#define DEFINE_JSON(symbol)                                                                                  \
+#define DEFINE_JsonReqFP(symbol)                                                                             \
     EXPORTED(Json::Value, symbol, (const Json::Value& request))                                              \
     {                                                                                                        \
         return simulator::ask(Entry::symbol, request);                                                       \
     }
-#define DEFINE_TEXT(symbol)                                                                                  \
+#define DEFINE_voidRetStrFP(symbol)                                                                          \
     EXPORTED(const char*, symbol, ())                                                                        \
     {                                                                                                        \
         return simulator::lasting_text(simulator::ask(Entry::symbol));                                       \
     }
-#define DEFINE_COUNT(symbol)                                                                                 \
+#define DEFINE_voidRetUIntFP(symbol)                                                                         \
     EXPORTED(std::uint32_t, symbol, ())                                                                      \
     {                                                                                                        \
         return simulator::count_of(simulator::ask(Entry::symbol));                                           \
     }
-#define DEFINE_INTEGER(symbol)                                                                               \
+#define DEFINE_voidRetIntFP(symbol)                                                                          \
     EXPORTED(std::int32_t, symbol, ())                                                                       \
     {                                                                                                        \
         return simulator::integer_of(simulator::ask(Entry::symbol));                                         \
     }
-#define DEFINE_LOG_CB(symbol)                                                                                \
-    EXPORTED(void, symbol, (simulator::Log_Callback callback))                                               \
+#define DEFINE_log4cxxMsgRetVoidFP(symbol)                                                                   \
+    EXPORTED(void, symbol, (KPRV::log4cxxMsgCB callback))                                                    \
     {                                                                                                        \
         simulator::ask(Entry::symbol, simulator::registration(callback != nullptr));                         \
         simulator::Simulator::instance().set_log_callback(callback);                                         \
     }
-#define DEFINE_EVENT_CB(symbol)                                                                              \
-    EXPORTED(void, symbol, (simulator::Event_Callback callback))                                             \
+#define DEFINE_evtProcessCBRetVoidFP(symbol)                                                                 \
+    EXPORTED(void, symbol, (KPRV::evtProcessCB callback))                                                    \
     {                                                                                                        \
         simulator::ask(Entry::symbol, simulator::registration(callback != nullptr));                         \
         simulator::Simulator::instance().set_event_callback(callback);                                       \
     }
 
-#define ROW(symbol, kind, request, behaviour) DEFINE_##kind(symbol)
-#include "simulator/Entry_Points.def"
+#define ENTRY_POINT(symbol, variable, signature)                                                             \
+    DEFINE_##signature(symbol) static_assert(std::is_same_v<decltype(&symbol), KPRV::signature>);
+#include "contracts/adapter/Entry_Points.def"

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <json/json.h>
-#include <span>
 #include <string_view>
 
 namespace KPRV::simulator {
@@ -12,7 +11,7 @@ struct State;
 /// simulator's lock, on a request that has the members its row asks for.
 using Behaviour = Json::Value (*)(State& state, const Json::Value& request);
 
-/// A row of Entry_Points.def.
+/// An entry point and its row of Behaviours.def.
 struct Entry_Row
 {
     const char* symbol;
@@ -20,15 +19,15 @@ struct Entry_Row
     Behaviour behaviour;
 };
 
-/// Every entry point, as an index of the table.
+/// Every entry point, in the order of the library's contract.
 enum class Entry
 {
-#define ROW(symbol, kind, request, behaviour) symbol,
-#include "simulator/Entry_Points.def"
-#undef ROW
+#define ENTRY_POINT(symbol, variable, signature) symbol,
+#include "contracts/adapter/Entry_Points.def"
+#undef ENTRY_POINT
 };
 
-std::span<const Entry_Row> entry_rows();
+const Entry_Row& row_of(Entry entry);
 
 /// The row of that name, or a null pointer.
 const Entry_Row* find_entry(std::string_view symbol);

@@ -38,7 +38,7 @@ void Event_Feed::want_no_more()
     changed_.notify_all();
 }
 
-void Event_Feed::set_callback(Event_Callback callback)
+void Event_Feed::set_callback(evtProcessCB callback)
 {
     const Auto_Lock lock(mutex_);
     callback_ = callback;
@@ -201,7 +201,7 @@ void Event_Feed::call(const char* text)
         In_Call& operator=(const In_Call&) = delete;
         Event_Feed& feed;
     };
-    const Event_Callback callback = callback_;
+    const evtProcessCB callback = callback_;
     const In_Call in_call(*this);
     callback(text);
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "contracts/adapter/Signatures.h"
 #include "module/runtime/Standard_Mutex.h"
 
 #include <chrono>
@@ -10,9 +11,6 @@
 #include <vector>
 
 namespace KPRV::simulator {
-
-/// Receives an adapter event as JSON text.
-using Event_Callback = void (*)(const char* text);
 
 /// A line of the script of an inventory: what is told to whoever wants events, and when.
 struct Scripted_Event
@@ -36,7 +34,7 @@ public:
 
     /// Waits for a call in progress, unless that is where it is called from: afterwards the callback that was
     /// there is not called any more.
-    void set_callback(Event_Callback callback);
+    void set_callback(evtProcessCB callback);
 
     /// Forgets the caller, its wishes and all events. Waits for nothing.
     void reset();
@@ -73,7 +71,7 @@ private:
 
     Standard_Mutex<> mutex_;
     std::condition_variable_any changed_;
-    Event_Callback callback_ GUARDED_BY(mutex_) = nullptr;
+    evtProcessCB callback_ GUARDED_BY(mutex_) = nullptr;
     bool wanted_ GUARDED_BY(mutex_) = false;
     bool is_script_due_ GUARDED_BY(mutex_) = false;
     unsigned calls_ GUARDED_BY(mutex_) = 0;

@@ -24,7 +24,7 @@ enum class Needs
 struct Test_Kind
 {
     const char* function;
-    const char* request; // the members that it must have, as in Entry_Points.def
+    const char* request; // the members that it must have, as in Behaviours.def
     Needs needs;
 };
 

@@ -25,7 +25,7 @@ Simulator& Simulator::instance()
 
 Json::Value Simulator::answer(Entry entry, const Json::Value& request)
 {
-    const Entry_Row& row = entry_rows()[static_cast<std::size_t>(entry)];
+    const Entry_Row& row = row_of(entry);
     const Strike strike = record(row, request);
     wait_out(strike);
     for (const Fault& fault : strike.faults)
@@ -133,13 +133,13 @@ void Simulator::unload()
     state_.from_environment = true;
 }
 
-void Simulator::set_log_callback(Log_Callback callback)
+void Simulator::set_log_callback(log4cxxMsgCB callback)
 {
     const Auto_Lock lock(mutex_);
     state_.session.log_callback = callback;
 }
 
-void Simulator::set_event_callback(Event_Callback callback)
+void Simulator::set_event_callback(evtProcessCB callback)
 {
     // Not under the lock: this may wait for a receiver that calls the library.
     events().set_callback(callback);
@@ -212,7 +212,7 @@ Json::Value Simulator::status()
 
 bool Simulator::log(int level, const char* file, int line, const char* text)
 {
-    Log_Callback callback = nullptr;
+    log4cxxMsgCB callback = nullptr;
     {
         const Auto_Lock lock(mutex_);
         callback = state_.session.log_callback;

@@ -25,8 +25,8 @@ public:
     /// One call of an entry point. Throws only what a fault says.
     Json::Value answer(Entry entry, const Json::Value& request);
 
-    void set_log_callback(Log_Callback callback);
-    void set_event_callback(Event_Callback callback);
+    void set_log_callback(log4cxxMsgCB callback);
+    void set_event_callback(evtProcessCB callback);
 
     /// Puts the inventory and its faults in place of the present ones. Throws Refused, in which
     /// case a host without adapters stands in, and init_hba_lib says why.

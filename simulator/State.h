@@ -1,5 +1,6 @@
 #pragma once
 
+#include "contracts/adapter/Signatures.h"
 #include "simulator/Event_Feed.h"
 #include "simulator/Inventory.h"
 
@@ -7,14 +8,11 @@
 
 namespace KPRV::simulator {
 
-/// Receives the library's log lines: level 1 to 5, file, line, text.
-using Log_Callback = void (*)(int level, const char* file, int line, const char* text);
-
 /// What a caller has told the library about itself.
 struct Session
 {
     bool initialised = false;
-    Log_Callback log_callback = nullptr;
+    log4cxxMsgCB log_callback = nullptr;
 };
 
 /// All that answers depend on.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "contracts/adapter/Signatures.h"
 #include "module/runtime/Types.h"
 
 #include <json/value.h>
@@ -11,21 +12,7 @@ namespace KPRV {
 // accepts concurrent calls. Without the library each one holds the stub of its class, so callers never ask
 // whether it is there: a stub's answer counts as a failed one.
 
-/// Called by the library for each of its events, on any of its threads.
-using evtProcessCB = void (*)(const char* event);
-/// Called by the library for each of its log lines, on any thread: level, file, line, text.
-using log4cxxMsgCB = void (*)(int level, const char* file, int line, const char* text);
-
-// The signature classes.
-using JsonReqFP = Json::Value (*)(const Json::Value& request);
-using JsonReqVoidFP = void (*)(const Json::Value& request);
-using voidRetStrFP = const char* (*)();
-using voidRetUIntFP = uint32 (*)();
-using voidRetIntFP = sint32 (*)();
-using evtProcessCBRetVoidFP = void (*)(evtProcessCB callback);
-using log4cxxMsgRetVoidFP = void (*)(log4cxxMsgCB callback);
-
-// Their stubs.
+// The stubs of the signature classes.
 /// Null.
 Json::Value default_JsonReqFP(const Json::Value& request);
 /// Does nothing. No entry point is of this class.

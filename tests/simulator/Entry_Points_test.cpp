@@ -1,19 +1,22 @@
+#include "contracts/adapter/Signatures.h"
 #include "tests/simulator/Simulator_Fixture.h"
 
 #include <dlfcn.h>
-#include <iterator>
-#include <set>
 
 namespace KPRV::simulator {
 namespace {
 
-constexpr const char* resolved_symbols[] = {
-#include "tests/simulator/resolved_symbols.inc"
+struct Entry_Point
+{
+    const char* name;
+    bool is_json;
 };
 
-const std::set<std::string> not_json = {
-    "free_hba_lib",     "get_agt_version",           "getNumberOfAdapters",
-    "registerLogMsgCb", "registerEventProcessingCb", "getRequestID"};
+constexpr Entry_Point entry_points[] = {
+#define ENTRY_POINT(symbol, variable, signature) {#symbol, std::is_same_v<signature, JsonReqFP>},
+#include "contracts/adapter/Entry_Points.def"
+#undef ENTRY_POINT
+};
 
 // Every member that any entry point asks for, so that no request is refused for lacking one.
 const char* everything = R"({
@@ -32,16 +35,14 @@ class Entry_Points_test : public Simulator_Fixture
 
 TEST_F(Entry_Points_test, exports_every_symbol_that_the_module_resolves)
 {
-    ASSERT_EQ(std::size(resolved_symbols), 117u);
-    EXPECT_EQ(std::set<std::string>(std::begin(resolved_symbols), std::end(resolved_symbols)).size(), 117u);
-    for (const char* name : resolved_symbols)
+    for (const auto& [name, is_json] : entry_points)
         EXPECT_NO_THROW(simulator.symbol<void()>(name)) << name;
 }
 
 TEST_F(Entry_Points_test, every_json_entry_point_answers_an_object_whatever_is_asked)
 {
-    for (const char* name : resolved_symbols) {
-        if (not_json.contains(name))
+    for (const auto& [name, is_json] : entry_points) {
+        if (!is_json)
             continue;
         for (const Json::Value& request :
              {Json::Value(), Json::Value(Json::arrayValue), Json::Value(7), json("{}"), json(everything)}) {
@@ -54,8 +55,7 @@ TEST_F(Entry_Points_test, every_json_entry_point_answers_an_object_whatever_is_a
 TEST_F(Entry_Points_test, what_nothing_answers_is_refused_by_name)
 {
     simulator.load_file(inventory("demo.json"));
-    for (const char* name : resolved_symbols) {
-        const bool is_json = !not_json.contains(name);
+    for (const auto& [name, is_json] : entry_points) {
         const Json::Value answer = is_json ? call(name, json(everything)) : Json::Value();
         if (answer.isObject() && error_code(answer) == 3) {
             EXPECT_EQ(answer["error"]["message"].asString(), std::string(name) + ": not supported");
