@@ -8,16 +8,16 @@ template <class Entry, class... Arguments>
 CMPIrc Host::filter_call(const std::string& provider_class, const std::string& name_space, Entry entry,
                          Arguments... arguments)
 {
-    CMPIIndicationMI* mi = providers_->indication(provider_class);
+    Result result;
+    CMPIIndicationMI* mi = providers_->indication(provider_class, result);
     if (!mi || !(mi->ft->*entry))
-        return CMPI_RC_ERR_NOT_SUPPORTED;
+        return result.ok() ? CMPI_RC_ERR_NOT_SUPPORTED : result.rc;
     Request request;
     request.path = {.name_space = name_space, .class_name = provider_class};
     add_context(request);
     Mi_Frame frame(*broker_, request.context);
     Argument<Select_Object> filter(*core_, "SELECT * FROM " + provider_class, std::string("WQL"));
     Argument<Path_Object> path(*core_, request.path);
-    Result result;
     frame.run(result, [&] {
         return (mi->ft->*entry)(mi, frame.context(), filter.cmpi(), provider_class.c_str(), path.cmpi(),
                                 arguments...);
@@ -28,14 +28,14 @@ CMPIrc Host::filter_call(const std::string& provider_class, const std::string& n
 template <class Entry>
 CMPIrc Host::switch_call(const std::string& provider_class, Entry entry)
 {
-    CMPIIndicationMI* mi = providers_->indication(provider_class);
+    Result result;
+    CMPIIndicationMI* mi = providers_->indication(provider_class, result);
     if (!mi || !(mi->ft->*entry))
-        return CMPI_RC_ERR_NOT_SUPPORTED;
+        return result.ok() ? CMPI_RC_ERR_NOT_SUPPORTED : result.rc;
     Request request;
     request.path.name_space = core_->options.name_space;
     add_context(request);
     Mi_Frame frame(*broker_, request.context);
-    Result result;
     frame.run(result, [&] { return (mi->ft->*entry)(mi, frame.context()); });
     return result.rc;
 }

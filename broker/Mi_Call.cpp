@@ -125,7 +125,8 @@ private:
     void call(Mi* mi, Entry entry, Arguments... arguments)
     {
         if (!mi || !(mi->ft->*entry)) {
-            result_.rc = CMPI_RC_ERR_NOT_SUPPORTED;
+            if (result_.ok())
+                result_.rc = CMPI_RC_ERR_NOT_SUPPORTED;
             return;
         }
         frame_.run(result_, [&] {
@@ -136,7 +137,7 @@ private:
     void operate()
     {
         using Table = CMPIInstanceMIFT;
-        CMPIInstanceMI* mi = providers_.instance(class_name_);
+        CMPIInstanceMI* mi = providers_.instance(class_name_, result_);
         switch (request_.operation) {
         case Operation::ENUMERATE_INSTANCE_NAMES:
             return call(mi, &Table::enumerateInstanceNames);
@@ -179,7 +180,7 @@ private:
     void traverse()
     {
         using Table = CMPIAssociationMIFT;
-        CMPIAssociationMI* mi = providers_.association(class_name_);
+        CMPIAssociationMI* mi = providers_.association(class_name_, result_);
         const Association_Filter& filter = request_.filter;
         const char *association_class = or_null(filter.association_class),
                    *result_class = or_null(filter.result_class), *role = or_null(filter.role),
@@ -201,7 +202,7 @@ private:
     {
         Argument<Args_Object> in(core(), arguments());
         Argument<Args_Object> out(core());
-        call(providers_.method(class_name_), &CMPIMethodMIFT::invokeMethod, request_.method.c_str(),
+        call(providers_.method(class_name_, result_), &CMPIMethodMIFT::invokeMethod, request_.method.c_str(),
              static_cast<const CMPIArgs*>(in.cmpi()), out.cmpi());
         result_.out = out->content;
         if (!result_.ok())

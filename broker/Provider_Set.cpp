@@ -1,5 +1,7 @@
 #include "broker/Provider_Set.h"
 
+#include "broker/Mi_Call.h"
+
 #include <algorithm>
 
 namespace KPRV::broker {
@@ -11,11 +13,15 @@ using Factory = Mi* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 
 /// The status is preset to 0; an interface counts only if it is still 0 afterwards.
 template <class Mi>
-void* call_factory(void* factory, const CMPIBroker* broker, const CMPIContext* context)
+void* call_factory(Mi_Frame& frame, void* factory, const CMPIBroker* broker, Result& answer)
 {
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    Mi* mi = reinterpret_cast<Factory<Mi>>(factory)(broker, context, &status);
-    return mi && mi->ft && status.rc == CMPI_RC_OK ? mi : nullptr;
+    Mi* mi = nullptr;
+    frame.run(answer, [&] {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        mi = reinterpret_cast<Factory<Mi>>(factory)(broker, frame.context(), &status);
+        return status;
+    });
+    return mi && mi->ft && answer.ok() ? mi : nullptr;
 }
 
 template <class Mi>
@@ -27,55 +33,53 @@ CMPIrc call_cleanup(void* mi, const CMPIContext* context, bool terminating)
 
 } // namespace
 
-CMPIInstanceMI* Provider_Set::instance(const std::string& class_name)
+CMPIInstanceMI* Provider_Set::instance(const std::string& class_name, Result& answer)
 {
-    return static_cast<CMPIInstanceMI*>(get(class_name, Mi_Kind::INSTANCE));
+    return static_cast<CMPIInstanceMI*>(get(class_name, Mi_Kind::INSTANCE, answer));
 }
 
-CMPIAssociationMI* Provider_Set::association(const std::string& class_name)
+CMPIAssociationMI* Provider_Set::association(const std::string& class_name, Result& answer)
 {
-    return static_cast<CMPIAssociationMI*>(get(class_name, Mi_Kind::ASSOCIATION));
+    return static_cast<CMPIAssociationMI*>(get(class_name, Mi_Kind::ASSOCIATION, answer));
 }
 
-CMPIMethodMI* Provider_Set::method(const std::string& class_name)
+CMPIMethodMI* Provider_Set::method(const std::string& class_name, Result& answer)
 {
-    return static_cast<CMPIMethodMI*>(get(class_name, Mi_Kind::METHOD));
+    return static_cast<CMPIMethodMI*>(get(class_name, Mi_Kind::METHOD, answer));
 }
 
-CMPIIndicationMI* Provider_Set::indication(const std::string& class_name)
+CMPIIndicationMI* Provider_Set::indication(const std::string& class_name, Result& answer)
 {
-    return static_cast<CMPIIndicationMI*>(get(class_name, Mi_Kind::INDICATION));
+    return static_cast<CMPIIndicationMI*>(get(class_name, Mi_Kind::INDICATION, answer));
 }
 
-void* Provider_Set::get(const std::string& class_name, Mi_Kind kind)
+void* Provider_Set::get(const std::string& class_name, Mi_Kind kind, Result& answer)
 {
     const Auto_Lock lock(mutex_);
     auto at = made_.find({class_name, kind});
     if (at != made_.end())
         return at->second;
-    void* mi = make(class_name, kind);
+    void* mi = make(class_name, kind, answer);
     if (mi)
         made_[{class_name, kind}] = mi;
     return mi;
 }
 
-void* Provider_Set::make(const std::string& class_name, Mi_Kind kind)
+void* Provider_Set::make(const std::string& class_name, Mi_Kind kind, Result& answer)
 {
     void* factory = module_.factory(class_name, kind);
     if (!factory)
         return nullptr;
-    Core& core = *broker_.core();
-    Argument<Context_Object> context(core);
-    Call_Frame frame(broker_.core(), context.cmpi());
+    Mi_Frame frame(broker_, {});
     switch (kind) {
     case Mi_Kind::INSTANCE:
-        return call_factory<CMPIInstanceMI>(factory, broker_.cmpi(), context.cmpi());
+        return call_factory<CMPIInstanceMI>(frame, factory, broker_.cmpi(), answer);
     case Mi_Kind::ASSOCIATION:
-        return call_factory<CMPIAssociationMI>(factory, broker_.cmpi(), context.cmpi());
+        return call_factory<CMPIAssociationMI>(frame, factory, broker_.cmpi(), answer);
     case Mi_Kind::METHOD:
-        return call_factory<CMPIMethodMI>(factory, broker_.cmpi(), context.cmpi());
+        return call_factory<CMPIMethodMI>(frame, factory, broker_.cmpi(), answer);
     default:
-        return call_factory<CMPIIndicationMI>(factory, broker_.cmpi(), context.cmpi());
+        return call_factory<CMPIIndicationMI>(frame, factory, broker_.cmpi(), answer);
     }
 }
 

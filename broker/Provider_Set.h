@@ -15,11 +15,12 @@ class Provider_Set
 public:
     Provider_Set(const Module& module, Broker& broker) : module_(module), broker_(broker) {}
 
-    /// The interface of that class and kind; null if the module has no such factory or the factory failed.
-    CMPIInstanceMI* instance(const std::string& class_name);
-    CMPIAssociationMI* association(const std::string& class_name);
-    CMPIMethodMI* method(const std::string& class_name);
-    CMPIIndicationMI* indication(const std::string& class_name);
+    /// The interface of that class and kind. Null if the module has no such factory, or if the factory
+    /// failed: `answer` then has its status.
+    CMPIInstanceMI* instance(const std::string& class_name, Result& answer);
+    CMPIAssociationMI* association(const std::string& class_name, Result& answer);
+    CMPIMethodMI* method(const std::string& class_name, Result& answer);
+    CMPIIndicationMI* indication(const std::string& class_name, Result& answer);
 
     bool serves(const std::string& class_name, Mi_Kind kind) const
     {
@@ -38,8 +39,8 @@ private:
     using Key = std::pair<std::string, Mi_Kind>;
 
     /// Calls the factory unless that has been done; interfaces of all kinds are two pointers.
-    void* get(const std::string& class_name, Mi_Kind kind);
-    void* make(const std::string& class_name, Mi_Kind kind);
+    void* get(const std::string& class_name, Mi_Kind kind, Result& answer);
+    void* make(const std::string& class_name, Mi_Kind kind, Result& answer);
     CMPIrc cleanup_one(void* mi, Mi_Kind kind, bool terminating);
     template <class Wanted>
     CMPIrc cleanup_if(Wanted wanted, bool terminating);

@@ -56,8 +56,14 @@ TEST_F(Host_Test, UnknownClassesAndUnservedOnes)
     EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, host->enumerate_instances("TOY_None").rc);
     // TOY_Base is known, but it has no provider of its own.
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->get_instance({.class_name = "TOY_Base"}).rc);
-    // Its factory answers an interface and a failure.
-    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->enumerate_instances("TOY_Broken").rc);
+}
+
+TEST_F(Host_Test, AFactoryThatFailsSaysWhy)
+{
+    // It answers an interface and a failure.
+    Result result = host->enumerate_instances("TOY_Broken");
+    EXPECT_EQ(CMPI_RC_ERR_FAILED, result.rc);
+    EXPECT_EQ("out of order", result.message);
 }
 
 TEST_F(Host_Test, GetsByKeyWithBothKeyStyles)

@@ -196,9 +196,10 @@ TOY_EXPORT CMPIMethodMI* TOY_Item_Provider_Create_MethodMI(const CMPIBroker* mb,
 }
 
 // A factory that fails by status, though it returns an interface.
-TOY_EXPORT CMPIInstanceMI* TOY_Broken_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
+TOY_EXPORT CMPIInstanceMI* TOY_Broken_Create_InstanceMI(const CMPIBroker* mb, const CMPIContext*,
                                                         CMPIStatus* status)
 {
     status->rc = CMPI_RC_ERR_FAILED;
+    status->msg = CMNewString(mb, "out of order", nullptr);
     return &toy::instance_mi;
 }
