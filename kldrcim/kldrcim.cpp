@@ -1,5 +1,5 @@
+#include "kldrcim/Cli.h"
 #include "kldrcim/formats/Output.h"
-#include "kldrcim/verbs/Cli.h"
 
 int main(int argc, char** argv)
 {

@@ -119,6 +119,11 @@ const char* status_name(int rc)
     return at == std::end(statuses) ? "unknown status" : at->name;
 }
 
+std::string code_text(int rc)
+{
+    return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
+}
+
 int status_of_name(const std::string& name)
 {
     auto at = std::find_if(std::begin(statuses), std::end(statuses),

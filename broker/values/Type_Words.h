@@ -24,6 +24,8 @@ std::int64_t smallest(CMPIType type);
 /// "CIM_ERR_NOT_FOUND" and its like for 1 to 17, "CMPI_RC_DO_NOT_UNLOAD" and its like beyond, "CMPI_RC_OK"
 /// for 0; "unknown status" for a number that has no name.
 const char* status_name(int rc);
+/// "CIM_ERR_NOT_FOUND (6)".
+std::string code_text(int rc);
 /// The number of such a name; -1 for a text that is none.
 int status_of_name(const std::string& name);
 

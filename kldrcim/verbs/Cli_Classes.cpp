@@ -29,17 +29,15 @@ struct Class_Row
     std::vector<std::string> keys;
 };
 
-std::vector<Class_Row> class_rows(const std::string& pattern, const Host& host)
+std::vector<Class_Row> class_rows(const std::string& pattern, Connection& connection)
 {
     std::vector<Class_Row> rows;
-    for (const std::string& name : host.catalogue().class_names()) {
-        const Class_Info* info = host.catalogue().find(name);
+    for (const std::string& name : connection.classes().class_names()) {
+        const Class_Info* info = connection.classes().find(name);
         if (!info->has_provider || fnmatch(pattern.c_str(), name.c_str(), FNM_CASEFOLD) != 0)
             continue;
-        Class_Row& row = rows.emplace_back(Class_Row{info->name, info->superclass, {}, {}});
-        for (Mi_Kind kind : mi_kinds)
-            if (host.module().factory(name, kind))
-                row.kinds.push_back(lower_name(mi_kind_name(kind)));
+        Class_Row& row =
+            rows.emplace_back(Class_Row{info->name, info->superclass, connection.provider_kinds(name), {}});
         for (const Feature_Info& property : info->properties)
             if (property.key)
                 row.keys.push_back(property.name);
@@ -59,11 +57,12 @@ std::string json_strings(const std::vector<std::string>& texts)
 
 } // namespace
 
-int list_classes(const Cli_Options& options, Host& host)
+int list_classes(const Cli_Options& options, Connection& connection)
 {
-    if (!host.catalogue().is_known())
-        return complain(host.module().path() + " does not publish its classes", 0);
-    std::vector<Class_Row> classes = class_rows(options.arguments.empty() ? "*" : options.arguments[0], host);
+    if (!connection.classes().is_known())
+        return complain(connection.location() + " does not publish its classes", 0);
+    std::vector<Class_Row> classes =
+        class_rows(options.arguments.empty() ? "*" : options.arguments[0], connection);
     if (options.format != Cli_Options::Format::JSON) {
         std::vector<std::vector<std::string>> rows;
         for (const Class_Row& row : classes)

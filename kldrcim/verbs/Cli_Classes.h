@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 #include "kldrcim/input/Cli_Options.h"
 
 namespace KPRV::kldrcim {
@@ -9,6 +9,6 @@ using namespace broker;
 
 /// `kldrcim classes`: those that have a provider and match the pattern, with superclass, provider kinds,
 /// keys.
-int list_classes(const Cli_Options& options, Host& host);
+int list_classes(const Cli_Options& options, Connection& connection);
 
 } // namespace KPRV::kldrcim

@@ -1,7 +1,5 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 
-#include "broker/values/Type_Words.h"
-
 #include <cstdio>
 
 namespace KPRV::kldrcim {
@@ -10,11 +8,6 @@ int complain(const std::string& text, int status)
 {
     std::fprintf(stderr, "kldrcim: %s\n", text.c_str());
     return status;
-}
-
-std::string code_text(CMPIrc rc)
-{
-    return std::string(status_name(rc)) + " (" + std::to_string(rc) + ")";
 }
 
 std::string failure_text(const Result& result)

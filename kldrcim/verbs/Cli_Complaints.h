@@ -1,6 +1,7 @@
 #pragma once
 
 #include "broker/values/Request.h"
+#include "broker/values/Type_Words.h"
 
 #include <string>
 #include <vector>
@@ -18,9 +19,6 @@ inline constexpr int USAGE_ERROR = 2;
 
 /// "kldrcim: TEXT"; gives the status back.
 int complain(const std::string& text, int status);
-
-/// "CIM_ERR_NOT_FOUND (6)".
-std::string code_text(CMPIrc rc);
 
 /// The code of an answer that failed, then the exception or the message, if there is one.
 std::string failure_text(const Result& result);

@@ -95,9 +95,9 @@ std::string findings_json(const std::vector<Conformance_Finding>& findings)
 
 } // namespace
 
-int run_conform(const Cli_Options& options, Host& host)
+int run_conform(const Cli_Options& options, Connection& connection)
 {
-    std::vector<Conformance_Finding> findings = check_conformance(host);
+    std::vector<Conformance_Finding> findings = check_conformance(connection);
     std::string text =
         options.format == Cli_Options::Format::JSON ? findings_json(findings) : findings_table(findings);
     put(text);

@@ -54,9 +54,9 @@ std::string characteristics_of(const Instance_Value& test)
     return text;
 }
 
-int list(const Cli_Options& options, Host& host)
+int list(const Cli_Options& options, Connection& connection)
 {
-    const Result tests = host.enumerate_instances(test_class, options.properties);
+    const Result tests = connection.enumerate_instances(test_class, options.properties);
     if (!tests.ok())
         return complain_of(tests);
     if (options.format != Cli_Options::Format::TABLE || options.properties) {
@@ -70,7 +70,7 @@ int list(const Cli_Options& options, Host& host)
     put(rows_as_table({"Test", "On", "Remarks"}, rows));
     rows.clear();
     for (const Element_Kind& kind : element_kinds())
-        for (const Instance_Value& element : host.enumerate_instances(kind.class_name).instances)
+        for (const Instance_Value& element : connection.enumerate_instances(kind.class_name).instances)
             rows.push_back({text_of(element, "DeviceID"), kind.words, text_of(element, "ElementName")});
     put("\n" + rows_as_table({"Element", "Kind", "Name"}, rows));
     return 0;
@@ -99,9 +99,9 @@ int report(const Run_Report& outcome)
     return outcome.passed ? 0 : 1;
 }
 
-bool takes_out_of_service(Host& host, const Path_Value& test)
+bool takes_out_of_service(Connection& connection, const Path_Value& test)
 {
-    const Result result = host.get_instance(test, {{"Characteristics"}});
+    const Result result = connection.get_instance(test, {{"Characteristics"}});
     return result.ok() && !result.instances.empty() &&
            has_characteristic(result.instances[0], OUT_OF_SERVICE);
 }
@@ -111,8 +111,8 @@ bool takes_out_of_service(Host& host, const Path_Value& test)
 class Running_Test
 {
 public:
-    Running_Test(Host& host, bool out_of_service, std::string element)
-        : host_(host), out_of_service_(out_of_service), element_(std::move(element))
+    Running_Test(Connection& connection, bool out_of_service, std::string element)
+        : connection_(connection), out_of_service_(out_of_service), element_(std::move(element))
     {
     }
     ~Running_Test() { wait_for_end(); }
@@ -121,7 +121,7 @@ public:
 
     void wait_for_end()
     {
-        while (is_test_running(host_))
+        while (connection_.is_at_work())
             wait();
     }
     /// For a moment.
@@ -153,23 +153,23 @@ private:
         std::_Exit(status_of_signal(interruption_.latest()));
     }
 
-    Host& host_;
+    Connection& connection_;
     const bool out_of_service_;
     const std::string element_;
     bool told_ = false;
     Interruption interruption_;
 };
 
-int run(const Cli_Options& options, Host& host)
+int run(const Cli_Options& options, Connection& connection)
 {
     Path_Value test, element;
     std::string error;
-    if (!find_test(host, options.arguments[1], test, error) ||
-        !find_element(host, test.class_name, options.arguments[2], element, error))
+    if (!find_test(connection, options.arguments[1], test, error) ||
+        !find_element(connection, test.class_name, options.arguments[2], element, error))
         return complain(error, USAGE_ERROR);
-    Running_Test running(host, takes_out_of_service(host, test), options.arguments[2]);
+    Running_Test running(connection, takes_out_of_service(connection, test), options.arguments[2]);
     const Result started =
-        host.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
+        connection.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
     if (!started.ok())
         return complain_of(started);
     const std::uint64_t code = started.return_value.as_uint();
@@ -184,7 +184,7 @@ int run(const Cli_Options& options, Host& host)
     flush_output();
     int status = 0;
     if (options.wait) {
-        status = report(follow_job(host, job, [&] { running.wait(); }));
+        status = report(follow_job(connection, job, [&] { running.wait(); }));
     } else {
         // A server would go on; this one is the module's process, and its end would leave the element out of
         // service.
@@ -199,13 +199,13 @@ int run(const Cli_Options& options, Host& host)
 
 } // namespace
 
-int diag(const Cli_Options& options, Host& host)
+int diag(const Cli_Options& options, Connection& connection)
 {
     const std::vector<std::string>& words = options.arguments;
     if (words[0] == "list" && words.size() == 1 && !options.wait)
-        return list(options, host);
+        return list(options, connection);
     if (words[0] == "run" && words.size() == 3)
-        return run(options, host);
+        return run(options, connection);
     return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE_ERROR);
 }
 

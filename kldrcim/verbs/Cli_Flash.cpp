@@ -57,9 +57,9 @@ const Path_Value* find_controller(const std::vector<Path_Value>& controllers, co
 }
 
 /// Version of the adapter's firmware, as the module publishes it now; nothing if it does not.
-std::optional<std::string> firmware_version(Host& host, const Path_Value& controller)
+std::optional<std::string> firmware_version(Connection& connection, const Path_Value& controller)
 {
-    Association_Index index(host);
+    Association_Index index(connection);
     for (const Path_Value& end :
          index.far_ends(software_association, "Dependent", controller, "Antecedent")) {
         const Instance_Value software = index.instance(end);
@@ -134,24 +134,25 @@ bool is_wanted(const Update& update)
 
 } // namespace
 
-int flash(const Cli_Options& options, Host& host)
+int flash(const Cli_Options& options, Connection& connection)
 {
     const std::string& word = options.arguments[0];
     const std::string& uri = options.arguments[1];
-    const Result controllers = host.enumerate_instance_names(controller_class);
+    const Result controllers = connection.enumerate_instance_names(controller_class);
     if (!controllers.ok())
         return complain(failure_text(controllers), FAILURE);
     const Path_Value* controller = find_controller(controllers.paths, word);
     if (!controller)
         return complain("no adapter \"" + word + "\"; \"kldrcim ein " + controller_class + "\" lists them",
                         NO_SUCH_ADAPTER);
-    const Result services = host.enumerate_instance_names(service_class);
+    const Result services = connection.enumerate_instance_names(service_class);
     if (!services.ok() || services.paths.empty())
         return complain(services.ok() ? std::string("the module offers no ") + service_class
                                       : failure_text(services),
                         FAILURE);
 
-    Update update = {visible_text(device_id(*controller)), uri, 0, firmware_version(host, *controller), {}};
+    Update update = {
+        visible_text(device_id(*controller)), uri, 0, firmware_version(connection, *controller), {}};
     if (!options.yes && isatty(STDIN_FILENO) && !is_wanted(update))
         return complain(update.adapter + ": not updated", FAILURE);
     flush_output();
@@ -160,14 +161,14 @@ int flash(const Cli_Options& options, Host& host)
     const Signals_Held_Back held_back;
     const Value install_options =
         Value::array(CMPI_uint16, {Value::unsigned_number(CMPI_uint16, option_update)});
-    const Result answer = host.invoke_method(services.paths.front(), "InstallFromURI",
-                                             {{"URI", Value::text(uri)},
-                                              {"Target", Value::path(*controller)},
-                                              {"InstallOptions", install_options}});
+    const Result answer = connection.invoke_method(services.paths.front(), "InstallFromURI",
+                                                   {{"URI", Value::text(uri)},
+                                                    {"Target", Value::path(*controller)},
+                                                    {"InstallOptions", install_options}});
     if (!answer.ok())
         return complain(failure_text(answer), FAILURE);
     update.return_value = answer.return_value.as_uint();
-    update.after = firmware_version(host, *controller);
+    update.after = firmware_version(connection, *controller);
     const int status = tell(options, update);
     flush_output();
     return status;

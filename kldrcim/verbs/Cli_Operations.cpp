@@ -1,7 +1,5 @@
 #include "kldrcim/verbs/Cli_Operations.h"
 
-#include "broker/Association_Routing.h"
-#include "kldrcim/input/Name_Spaces.h"
 #include "kldrcim/input/Typed_Input.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
@@ -15,8 +13,8 @@ namespace {
 class Plain_Operation
 {
 public:
-    Plain_Operation(const Cli_Options& options, Host& host)
-        : options_(options), host_(host), catalogue_(host.catalogue())
+    Plain_Operation(const Cli_Options& options, Connection& connection)
+        : options_(options), connection_(connection), catalogue_(connection.classes())
     {
     }
 
@@ -26,7 +24,7 @@ public:
         request.operation = find_verb(options_.verb)->operation;
         if (!read_request(request))
             return complain(error_, USAGE_ERROR);
-        Result result = host_.run(request);
+        Result result = connection_.run(request);
         if (!result.ok())
             return complain(status_text(request, result), 1);
         write(request, result);
@@ -40,7 +38,7 @@ private:
     bool read_request(Request& request)
     {
         if (!typed_path(catalogue_, argument(0), request.path, error_) ||
-            (!request.path.name_space.empty() && !is_served(host_, request.path.name_space, error_)))
+            (!request.path.name_space.empty() && !connection_.serves(request.path.name_space, error_)))
             return false;
         request.properties = options_.properties;
         if (is_association_operation(request.operation))
@@ -117,8 +115,8 @@ private:
         if (result.exception || !result.message.empty())
             return text;
         if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
-            text +=
-                ": the module has no class " + unknown_class(request) + "; \"kldrcim classes\" lists them";
+            text += ": " + connection_.subject() + " has no class " + unknown_class(request) +
+                    "; \"kldrcim classes\" lists them";
         else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
             text += ": " + request.path.class_name + " has no method " + request.method;
         return text;
@@ -152,16 +150,16 @@ private:
     }
 
     const Cli_Options& options_;
-    Host& host_;
+    Connection& connection_;
     const Class_Catalogue& catalogue_;
     std::string error_;
 };
 
 } // namespace
 
-int run_operation(const Cli_Options& options, Host& host)
+int run_operation(const Cli_Options& options, Connection& connection)
 {
-    return Plain_Operation(options, host).run();
+    return Plain_Operation(options, connection).run();
 }
 
 } // namespace KPRV::kldrcim

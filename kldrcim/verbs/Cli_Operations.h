@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 #include "kldrcim/input/Cli_Options.h"
 
 namespace KPRV::kldrcim {
@@ -8,6 +8,6 @@ namespace KPRV::kldrcim {
 using namespace broker;
 
 /// The verbs that stand for one operation of a CIM server: asks, and writes what comes.
-int run_operation(const Cli_Options& options, Host& host);
+int run_operation(const Cli_Options& options, Connection& connection);
 
 } // namespace KPRV::kldrcim

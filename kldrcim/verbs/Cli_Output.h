@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 #include "kldrcim/input/Cli_Options.h"
 
 namespace KPRV::kldrcim {

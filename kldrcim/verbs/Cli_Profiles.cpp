@@ -7,10 +7,10 @@
 
 namespace KPRV::kldrcim {
 
-int write_profiles(const Cli_Options& options, Host& host)
+int write_profiles(const Cli_Options& options, Connection& connection)
 {
-    Association_Index index(host);
-    const std::vector<Profile_Branch> roots = walk_profiles(index, host.catalogue());
+    Association_Index index(connection);
+    const std::vector<Profile_Branch> roots = walk_profiles(index, connection.classes());
     const std::vector<Provider_Failure>& failures = index.failures();
     if (!failures.empty() && same_name(failures.front().provider_class, profile_root_class))
         return complain(

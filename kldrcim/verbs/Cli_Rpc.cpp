@@ -42,7 +42,7 @@ std::string read_all(std::FILE* file)
 class Agent
 {
 public:
-    explicit Agent(Host& host) : host_(host) {}
+    explicit Agent(Connection& connection) : connection_(connection) {}
 
     /// False with a one-line `error` if the provider answers a failure or no reply.
     bool call(const std::string& request, std::string& reply, std::string& error)
@@ -50,7 +50,8 @@ public:
         Path_Value path;
         path.class_name = agent_class;
         path.keys = {{"Name", Value::text(agent_name)}};
-        const Result result = host_.invoke_method(path, "executeMethod", {{"request", Value::text(request)}});
+        const Result result =
+            connection_.invoke_method(path, "executeMethod", {{"request", Value::text(request)}});
         const Value* response = find_value(result.out, "response");
         if (!result.ok() || !response) {
             error = result.ok() ? "executeMethod gave no response" : failure_text(result);
@@ -61,7 +62,7 @@ public:
     }
 
 private:
-    Host& host_;
+    Connection& connection_;
 };
 
 std::vector<std::vector<std::string>> split_calls(const std::vector<std::string>& arguments)
@@ -149,11 +150,11 @@ bool check_rpc(const Cli_Options& options, std::string& error)
     return error.empty();
 }
 
-int run_rpc(const Cli_Options& options, Host& host)
+int run_rpc(const Cli_Options& options, Connection& connection)
 {
     if (options.list_methods)
         return list_methods(options);
-    Agent agent(host);
+    Agent agent(connection);
     if (options.raw)
         return call_raw(agent, *options.raw);
     std::vector<std::string> requests;

@@ -12,9 +12,9 @@ namespace {
 
 /// Walks, and writes what `text_of` makes of it.
 template <class Text_Of>
-int draw(const Cli_Options& options, Host& host, bool cross_links, Text_Of text_of)
+int draw(const Cli_Options& options, Connection& connection, bool cross_links, Text_Of text_of)
 {
-    Association_Index index(host);
+    Association_Index index(connection);
     const Topology topology = walk_topology(
         index, {.software = options.software, .connectors = options.connectors, .cross_links = cross_links});
     const std::vector<Provider_Failure>& failures = index.failures();
@@ -34,18 +34,18 @@ bool wants_color(const Cli_Options& options)
 
 } // namespace
 
-int draw_tree(const Cli_Options& options, Host& host)
+int draw_tree(const Cli_Options& options, Connection& connection)
 {
-    return draw(options, host, false, [&](const Topology& topology) {
+    return draw(options, connection, false, [&](const Topology& topology) {
         return options.format == Cli_Options::Format::JSON
                    ? tree_json(topology)
                    : tree_text(topology, options.ascii || !locale_is_utf8(), wants_color(options));
     });
 }
 
-int draw_graph(const Cli_Options& options, Host& host)
+int draw_graph(const Cli_Options& options, Connection& connection)
 {
-    return draw(options, host, true, graphviz_text);
+    return draw(options, connection, true, graphviz_text);
 }
 
 } // namespace KPRV::kldrcim

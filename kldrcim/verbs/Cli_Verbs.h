@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 #include "kldrcim/input/Cli_Options.h"
 
 #include <span>
@@ -10,7 +10,7 @@ namespace KPRV::kldrcim {
 using namespace broker;
 
 /// What a verb does on an open module; gives the exit status.
-using Verb_Body = int (*)(const Cli_Options& options, Host& host);
+using Verb_Body = int (*)(const Cli_Options& options, Connection& connection);
 
 /// One word that `kldrcim` understands.
 struct Cli_Verb

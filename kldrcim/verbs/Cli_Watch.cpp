@@ -1,6 +1,5 @@
 #include "kldrcim/verbs/Cli_Watch.h"
 
-#include "broker/Subscription.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
@@ -52,17 +51,6 @@ private:
     std::deque<Instance_Value> indications_ GUARDED_BY(mutex_);
 };
 
-/// Where the host's indications go, for a scope.
-struct Sink_Scope
-{
-    Sink_Scope(Host& owner, Host::Sink sink) : host(owner) { host.set_sink(std::move(sink)); }
-    ~Sink_Scope() { host.set_sink({}); }
-    Sink_Scope(const Sink_Scope&) = delete;
-    Sink_Scope& operator=(const Sink_Scope&) = delete;
-
-    Host& host;
-};
-
 void write(const Cli_Options& options, Instance_Value& indication)
 {
     if (options.properties)
@@ -75,29 +63,25 @@ void write(const Cli_Options& options, Instance_Value& indication)
     flush_output();
 }
 
-int refused(const std::string& name_space, const std::string& provider_class, CMPIrc rc)
-{
-    return complain(code_text(rc) + ": " + provider_class + " takes no subscription for " + name_space, 1);
-}
-
 } // namespace
 
-int watch(const Cli_Options& options, Host& host)
+int watch(const Cli_Options& options, Connection& connection)
 {
-    const std::string provider_class = options.arguments.empty() ? alert_class : options.arguments[0];
+    const std::string indication_class = options.arguments.empty() ? alert_class : options.arguments[0];
     const std::vector<std::string> name_spaces =
         options.filters.empty() ? std::vector{options.name_space} : options.filters;
 
     Interruption interruption;
     Inbox inbox(interruption);
-    const Sink_Scope sink(host, [&](const std::string& name_space, const Instance_Value& indication) {
-        inbox.put(name_space, indication);
-        return CMPI_RC_OK;
-    });
-    Subscription subscription(host, provider_class);
-    for (const std::string& name_space : name_spaces)
-        if (const CMPIrc rc = subscription.add(name_space); rc != CMPI_RC_OK)
-            return refused(name_space, provider_class, rc);
+    std::string error;
+    const auto subscription = connection.subscribe(
+        indication_class, name_spaces,
+        [&](const std::string& name_space, const Instance_Value& indication) {
+            inbox.put(name_space, indication);
+        },
+        error);
+    if (!subscription)
+        return complain(error, FAILURE);
     Instance_Value indication;
     for (unsigned written = 0; options.count == 0 || written < options.count; ++written) {
         if (!inbox.take(indication))

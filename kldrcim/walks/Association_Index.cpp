@@ -28,7 +28,7 @@ const Association_Index::Links& Association_Index::links(const std::string& asso
 {
     auto [at, is_new] = links_.try_emplace(association);
     if (is_new) {
-        Result result = host_.enumerate_instance_names(association);
+        Result result = connection_.enumerate_instance_names(association);
         note_failure(association, result);
         at->second = std::move(result.paths);
     }
@@ -66,7 +66,7 @@ const Association_Index::Class_Instances& Association_Index::class_instances(con
     Class_Instances& kept = at->second;
     if (!is_new)
         return kept;
-    Result result = host_.enumerate_instances(class_name);
+    Result result = connection_.enumerate_instances(class_name);
     note_failure(class_name, result);
     kept.instances = std::move(result.instances);
     for (std::size_t i = 0; i < kept.instances.size(); ++i)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 
 #include <unordered_map>
 
@@ -14,7 +14,7 @@ using namespace broker;
 class Association_Index
 {
 public:
-    explicit Association_Index(Host& host) : host_(host) {}
+    explicit Association_Index(Connection& connection) : connection_(connection) {}
 
     /// The far ends of the links of an association whose near role holds the object, each once, in the order
     /// of the enumeration. With `above_role`, only of links where that role holds `above`.
@@ -44,7 +44,7 @@ private:
     const Class_Instances& class_instances(const std::string& class_name);
     void note_failure(const std::string& class_name, const Result& result);
 
-    Host& host_;
+    Connection& connection_;
     std::unordered_map<std::string, Links> links_;
     /// By association and near role: positions in the links by the identity of the near end.
     std::unordered_map<std::string, Positions> positions_;

@@ -25,7 +25,7 @@ bool has_value(const Instance_Value& instance, const std::string& property)
 class Conformance_Walk
 {
 public:
-    explicit Conformance_Walk(Host& host) : host_(host) {}
+    explicit Conformance_Walk(Connection& connection) : connection_(connection) {}
 
     Conformance_Finding take(const Conformance_Step& step)
     {
@@ -44,7 +44,7 @@ public:
 private:
     void enumerate(const Conformance_Step& step, Instances& found)
     {
-        Result all = host_.enumerate_instances(step.class_name);
+        Result all = connection_.enumerate_instances(step.class_name);
         note_failure(all);
         for (Instance_Value& instance : all.instances)
             if (const Value* name = instance.property("RegisteredName"); name && name->as_text() == step.name)
@@ -81,10 +81,10 @@ private:
                           .result_class = step.class_name,
                           .role = step.near_role,
                           .result_role = step.far_role};
-        Result result = host_.run(request);
+        Result result = connection_.run(request);
         note_failure(result);
         std::erase_if(result.instances, [&](const Instance_Value& instance) {
-            return !host_.catalogue().is_a(instance.path.class_name, step.class_name);
+            return !connection_.classes().is_a(instance.path.class_name, step.class_name);
         });
         return result.instances;
     }
@@ -122,16 +122,16 @@ private:
             finding_.missing.push_back(status_name(result.rc));
     }
 
-    Host& host_;
+    Connection& connection_;
     std::map<std::string, Instances> objects_;
     Conformance_Finding finding_{};
 };
 
 } // namespace
 
-std::vector<Conformance_Finding> check_conformance(Host& host)
+std::vector<Conformance_Finding> check_conformance(Connection& connection)
 {
-    Conformance_Walk walk(host);
+    Conformance_Walk walk(connection);
     std::vector<Conformance_Finding> findings;
     for (const Conformance_Step* step = conformance_steps; step->name; ++step)
         findings.push_back(walk.take(*step));

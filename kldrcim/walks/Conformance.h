@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 #include "kldrcim/walks/Conformance_Plan.h"
 
 namespace KPRV::kldrcim {
@@ -30,7 +30,7 @@ struct Conformance_Finding
 /// Walks as a client does that knows profiles and nothing of this module: it enumerates registered profiles
 /// and from there on follows associations by the names of the CIM Schema. One finding a step, in the order of
 /// the plan.
-std::vector<Conformance_Finding> check_conformance(Host& host);
+std::vector<Conformance_Finding> check_conformance(Connection& connection);
 
 /// True if a finding misses something.
 bool misses_something(const std::vector<Conformance_Finding>& findings);

@@ -57,10 +57,10 @@ std::string time_of_day(const std::string& datetime)
     return utc.substr(8, 2) + ":" + utc.substr(10, 2) + ":" + utc.substr(12, 2) + utc.substr(14, 4);
 }
 
-void collect(Host& host, const char* class_name, const std::string& job_id, Run_Report& report)
+void collect(Connection& connection, const char* class_name, const std::string& job_id, Run_Report& report)
 {
     const std::string head = job_id + ":";
-    for (const Instance_Value& each : host.enumerate_instances(class_name).instances) {
+    for (const Instance_Value& each : connection.enumerate_instances(class_name).instances) {
         const auto text_of = [&](const char* name) {
             const Value* const value = each.property(name);
             return value ? value->as_text() : std::string();
@@ -81,26 +81,20 @@ void collect(Host& host, const char* class_name, const std::string& job_id, Run_
 
 } // namespace
 
-bool is_test_running(Host& host)
-{
-    // The thread of a run stays attached to its server until it ends.
-    return host.ledger().live(Object_Kind::CONTEXT) != 0;
-}
-
-Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause)
+Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<void()>& pause)
 {
     {
         Progress progress;
-        while (is_test_running(host)) {
-            progress.show(state_words(host.get_instance(job)));
+        while (connection.is_at_work()) {
+            progress.show(state_words(connection.get_instance(job)));
             pause();
         }
-        progress.show(state_words(host.get_instance(job)));
+        progress.show(state_words(connection.get_instance(job)));
     }
     Run_Report report;
     const Value* const id = job.key("InstanceID");
     for (const char* class_name : {"KALDERA_DiagnosticServiceRecord", "KALDERA_DiagnosticCompletionRecord"})
-        collect(host, class_name, id ? id->as_text() : "", report);
+        collect(connection, class_name, id ? id->as_text() : "", report);
     std::ranges::sort(report.records, {}, &Run_Record::number);
     const auto count = [&](const char* outcome) {
         return std::ranges::count(report.records, outcome, &Run_Record::outcome);

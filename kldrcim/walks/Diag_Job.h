@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 
 #include <functional>
 
@@ -28,13 +28,9 @@ struct Run_Report
     bool passed = false;
 };
 
-/// True until the end of a run: of its thread, not only of its job, which is closed before the results are
-/// written.
-bool is_test_running(Host& host);
-
 /// Follows a run to its end and collects its records. Meanwhile standard error shows the job's state and how
 /// long it has been at work: on a terminal in one line that changes, else a line for each state. `pause` is
 /// called between two looks.
-Run_Report follow_job(Host& host, const Path_Value& job, const std::function<void()>& pause);
+Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<void()>& pause);
 
 } // namespace KPRV::kldrcim

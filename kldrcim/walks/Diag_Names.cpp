@@ -33,9 +33,9 @@ std::string flat_address(const std::string& text)
     return flat;
 }
 
-bool find_address(Host& host, const Element_Kind& kind, const std::string& flat, Path_Value& path)
+bool find_address(Connection& connection, const Element_Kind& kind, const std::string& flat, Path_Value& path)
 {
-    for (const Path_Value& each : host.enumerate_instance_names(kind.class_name).paths) {
+    for (const Path_Value& each : connection.enumerate_instance_names(kind.class_name).paths) {
         const Value* const id = each.key("DeviceID");
         if (!id || flat_address(id->as_text()) != flat)
             continue;
@@ -61,10 +61,10 @@ std::string element_words(const std::string& test_class_name)
     return words;
 }
 
-bool find_test(Host& host, const std::string& name, Path_Value& path, std::string& error)
+bool find_test(Connection& connection, const std::string& name, Path_Value& path, std::string& error)
 {
     const std::string wanted = lower_name(name);
-    for (const Path_Value& each : host.enumerate_instance_names(test_class).paths) {
+    for (const Path_Value& each : connection.enumerate_instance_names(test_class).paths) {
         const Value* const key = each.key("Name");
         const std::string known = key ? lower_name(key->as_text()) : "";
         if (known != wanted && known != name_prefix + wanted)
@@ -76,15 +76,15 @@ bool find_test(Host& host, const std::string& name, Path_Value& path, std::strin
     return false;
 }
 
-bool find_element(Host& host, const std::string& test_class_name, const std::string& text, Path_Value& path,
-                  std::string& error)
+bool find_element(Connection& connection, const std::string& test_class_name, const std::string& text,
+                  Path_Value& path, std::string& error)
 {
     if (text.find('=') != std::string::npos)
-        return typed_path(host.catalogue(), text, path, error);
+        return typed_path(connection.classes(), text, path, error);
     const std::string flat = flat_address(text);
     for (const bool right_kind : {true, false})
         for (const Element_Kind& kind : kinds)
-            if (takes(kind, test_class_name) == right_kind && find_address(host, kind, flat, path))
+            if (takes(kind, test_class_name) == right_kind && find_address(connection, kind, flat, path))
                 return true;
     error = "no port or adapter " + text + "; \"kldrcim diag list\" lists them";
     return false;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "kldrcim/connection/Connection.h"
 
 #include <span>
 
@@ -26,12 +26,12 @@ std::span<const Element_Kind> element_kinds();
 std::string element_words(const std::string& test_class_name);
 
 /// The test of that name, with or without "Kaldera:" and in any letter case. False with a one-line `error`.
-bool find_test(Host& host, const std::string& name, Path_Value& path, std::string& error);
+bool find_test(Connection& connection, const std::string& name, Path_Value& path, std::string& error);
 
 /// The element with that address: index form, flat form or dashes, in any letter case; or by its path. Where
 /// an adapter and its port share the address, the test decides. A path, and an element of a kind that the
 /// test does not take, is left to the module to refuse.
-bool find_element(Host& host, const std::string& test_class_name, const std::string& text, Path_Value& path,
-                  std::string& error);
+bool find_element(Connection& connection, const std::string& test_class_name, const std::string& text,
+                  Path_Value& path, std::string& error);
 
 } // namespace KPRV::kldrcim

@@ -2,6 +2,7 @@
 #include "tests/broker/Toy_Host.h"
 #include "tests/kldrcim/Run_Kldrcim.h"
 
+#include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/walks/Conformance.h"
 
 namespace KPRV::kldrcim {
@@ -11,8 +12,8 @@ using Verdict = Conformance_Finding::Verdict;
 
 TEST(Conformance, AModuleWithoutProfilesMissesTheThreeAndReachesNothing)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    std::vector<Conformance_Finding> findings = check_conformance(*host);
+    Local_Connection connection(open_toy(TOY_DESCRIBED));
+    std::vector<Conformance_Finding> findings = check_conformance(connection);
     EXPECT_TRUE(misses_something(findings));
     for (const Conformance_Finding& finding : findings) {
         SCOPED_TRACE(finding.step->name);

@@ -1,4 +1,4 @@
-#include "kldrcim/input/Server_Instances_File.h"
+#include "kldrcim/local/Server_Instances_File.h"
 
 #include "broker/values/Value_Text.h"
 #include "tests/kldrcim/Run_Kldrcim.h"

@@ -1,5 +1,6 @@
 // The walk over the small host: what it finds, and what it asks.
 #include "kldrcim/formats/Topology_Text.h"
+#include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/walks/Profile_Tree.h"
 
 #include "tests/broker/Toy_Host.h"
@@ -11,6 +12,7 @@ class Topology_Test : public Toy_Test
 {
 protected:
     Topology_Test() { host = open_toy(TOY_FABRIC); }
+    void SetUp() override { connection.emplace(*host); }
 
     unsigned count(const std::string& class_name)
     {
@@ -23,11 +25,13 @@ protected:
         return static_cast<std::size_t>(std::count_if(topology.nodes.begin(), topology.nodes.end(),
                                                       [&](const auto& node) { return node.kind == kind; }));
     }
+
+    std::optional<Local_Connection> connection;
 };
 
 TEST_F(Topology_Test, AsksEachClassOnce)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     walk_topology(index, {.software = true, .connectors = true, .cross_links = true});
     EXPECT_TRUE(index.failures().empty());
     for (const std::string& name : host->catalogue().class_names()) {
@@ -39,7 +43,7 @@ TEST_F(Topology_Test, AsksEachClassOnce)
 
 TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     walk_profiles(index, host->catalogue());
     EXPECT_TRUE(index.failures().empty());
     for (const std::string& name : host->catalogue().class_names()) {
@@ -51,7 +55,7 @@ TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
 
 TEST_F(Topology_Test, DoesNotAskForWhatIsNotShown)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     Topology topology = walk_topology(index, {});
     for (const char* name :
          {"KALDERA_AdapterElementSoftwareIdentity", "KALDERA_AdapterSoftwareIdentity", "KALDERA_Realizes",
@@ -63,7 +67,7 @@ TEST_F(Topology_Test, DoesNotAskForWhatIsNotShown)
 
 TEST_F(Topology_Test, WhatIsSeenThroughTwoPortsIsOneNode)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     Topology topology = walk_topology(index, {});
     EXPECT_EQ(2u, nodes(topology, Node_Kind::TARGET));
     EXPECT_EQ(3u, nodes(topology, Node_Kind::UNIT));
@@ -77,7 +81,7 @@ TEST_F(Topology_Test, WhatIsSeenThroughTwoPortsIsOneNode)
 
 TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     Path_Value initiator = {.class_name = "KALDERA_SCSIProtocolEndpoint",
                             .keys = {{"Name", Value::text("1000024b4c100000")}}};
     const char* paths = "KALDERA_SCSIInitiatorTargetLogicalUnitPath";
@@ -90,7 +94,7 @@ TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
 
 TEST_F(Topology_Test, AnInstanceThatTheModuleDoesNotHaveKeepsItsKeys)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     Path_Value gone = {.class_name = "KALDERA_FCPort", .keys = {{"DeviceID", Value::text("gone")}}};
     EXPECT_EQ("gone", index.instance(gone).property("DeviceID")->as_text());
     EXPECT_TRUE(index.failures().empty());
@@ -98,7 +102,7 @@ TEST_F(Topology_Test, AnInstanceThatTheModuleDoesNotHaveKeepsItsKeys)
 
 TEST_F(Topology_Test, FailuresAreToldOnce)
 {
-    Association_Index index(*host);
+    Association_Index index(*connection);
     Path_Value tape = {.class_name = "KALDERA_TapeDrive", .keys = {{"DeviceID", Value::text("tape_only")}}};
     index.far_ends("TOY_Broken", "Antecedent", tape, "Dependent");
     index.far_ends("TOY_Broken", "Dependent", tape, "Antecedent");

@@ -1,5 +1,5 @@
 // `kldrcim flash` on the built module and the demo host.
-#include "kldrcim/verbs/Cli.h"
+#include "kldrcim/Cli.h"
 #include "tests/module/exports/Module_Fixture.h"
 #include "tests/support/Scripted_Programs.h"
 #include "tests/support/Working_Folder.h"

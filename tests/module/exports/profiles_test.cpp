@@ -1,4 +1,5 @@
 #include "kldrcim/formats/Profile_Text.h"
+#include "kldrcim/local/Local_Connection.h"
 #include "tests/module/exports/Golden.h"
 #include "tests/module/exports/Module_Fixture.h"
 #include "tests/support/Named_Process.h"
@@ -133,7 +134,8 @@ TEST_F(Profiles, TheServersOwnHangTogether)
 
 TEST_F(Profiles, AClientThatKnowsNothingFindsAll)
 {
-    kldrcim::Association_Index index(*server);
+    kldrcim::Local_Connection connection(*server);
+    kldrcim::Association_Index index(connection);
     std::string text = kldrcim::profile_text(kldrcim::walk_profiles(index, server->catalogue()), true);
     EXPECT_TRUE(index.failures().empty());
     replace_all(text, "KALDERA_ComputerSystem " + This_Host::find().name + "\n",

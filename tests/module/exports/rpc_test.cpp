@@ -1,7 +1,7 @@
 // `kldrcim rpc` on the built module and the demo host: every method of the table, errors, and what is kept.
 #include "tests/module/exports/Module_Fixture.h"
 
-#include "kldrcim/verbs/Cli.h"
+#include "kldrcim/Cli.h"
 #include "kldrcim/walks/Rpc_Methods.h"
 
 #include <json/json.h>

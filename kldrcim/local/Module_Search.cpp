@@ -1,4 +1,4 @@
-#include "kldrcim/input/Module_Search.h"
+#include "kldrcim/local/Module_Search.h"
 
 #include <filesystem>
 

@@ -1,4 +1,4 @@
-#include "kldrcim/input/Server_Instances_File.h"
+#include "kldrcim/local/Server_Instances_File.h"
 
 #include "broker/values/Type_Words.h"
 #include "kldrcim/input/Typed_Input.h"

@@ -1,0 +1,47 @@
+#include "kldrcim/local/Open_Module.h"
+
+#include "kldrcim/local/Local_Connection.h"
+#include "kldrcim/local/Module_Search.h"
+#include "kldrcim/local/Server_Instances_File.h"
+
+#include <dlfcn.h>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+bool is_loaded(const char* library)
+{
+    void* const handle = dlopen(library, RTLD_NOW | RTLD_NOLOAD);
+    if (handle)
+        dlclose(handle);
+    return handle;
+}
+
+} // namespace
+
+std::unique_ptr<Connection> open_module(const Cli_Options& options, std::string& error, std::string& warning)
+{
+    Host_Options host_options;
+    host_options.user = options.user;
+    host_options.name_space = options.name_space;
+    std::unique_ptr<Host> host =
+        Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
+    if (!host) {
+        error = "cannot load the provider module: " + error;
+        return nullptr;
+    }
+    if (!options.server_instances.empty() &&
+        !read_server_instances(options.server_instances, host->catalogue(), host->store(), error))
+        return nullptr;
+    auto connection = std::make_unique<Local_Connection>(std::move(host));
+    if (!connection->serves(options.name_space, error))
+        return nullptr;
+    // Without its adapter library the module loads and finds nothing, which should not look like "no
+    // adapters".
+    if (connection->is_own_module() && !is_loaded("libdzntj.so"))
+        warning = "the adapter library libdzntj.so is not loaded; no adapters will be seen";
+    return connection;
+}
+
+} // namespace KPRV::kldrcim
