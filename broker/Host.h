@@ -2,6 +2,7 @@
 
 #include "broker/Mi_Call.h"
 #include "broker/Server_Store.h"
+#include "broker/values/Operations.h"
 #include "module/runtime/Standard_Mutex.h"
 
 namespace KPRV::broker {
@@ -14,7 +15,7 @@ namespace KPRV::broker {
 ///     auto host = Host::open("./libkldrprovider_Module.so", {}, error);
 ///     Result result = host->enumerate_instances("KALDERA_FCPort");
 ///     ASSERT_EQ("", host->violations().text());
-class Host final : private Up_Calls
+class Host final : public Operations, private Up_Calls
 {
 public:
     using Sink = std::function<CMPIrc(const std::string& name_space, const Instance_Value& indication)>;
@@ -23,18 +24,16 @@ public:
     static std::unique_ptr<Host> open(const std::string& library, Host_Options options, std::string& error);
     ~Host() override;
 
-    /// The operations of a client. Paths without a name space get that of the options. An enumeration of a
-    /// superclass asks the providers of all its subclasses; the first that fails ends it. Rc 5 for a class
-    /// that neither the catalogue nor a factory knows, 7 for one that nobody serves.
-    Result enumerate_instance_names(const std::string& class_name);
-    Result enumerate_instances(const std::string& class_name, const Property_List& properties = {});
-    Result get_instance(const Path_Value& path, const Property_List& properties = {});
-    Result create_instance(const Instance_Value& instance);
-    Result modify_instance(const Instance_Value& instance, const Property_List& properties = {});
-    Result delete_instance(const Path_Value& path);
-    Result invoke_method(const Path_Value& path, const std::string& method,
-                         const std::vector<Named_Value>& in);
-
+    /// A client's operation; its context gets the usual entries where it has none. A path without a name
+    /// space gets that of the options. An enumeration of a superclass asks the providers of all its
+    /// subclasses; the first that fails ends it. Rc 5 for a class that neither the catalogue nor a factory
+    /// knows, 7 for one that nobody serves.
+    ///
+    /// An association request goes to the providers of the class that its filter names and of the subclasses,
+    /// or, without such a filter, to every association with a role that can hold the path's class; objects
+    /// that several report come once, and it fails only if all fail. Rc 5 if the named class is unknown, 7 if
+    /// it has no provider.
+    Result run(Request request, Receiver* receiver = nullptr) override;
     /// The association calls of one provider class, whatever the path's class.
     Result associators(const std::string& provider_class, const Path_Value& path,
                        const Association_Filter& filter, const Property_List& properties = {});
@@ -45,11 +44,6 @@ public:
     Result reference_names(const std::string& provider_class, const Path_Value& path,
                            const Association_Filter& filter);
 
-    /// Any request; its context gets the usual entries where it has none. An association request goes to the
-    /// providers of the class that its filter names and of the subclasses, or, without such a filter, to
-    /// every association with a role that can hold the path's class; objects that several report come once,
-    /// and it fails only if all fail. Rc 5 if the named class is unknown, 7 if it has no provider.
-    Result run(Request request, Receiver* receiver = nullptr);
     /// The same, at the provider of one class.
     Result run_at(const std::string& provider_class, Request request, Receiver* receiver = nullptr);
 

@@ -1,8 +1,7 @@
 #pragma once
 
 #include "broker/values/Class_Catalogue.h"
-#include "broker/values/Receiver.h"
-#include "broker/values/Request.h"
+#include "broker/values/Operations.h"
 
 #include <cstdio>
 #include <functional>
@@ -30,22 +29,11 @@ public:
 using Indication_Sink = std::function<void(const std::string& name_space, const Instance_Value& indication)>;
 
 /// Where verbs send CIM operations: a module in this process, or a CIM server. Paths without a name space are
-/// in that of the connection.
-class Connection
+/// in that of the connection. Whatever was answered is a result; an operation throws `Connection_Error` if
+/// there was no answer to be had.
+class Connection : public Operations
 {
 public:
-    virtual ~Connection() = default;
-
-    /// One operation. With a receiver, instances and paths go there as they come, and are not in the result.
-    /// Whatever was answered is a result; throws `Connection_Error` if there was no answer to be had.
-    virtual Result run(Request request, Receiver* receiver = nullptr) = 0;
-
-    Result enumerate_instance_names(const std::string& class_name);
-    Result enumerate_instances(const std::string& class_name, const Property_List& properties = {});
-    Result get_instance(const Path_Value& path, const Property_List& properties = {});
-    Result invoke_method(const Path_Value& path, const std::string& method,
-                         const std::vector<Named_Value>& in);
-
     /// What is known of the classes of the connection's name space.
     virtual const Class_Catalogue& classes() = 0;
     /// The kinds of provider that serve a class: "instance", "association", "method", "indication".
