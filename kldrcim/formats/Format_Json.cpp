@@ -63,12 +63,33 @@ std::string json_values(const std::vector<Named_Value>& values, unsigned indent)
     return json_object(members, indent);
 }
 
-std::string json_instance(const Instance_Value& instance, unsigned indent)
+std::string json_words(std::span<const Value_Meaning> meanings, const Value& value, unsigned indent)
 {
-    return json_object({{"class", json_string(instance.path.class_name)},
-                        {"path", json_string(path_text(instance.path))},
-                        {"properties", json_values(instance.properties, indent + 2)}},
-                       indent);
+    if (!value.is_array()) {
+        const char* const word = word_of(meanings, value);
+        return word ? json_string(word) : "null";
+    }
+    std::vector<std::string> elements;
+    for (const Value& element : value.elements())
+        elements.push_back(json_words(meanings, element, indent + 2));
+    return json_array(elements, indent);
+}
+
+std::string json_instance(const Instance_Value& instance, unsigned indent, Words words)
+{
+    std::vector<std::pair<std::string, std::string>> members = {
+        {"class", json_string(instance.path.class_name)},
+        {"path", json_string(path_text(instance.path))},
+        {"properties", json_values(instance.properties, indent + 2)},
+    };
+    const Class_Words class_words(instance.path.class_name, words);
+    std::vector<std::pair<std::string, std::string>> meant;
+    for (const Named_Value& property : instance.properties)
+        if (const auto meanings = class_words.of(property.name); !meanings.empty() && !property.value.null)
+            meant.emplace_back(property.name, json_words(meanings, property.value, indent + 4));
+    if (!meant.empty())
+        members.emplace_back("words", json_object(meant, indent + 2));
+    return json_object(members, indent);
 }
 
 std::string json_text(const Value& value, unsigned indent)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "kldrcim/formats/Value_Words.h"
 
 namespace KPRV::kldrcim {
 
@@ -10,8 +10,13 @@ using namespace broker;
 /// of texts is used. References are object paths as text; a NaN or infinity is null.
 std::string json_text(const Value& value, unsigned indent = 0);
 
-/// `{"class": ..., "path": ..., "properties": {...}}`, nulls included.
-std::string json_instance(const Instance_Value& instance, unsigned indent = 0);
+/// `{"class": ..., "path": ..., "properties": {...}, "words": {...}}`, nulls included. "words" says what
+/// those numbers mean that have a meaning, under the names of the properties; it is left out where there are
+/// none.
+std::string json_instance(const Instance_Value& instance, unsigned indent = 0, Words words = Words::LEFT_OUT);
+
+/// What the number, or each number of the array, means: a text, or null.
+std::string json_words(std::span<const Value_Meaning> meanings, const Value& value, unsigned indent = 0);
 
 std::string json_string(const std::string& text);
 

@@ -56,12 +56,12 @@ std::string row_of(const std::vector<std::string>& cells, const std::vector<std:
     return line.substr(0, line.find_last_not_of(' ') + 1) + "\n";
 }
 
-std::string as_blocks(const std::vector<Instance_Value>& instances)
+std::string as_blocks(const std::vector<Instance_Value>& instances, Words words)
 {
     std::string text;
     for (const Instance_Value& instance : instances)
         text += (text.empty() ? "" : "\n") + path_text(instance.path) + "\n" +
-                values_as_block(instance.properties);
+                values_as_block(instance.properties, Class_Words(instance.path.class_name, words));
     return text;
 }
 
@@ -80,7 +80,7 @@ std::string rows_as_table(const std::vector<std::string>& headings,
     return text;
 }
 
-std::string values_as_block(const std::vector<Named_Value>& values)
+std::string values_as_block(const std::vector<Named_Value>& values, const Class_Words& words)
 {
     std::size_t width = 0;
     for (const Named_Value& entry : values)
@@ -90,30 +90,32 @@ std::string values_as_block(const std::vector<Named_Value>& values)
     for (const Named_Value& entry : values)
         if (!entry.value.null)
             text += "  " + entry.name + std::string(width - entry.name.size(), ' ') + " = " +
-                    visible_lines(plain_text(entry.value)) + "\n";
+                    visible_lines(worded_text(words.of(entry.name), entry.value)) + "\n";
     return text;
 }
 
 std::string instances_as_table(const std::vector<Instance_Value>& instances,
-                               const std::vector<std::string>* columns, std::size_t width)
+                               const std::vector<std::string>* columns, std::size_t width, Words words)
 {
     if (instances.empty())
         return "";
     std::vector<std::string> headings = columns ? *columns : columns_of(instances);
     if (headings.empty() || headings.size() > most_columns)
-        return as_blocks(instances);
+        return as_blocks(instances, words);
     std::vector<std::vector<std::string>> rows;
     for (const Instance_Value& instance : instances) {
+        const Class_Words class_words(instance.path.class_name, words);
         std::vector<std::string>& row = rows.emplace_back();
         for (const std::string& heading : headings) {
             const Value* value = instance.property(heading);
-            row.push_back(value && !value->null ? visible_text(plain_text(*value)) : "");
+            row.push_back(value && !value->null ? visible_text(worded_text(class_words.of(heading), *value))
+                                                : "");
         }
     }
     std::size_t total = 2 * (headings.size() - 1);
     for (std::size_t column : widths_of(headings, rows))
         total += column;
-    return width && total > width ? as_blocks(instances) : rows_as_table(headings, rows);
+    return width && total > width ? as_blocks(instances, words) : rows_as_table(headings, rows);
 }
 
 } // namespace KPRV::kldrcim

@@ -130,6 +130,8 @@ constexpr Cli_Option option_table[] = {
      "no box-drawing characters (default where the locale is not UTF-8)"},
     {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,
      "states in colors: auto, always or never (default: auto, on a terminal and without NO_COLOR)"},
+    {"--raw",        nullptr,          nullptr,                             &Options::numbers,       nullptr,                  false,
+     "numbers alone, without what they mean"},
     {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
      "the whole text of a call"},
     {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,

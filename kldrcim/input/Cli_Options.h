@@ -48,6 +48,8 @@ struct Cli_Options
     /// rpc: the whole text of a call, or "-" for standard input.
     std::optional<std::string> raw;
     bool list_methods = false;
+    /// Numbers alone, without what they mean.
+    bool numbers = false;
     /// Follow the job of a test that was started.
     bool wait = false;
     /// Update firmware without asking.

@@ -11,12 +11,42 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-const Cli_Option* find_option(const std::string& written)
+/// Two options may share a name, for different verbs; where the verb is none of these, or null, the first
+/// stands for both. Null for what is no option.
+const Cli_Option* find_option(const std::string& written, const Cli_Verb* verb)
 {
     const std::string name = written == "-h" ? "--help" : written;
-    const auto at =
-        std::ranges::find_if(cli_options(), [&](const Cli_Option& option) { return name == option.name; });
-    return at == cli_options().end() ? nullptr : &*at;
+    const Cli_Option* found = nullptr;
+    for (const Cli_Option& option : cli_options())
+        if (name == option.name && (!found || (verb && takes_option(*verb, option))))
+            found = &option;
+    return found;
+}
+
+bool is_option(const std::string& argument)
+{
+    return argument.size() >= 2 && argument[0] == '-';
+}
+
+/// True if the option is another one for some verb. Its value, if it has one, is no verb.
+bool depends_on_verb(const std::string& name)
+{
+    return std::ranges::count(cli_options(), name, &Cli_Option::name) > 1;
+}
+
+/// The verb of a command line whose options may stand before it; null if there is none.
+const Cli_Verb* verb_among(const std::vector<std::string>& arguments)
+{
+    for (std::size_t i = 0; i < arguments.size() && arguments[i] != "--"; ++i) {
+        if (!is_option(arguments[i]))
+            return find_verb(arguments[i]);
+        const Cli_Option* const option = find_option(arguments[i], nullptr);
+        if (!option || i + 1 == arguments.size())
+            continue;
+        if (depends_on_verb(arguments[i]) ? !find_verb(arguments[i + 1]) : !option->flag)
+            ++i;
+    }
+    return nullptr;
 }
 
 template <class Rows>
@@ -35,11 +65,14 @@ std::string unknown_option(const std::string& argument)
            "; \"kldrcim --help\" lists them";
 }
 
-std::string verbs_with(const Cli_Option& option)
+/// Those that know an option of that name.
+std::string verbs_with(const std::string& name)
 {
     std::string names;
     for (const Cli_Verb& verb : cli_verbs())
-        if (contains_word(verb.options, option.name))
+        if (std::ranges::any_of(cli_options(), [&](const Cli_Option& option) {
+                return name == option.name && takes_option(verb, option);
+            }))
             names += (names.empty() ? "" : " ") + std::string(verb.name);
     return names;
 }
@@ -49,9 +82,9 @@ bool check_sense(const Cli_Options& options, const Cli_Verb& verb,
                  const std::vector<const Cli_Option*>& given, std::string& error)
 {
     for (const Cli_Option* option : given)
-        if (!option->is_common && !contains_word(verb.options, option->name)) {
+        if (!option->is_common && !takes_option(verb, *option)) {
             error = std::string(option->name) + " makes no sense for " + verb.name + "; it is for " +
-                    verbs_with(*option);
+                    verbs_with(option->name);
             return false;
         }
     const char* const format = name_of(options.format);
@@ -84,10 +117,11 @@ bool check_arguments(const Cli_Options& options, const Cli_Verb& verb, std::stri
 bool parse_options(const std::vector<std::string>& arguments, Cli_Options& options, std::string& error)
 {
     bool options_end = false;
+    const Cli_Verb* const named = verb_among(arguments);
     std::vector<const Cli_Option*> given;
     for (std::size_t i = 0; i < arguments.size(); ++i) {
         const std::string& argument = arguments[i];
-        if (options_end || argument.size() < 2 || argument[0] != '-') {
+        if (options_end || !is_option(argument)) {
             if (options.verb.empty())
                 options.verb = argument;
             else
@@ -99,7 +133,7 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
             continue;
         }
         std::size_t equals = argument.find('=');
-        const Cli_Option* option = find_option(argument.substr(0, equals));
+        const Cli_Option* option = find_option(argument.substr(0, equals), named);
         if (!option) {
             error = unknown_option(argument);
             return false;

@@ -108,7 +108,7 @@ std::string owners(const Cli_Option& option)
     std::string names;
     if (!option.is_common)
         for (const Cli_Verb& verb : cli_verbs())
-            if (contains_word(verb.options, option.name))
+            if (takes_option(verb, option))
                 names += (names.empty() ? "" : ", ") + std::string(verb.name);
     return names.empty() ? "" : names + ": ";
 }
@@ -151,7 +151,7 @@ std::string verb_help(const Cli_Verb& verb)
     std::string text = wrapped(usage_line(verb).replace(0, 1, "U"), 0) + "\n" + forms(verb);
     std::string own, common;
     for (const Cli_Option& option : cli_options())
-        if (contains_word(verb.options, option.name))
+        if (takes_option(verb, option))
             own += entry(option, "");
         else if (option.is_common)
             common += entry(option, "");

@@ -138,7 +138,7 @@ private:
         case Operation::GET_INSTANCE:
             return write_instance(options_, result.instances);
         case Operation::INVOKE_METHOD:
-            return write_method(options_, result);
+            return write_method(options_, request, result);
         case Operation::ENUMERATE_INSTANCE_NAMES:
         case Operation::CREATE_INSTANCE:
         case Operation::ASSOCIATOR_NAMES:

@@ -13,6 +13,6 @@ void write_instances(const Cli_Options& options, const std::vector<Instance_Valu
 void write_instance(const Cli_Options& options, const std::vector<Instance_Value>& instances);
 void write_paths(const Cli_Options& options, const std::vector<Path_Value>& paths);
 /// Return value, then out parameters.
-void write_method(const Cli_Options& options, const Result& result);
+void write_method(const Cli_Options& options, const Request& request, const Result& result);
 
 } // namespace KPRV::kldrcim

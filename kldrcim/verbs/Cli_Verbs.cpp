@@ -20,18 +20,20 @@ constexpr std::size_t any = ~std::size_t(0);
 
 constexpr const char* all_formats = "table json mof";
 constexpr const char* ends_options = "--assoc --role --result --result-role";
+constexpr const char* ends_with_words = "--assoc --role --result --result-role --raw";
 constexpr const char* links_options = "--assoc --role";
+constexpr const char* links_with_words = "--assoc --role --raw";
 
 using Op = Operation;
 
 // clang-format off
 constexpr Cli_Verb verbs[] = {
 //   name        arguments                                          body             operation                    formats       options
-    {"ei",       1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCES,     all_formats,  "",
+    {"ei",       1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCES,     all_formats,  "--raw",
      "enumerate instances", nullptr},
     {"ein",      1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCE_NAMES, all_formats, "",
      "enumerate instance names", nullptr},
-    {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            all_formats,  "",
+    {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            all_formats,  "--raw",
      "get one instance", nullptr},
     {"ci",       2, any, "CLASS NAME=VALUE...",                     run_operation,   Op::CREATE_INSTANCE,         all_formats,  "",
      "create an instance", nullptr},
@@ -39,13 +41,13 @@ constexpr Cli_Verb verbs[] = {
      "modify the named properties of an instance", nullptr},
     {"di",       1, 1,   "PATH",                                    run_operation,   Op::DELETE_INSTANCE,         all_formats,  "",
      "delete an instance", nullptr},
-    {"cm",       2, any, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "",
+    {"cm",       2, any, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "--raw",
      "call a method; PATH may name a class alone for a static one", nullptr},
-    {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             all_formats,  ends_options,
+    {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             all_formats,  ends_with_words,
      "instances associated with one (associators)", nullptr},
     {"ain",      1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATOR_NAMES,        all_formats,  ends_options,
      "their names", nullptr},
-    {"ri",       1, 1,   "PATH",                                    run_operation,   Op::REFERENCES,              all_formats,  links_options,
+    {"ri",       1, 1,   "PATH",                                    run_operation,   Op::REFERENCES,              all_formats,  links_with_words,
      "associations that refer to an instance (references)", nullptr},
     {"rin",      1, 1,   "PATH",                                    run_operation,   Op::REFERENCE_NAMES,         all_formats,  links_options,
      "their names", nullptr},
@@ -57,13 +59,13 @@ constexpr Cli_Verb verbs[] = {
      "the registered profiles and what conforms to each, as a tree", nullptr},
     {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",
      "what a client of the Storage HBA profile expects, beside what it finds", "1 something mandatory is missing."},
-    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        all_formats,  "--filter --count",
+    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        all_formats,  "--filter --count --raw",
      "subscribe to indications (default: KALDERA_AlertIndication) and write each as it comes, until interrupted", nullptr},
     {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        all_formats,  "--wait",
      "the hardware tests, and the ports and adapters that they can be run on\n"
      "run a test, by its name, on a port or adapter, by its address or PATH; the test takes the element out of service while it runs",
      "run: 3 the test was refused; 128 and its number after a signal. With --wait: 0 the test passed, 1 it failed."},
-    {"rpc",      0, any, "METHOD [PARAMETER...]\n--list [PATTERN]\n--raw TEXT", run_rpc, Op{},                    "table json", "--list --raw",
+    {"rpc",      0, any, "METHOD [PARAMETER...]\n--list [PATTERN]\n--raw TEXT", run_rpc, Op{},                    "table json", "--list --raw=",
      "call a method of the agent's JSON-RPC protocol; \"+\" stands before a further call\n"
      "list its methods with their parameters\n"
      "send TEXT, or with \"-\" standard input, as it is; write the reply as it is", nullptr},
@@ -80,6 +82,13 @@ constexpr Cli_Verb verbs[] = {
 std::span<const Cli_Verb> cli_verbs()
 {
     return verbs;
+}
+
+bool takes_option(const Cli_Verb& verb, const Cli_Option& option)
+{
+    const std::string name = option.name;
+    const bool has_twin = std::ranges::count(cli_options(), name, &Cli_Option::name) > 1;
+    return contains_word(verb.options, has_twin && option.value ? name + "=" : name);
 }
 
 const Cli_Verb* find_verb(const std::string& name)

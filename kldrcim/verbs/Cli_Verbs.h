@@ -35,6 +35,11 @@ struct Cli_Verb
 
 std::span<const Cli_Verb> cli_verbs();
 
+/// True for an option that the verb has beside those that all have. Of two options of one name, the one with
+/// a value stands as
+/// "--name=" in the verb's row.
+bool takes_option(const Cli_Verb& verb, const Cli_Option& option);
+
 /// Null for a word that is no verb.
 const Cli_Verb* find_verb(const std::string& name);
 

@@ -176,6 +176,21 @@ TEST(Cli, HelpAndVersion)
     EXPECT_EQ(0u, kldrcim("--version").out.find("kldrcim "));
 }
 
+TEST(Cli, AnOptionMayDependOnTheVerb)
+{
+    // A text for rpc, none for the others, wherever it stands.
+    const Outcome called = on_fabric("rpc --raw '{}'");
+    EXPECT_EQ(called.error, on_fabric("--raw '{}' rpc").error);
+    EXPECT_EQ(std::string::npos, called.error.find("usage")) << called.error;
+    EXPECT_EQ(0, on_fabric("--raw ein KALDERA_FCPort")
+                     .error.find("kldrcim: --raw makes no sense for ein; it is for ei "));
+    EXPECT_EQ("kldrcim: --raw takes no value\n", on_fabric("ei KALDERA_FCPort --raw=x").error);
+    EXPECT_EQ("kldrcim: --raw wants a value\n", on_fabric("rpc --raw").error);
+    EXPECT_EQ(on_fabric("ei KALDERA_FCPort --raw").out, on_fabric("--raw ei KALDERA_FCPort").out);
+    EXPECT_EQ(on_fabric("ei KALDERA_FCPort --raw").out,
+              on_fabric("--format table --raw ei KALDERA_FCPort").out);
+}
+
 TEST(Cli, EachVerbHasHelpOfItsOwn)
 {
     const std::string all = kldrcim("--help").out;
@@ -187,10 +202,12 @@ TEST(Cli, EachVerbHasHelpOfItsOwn)
         EXPECT_EQ("", run.error);
         EXPECT_EQ(0u, run.out.find(std::string("Usage: kldrcim [options] ") + verb.name)) << run.out;
         for (const Cli_Option& option : cli_options()) {
-            const bool has_it = option.is_common || contains_word(verb.options, option.name);
-            EXPECT_EQ(has_it, run.out.find("\n  " + std::string(option.name)) != std::string::npos)
-                << option.name;
-            EXPECT_NE(std::string::npos, all.find("\n  " + std::string(option.name)));
+            // Of two options of one name, the value tells which it is.
+            const std::string line =
+                "\n  " + std::string(option.name) + (option.value ? " " + std::string(option.value) : "  ");
+            const bool has_it = option.is_common || takes_option(verb, option);
+            EXPECT_EQ(has_it, run.out.find(line) != std::string::npos) << line;
+            EXPECT_NE(std::string::npos, all.find(line)) << line;
         }
         std::istringstream lines(run.out + all);
         for (std::string line; std::getline(lines, line);)

@@ -87,6 +87,15 @@ def check_missing(check, kldrcim, name):
             check.refused(f"get {path}", pywbem.CIM_ERR_NOT_FOUND, check.connection.GetInstance, path)
 
 
+def check_words(check):
+    """The server's class says what numbers mean: of a property that the product class declares anew, and of an inherited one."""
+    for name, number, word in (("PortType", 10, "N"), ("OperationalStatus", 11, "In Service"), ("EnabledState", 2, "Enabled")):
+        said = check.attempt(
+            f"value map of {name}", pywbem.ValueMapping.for_property, check.connection, None, "KALDERA_FCPort", name
+        )
+        check.expect(f"{name} {number}", said and said.tovalues(number), word)
+
+
 def main():
     check = Check(__doc__)
     catalogue, kldrcim = Catalogue(), Kldrcim(check)
@@ -95,6 +104,7 @@ def main():
     check.expect("classes with a provider", len(catalogue.kinds), 76)
     for name in catalogue.of_kind("indication"):
         check.expect(f"enumerate {name}", check.connection.EnumerateInstances(name), [])
+    check_words(check)
     with management_application():
         for name in catalogue.of_kind("instance", "association"):
             check_class(check, comparison, kldrcim, name)

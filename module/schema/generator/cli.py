@@ -3,8 +3,7 @@
 import argparse
 import sys
 
-from . import listing, loading, module, records, registrations, skeletons, tables
-from .declarations import QualifierType
+from . import listing, loading, module, records, registrations, skeletons, tables, value_maps, value_words
 from .errors import MofError
 from .flags import ASSOCIATION, INDICATION
 from .output import Output
@@ -46,13 +45,25 @@ def generate(files, prefix, without=()):
     return output
 
 
-def deployment(files, prefix, without, version):
+def maps_of(path, classes):
+    return value_maps.read(path, classes) if path else {}
+
+
+def words(files, maps):
+    """What programs read that show values to people, in memory."""
+    classes = resolve(read(files))
+    output = Output()
+    value_words.emit(classes, maps_of(maps, classes), output)
+    return output
+
+
+def deployment(files, prefix, without, version, maps=None):
     """What servers read, in memory: registrations and MOF."""
     declarations = read(files)
     classes = resolve(declarations)
     output = Output()
     registrations.emit(providers_of(classes, prefix, without), output, version)
-    loading.emit(classes, [each for each in declarations if isinstance(each, QualifierType)], prefix, output)
+    loading.emit(classes, declarations, prefix, maps_of(maps, classes), output)
     return output
 
 
@@ -65,13 +76,17 @@ def main(arguments=None):
     parser.add_argument("--without-provider", action="append", default=[], metavar="CLASS")
     parser.add_argument("--deployment", action="store_true", help="generate what CIM servers read, not C++")
     parser.add_argument("--module-version", default="0", metavar="TEXT", help="with --deployment")
+    parser.add_argument("--value-maps", metavar="FILE", help="what numbers mean, for --deployment and --words")
+    parser.add_argument("--words", action="store_true", help="generate the table of value maps alone")
     options = parser.parse_args(arguments)
     if not options.list and not options.output:
         parser.error("--output or --list is needed")
     try:
         catalogue = (options.mof, options.provider_prefix, options.without_provider)
         if options.deployment:
-            output = deployment(*catalogue, options.module_version)
+            output = deployment(*catalogue, options.module_version, options.value_maps)
+        elif options.words:
+            output = words(options.mof, options.value_maps)
         else:
             output = generate(*catalogue)
     except MofError as error:

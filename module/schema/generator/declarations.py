@@ -47,6 +47,8 @@ class Element:
     default: Optional[Literal] = None
     parameters: list = field(default_factory=list)
     is_reference: bool = False
+    #: Offset in the file of the bracket that ends the qualifiers; without qualifiers, of the type.
+    qualifiers_end: int = 0
 
 
 @dataclass

@@ -20,14 +20,15 @@ TOKEN = re.compile(
 
 
 class Token:
-    """Kind (name, number, string, char, mark or end), text without quotes, and place."""
+    """Kind (name, number, string, char, mark or end), text without quotes, place, and offset in the file."""
 
-    __slots__ = ("kind", "text", "where")
+    __slots__ = ("kind", "text", "where", "at")
 
-    def __init__(self, kind, text, where):
+    def __init__(self, kind, text, where, at):
         self.kind = kind
         self.text = text
         self.where = where
+        self.at = at
 
     def __str__(self):
         return "the end of the file" if self.kind == "end" else f"'{self.text}'"
@@ -48,10 +49,10 @@ def tokens(text, file):
             raise MofError(where, f"unexpected character '{text[at]}'")
         kind = match.lastgroup
         if kind in ("string", "char"):
-            result.append(Token(kind, unquote(match[0]), where))
+            result.append(Token(kind, unquote(match[0]), where, at))
         elif kind in ("number", "name", "mark"):
-            result.append(Token(kind, match[0], where))
+            result.append(Token(kind, match[0], where, at))
         line += match[0].count("\n")
         at = match.end()
-    result.append(Token("end", "", Where(file, line)))
+    result.append(Token("end", "", Where(file, line), at))
     return result

@@ -1,6 +1,11 @@
-"""The MOF that a server's compiler loads: declarations as they stand in the sources, no class before what it needs."""
+"""The MOF that a server's compiler loads: declarations as they stand in the sources, with their value maps, no class before what
+it needs."""
 
+import json
+
+from .declarations import ClassDeclaration, QualifierType
 from .output import read
+from .value_maps import effective
 
 HEADS = {
     "kldr_qualifiers.mof": "// Qualifiers, for a namespace that has none: load this first.\n",
@@ -8,6 +13,8 @@ HEADS = {
     "// that schema: after the qualifiers, before the product classes.\n",
     "kldrprovider.mof": "// The product classes, for the namespace root/kaldera.\n",
 }
+
+WIDTH = 120
 
 
 def elements(class_):
@@ -62,8 +69,56 @@ def sources(places):
     return list(dict.fromkeys(place.file for place in places))
 
 
-def emit(classes, qualifiers, prefix, output):
-    """`qualifiers` are the declarations of the qualifiers."""
+def map_of(class_, feature, prefix, maps):
+    """The map to state with a declaration. A product class restates what it inherits, since not every server's compiler hands
+    the qualifiers of an overridden feature down."""
+    return effective(class_, feature, maps) if class_.name.startswith(prefix) else maps.get((class_.name, feature.name))
+
+
+def words(name, texts):
+    """A qualifier of many texts, on lines of its own."""
+    lines = [f"     {name} {{{json.dumps(texts[0])}"]
+    for each in texts[1:]:
+        lines[-1] += ","
+        if len(lines[-1]) + len(each) + 5 > WIDTH:
+            lines.append("        ")
+        lines[-1] += f" {json.dumps(each)}"
+    return "\n".join(lines) + "}"
+
+
+def qualified(text, places):
+    """The MOF text with the maps stated at the places, which are (offset, has qualifiers, map)."""
+    for offset, has_qualifiers, value_map in sorted(places, key=lambda place: place[0], reverse=True):
+        meanings = value_map.meanings
+        both = words("ValueMap", [each.text for each in meanings]) + ",\n" + words("Values", [each.word for each in meanings])
+        added = f",\n{both}" if has_qualifiers else f"[{both.lstrip()}]\n    "
+        text = text[:offset] + added + text[offset:]
+    return text
+
+
+def mapped(classes, elements_of, prefix, maps):
+    """By file, where a map belongs."""
+    places = {}
+    for class_ in classes:
+        for feature in class_.own_features:
+            value_map = map_of(class_, feature, prefix, maps)
+            if value_map:
+                element = elements_of[class_.name, feature.name]
+                place = (element.qualifiers_end, bool(element.qualifiers), value_map)
+                places.setdefault(feature.where.file, []).append(place)
+    return places
+
+
+def emit(classes, declarations, prefix, maps, output):
+    """`declarations` are those that the classes come from."""
+    qualifiers = [each for each in declarations if isinstance(each, QualifierType)]
+    elements_of = {
+        (each.name, element.name): element
+        for each in declarations
+        if isinstance(each, ClassDeclaration)
+        for element in each.elements
+    }
+    places_of = mapped(classes, elements_of, prefix, maps)
     product = [class_ for class_ in classes if class_.name.startswith(prefix)]
     structure = [class_ for class_ in classes if not class_.name.startswith(prefix)]
     for name, places in (
@@ -71,4 +126,5 @@ def emit(classes, qualifiers, prefix, output):
         ("kldr_structure.mof", [class_.where for class_ in loading_order(structure)]),
         ("kldrprovider.mof", [class_.where for class_ in loading_order(product)]),
     ):
-        output.add(f"mof/{name}", HEADS[name] + "".join("\n" + read(file) for file in sources(places)))
+        texts = [qualified(read(file), places_of.get(file, [])) for file in sources(places)]
+        output.add(f"mof/{name}", HEADS[name] + "".join("\n" + text for text in texts))

@@ -89,6 +89,10 @@ class Parser:
         type_name = self.name("a type")
         if type_name.text not in ("boolean", "string"):
             self.refuse(type_name, f"qualifier '{name.text}' is neither boolean nor string")
+        of_type = type_name.text
+        if self.accept("["):
+            self.expect("]")
+            of_type += "[]"
         self.expect("=")
         default = self.name("true, false or null").text.lower()
         clauses = {"scope": [], "flavor": []}
@@ -104,7 +108,7 @@ class Parser:
             self.expect(")")
         self.expect(";")
         return QualifierType(
-            name.text, type_name.text, default == "true", clauses["scope"], clauses["flavor"], name.where
+            name.text, of_type, default == "true" if of_type == "boolean" else None, clauses["scope"], clauses["flavor"], name.where
         )
 
     def class_declaration(self):
@@ -140,6 +144,11 @@ class Parser:
             else:
                 self.refuse(token, f"expected a text, true or false before {token}")
             self.expect(")")
+        elif self.accept("{"):
+            value = [self.expect_kind("string", "a text").text]
+            while self.accept(","):
+                value.append(self.expect_kind("string", "a text").text)
+            self.expect("}")
         return Qualifier(name.text, value, name.where)
 
     def element(self):
@@ -162,6 +171,7 @@ class Parser:
     def typed_name(self, kind):
         """[qualifiers] type [REF] name [ [] ]"""
         qualifiers = self.qualifiers()
+        end = (self.tokens[self.at - 1] if qualifiers else self.token).at
         type_name = self.name("a type")
         reference = self.accept("ref") is not None
         name = self.name("a name")
@@ -171,7 +181,7 @@ class Parser:
         if reference and kind == "property":
             kind = "reference"
         return Element(
-            kind, name.text, type_name.text, array, qualifiers, name.where, is_reference=reference
+            kind, name.text, type_name.text, array, qualifiers, name.where, is_reference=reference, qualifiers_end=end
         )
 
     def literal(self):

@@ -4,6 +4,13 @@ from .errors import MofError
 from .flags import BITS
 
 
+def kind_of(value):
+    """The type of a qualifier that can have the value."""
+    if isinstance(value, bool):
+        return "boolean"
+    return "string[]" if isinstance(value, list) else "string"
+
+
 class Qualifiers:
     """The qualifier declarations, by lower-case name."""
 
@@ -46,7 +53,7 @@ class Qualifiers:
             raise MofError(use.where, f"qualifier '{use.name}' stands twice")
         if scope not in type_.scopes and "any" not in type_.scopes:
             raise MofError(use.where, f"qualifier '{use.name}' does not apply to a {scope}")
-        if isinstance(use.value, bool) != (type_.type == "boolean"):
+        if kind_of(use.value) != type_.type:
             raise MofError(use.where, f"qualifier '{use.name}' takes a {type_.type}")
         if "disableoverride" in type_.flavors and inherited.get(key) is True and use.value is False:
             raise MofError(use.where, f"qualifier '{use.name}' is inherited and cannot be turned off")

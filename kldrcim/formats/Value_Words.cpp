@@ -1,0 +1,50 @@
+#include "kldrcim/formats/Value_Words.h"
+
+#include "broker/values/Value_Text.h"
+
+#include <algorithm>
+
+namespace KPRV::kldrcim {
+
+Class_Words::Class_Words(std::string_view class_name, Words words)
+{
+    if (words == Words::LEFT_OUT)
+        return;
+    const auto found = std::ranges::equal_range(
+        mapped_features(), lower_name(class_name), {},
+        [](const Mapped_Feature& each) { return std::string_view(each.class_name); });
+    features_ = {found.begin(), found.end()};
+}
+
+std::span<const Value_Meaning> Class_Words::of(std::string_view feature) const
+{
+    const auto found = std::ranges::find_if(
+        features_, [&](const Mapped_Feature& each) { return same_name(each.name, feature); });
+    return found == features_.end() ? std::span<const Value_Meaning>() : found->meanings;
+}
+
+const char* word_of(std::span<const Value_Meaning> meanings, const Value& number)
+{
+    if (number.null || !std::holds_alternative<std::uint64_t>(number.data))
+        return nullptr;
+    const std::uint64_t value = number.as_uint();
+    const auto found = std::ranges::find_if(
+        meanings, [&](const Value_Meaning& each) { return each.least <= value && value <= each.most; });
+    return found == meanings.end() ? nullptr : found->word;
+}
+
+std::string worded_text(std::span<const Value_Meaning> meanings, const Value& value)
+{
+    if (meanings.empty() || value.null || (value.is_array() && value.elements().empty()))
+        return plain_text(value);
+    if (!value.is_array()) {
+        const char* const word = word_of(meanings, value);
+        return plain_text(value) + (word ? " (" + std::string(word) + ")" : "");
+    }
+    std::string text;
+    for (const Value& element : value.elements())
+        text += (text.empty() ? "" : ", ") + worded_text(meanings, element);
+    return text;
+}
+
+} // namespace KPRV::kldrcim
