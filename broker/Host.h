@@ -2,7 +2,7 @@
 
 #include "broker/Mi_Call.h"
 #include "broker/Server_Store.h"
-#include "broker/values/Operations.h"
+#include "broker/values/Cim_Operations.h"
 #include "module/runtime/Standard_Mutex.h"
 
 namespace KPRV::broker {
@@ -15,7 +15,7 @@ namespace KPRV::broker {
 ///     auto host = Host::open("./libkldrprovider_Module.so", {}, error);
 ///     Result result = host->enumerate_instances("KALDERA_FCPort");
 ///     ASSERT_EQ("", host->violations().text());
-class Host final : public Operations, private Up_Calls
+class Host final : public Cim_Operations, private Up_Calls
 {
 public:
     using Sink = std::function<CMPIrc(const std::string& name_space, const Instance_Value& indication)>;

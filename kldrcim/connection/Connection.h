@@ -1,7 +1,7 @@
 #pragma once
 
+#include "broker/values/Cim_Operations.h"
 #include "broker/values/Class_Catalogue.h"
-#include "broker/values/Operations.h"
 
 #include <cstdio>
 #include <functional>
@@ -31,7 +31,7 @@ using Indication_Sink = std::function<void(const std::string& name_space, const 
 /// Where verbs send CIM operations: a module in this process, or a CIM server. Paths without a name space are
 /// in that of the connection. Whatever was answered is a result; an operation throws `Connection_Error` if
 /// there was no answer to be had.
-class Connection : public Operations
+class Connection : public Cim_Operations
 {
 public:
     /// What is known of the classes of the connection's name space.

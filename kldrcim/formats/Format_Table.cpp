@@ -25,9 +25,7 @@ std::vector<std::string> columns_of(const std::vector<Instance_Value>& instances
     std::vector<std::string> columns;
     for (const Instance_Value& instance : instances)
         for (const Named_Value& property : instance.properties)
-            if (!property.value.null &&
-                std::none_of(columns.begin(), columns.end(),
-                             [&](const std::string& column) { return same_name(column, property.name); }))
+            if (!property.value.null && !contains_name(columns, property.name))
                 columns.push_back(property.name);
     return columns;
 }
@@ -51,18 +49,17 @@ std::string row_of(const std::vector<std::string>& cells, const std::vector<std:
     for (std::size_t i = 0; i < cells.size(); ++i) {
         line += cells[i];
         if (i + 1 < cells.size())
-            line.append(widths[i] - display_width(cells[i]) + 2, ' ');
+            line.append(std::max(widths[i], display_width(cells[i])) - display_width(cells[i]) + 2, ' ');
     }
     return line.substr(0, line.find_last_not_of(' ') + 1) + "\n";
 }
 
-std::string as_blocks(const std::vector<Instance_Value>& instances, Words words)
+std::string head_of(const std::vector<std::string>& headings, const std::vector<std::size_t>& widths)
 {
-    std::string text;
-    for (const Instance_Value& instance : instances)
-        text += (text.empty() ? "" : "\n") + path_text(instance.path) + "\n" +
-                values_as_block(instance.properties, Class_Words(instance.path.class_name, words));
-    return text;
+    std::vector<std::string> rule;
+    for (const std::size_t width : widths)
+        rule.emplace_back(width, '-');
+    return row_of(headings, widths) + row_of(rule, widths);
 }
 
 } // namespace
@@ -71,10 +68,7 @@ std::string rows_as_table(const std::vector<std::string>& headings,
                           const std::vector<std::vector<std::string>>& rows)
 {
     std::vector<std::size_t> widths = widths_of(headings, rows);
-    std::vector<std::string> rule;
-    for (std::size_t width : widths)
-        rule.emplace_back(width, '-');
-    std::string text = row_of(headings, widths) + row_of(rule, widths);
+    std::string text = head_of(headings, widths);
     for (const auto& row : rows)
         text += row_of(row, widths);
     return text;
@@ -94,28 +88,66 @@ std::string values_as_block(const std::vector<Named_Value>& values, const Class_
     return text;
 }
 
+Instances_Table::Instances_Table(const std::vector<Instance_Value>& first,
+                                 const std::vector<std::string>* columns, std::size_t width, Words words)
+    : are_fixed_(columns), words_(words), headings_(columns ? *columns : columns_of(first))
+{
+    if (headings_.empty() || headings_.size() > most_columns)
+        return;
+    std::vector<std::vector<std::string>> rows;
+    for (const Instance_Value& instance : first)
+        rows.push_back(cells(instance));
+    widths_ = widths_of(headings_, rows);
+    std::size_t total = 2 * (headings_.size() - 1);
+    for (const std::size_t column : widths_)
+        total += column;
+    if (width && total > width)
+        widths_.clear();
+}
+
+std::vector<std::string> Instances_Table::cells(const Instance_Value& instance) const
+{
+    const Class_Words class_words(instance.path.class_name, words_);
+    std::vector<std::string> row;
+    for (const std::string& heading : headings_) {
+        const Value* value = instance.property(heading);
+        row.push_back(value && !value->null ? visible_text(worded_text(class_words.of(heading), *value))
+                                            : "");
+    }
+    return row;
+}
+
+std::string Instances_Table::head() const
+{
+    return is_of_blocks() ? "" : head_of(headings_, widths_);
+}
+
+std::string Instances_Table::row(const Instance_Value& instance) const
+{
+    return is_of_blocks()
+               ? path_text(instance.path) + "\n" +
+                     values_as_block(instance.properties, Class_Words(instance.path.class_name, words_))
+               : row_of(cells(instance), widths_);
+}
+
+bool Instances_Table::has_columns_for(const Instance_Value& instance) const
+{
+    return are_fixed_ || is_of_blocks() ||
+           std::ranges::all_of(instance.properties, [&](const Named_Value& property) {
+               return property.value.null || contains_name(headings_, property.name);
+           });
+}
+
 std::string instances_as_table(const std::vector<Instance_Value>& instances,
                                const std::vector<std::string>* columns, std::size_t width, Words words)
 {
     if (instances.empty())
         return "";
-    std::vector<std::string> headings = columns ? *columns : columns_of(instances);
-    if (headings.empty() || headings.size() > most_columns)
-        return as_blocks(instances, words);
-    std::vector<std::vector<std::string>> rows;
-    for (const Instance_Value& instance : instances) {
-        const Class_Words class_words(instance.path.class_name, words);
-        std::vector<std::string>& row = rows.emplace_back();
-        for (const std::string& heading : headings) {
-            const Value* value = instance.property(heading);
-            row.push_back(value && !value->null ? visible_text(worded_text(class_words.of(heading), *value))
-                                                : "");
-        }
-    }
-    std::size_t total = 2 * (headings.size() - 1);
-    for (std::size_t column : widths_of(headings, rows))
-        total += column;
-    return width && total > width ? as_blocks(instances, words) : rows_as_table(headings, rows);
+    const Instances_Table table(instances, columns, width, words);
+    std::string text = table.head();
+    for (const Instance_Value& instance : instances)
+        text += (&instance == &instances.front() ? "" : table.between()) + table.row(instance);
+    return text;
 }
 
 } // namespace KPRV::kldrcim

@@ -25,6 +25,8 @@ std::unique_ptr<Connection> open_module(const Cli_Options& options, std::string&
     Host_Options host_options;
     host_options.user = options.user;
     host_options.name_space = options.name_space;
+    // A large answer should not be outweighed by what remembers its objects.
+    host_options.most_shells = 1 << 14;
     std::unique_ptr<Host> host =
         Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
     if (!host) {

@@ -56,11 +56,14 @@ std::string characteristics_of(const Instance_Value& test)
 
 int list(const Cli_Options& options, Connection& connection)
 {
-    const Result tests = connection.enumerate_instances(test_class, options.properties);
+    Result tests = connection.enumerate_instances(test_class, options.properties);
     if (!tests.ok())
         return complain_of(tests);
     if (options.format != Cli_Options::Format::TABLE || options.properties) {
-        write_instances(options, tests.instances);
+        const auto writer = make_writer(options);
+        for (Instance_Value& test : tests.instances)
+            writer->instance(std::move(test));
+        writer->end(true);
         return 0;
     }
     std::vector<std::vector<std::string>> rows;

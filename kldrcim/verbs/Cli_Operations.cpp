@@ -1,5 +1,6 @@
 #include "kldrcim/verbs/Cli_Operations.h"
 
+#include "kldrcim/formats/Output.h"
 #include "kldrcim/input/Typed_Input.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
@@ -24,9 +25,15 @@ public:
         request.operation = find_verb(options_.verb)->operation;
         if (!read_request(request))
             return complain(error_, USAGE_ERROR);
-        Result result = connection_.run(request);
-        if (!result.ok())
-            return complain(status_text(request, result), 1);
+        const auto writer = answers_with_many(request.operation) ? make_writer(options_) : nullptr;
+        const Result result = connection_.run(request, writer.get());
+        // What came before a failure is worth reading; that it is not all is told behind it.
+        if (writer)
+            writer->end(result.ok());
+        if (!result.ok()) {
+            flush_output();
+            return complain(status_text(request, result), FAILURE);
+        }
         write(request, result);
         warn_of(result.failures);
         return 0;
@@ -128,25 +135,29 @@ private:
         return named ? named_association(request) : request.path.class_name;
     }
 
+    static bool answers_with_many(Operation operation)
+    {
+        return is_association_operation(operation) || operation == Operation::ENUMERATE_INSTANCES ||
+               operation == Operation::ENUMERATE_INSTANCE_NAMES;
+    }
+
     void write(const Request& request, const Result& result) const
     {
-        switch (request.operation) {
-        case Operation::ENUMERATE_INSTANCES:
-        case Operation::ASSOCIATORS:
-        case Operation::REFERENCES:
-            return write_instances(options_, result.instances);
-        case Operation::GET_INSTANCE:
-            return write_instance(options_, result.instances);
-        case Operation::INVOKE_METHOD:
-            return write_method(options_, request, result);
-        case Operation::ENUMERATE_INSTANCE_NAMES:
-        case Operation::CREATE_INSTANCE:
-        case Operation::ASSOCIATOR_NAMES:
-        case Operation::REFERENCE_NAMES:
-            return write_paths(options_, result.paths);
-        default:
-            return;
-        }
+        if (request.operation == Operation::GET_INSTANCE)
+            write_instance(options_, result.instances);
+        else if (request.operation == Operation::INVOKE_METHOD)
+            write_method(options_, request, result);
+        else if (request.operation == Operation::CREATE_INSTANCE)
+            write_paths(result.paths);
+    }
+
+    /// Of what was created.
+    void write_paths(const std::vector<Path_Value>& paths) const
+    {
+        const auto writer = make_writer(options_);
+        for (const Path_Value& path : paths)
+            writer->path(Path_Value(path));
+        writer->end(true);
     }
 
     const Cli_Options& options_;

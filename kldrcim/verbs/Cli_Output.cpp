@@ -19,20 +19,17 @@ Words words_of(const Cli_Options& options)
 
 } // namespace
 
-void write_instances(const Cli_Options& options, const std::vector<Instance_Value>& instances)
+std::unique_ptr<Result_Writer> make_writer(const Cli_Options& options)
 {
-    if (options.format == Format::TABLE)
-        return put(instances_as_table(instances, options.properties ? &*options.properties : nullptr,
-                                      terminal_width(), words_of(options)));
-    if (options.format == Format::MOF) {
-        for (const Instance_Value& instance : instances)
-            put(mof_instance(instance));
-        return;
+    switch (options.format) {
+    case Format::JSON:
+        return json_writer(words_of(options));
+    case Format::MOF:
+        return mof_writer();
+    default:
+        return table_writer(options.properties ? &*options.properties : nullptr, terminal_width(),
+                            words_of(options));
     }
-    std::vector<std::string> elements;
-    for (const Instance_Value& instance : instances)
-        elements.push_back(json_instance(instance, 2, words_of(options)));
-    put(json_array(elements) + "\n");
 }
 
 void write_instance(const Cli_Options& options, const std::vector<Instance_Value>& instances)
@@ -47,19 +44,6 @@ void write_instance(const Cli_Options& options, const std::vector<Instance_Value
         put(path_text(instances.front().path) + "\n" +
             values_as_block(instances.front().properties,
                             Class_Words(instances.front().path.class_name, words_of(options))));
-}
-
-void write_paths(const Cli_Options& options, const std::vector<Path_Value>& paths)
-{
-    std::vector<std::string> elements;
-    for (const Path_Value& path : paths) {
-        if (options.format == Format::JSON)
-            elements.push_back(json_string(path_text(path)));
-        else
-            put(path_text(path) + "\n");
-    }
-    if (options.format == Format::JSON)
-        put(json_array(elements) + "\n");
 }
 
 void write_method(const Cli_Options& options, const Request& request, const Result& result)

@@ -1,7 +1,10 @@
 // TOY_Many: as many instances as the environment variable TOY_MANY says, none of which exists before it is
-// returned. With TOY_MANY_FAILS the enumeration fails behind the last.
+// returned. With TOY_MANY_FAILS the enumeration fails behind the last; in the middle it waits for a writer of
+// the FIFO that TOY_MANY_WAITS names. The 2000th is wider than others, and of the 3000th on there is more to
+// tell.
 #include "tests/broker/toy.h"
 
+#include <cstdio>
 #include <cstdlib>
 
 namespace toy {
@@ -21,6 +24,15 @@ CMPIObjectPath* many_path(CMPIUint32 id)
     return path;
 }
 
+void wait_in_the_middle(CMPIUint32 id)
+{
+    const char* fifo = std::getenv("TOY_MANY_WAITS");
+    if (!fifo || id != wanted() / 2)
+        return;
+    if (std::FILE* file = std::fopen(fifo, "r"))
+        std::fclose(file);
+}
+
 CMPIStatus finish(const CMPIResult* result)
 {
     return std::getenv("TOY_MANY_FAILS")
@@ -33,6 +45,7 @@ CMPIStatus return_paths(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* r
     for (CMPIUint32 id = 1; id <= wanted(); ++id) {
         CMPIObjectPath* path = many_path(id);
         CMReturnObjectPath(result, path);
+        wait_in_the_middle(id);
         CMRelease(path);
     }
     return finish(result);
@@ -46,9 +59,12 @@ CMPIStatus return_instances(CMPIInstanceMI*, const CMPIContext*, const CMPIResul
         CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
         CMSetProperty(instance, "Id", &id, CMPI_uint32);
         CMSetProperty(instance, "Text", id == 2000 ? "wider than all before" : "as all", CMPI_chars);
+        if (id >= 3000)
+            CMSetProperty(instance, "Late", "now", CMPI_chars);
         const CMPIStatus status = CMReturnInstance(result, instance);
         CMRelease(instance);
         CMRelease(path);
+        wait_in_the_middle(id);
         if (status.rc != CMPI_RC_OK)
             return status;
     }

@@ -6,10 +6,10 @@
 namespace KPRV::broker {
 
 /// Somebody who carries out CIM operations, each of which is one request.
-class Operations
+class Cim_Operations
 {
 public:
-    virtual ~Operations() = default;
+    virtual ~Cim_Operations() = default;
 
     /// One operation. With a receiver, instances and paths go there as they come, and are not in the result.
     virtual Result run(Request request, Receiver* receiver = nullptr) = 0;
