@@ -1,3 +1,4 @@
+// The function table of `CMPIArgs`: the arguments of a method call.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

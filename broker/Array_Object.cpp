@@ -1,3 +1,4 @@
+// The function table of `CMPIArray`: of fixed size and one type, as it was made.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
 

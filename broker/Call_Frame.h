@@ -8,6 +8,14 @@ namespace KPRV::broker {
 
 /// What a thread owes to one MI entry (or to one attachment): the objects made meanwhile, which end with it.
 /// Frames of a thread stack up when an up-call comes back into the module. Used by its own thread only.
+///
+/// How it works. A server calls an entry of a provider, and whatever the provider makes through the broker
+/// until it returns is the server's to free then. The frame stands on the stack of the call: its constructor
+/// makes it the thread's innermost, `make_object` records each object on that one, and its destructor retires
+/// what is still recorded and puts the outer frame back. A clone is recorded nowhere: it is the provider's to
+/// release. `CMRelease` takes an object off its frame, if the frame is on the caller's thread. Retired is not
+/// freed: the object stays with a mark, so that a use after the call is a line in `Violations`. A thread that
+/// is attached has a frame from attachment to detachment.
 class Call_Frame
 {
 public:

@@ -1,3 +1,4 @@
+// The function table of `CMPIContext`: what a server tells a provider beside the request.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

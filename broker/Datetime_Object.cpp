@@ -1,3 +1,4 @@
+// The function table of `CMPIDateTime`: a moment or an interval.
 #include "broker/Convert.h"
 #include "broker/values/Datetime_Text.h"
 

@@ -1,3 +1,4 @@
+// The function table of `CMPIEnumeration`: what an up-call found, read once from front to back.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

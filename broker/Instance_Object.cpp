@@ -1,3 +1,4 @@
+// The function table of `CMPIInstance`, and how the class that it knows shapes what is set.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
 

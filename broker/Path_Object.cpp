@@ -1,3 +1,4 @@
+// The function table of `CMPIObjectPath`, and what servers make of the keys that are added.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
 #include "broker/values/Value_Text.h"

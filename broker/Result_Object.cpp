@@ -1,3 +1,4 @@
+// The function table of `CMPIResult`: takes what a provider returns, if the operation may return it.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

@@ -1,3 +1,4 @@
+// The function table of `CMPISelectExp`: a filter that gives its text and understands none of it.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

@@ -1,3 +1,4 @@
+// The function table of `CMPIString`.
 #include "broker/Convert.h"
 
 namespace KPRV::broker {

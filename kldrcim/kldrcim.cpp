@@ -1,3 +1,4 @@
+// The program: `main`, and nothing that a test would want to call.
 #include "kldrcim/Cli.h"
 #include "kldrcim/formats/Output.h"
 

@@ -1,3 +1,4 @@
+// Behaviours of adapters: their addresses, ids, data, flash and state.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 #include "simulator/State_Events.h"

@@ -1,3 +1,4 @@
+// The behaviour of a firmware update: an image is read, refused or taken.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 #include "simulator/State_Events.h"

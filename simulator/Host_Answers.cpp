@@ -1,3 +1,4 @@
+// Behaviours of the host as a whole: its adapters in one answer, global data, time, the driver's log.
 #include "simulator/Answers.h"
 #include "simulator/Behaviours.h"
 

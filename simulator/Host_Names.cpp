@@ -1,3 +1,4 @@
+// Keeps whoever opens this library from waiting for a name server.
 #include <nss.h>
 
 namespace KPRV::simulator {

@@ -1,3 +1,5 @@
+// Behaviours of the library itself: start, end, version, events, what is accepted and what is not
+// supported.
 #include "simulator/Answers.h"
 #include "simulator/Behaviours.h"
 

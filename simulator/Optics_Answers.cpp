@@ -1,3 +1,4 @@
+// Behaviours of what is plugged into a port: who made it, what it measures.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 

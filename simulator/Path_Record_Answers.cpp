@@ -1,3 +1,4 @@
+// Behaviours of what is set for paths behind a port: LUN masks and advanced I/O profiles.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 #include "simulator/Target.h"

@@ -1,3 +1,4 @@
+// Behaviours of physical ports, FC and Ethernet: addresses, data, state, what can be set.
 #include "simulator/Behaviours.h"
 #include "simulator/Inventory_Members.h"
 #include "simulator/Lookup.h"

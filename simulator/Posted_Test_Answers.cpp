@@ -1,3 +1,4 @@
+// Behaviours of hardware tests: posted, started, cancelled, asked after.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 #include "simulator/Target.h"

@@ -1,3 +1,4 @@
+// Behaviours of what a port sees: remote ports, and their LUNs.
 #include "simulator/Behaviours.h"
 #include "simulator/Target.h"
 

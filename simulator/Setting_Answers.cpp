@@ -1,3 +1,4 @@
+// Behaviours of settings that are kept and read back: aliases, modes, trunking, authentication.
 #include "simulator/Answers.h"
 #include "simulator/Behaviours.h"
 #include "simulator/State_Events.h"

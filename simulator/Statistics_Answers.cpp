@@ -1,3 +1,4 @@
+// Behaviours of counters: read, and set back.
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"
 

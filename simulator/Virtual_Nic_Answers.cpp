@@ -1,3 +1,4 @@
+// Behaviours of the functions that an Ethernet port is split into.
 #include "simulator/Address.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"

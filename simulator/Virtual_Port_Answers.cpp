@@ -1,3 +1,4 @@
+// Behaviours of virtual FC ports: made, read, removed.
 #include "simulator/Address.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Lookup.h"

@@ -1,15 +1,18 @@
 #!/usr/bin/env python3
 """Draws who includes, links and opens whom: folders.py LINKS, the list of what the build links, writes a drawing to standard output.
+With --tables it writes the linter's table into the tables of README.md and CONTRIBUTING.md.
 
 What is included comes from the linter's table, what is linked from the build. An arrow is left out where a way of other arrows leads
 there as well. Graphviz finds the places; colours and words are ours."""
 
 import html
+import re
 import subprocess
 import sys
 from pathlib import Path
 
-from lint import ALLOWED, folder_of
+from lint import ALLOWED, ROOT, folder_of
+from tables import aligned_page, cells_of
 
 # Who opens whom at run time; the simulator stands where the adapter library is.
 OPENED = {"broker": "module/exports", "module/adapter": "simulator"}
@@ -20,6 +23,26 @@ WORKSHOP = {"tests", "tools"}
 KINDS = {"includes": "#4a5a6a", "linked": "#b3541e", "opened": "#2f7d4f"}
 LEGEND = {"includes": "includes", "linked": "generated or linked, not included", "opened": "opened at run time"}
 COLOURS = {"module": "#e8eef6", "kldrcim": "#f5eee2", "contracts": "#eeeeee", "broker": "#f5eee2", "simulator": "#e9f3ea"}
+
+
+def may_include(folder):
+    """A row of the linter's table as the pages have it: folders of the module by their last name."""
+    names = [name.removeprefix("module/") if folder.startswith("module/") else name for name in ALLOWED[folder].split()]
+    return "all" if names == ["*"] else " ".join(f"`{name}`" for name in names) or "nothing"
+
+
+def with_table(page):
+    """The page with its table of folders as the linter has it. What a folder holds is for a person to write."""
+    lines = page.split("\n")
+    begin = next(at for at, line in enumerate(lines) if re.match(r"\| folder +\|( holds +\|)? may include +\|", line))
+    end = next(at for at in range(begin, len(lines)) if not lines[at].startswith("|"))
+    rows = {cells[0].strip("`/"): cells for cells in map(cells_of, lines[begin + 2:end])}
+    shows_all = len(cells_of(lines[begin])) == 2
+    made = []
+    for folder in ALLOWED if shows_all else [each for each in reversed(ALLOWED) if each not in WORKSHOP]:
+        holds = [] if shows_all else [rows.get(folder, ["", ""])[1]]
+        made.append(f"| {' | '.join([f'`{folder}/`', *holds, may_include(folder)])} |")
+    return aligned_page("\n".join(lines[:begin + 2] + made + lines[end:]))
 
 
 def included():
@@ -125,6 +148,10 @@ def svg(arrows):
 
 
 def main():
+    if sys.argv[1] == "--tables":
+        for page in map(ROOT.joinpath, ("README.md", "CONTRIBUTING.md")):
+            page.write_text(with_table(page.read_text(encoding="utf-8")), encoding="utf-8")
+        return
     sys.stdout.write(svg(drawn(Path(sys.argv[1]).read_text(encoding="utf-8").splitlines())))
 
 

@@ -1,6 +1,7 @@
 #!/usr/bin/env python3
 """House rules that a machine can check: include arrows, file sizes, mirrored tests, known traps."""
 
+import itertools
 import os
 import re
 import sys
@@ -34,6 +35,7 @@ ALLOWED = {
     "kldrcim/connection": "broker/values",
     "kldrcim/local":      "broker/values broker kldrcim/input kldrcim/connection <json>",
     "kldrcim/walks":      "broker/values kldrcim/input kldrcim/connection contracts/agent",
+    "kldrcim/wire":       "broker/values",
     "kldrcim/formats":    "broker/values kldrcim/walks <json>",
     "kldrcim/verbs":      "broker/values kldrcim/input kldrcim/connection kldrcim/walks kldrcim/formats module/runtime",
     "kldrcim":            "kldrcim/connection kldrcim/local kldrcim/input kldrcim/formats kldrcim/verbs",
@@ -125,6 +127,17 @@ def check_mutexes(path, lines, complain):
             complain(path, number, f"{match.group(1)} guards nothing: GUARDED_BY or REQUIRES is missing")
 
 
+def check_head(path, lines, complain):
+    """A source without a header of its own says first what of whom stands in it. A provider's class says so, and tests are named
+    after what they test."""
+    if path.suffix == ".h" or path.parts[0] == "tests" or (ROOT / path.with_suffix(".h")).exists() or \
+            path.match("module/providers/*_Provider.cpp"):
+        return
+    head = " ".join(itertools.takewhile(lambda line: line.startswith("// "), lines))
+    if not re.search(r"\w{2}.*[.:]( |$)", head):
+        complain(path, 1, "has no header: which sentence says what of whom stands here?")
+
+
 def main():
     failures = []
 
@@ -143,6 +156,7 @@ def main():
             check_arrows(path, lines, complain)
             check_traps(path, lines, complain)
             check_mutexes(path, lines, complain)
+            check_head(path, lines, complain)
 
     for failure in failures:
         print(failure)

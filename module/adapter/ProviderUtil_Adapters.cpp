@@ -1,3 +1,4 @@
+// Of `ProviderUtil`, what asks the library for its adapters: which there are, and what one is.
 #include "module/adapter/Adapter_List.h"
 #include "module/adapter/Ethernet_Port_Query.h"
 #include "module/adapter/Guarded_Call.h"

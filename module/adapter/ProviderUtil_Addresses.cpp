@@ -1,3 +1,4 @@
+// Of `ProviderUtil`, the forms of WWNs and MACs: with colons and without, as bytes, in a tag.
 #include "module/adapter/No_Address.h"
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/ProviderUtil_Log.h"

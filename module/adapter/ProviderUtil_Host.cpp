@@ -1,3 +1,4 @@
+// Of `ProviderUtil`, the name and the address of the machine, from the C library's resolver.
 #include "module/adapter/Host_Calls.h"
 #include "module/adapter/Host_Name.h"
 #include "module/adapter/ProviderUtil.h"

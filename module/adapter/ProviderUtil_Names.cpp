@@ -1,3 +1,4 @@
+// Of `ProviderUtil`, the names of classes, records and tests, as tables by their ids.
 #include "module/adapter/Class_Names.h"
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/ProviderUtil_Log.h"

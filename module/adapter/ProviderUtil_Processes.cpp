@@ -1,3 +1,4 @@
+// Of `ProviderUtil`, what is asked of the system: is the agent running, fetch a file, is there a file.
 #include "module/adapter/Child_Program.h"
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/ProviderUtil_Log.h"

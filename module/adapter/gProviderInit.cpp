@@ -1,3 +1,5 @@
+// The object whose constructor opens and starts the adapter library, and whose destructor frees it; linked
+// last.
 #include "module/adapter/ProviderInit.h"
 
 namespace KPRV {

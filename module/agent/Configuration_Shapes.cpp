@@ -1,3 +1,4 @@
+// Of `Method_Shapes`, those of methods that change settings.
 #include "module/agent/Method_Shapes.h"
 
 #include "contracts/adapter/HbaAgentError.h"

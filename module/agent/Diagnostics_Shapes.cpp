@@ -1,3 +1,4 @@
+// Of `Method_Shapes`, those of methods that test.
 #include "module/agent/Method_Shapes.h"
 
 #include "module/adapter/Json_Access.h"

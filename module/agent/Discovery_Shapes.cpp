@@ -1,3 +1,5 @@
+// Of `Method_Shapes`, those of methods that put an answer together of many: the host, its adapters, their
+// ports.
 #include "module/agent/Method_Shapes.h"
 
 #include "module/adapter/Json_Access.h"

@@ -1,3 +1,5 @@
+// Of `ProviderDiscoveryMethods`, what a hypervisor's own provider tells of manufacturer and model, asked
+// by an up-call.
 #include "module/agent/ProviderDiscoveryMethods.h"
 
 #include "module/runtime/cimom.h"

@@ -12,6 +12,17 @@ namespace KPRV {
 
 /// The subscription to the adapter library's events, and the queue of finished alerts between the library's
 /// threads, which fill it, and the delivery thread, which empties it.
+///
+/// How it works. The library calls `providerHandleEvent` on a thread of its own, many at once. The event is
+/// read, its category says which alerts it gives, and each is built outside the lock; only the sequence
+/// number and the place in the queue are given under it, so that numbers stand in the queue in their order.
+/// The delivery thread looks fifty times a second: at a counter first, which costs no lock while nothing has
+/// come. What it takes it hands on as a clone, and the alert itself stays allocated, as the server may keep
+/// what it was given.
+///
+/// The two never wait for each other's work: building asks the library, delivering waits for the server, and
+/// neither happens under the queue's lock. The queue has no bound; what was queued before a subscription
+/// ended is delivered in the next one.
 class IndicationHelper
 {
 public:

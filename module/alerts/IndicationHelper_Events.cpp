@@ -1,3 +1,4 @@
+// Of `IndicationHelper`, the way of one event: read, matched with its category, filled with texts, queued.
 #include "module/alerts/Alert_Building.h"
 #include "module/alerts/Event_Categories.h"
 #include "module/alerts/IndicationHelper.h"

@@ -1,3 +1,4 @@
+// The objects of alerts that live as long as the module, and their place among its statics.
 #include "module/alerts/IndicationHelper.h"
 #include "module/alerts/IndicationManager.h"
 

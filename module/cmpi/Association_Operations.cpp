@@ -1,3 +1,4 @@
+// The entries of the association table: who is joined to an object, and by what.
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/Operation_Scope.h"
 #include "module/cmpi/association_handlers.h"

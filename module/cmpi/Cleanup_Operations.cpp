@@ -1,3 +1,4 @@
+// The four entries by which a server takes its leave of a provider.
 #include "module/cmpi/CMPI_Adapter.h"
 #include "module/cmpi/CMPI_Thread_Context.h"
 #include "module/cmpi/entries.h"

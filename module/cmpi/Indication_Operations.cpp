@@ -1,3 +1,4 @@
+// The entries of the indication table, and what the provider's thread calls with each indication.
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/Made_Objects.h"
 #include "module/cmpi/Operation_Scope.h"

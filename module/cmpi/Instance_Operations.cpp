@@ -1,3 +1,4 @@
+// The entries of the instance table: enumerate, get, create, modify, delete.
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/Operation_Scope.h"
 #include "module/cmpi/Shared_Ends.h"

@@ -1,3 +1,4 @@
+// The entry of the method table: arguments become an invocation record, and come back from it.
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/Operation_Scope.h"
 #include "module/cmpi/cmpi_text.h"

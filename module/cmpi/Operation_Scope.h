@@ -9,6 +9,12 @@ namespace KPRV {
 /// The frame of an operation: the thread's context is pushed, then the provider is locked, then the entry is
 /// traced; the end of the scope unlocks and pops, also when an exception passes. What an operation creates
 /// is declared behind its scope and so released before the lock.
+///
+/// How it works. Its members are the frame, in the order in which C++ makes them and backwards ends them. The
+/// context comes first: up-calls of the operation find broker and context on top of their thread's stack.
+/// Then the provider's mutex, recursive, since an up-call may come back into the same provider on the same
+/// thread. It is held until the entry returns, so that one provider runs one operation at a time. Exceptions
+/// pass through and unwind it; so does a thread that is cancelled.
 class SCOPED_CAPABILITY Operation_Scope
 {
 public:

@@ -10,6 +10,13 @@ namespace KPRV {
 /// The object paths that the ends of associations became, for the length of one request. Of thousands of
 /// associations most share an end with the one before, and the server keeps each path that is made until the
 /// request ends; what is set into an instance or a path is copied.
+///
+/// How it works. For each role the last end is kept with its path: lists are joined as nested loops, so that
+/// the outer end stays the same for many associations, and the inner one changes each time and costs one
+/// look. An end is the same if it is the same instance, by its address. The entry holds a count of it: let
+/// go, its memory could become another end, whose path would be the former's. A role is known by the address
+/// of its name in the metadata. Three roles have room, as many as an association of the catalogue has ends.
+/// The handler of a request owns one of these, and no other thread sees it.
 class Shared_Ends
 {
 public:

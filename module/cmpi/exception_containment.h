@@ -6,6 +6,13 @@
 // What stands between a server and the entries of the module, chosen by the CMake option
 // KLDR_CONTAIN_EXCEPTIONS: nothing, so that an exception goes on into the server, or a catch around each
 // entry.
+//
+// How it works. Both forms are compiled from one source, and the module is linked with one. The containing
+// form walks the tables of a provider after they were filled, and puts in the place of each entry a function
+// that a template makes for its type: it calls the entry, of a table that all providers share, inside a
+// `try`. What is caught becomes a status; its text is made on the stack, since memory may be what ran out. A
+// thread that ends or is cancelled unwinds by an exception that must not be caught for good: it is told apart
+// by the standard's own means and goes on. Factories have no table: `create_mi` is their frame.
 
 namespace KPRV {
 

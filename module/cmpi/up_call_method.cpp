@@ -1,11 +1,10 @@
+// Of `CMPI_Thread_Context`, the up-call of a method, which converts in both directions.
 #include "module/cmpi/CMPI_Containers.h"
 #include "module/cmpi/CMPI_Thread_Context.h"
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/cmpi_text.h"
 #include "module/cmpi/to_cimple_value.h"
 #include "module/runtime/log.h"
-
-// The up-call of a method, apart from the plain up-calls: it converts in both directions.
 
 namespace KPRV {
 

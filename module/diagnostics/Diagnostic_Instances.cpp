@@ -1,3 +1,4 @@
+// Of `DiagnosticHelper`, what builds one instance: a test, a job, a record, the tests' software.
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/model/Instance_Building.h"
 #include "module/runtime/Ref.h"

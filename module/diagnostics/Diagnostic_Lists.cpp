@@ -1,3 +1,4 @@
+// Of `DiagnosticHelper`, what publishes the jobs and records of all runs, and the associations among them.
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/model/Fresh_Instances.h"
 #include "module/runtime/Ref.h"

@@ -1,3 +1,5 @@
+// Of `DiagnosticHelper`, what the thread of a run does: ask the library, wait, write records, finish the
+// job.
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/diagnostics/Element_State.h"
 #include "module/diagnostics/Record_Texts.h"

@@ -1,3 +1,4 @@
+// Of `DiagnosticHelper`, the checks before a run, its job, and the start of its thread.
 #include "module/diagnostics/DiagnosticHelper.h"
 
 #include "module/adapter/Json_Access.h"

@@ -1,3 +1,4 @@
+// The one symbol by which a server that knows the module finds its list of providers.
 #include "module/runtime/Registration.h"
 
 namespace KPRV {

@@ -1,3 +1,5 @@
+// Of `ServerManager`, what describes the server: its object manager, namespaces, protocol, our software,
+// the agent's service.
 #include "module/managers/ServerManager.h"
 #include "module/model/Instance_Building.h"
 #include "module/runtime/Ref.h"

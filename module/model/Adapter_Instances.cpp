@@ -1,3 +1,4 @@
+// Of `AdapterHelper`, the instances of one adapter: controller, card, product, software.
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/AdapterHelper.h"
 #include "module/model/Instance_Building.h"

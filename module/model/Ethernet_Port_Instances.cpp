@@ -1,3 +1,4 @@
+// Of `EthernetPortHelper`, the instances of one Ethernet port: the port, its LAN endpoint.
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/EthernetPortHelper.h"
 #include "module/model/Instance_Building.h"

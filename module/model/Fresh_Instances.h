@@ -10,6 +10,12 @@ namespace KPRV {
 
 /// Instances on their way to a caller. It owns them until `release`, so that nothing is lost when an
 /// exception of the library passes.
+///
+/// How it works. A helper walks the library and builds an instance for each thing it finds; the next question
+/// to the library may throw, and so may the memory for the next place. An instance is therefore owned at each
+/// moment by one: by the builder's `Ref`, by this list from `append` on, by the caller from `release` on.
+/// `append` holds it while it makes room, and lets go when the place is taken. `release` copies the pointers
+/// into an array first, which may throw, and forgets its own afterwards, which may not.
 class Fresh_Instances
 {
 public:

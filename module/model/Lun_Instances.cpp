@@ -1,3 +1,4 @@
+// Of `TargetHelper`, the instances of one logical unit: extent, tape drive, disk, the path to it.
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/Instance_Building.h"
 #include "module/model/Record_Filling.h"

@@ -1,3 +1,4 @@
+// Of `PortHelper`, the beacon of a port: on, off, and what the library says to it.
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/ProviderUtil.h"

@@ -1,3 +1,4 @@
+// Of `PortHelper`, the instances of one FC port: port, statistics, endpoint, group, beacon.
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/Instance_Building.h"
 #include "module/model/PortHelper.h"

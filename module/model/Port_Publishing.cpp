@@ -1,3 +1,4 @@
+// Of `PortHelper`, what becomes of one port for the class that was asked for.
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/ProviderUtil.h"

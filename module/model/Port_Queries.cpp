@@ -1,3 +1,4 @@
+// Of `PortHelper`, single questions about a port that others ask.
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/ProviderUtil.h"

@@ -17,6 +17,13 @@ inline std::string_view view_of(const String& text)
 
 /// Positions of a list by a text of its elements, whatever its case: a join looks its partners up instead of
 /// walking the list for each element of the other one. The texts stay where they are, and outlive the index.
+///
+/// How it works. Nested loops would compare each element of one list with each of the other. Here the inner
+/// list is walked once: each text is folded to a number and its position noted under it. The outer list is
+/// then walked in its order, and for each element the positions come in the inner list's order, which gives
+/// the very pairs of the loops in the very order. Texts are equal whatever their case; the hash sets the bit
+/// that tells cases apart in every byte, so that equal texts always meet, and `Equal` parts those that meet
+/// by chance. Elements of one text mostly follow each other: the last place is remembered.
 class Position_Index
 {
 public:

@@ -4,6 +4,18 @@
 
 #include <algorithm>
 
+// How it works. The metadata of a class lists its features; where a feature's value lies stands in the
+// feature's own record. A walk by it would read three places for each cell: list, record, instance. The plan
+// of a class puts what walks need side by side, in three groups: all cells, the keys, and those behind which
+// memory stands.
+//
+// A plan is made when it is first asked for, under a mutex, out of zeroed pages of the module, and never
+// given back. It enters a table by the address of its class with one release store; who looks it up follows
+// open addressing with acquire loads, and takes no lock. Two threads that miss at once meet at the mutex, and
+// the second finds the first one's plan. A class that is counted may go while others take its address, so
+// that it gets none; nor does any class when the pages are used up. `visit_cells` then makes each cell from
+// its feature on the way, and nobody sees a difference.
+
 namespace KPRV {
 
 enum class Cell_Kind : uint8

@@ -1,3 +1,4 @@
+// Of `Instance`, whether two name the same object, and whether two are the same in all that they hold.
 #include "module/runtime/Instance.h"
 
 #include "module/runtime/Class_Plan.h"

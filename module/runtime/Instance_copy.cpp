@@ -1,3 +1,4 @@
+// Of `Instance`, the ways to a copy: whole, by keys, into another one.
 #include "module/runtime/Instance.h"
 
 #include "module/runtime/empty_arrays.h"

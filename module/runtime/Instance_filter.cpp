@@ -1,3 +1,4 @@
+// Of `Instance`, what hides properties that nobody asked for.
 #include "module/runtime/Instance.h"
 
 #include "module/runtime/Class_Plan.h"

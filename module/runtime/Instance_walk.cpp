@@ -1,3 +1,11 @@
+// Of `Instance`, the walks over an instance and all that it refers to.
+//
+// How it works. An instance is one block whose class is data: a walk asks the class's plan for the cells and
+// finds each at its distance from the block's beginning. What is done with every instance, to make it, to
+// copy it, to let it go, is a `visit_cells` with a group of cells and what is to be done with one; what
+// compares instances of two classes goes by the features. None of them looks behind a reference. Those here
+// do: depth first and in the order of the features, and as often as an instance is referred to.
+// `__create_refs` makes what the others walk: behind each reference an instance that has its defaults.
 #include "module/runtime/Instance.h"
 
 #include "module/runtime/Class_Plan.h"

@@ -1,3 +1,4 @@
+// Of `Model_Path`, from text to the instance that has its keys.
 #include "module/runtime/Model_Path.h"
 
 #include "module/runtime/Ref.h"

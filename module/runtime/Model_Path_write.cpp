@@ -1,3 +1,4 @@
+// Of `Model_Path`, from an instance to the text of its keys.
 #include "module/runtime/Model_Path.h"
 
 #include "module/runtime/features.h"

@@ -1,3 +1,4 @@
+// Of `Value`, its dump for debugging.
 #include "module/runtime/Value.h"
 
 #include "module/runtime/print_instance.h"

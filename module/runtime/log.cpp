@@ -16,6 +16,17 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+// How it works. A line is written if the user's file asks for its level. Until the log is open each call
+// looks for that file, since it may be put in place while the server runs; from then on the threshold, an
+// atomic, drops what is too talkative before any lock is taken. What is to be written takes the mutex among
+// the threads, then the lock file among the processes that share the log, and appends the whole line before
+// either is let go.
+//
+// It must not fail whoever calls it: destructors log, and so does code that has just run out of memory. So
+// nothing throws out of it; a line for which there is no memory is put together on the stack and cut; a
+// thread that is cancelled is not unwound while it holds the mutex. Nothing inside calls the server, which
+// may be what the line is about.
+
 namespace KPRV {
 
 const char* const _log_level_strings[5] = {"FATAL", "ERR", "WARN", "INFO", "DBG"};

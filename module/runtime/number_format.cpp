@@ -1,3 +1,4 @@
+// Of `number_text`, from number to text.
 #include "module/runtime/number_text.h"
 
 #include <array>

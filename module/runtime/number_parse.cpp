@@ -1,3 +1,4 @@
+// Of `number_text`, from text to number.
 #include "module/runtime/number_text.h"
 #include "module/runtime/strutil.h"
 

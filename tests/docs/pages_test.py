@@ -171,6 +171,21 @@ class Failure(unittest.TestCase):
                     self.assertRegex(throws + below.get(folder, ""), rf"\b{name}\b", folder)
 
 
+class Traps(unittest.TestCase):
+    """The traps of CONTRIBUTING.md against `traps_page.cpp`, which is compiled."""
+
+    def test_what_the_page_calls_right_is_code(self):
+        code = {line.strip() for line in read(ROOT / "tests/docs/traps_page.cpp").splitlines()}
+        traps = read(ROOT / "CONTRIBUTING.md").split("## Traps\n")[1].split("\n## ")[0]
+        numbers = re.findall(r"^(\d+)\. ", traps, re.M)
+        examples = re.findall(r"```cpp\n +// wrong\n(.*?) +// right\n(.*?) +```", traps, re.S)
+        self.assertEqual(numbers, [str(number + 1) for number in range(len(examples))])
+        for wrong, right in examples:
+            self.assertTrue(0 < wrong.count("\n") <= 3 and 0 < right.count("\n") <= 3, right)
+            for line in right.splitlines():
+                self.assertIn(line.strip(), code)
+
+
 class Glossary(unittest.TestCase):
     def test_words_stand_once_and_in_order(self):
         words = [word.lower() for word, _ in rows(ROOT / "docs/glossary.md", "word", "means")]

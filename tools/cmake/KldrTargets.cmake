@@ -7,6 +7,8 @@ option(KLDR_CONTAIN_EXCEPTIONS "answer an exception with a failure, rather than 
 set(KLDR_CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/contracts/cmpi" CACHE PATH
     "folder of cmpidt.h, cmpift.h and cmpimacs.h; a server's own headers may stand in for ours")
 
+option(KLDR_SHARE_RUNS "let files of the module share compiler runs, as those of other targets do" OFF)
+
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)

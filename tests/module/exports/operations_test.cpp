@@ -11,13 +11,13 @@
 namespace KPRV {
 namespace {
 
-class Operations : public Module_Fixture
+class Module_Operations : public Module_Fixture
 {
 protected:
     static broker::Path_Value path_of(const char* class_name) { return {{}, "root/kaldera", class_name, {}}; }
 };
 
-TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
+TEST_F(Module_Operations, AnswerUnsupportedForEveryMethodWithoutABody)
 {
     const std::set<std::string> with_body = {
         "KALDERA_AgentService.executeMethod",
@@ -50,7 +50,7 @@ TEST_F(Operations, AnswerUnsupportedForEveryMethodWithoutABody)
     EXPECT_GT(methods, 100u);
 }
 
-TEST_F(Operations, KnowMethodsWhateverTheirCase)
+TEST_F(Module_Operations, KnowMethodsWhateverTheirCase)
 {
     open("empty.json");
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED,
@@ -59,7 +59,7 @@ TEST_F(Operations, KnowMethodsWhateverTheirCase)
               server->invoke_method(path_of("KALDERA_FCPortStatistics"), "NoSuchMethod", {}).rc);
 }
 
-TEST_F(Operations, DoNotKnowClassesBeyondTheRepository)
+TEST_F(Module_Operations, DoNotKnowClassesBeyondTheRepository)
 {
     open("empty.json");
     // The provider is asked for a class that it has never heard of.
@@ -69,7 +69,7 @@ TEST_F(Operations, DoNotKnowClassesBeyondTheRepository)
     EXPECT_EQ(CMPI_RC_ERR_FAILED, server->run_at("KALDERA_Product", request).rc);
 }
 
-TEST_F(Operations, OfDifferentProvidersRunSideBySide)
+TEST_F(Module_Operations, OfDifferentProvidersRunSideBySide)
 {
     open("one_hba.json");
     simulator.add_fault(R"({"call": "getHbaByWwn", "do": "hold"})");
@@ -85,7 +85,7 @@ TEST_F(Operations, OfDifferentProvidersRunSideBySide)
         client.join();
 }
 
-TEST_F(Operations, OfOneProviderTakeTurns)
+TEST_F(Module_Operations, OfOneProviderTakeTurns)
 {
     open("one_hba.json");
     simulator.add_fault(R"({"call": "getHbaByWwn", "at": 1, "do": "hold"})");
@@ -102,7 +102,7 @@ TEST_F(Operations, OfOneProviderTakeTurns)
     EXPECT_EQ(2u, simulator.requests("getHbaByWwn").size());
 }
 
-TEST_F(Operations, ManyAtOnceAnswerEachAlike)
+TEST_F(Module_Operations, ManyAtOnceAnswerEachAlike)
 {
     open();
     std::vector<std::thread> clients;
@@ -119,7 +119,7 @@ TEST_F(Operations, ManyAtOnceAnswerEachAlike)
         client.join();
 }
 
-TEST_F(Operations, RunOnTheSmallStacksOfARequestThread)
+TEST_F(Module_Operations, RunOnTheSmallStacksOfARequestThread)
 {
     open();
     pthread_attr_t attributes;
@@ -137,7 +137,7 @@ TEST_F(Operations, RunOnTheSmallStacksOfARequestThread)
     pthread_attr_destroy(&attributes);
 }
 
-TEST_F(Operations, ComeAndGoWithTheCountOfTheirInterfaces)
+TEST_F(Module_Operations, ComeAndGoWithTheCountOfTheirInterfaces)
 {
     open("one_hba.json");
     EXPECT_TRUE(server->enumerate_instances("KALDERA_Product").ok());
@@ -148,7 +148,7 @@ TEST_F(Operations, ComeAndGoWithTheCountOfTheirInterfaces)
 }
 
 // A server's request threads may have small stacks, and its clients name what they like.
-TEST_F(Operations, TakeNoReferenceApartThatFitsNowhere)
+TEST_F(Module_Operations, TakeNoReferenceApartThatFitsNowhere)
 {
     open("empty.json");
     broker::Path_Value nested = path_of("KALDERA_FCPortSystemDevice");
