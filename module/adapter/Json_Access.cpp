@@ -127,18 +127,20 @@ void find_members(const Json::Value& object, std::span<const std::string_view> n
     std::fill_n(found, names.size(), nullptr);
     if (!object.isObject())
         return;
-    // An object keeps its members in the same order.
+    // An object keeps its members in the same order. Counted, since comparing iterators is a call, too.
     size_t place = 0;
-    const auto last = object.end();
-    for (auto member = object.begin(); member != last && place < names.size(); ++member) {
+    auto member = object.begin();
+    for (auto count = object.size(); count > 0 && place < names.size(); --count, ++member) {
         const char* name_end = nullptr;
         const char* const name_begin = member.memberName(&name_end);
         const std::string_view name(name_begin, size_t(name_end - name_begin));
-        int order = -1;
-        while (place < names.size() && (order = names[place].compare(name)) < 0)
-            place++;
-        if (order == 0)
-            found[place++] = &*member;
+        if (names[place] != name) {
+            while (place < names.size() && names[place] < name)
+                place++;
+            if (place == names.size() || names[place] != name)
+                continue;
+        }
+        found[place++] = &*member;
     }
 }
 

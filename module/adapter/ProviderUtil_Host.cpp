@@ -3,6 +3,7 @@
 #include "module/adapter/Host_Name.h"
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/ProviderUtil_Log.h"
+#include "module/runtime/Request_Scope.h"
 
 #include <arpa/inet.h>
 
@@ -91,23 +92,45 @@ private:
     std::unique_ptr<char[]> _more;
 };
 
-/// Finds the host's first address that is no loopback address.
-Lookup look_up(const char* host, Out_Text out)
+/// What the system says of the host.
+struct Host_Facts : Request_Scope::Note
 {
-    const Host_Entry answer(host);
-    const hostent* const entry = answer.entry();
-    if (!entry || !entry->h_addr_list || !entry->h_addr_list[0])
-        return Lookup::NONE;
-    for (char** next = entry->h_addr_list; *next; next++) {
-        char text[INET_ADDRSTRLEN];
-        inet_ntop(AF_INET, *next, text, sizeof text);
-        if (strncmp(text, "127", 3) != 0) {
-            out.set(text);
-            return Lookup::FOUND;
+    Host_Facts()
+    {
+        named = ask_name(host_calls.gethostname, host);
+        if (!named)
+            return;
+        look_up();
+        if (lookup != Lookup::LOOPBACK_ONLY)
+            return;
+        still_named = ask_name(host_calls.gethostname, host);
+        in_domain = still_named && ask_name(host_calls.getdomainname, domain);
+    }
+
+    bool named = false;
+    char host[NAME_SIZE] = {};
+    Lookup lookup = Lookup::NONE;
+    char address[INET_ADDRSTRLEN] = {}; ///< The first one that is no loopback address.
+    // Only where there are loopback addresses and no others.
+    bool still_named = false;
+    bool in_domain = false;
+    char domain[NAME_SIZE] = {};
+
+private:
+    void look_up()
+    {
+        const Host_Entry answer(host);
+        const hostent* const entry = answer.entry();
+        if (!entry || !entry->h_addr_list || !entry->h_addr_list[0])
+            return;
+        lookup = Lookup::LOOPBACK_ONLY;
+        for (char** next = entry->h_addr_list; *next && lookup != Lookup::FOUND; next++) {
+            inet_ntop(AF_INET, *next, address, sizeof address);
+            if (strncmp(address, "127", 3) != 0)
+                lookup = Lookup::FOUND;
         }
     }
-    return Lookup::LOOPBACK_ONLY;
-}
+};
 
 /// The code of `getHostInfo`, and what its caller is to tell the log; null for nothing.
 struct Outcome
@@ -116,39 +139,49 @@ struct Outcome
     const char* said;
 };
 
-Outcome ask_for_host(Out_Text out)
+Outcome tell_host(const Host_Facts& facts, Out_Text out)
 {
-    constexpr Outcome named = {2,
-                               "gethostbyname() FAILED. hostString will have hostname instead of ipAddress"};
-    char host[NAME_SIZE] = {};
-    if (!ask_name(host_calls.gethostname, host)) {
+    constexpr Outcome by_name = {
+        2, "gethostbyname() FAILED. hostString will have hostname instead of ipAddress"};
+    if (!facts.named) {
         out.set("localhost");
         return {3, "gethostname() FAILED. hostString will be filled with localhost"};
     }
-    switch (look_up(host, out)) {
+    switch (facts.lookup) {
     case Lookup::NONE:
-        out.set(host);
-        return named;
+        out.set(facts.host);
+        return by_name;
     case Lookup::FOUND:
+        out.set(facts.address);
         return {0, nullptr};
     case Lookup::LOOPBACK_ONLY:
         break;
     }
 
-    if (!ask_name(host_calls.gethostname, host))
+    if (!facts.still_named)
         return {2, "gethostname() failed"};
-    out.set(host);
-    char domain[NAME_SIZE] = {};
-    if (!ask_name(host_calls.getdomainname, domain))
+    out.set(facts.host);
+    if (!facts.in_domain)
         return {2, "getdomainname() failed"};
     // The name with its domain is tested and then dropped: callers have always seen the bare name. The test
     // can only hold where the buffer had no room for the domain.
     out.append(".");
-    out.append(domain);
-    if (strncmp(out.data, "localhost", out.size) == 0 && strcmp(domain, "(none)") == 0)
+    out.append(facts.domain);
+    if (strncmp(out.data, "localhost", out.size) == 0 && strcmp(facts.domain, "(none)") == 0)
         return {4, nullptr};
-    out.set(host);
-    return named;
+    out.set(facts.host);
+    return by_name;
+}
+
+/// Within a request the system is asked once: the resolver reads files and may ask the network.
+Outcome ask_for_host(Out_Text out)
+{
+    Request_Scope* const request = Request_Scope::current();
+    if (!request)
+        return tell_host(Host_Facts(), out);
+    if (!request->host)
+        request->host = std::make_unique<Host_Facts>();
+    return tell_host(static_cast<const Host_Facts&>(*request->host), out);
 }
 
 void tell(const char* said)

@@ -94,8 +94,8 @@ static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* 
     __set_null_flags(model.ptr(), false, true, 1);
 
     enum_instance_names data{scope.broker(), result, name_space_of(cop), CMPI_RC_OK, {}};
-    const int status =
-        scope.adapter()->Provider_Handle::enum_instances(model.ptr(), enum_instance_names::_proc, &data);
+    const int status = scope.adapter()->Provider_Handle::enum_instances(
+        model.ptr(), enum_instance_names::_proc, &data, Wanted::names());
     const CMPIrc rc = translate(Status_Family::ENUM_INSTANCES, status);
     // Unlike the enumeration of instances, this one ends the result only on success itself.
     if (status == ENUM_INSTANCES_OK)

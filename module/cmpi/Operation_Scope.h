@@ -2,6 +2,7 @@
 
 #include "module/cmpi/CMPI_Adapter.h"
 #include "module/cmpi/CMPI_Thread_Context.h"
+#include "module/runtime/Request_Scope.h"
 #include "module/runtime/log.h"
 
 namespace KPRV {
@@ -37,6 +38,7 @@ public:
 private:
     CMPI_Adapter* _adapter;
     const char* _function;
+    Request_Scope _request;
     Context_Scope _context;
     Auto_Mutex _lock;
 };

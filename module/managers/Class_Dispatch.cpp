@@ -6,7 +6,8 @@
 
 namespace KPRV {
 
-Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id)
+Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id,
+                                const Wanted& wanted)
 {
     log(Log_Level::INFO, site.file, site.line, "Requested classId : %d", static_cast<int>(id));
     log(Log_Level::INFO, site.file, site.line, "Requested class is: %s", ProviderUtil::getClassName(id));
@@ -21,7 +22,7 @@ Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows,
             "Driver is not installed or there is a zntl mismatch hence no instances returned");
         return {};
     }
-    return row->source(id);
+    return row->source(id, wanted);
 }
 
 } // namespace KPRV

@@ -3,6 +3,7 @@
 #include "module/adapter/classId_t.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 #include "module/runtime/log.h"
 
 #include <span>
@@ -17,8 +18,8 @@ enum class Needs
     DRIVER,
 };
 
-/// Gives all instances of a class; the caller owns them.
-using Instances_Source = Array<Instance*> (*)(classId_t id);
+/// Gives all instances of a class; the caller owns them. A null stands for one that is not wanted.
+using Instances_Source = Array<Instance*> (*)(classId_t id, const Wanted& wanted);
 
 /// One class that a manager serves.
 struct Class_Row
@@ -30,6 +31,7 @@ struct Class_Row
 
 /// All instances of the class, by the manager's rows; empty for a class without a row. The reason of an empty
 /// result is in the log, as the caller's line.
-Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id);
+Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id,
+                                const Wanted& wanted);
 
 } // namespace KPRV

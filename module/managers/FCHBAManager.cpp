@@ -15,35 +15,35 @@ namespace KPRV {
 
 namespace {
 
-Array<Instance*> by_adapter_helper(classId_t id)
+Array<Instance*> by_adapter_helper(classId_t id, const Wanted& wanted)
 {
-    return AdapterHelper::getAdapterHelperInstance()->getInstancesByClass(id);
+    return AdapterHelper::getAdapterHelperInstance()->getInstancesByClass(id, wanted);
 }
-Array<Instance*> by_common_helper(classId_t id)
+Array<Instance*> by_common_helper(classId_t id, const Wanted& wanted)
 {
-    return CommonHelper::getCommonHelperObject()->getComputerSystemInstances(id);
+    return CommonHelper::getCommonHelperObject()->getComputerSystemInstances(id, wanted);
 }
-Array<Instance*> by_port_helper(classId_t id)
+Array<Instance*> by_port_helper(classId_t id, const Wanted& wanted)
 {
-    return PortHelper::getPortHelperObject()->getInstancesByClass(id);
+    return PortHelper::getPortHelperObject()->getInstancesByClass(id, wanted);
 }
-Array<Instance*> by_access_point_helper(classId_t id)
+Array<Instance*> by_access_point_helper(classId_t id, const Wanted&)
 {
     return AccessPointHelper::getAccessPointHelperInstance()->getInstancesByClass(id);
 }
-Array<Instance*> by_ethernet_port_helper(classId_t id)
+Array<Instance*> by_ethernet_port_helper(classId_t id, const Wanted& wanted)
 {
-    return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(id);
+    return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(id, wanted);
 }
-Array<Instance*> by_diagnostic_helper(classId_t id)
+Array<Instance*> by_diagnostic_helper(classId_t id, const Wanted&)
 {
     return DiagnosticHelper::getDiagnosticHelperObject()->getInstancesByClass(id);
 }
-Array<Instance*> by_physical_asset_helper(classId_t id)
+Array<Instance*> by_physical_asset_helper(classId_t id, const Wanted&)
 {
     return PhysicalAssetHelper::getPhysicalAssetHelperObject()->getInstancesByClass(id);
 }
-Array<Instance*> by_software_update_helper(classId_t id)
+Array<Instance*> by_software_update_helper(classId_t id, const Wanted&)
 {
     return SoftwareUpdateHelper::getSoftwareUpdateHelperInstance()->getInstancesByClass(id);
 }
@@ -102,22 +102,23 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
     return &manager;
 }
 
-Array<Instance*> FCHBAManager::getInstances(classId_t id) const
+Array<Instance*> FCHBAManager::getInstances(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getInstances");
-    return dispatch_class(LOG_HERE, rows, id);
+    return dispatch_class(LOG_HERE, rows, id, wanted);
 }
 
-Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(const String& address) const
+Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(const String& address, const Wanted& wanted) const
 {
     LOG_SCOPE("getFCPortInstancesByAdapter");
-    return PortHelper::getPortHelperObject()->getFCPortInstancesByAdapter(address);
+    return PortHelper::getPortHelperObject()->getFCPortInstancesByAdapter(address, wanted);
 }
 
-Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& mac) const
+Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& mac,
+                                                                 const Wanted& wanted) const
 {
     LOG_SCOPE("getEthernetPortInstancesByAdapter");
-    return EthernetPortHelper::getEthernetPortHelperObject()->getEthernetPortInstancesByAdapter(mac);
+    return EthernetPortHelper::getEthernetPortHelperObject()->getEthernetPortInstancesByAdapter(mac, wanted);
 }
 
 DiagnosticHelper* FCHBAManager::getDiagnosticHelper() const

@@ -4,6 +4,7 @@
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
 #include "module/runtime/String.h"
+#include "module/runtime/Wanted.h"
 
 #include <initializer_list>
 
@@ -19,15 +20,16 @@ public:
     /// Made at first use, gone when the module is unloaded.
     static FCHBAManager* getFCHBAManager();
 
-    /// All instances of the class, each fresh; the caller owns them. Read from the library at each call.
-    Array<Instance*> getInstances(classId_t id) const;
+    /// All instances of the class, each fresh; the caller owns them. Read from the library at each call. A
+    /// null stands for one that is not wanted.
+    Array<Instance*> getInstances(classId_t id, const Wanted& wanted = {}) const;
 
     // Ports of one adapter, asked for without a look at the driver; the caller owns them.
 
     /// The FC ports of the adapter with that address.
-    Array<Instance*> getFCPortInstancesByAdapter(const String& address) const;
+    Array<Instance*> getFCPortInstancesByAdapter(const String& address, const Wanted& wanted = {}) const;
     /// The Ethernet ports of the adapter that the MAC belongs to.
-    Array<Instance*> getEthernetPortInstancesByAdapter(const String& mac) const;
+    Array<Instance*> getEthernetPortInstancesByAdapter(const String& mac, const Wanted& wanted = {}) const;
 
     /// As `PortHelper::setAlarmState`.
     int setAlarmState(const String& port, int state) const;

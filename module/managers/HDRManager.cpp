@@ -7,9 +7,9 @@ namespace KPRV {
 
 namespace {
 
-Array<Instance*> by_port_helper(classId_t id)
+Array<Instance*> by_port_helper(classId_t id, const Wanted& wanted)
 {
-    return PortHelper::getPortHelperObject()->getInstancesByClass(id);
+    return PortHelper::getPortHelperObject()->getInstancesByClass(id, wanted);
 }
 
 // clang-format off
@@ -35,10 +35,10 @@ HDRManager* HDRManager::getHDRManager()
     return &manager;
 }
 
-Array<Instance*> HDRManager::getInstances(classId_t id) const
+Array<Instance*> HDRManager::getInstances(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getInstances");
-    return dispatch_class(LOG_HERE, rows, id);
+    return dispatch_class(LOG_HERE, rows, id, wanted);
 }
 
 } // namespace KPRV

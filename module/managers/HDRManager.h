@@ -3,6 +3,7 @@
 #include "module/adapter/classId_t.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 
 namespace KPRV {
 
@@ -14,7 +15,7 @@ public:
     static HDRManager* getHDRManager();
 
     /// As `FCHBAManager::getInstances`.
-    Array<Instance*> getInstances(classId_t id) const;
+    Array<Instance*> getInstances(classId_t id, const Wanted& wanted = {}) const;
 
 private:
     HDRManager();

@@ -9,7 +9,7 @@ namespace {
 
 /// The operation of the manager that gives a class.
 template <Array<Instance*> (ServerManager::*OPERATION)() const>
-Array<Instance*> by(classId_t)
+Array<Instance*> by(classId_t, const Wanted&)
 {
     return (ServerManager::getServerManager()->*OPERATION)();
 }
@@ -38,7 +38,7 @@ ServerManager* ServerManager::getServerManager()
 Array<Instance*> ServerManager::getInstances(classId_t id) const
 {
     LOG_SCOPE("getInstances");
-    return dispatch_class(LOG_HERE, rows, id);
+    return dispatch_class(LOG_HERE, rows, id, {});
 }
 
 Array<Instance*> ServerManager::getRegisteredProfileInstances() const

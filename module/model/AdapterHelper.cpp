@@ -14,6 +14,7 @@ namespace KPRV {
 struct AdapterHelper::Walk
 {
     classId_t id;
+    const Wanted& wanted;
     Fresh_Instances instances = {};
     Host_Name host = Host_Name(256);
     bool network_driver_done = false;
@@ -41,7 +42,7 @@ AdapterHelper* AdapterHelper::getAdapterHelperInstance()
     return &helper;
 }
 
-Array<Instance*> AdapterHelper::getInstancesByClass(classId_t id) const
+Array<Instance*> AdapterHelper::getInstancesByClass(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getInstancesByClass");
     Json::Value response;
@@ -55,7 +56,7 @@ Array<Instance*> AdapterHelper::getInstancesByClass(classId_t id) const
         return {};
     }
 
-    Walk walk = {.id = id};
+    Walk walk = {.id = id, .wanted = wanted};
     for (int number = 1; number <= count; number++) {
         const String index = adapter_address(LOG_HERE, *list, static_cast<unsigned>(number - 1));
         try {
@@ -82,14 +83,13 @@ void AdapterHelper::publish(Walk& walk, const String& index, int number) const
 
     switch (walk.id) {
     case PHYSICALPACKAGE:
-        walk.instances.append(getPhysicalPackageInstance(adapter));
+        walk.instances.append(getPhysicalPackageInstance(adapter, walk.wanted));
         break;
     case PRODUCT:
-        walk.instances.append(getProductInstance(adapter));
+        walk.instances.append(getProductInstance(adapter, walk.wanted));
         break;
     case PORTCONTROLLER:
-        adapter.status = asBool(member(member(answer, "hbaData"), "hbaStatus")) ? 11 : 10;
-        walk.instances.append(getPortControllerInstance(adapter));
+        walk.instances.append(getPortControllerInstance(adapter, walk.wanted));
         break;
     case ADAPTERSOFTWAREIDENTITY:
         publish_software(walk, answer, index, adapter);
@@ -103,7 +103,7 @@ void AdapterHelper::publish_software(Walk& walk, const Json::Value& answer, cons
                                      _adapterData& adapter) const
 {
     const auto append = [&](softwareType_t type, bool network) {
-        walk.instances.append(getAdapterSoftwareIdentityInstance(adapter, type, network));
+        walk.instances.append(getAdapterSoftwareIdentityInstance(adapter, type, network, walk.wanted));
     };
     if (!walk.network_driver_done && *adapter.networkDriverName) {
         append(SOFTWARE_DRIVER, true);

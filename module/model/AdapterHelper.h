@@ -6,6 +6,7 @@
 #include "module/model/Logged_Life.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 #include "module/schema/KALDERA_AdapterSoftwareIdentity.h"
 #include "module/schema/KALDERA_PhysicalPackage.h"
 #include "module/schema/KALDERA_PortController.h"
@@ -33,14 +34,19 @@ public:
 
     /// Walks all adapters for one of the four classes (ids 2, 6, 7 and 8). An adapter that cannot be read, or
     /// has no port, is left out. Exceptions of `libGetAllAdaptersIndexString` and `libGetFlashInfo` pass.
-    Array<Instance*> getInstancesByClass(classId_t id) const;
+    Array<Instance*> getInstancesByClass(classId_t id, const Wanted& wanted = {}) const;
 
-    KALDERA_PortController* getPortControllerInstance(const _adapterData& adapter) const;
-    KALDERA_PhysicalPackage* getPhysicalPackageInstance(const _adapterData& adapter) const;
-    KALDERA_Product* getProductInstance(const _adapterData& adapter) const;
+    // Null for one that is not wanted.
+
+    KALDERA_PortController* getPortControllerInstance(const _adapterData& adapter,
+                                                      const Wanted& wanted = {}) const;
+    KALDERA_PhysicalPackage* getPhysicalPackageInstance(const _adapterData& adapter,
+                                                        const Wanted& wanted = {}) const;
+    KALDERA_Product* getProductInstance(const _adapterData& adapter, const Wanted& wanted = {}) const;
     /// `network` matters for a driver only: the network driver or the storage driver.
-    KALDERA_AdapterSoftwareIdentity*
-    getAdapterSoftwareIdentityInstance(const _adapterData& adapter, softwareType_t type, bool network) const;
+    KALDERA_AdapterSoftwareIdentity* getAdapterSoftwareIdentityInstance(const _adapterData& adapter,
+                                                                        softwareType_t type, bool network,
+                                                                        const Wanted& wanted = {}) const;
 
     /// Vital product data of a card, from `hbaData`: serial, part and FRU number, UUID. Throws
     /// `Not_Convertible`.
@@ -52,7 +58,9 @@ private:
     /// False if the adapter has no port; `number` and `index` name it in the log. Throws `Not_Convertible`.
     bool fill(const Json::Value& answer, int number, const char* index, Host_Name& host,
               _adapterData& adapter) const;
-    void fill_common(const Json::Value& answer, _adapterData& adapter) const;
+    struct Hba_Members;
+    void fill_common(const Json::Value& answer, const Hba_Members& hba, _adapterData& adapter) const;
+    void fill_vpd(const Hba_Members& hba, _adapterData& adapter) const;
     void fill_bios(const Json::Value& answer, _adapterData& adapter) const;
 
     struct Walk;

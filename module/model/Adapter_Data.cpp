@@ -5,12 +5,50 @@
 #include "module/model/Record_Filling.h"
 #include "module/runtime/log.h"
 
-#include <cstdio>
+#include <algorithm>
 #include <strings.h>
 
 namespace KPRV {
 
 namespace {
+
+// What is read of `hbaData` and `driver`, in the order of their members.
+enum : size_t
+{
+    FRU_NUMBER,
+    MAC,
+    STATUS,
+    MODEL,
+    OEM,
+    OEM_SERIAL_NUMBER,
+    PART_NUMBER,
+    PORT_COUNT,
+    SERIAL_NUMBER,
+    UUID,
+    WWN,
+    NUM_HBA_MEMBERS
+};
+constexpr std::array<std::string_view, NUM_HBA_MEMBERS> hba_members = {
+    "fruNum",  "hbaMAC",    "hbaStatus",    "model", "oem", "oemSerialNum",
+    "partNum", "portCount", "serialNumber", "uuid",  "wwn",
+};
+static_assert(std::ranges::is_sorted(hba_members));
+
+enum : size_t
+{
+    NETWORK_NAME,
+    NETWORK_VERSION,
+    STORAGE_NAME,
+    STORAGE_VERSION,
+    NUM_DRIVER_MEMBERS
+};
+constexpr std::array<std::string_view, NUM_DRIVER_MEMBERS> driver_members = {
+    "networkDriverName",
+    "networkDriverVersion",
+    "storageDriverName",
+    "storageDriverVersion",
+};
+static_assert(std::ranges::is_sorted(driver_members));
 
 /// Vendors whose cards carry no FRU number.
 bool has_no_fru(const char* vendor)
@@ -20,66 +58,76 @@ bool has_no_fru(const char* vendor)
 
 } // namespace
 
+struct AdapterHelper::Hba_Members : Members<NUM_HBA_MEMBERS>
+{
+    using Members::Members;
+};
+
 void AdapterHelper::fillVPDInfo(const Json::Value& hba_data, _adapterData* adapter) const
 {
+    fill_vpd(Hba_Members(hba_data, hba_members), *adapter);
+}
+
+void AdapterHelper::fill_vpd(const Hba_Members& hba, _adapterData& adapter) const
+{
     LOG_SCOPE("fillVPDInfo");
-    const std::string vendor = asString(member(hba_data, "oem"));
-    char line[128];
-    snprintf(line, sizeof line, "Adapter vendor code is :%s", vendor.c_str());
-    LOG(DBG, "%s", line);
+    const std::string vendor = asString(hba[OEM]);
+    // Cut as it always was.
+    LOG(DBG, "Adapter vendor code is :%.103s", vendor.c_str());
 
     if (has_no_fru(vendor.c_str()))
         LOG(INFO, "%s VPD info doesnt have the FRU details to print.", vendor.c_str());
     else
-        copy_member(adapter->fruNumber, hba_data, "fruNum");
-    copy_member(adapter->partNumber, hba_data, "partNum");
-    if (const auto serial = oem_serial_number(hba_data))
-        copy_text(adapter->serialNumber, serial->c_str());
-    copy_member(adapter->uuid, hba_data, "uuid");
+        copy_text(adapter.fruNumber, asView(hba[FRU_NUMBER]));
+    copy_text(adapter.partNumber, asView(hba[PART_NUMBER]));
+    if (const auto serial = oem_serial_number(hba[OEM_SERIAL_NUMBER], hba[PART_NUMBER]))
+        copy_text(adapter.serialNumber, serial->c_str());
+    copy_text(adapter.uuid, asView(hba[UUID]));
 }
 
 /// What every adapter with a driver has.
-void AdapterHelper::fill_common(const Json::Value& answer, _adapterData& adapter) const
+void AdapterHelper::fill_common(const Json::Value& answer, const Hba_Members& hba,
+                                _adapterData& adapter) const
 {
-    const Json::Value& hba_data = member(answer, "hbaData");
-    copy_member(adapter.serialNumber, hba_data, "serialNumber");
-    fillVPDInfo(hba_data, &adapter);
+    copy_text(adapter.serialNumber, asView(hba[SERIAL_NUMBER]));
+    fill_vpd(hba, adapter);
     copy_text(adapter.vendor, "KLDR");
     copy_trimmed(adapter.firmwareVersion, member(answer, "firmware"), "version");
-    copy_member(adapter.model, hba_data, "model");
+    copy_text(adapter.model, asView(hba[MODEL]));
 }
 
 bool AdapterHelper::fill(const Json::Value& answer, int number, const char* index, Host_Name& host,
                          _adapterData& adapter) const
 {
-    const Json::Value& hba_data = member(answer, "hbaData");
-    const Json::Value& driver = member(answer, "driver");
+    const Hba_Members hba(member(answer, "hbaData"), hba_members);
+    const Members<NUM_DRIVER_MEMBERS> driver(member(answer, "driver"), driver_members);
 
-    adapter.isCNA = hasMember(hba_data, "hbaMAC");
+    adapter.isCNA = hba.has(MAC);
     LOG(INFO, "Adapter Type : %s", adapter.isCNA ? "CNA" : "FC HBA");
-    if (asInt(member(hba_data, "portCount")) == 0) {
+    if (asInt(hba[PORT_COUNT]) == 0) {
         LOG(WARN, "There are no ports associated to Adapter id %d - %s", number, index);
         return false;
     }
     adapter.systemName = host.get();
     if (adapter.isCNA)
-        copy_flat(adapter.mac, hba_data, "hbaMAC");
+        copy_flat(adapter.mac, text_of(hba[MAC]));
 
     // The texts below the address come with a driver: an adapter that has none is published with empty
     // fields.
-    const bool network = hasMember(driver, "networkDriverName");
-    const bool storage = hasMember(driver, "storageDriverName");
+    const bool network = driver.has(NETWORK_NAME);
+    const bool storage = driver.has(STORAGE_NAME);
     if (network) {
-        copy_member(adapter.networkDriverName, driver, "networkDriverName");
-        copy_trimmed(adapter.networkDriverVersion, driver, "networkDriverVersion");
+        copy_text(adapter.networkDriverName, asView(driver[NETWORK_NAME]));
+        copy_trimmed(adapter.networkDriverVersion, driver[NETWORK_VERSION]);
     }
     if (storage) {
-        copy_flat(adapter.nodeWWN, hba_data, "wwn");
-        copy_member(adapter.storageDriverName, driver, "storageDriverName");
-        copy_trimmed(adapter.storageDriverVersion, driver, "storageDriverVersion");
+        copy_flat(adapter.nodeWWN, text_of(hba[WWN]));
+        copy_text(adapter.storageDriverName, asView(driver[STORAGE_NAME]));
+        copy_trimmed(adapter.storageDriverVersion, driver[STORAGE_VERSION]);
     }
     if (network || storage)
-        fill_common(answer, adapter);
+        fill_common(answer, hba, adapter);
+    adapter.status = asBool(hba[STATUS]) ? 11 : 10;
     return true;
 }
 

@@ -10,7 +10,7 @@ struct _adapterData
 {
     char nodeWWN[24];  ///< Flat form; only with a storage driver.
     char mac[18];      ///< Flat form; CNA only.
-    sint32 status;     ///< 11 in service, 10 stopped; only for controllers.
+    sint32 status;     ///< 11 in service, 10 stopped.
     String systemName; ///< At most 255 characters.
     char model[16];
     char serialNumber[64];

@@ -85,14 +85,19 @@ Software software(const _adapterData& adapter, softwareType_t type, bool network
 
 } // namespace
 
-KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterData& adapter) const
+KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterData& adapter,
+                                                                 const Wanted& wanted) const
 {
     LOG_SCOPE("getPortControllerInstance");
-    const bool stopped = adapter.status == 10;
-    Ref<KALDERA_PortController> controller(create_null<KALDERA_PortController>());
+    auto controller = create_wanted(wanted, &KALDERA_PortController::DeviceID, adapter.address());
+    if (!controller)
+        return nullptr;
     set_system_keys(*controller, PORTCONTROLLER, adapter.systemName);
-    controller->Name.set(adapter.serialNumber);
     controller->DeviceID.set(adapter.address());
+    if (!wanted.whole())
+        return controller.steal();
+    const bool stopped = adapter.status == 10;
+    controller->Name.set(adapter.serialNumber);
     controller->OperationalStatus.set(array_of({static_cast<uint16>(adapter.status)}));
     controller->StatusDescriptions.set(
         array_of<String>({stopped ? "The adapter is disabled" : "The adapter is in service"}));
@@ -106,13 +111,19 @@ KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterD
     return controller.steal();
 }
 
-KALDERA_PhysicalPackage* AdapterHelper::getPhysicalPackageInstance(const _adapterData& adapter) const
+KALDERA_PhysicalPackage* AdapterHelper::getPhysicalPackageInstance(const _adapterData& adapter,
+                                                                   const Wanted& wanted) const
 {
     LOG_SCOPE("getPhysicalPackageInstance");
+    const std::string own_tag = tag(adapter);
+    auto package = create_wanted(wanted, &KALDERA_PhysicalPackage::Tag, own_tag);
+    if (!package)
+        return nullptr;
+    package->CreationClassName.set(class_name_text(PHYSICALPACKAGE));
+    package->Tag.set(to_String(own_tag));
+    if (!wanted.whole())
+        return package.steal();
     const std::string serial = *adapter.serialNumber ? std::string(" ") + adapter.serialNumber : "";
-    Ref<KALDERA_PhysicalPackage> package(create_null<KALDERA_PhysicalPackage>());
-    package->CreationClassName.set(ProviderUtil::getClassName(PHYSICALPACKAGE));
-    package->Tag.set(to_String(tag(adapter)));
     package->Manufacturer.set(adapter.vendor);
     describe(*package, kind(adapter));
     package->Model.set(adapter.model);
@@ -124,26 +135,33 @@ KALDERA_PhysicalPackage* AdapterHelper::getPhysicalPackageInstance(const _adapte
     return package.steal();
 }
 
-KALDERA_Product* AdapterHelper::getProductInstance(const _adapterData& adapter) const
+KALDERA_Product* AdapterHelper::getProductInstance(const _adapterData& adapter, const Wanted& wanted) const
 {
     LOG_SCOPE("getProductInstance");
-    Ref<KALDERA_Product> product(create_null<KALDERA_Product>());
-    describe(*product, kind(adapter));
+    auto product = create_wanted(wanted, &KALDERA_Product::IdentifyingNumber, adapter.serialNumber);
+    if (!product)
+        return nullptr;
     product->Version.set(adapter.firmwareVersion);
     product->Name.set("KALDERA CIM Provider");
     product->Vendor.set(adapter.vendor);
     product->IdentifyingNumber.set(adapter.serialNumber);
+    if (wanted.whole())
+        describe(*product, kind(adapter));
     return product.steal();
 }
 
 KALDERA_AdapterSoftwareIdentity*
 AdapterHelper::getAdapterSoftwareIdentityInstance(const _adapterData& adapter, softwareType_t type,
-                                                  bool network) const
+                                                  bool network, const Wanted& wanted) const
 {
     LOG_SCOPE("getAdapterSoftwareIdentityInstance");
     const Software texts = software(adapter, type, network);
-    Ref<KALDERA_AdapterSoftwareIdentity> identity(create_null<KALDERA_AdapterSoftwareIdentity>());
+    auto identity = create_wanted(wanted, &KALDERA_AdapterSoftwareIdentity::InstanceID, texts.id);
+    if (!identity)
+        return nullptr;
     identity->InstanceID.set(to_String(texts.id));
+    if (!wanted.whole())
+        return identity.steal();
     identity->VersionString.set(to_String(texts.version));
     identity->Classifications.set(array_of({static_cast<uint16>(type)}));
     describe(*identity, to_String(texts.title));

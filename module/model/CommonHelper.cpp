@@ -51,26 +51,30 @@ CommonHelper* CommonHelper::getCommonHelperObject()
     return &helper;
 }
 
-Array<Instance*> CommonHelper::getComputerSystemInstances(classId_t id) const
+Array<Instance*> CommonHelper::getComputerSystemInstances(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getComputerSystemInstances");
     char host[255] = {};
     const int result = ProviderUtil::getHostInfo(host, sizeof host);
     Fresh_Instances instances;
-    instances.append(getComputerSystemInstance(id, result, host));
+    instances.append(getComputerSystemInstance(id, result, host, wanted));
     return instances.release();
 }
 
-KALDERA_ComputerSystem* CommonHelper::getComputerSystemInstance(classId_t id, int result,
-                                                                const char* host) const
+KALDERA_ComputerSystem* CommonHelper::getComputerSystemInstance(classId_t id, int result, const char* host,
+                                                                const Wanted& wanted) const
 {
     const Host_Row& row = row_of(result);
     if (row.warning)
         LOG(WARN, "%s", row.warning);
-    const String description = "The host with Kaldera's adapters installed.";
-    Ref<KALDERA_ComputerSystem> computer(create_null<KALDERA_ComputerSystem>());
+    auto computer = create_wanted(wanted, &KALDERA_ComputerSystem::Name, host);
+    if (!computer)
+        return nullptr;
     computer->CreationClassName.set(ProviderUtil::getClassName(id));
     computer->Name.set(host);
+    if (!wanted.whole())
+        return computer.steal();
+    const String description = "The host with Kaldera's adapters installed.";
     if (row.name_format)
         computer->NameFormat.set(row.name_format);
     computer->OtherIdentifyingInfo.set(array_of<String>({host}));

@@ -4,6 +4,7 @@
 #include "module/model/Logged_Life.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 #include "module/schema/KALDERA_ComputerSystem.h"
 
 namespace KPRV {
@@ -15,10 +16,12 @@ public:
     static CommonHelper* getCommonHelperObject();
 
     /// One instance, always; the caller owns it. `id` gives the class name that it bears (1).
-    Array<Instance*> getComputerSystemInstances(classId_t id) const;
+    Array<Instance*> getComputerSystemInstances(classId_t id, const Wanted& wanted = {}) const;
 
-    /// `result` and `host` are what `ProviderUtil::getHostInfo` gave. What is not named is null.
-    KALDERA_ComputerSystem* getComputerSystemInstance(classId_t id, int result, const char* host) const;
+    /// `result` and `host` are what `ProviderUtil::getHostInfo` gave. What is not named is null. Null for a
+    /// host that is not wanted.
+    KALDERA_ComputerSystem* getComputerSystemInstance(classId_t id, int result, const char* host,
+                                                      const Wanted& wanted = {}) const;
 
 private:
     CommonHelper();

@@ -17,28 +17,30 @@ EthernetPortHelper* EthernetPortHelper::getEthernetPortHelperObject()
     return &helper;
 }
 
-Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id) const
+Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getInstancesByClass");
     Host_Name host(64);
     return walk_adapters(LOG_HERE, [&](int adapter_id, const Json::Value& list, Fresh_Instances& instances) {
         const String address = adapter_address(LOG_HERE, list, static_cast<unsigned>(adapter_id - 1));
         if (ProviderUtil::hasEthernetPort(address))
-            walk_adapter(adapter_id, id, host, instances);
+            walk_adapter(adapter_id, id, wanted, host, instances);
         else
             LOG(INFO, "No Ethernet ports found for Adapter - %s", address.c_str());
     });
 }
 
-Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id) const
+Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id,
+                                                             const Wanted& wanted) const
 {
     Host_Name host(64);
     Fresh_Instances instances;
-    walk_adapter(adapter_id, id, host, instances);
+    walk_adapter(adapter_id, id, wanted, host, instances);
     return instances.release();
 }
 
-Array<Instance*> EthernetPortHelper::getEthernetPortInstancesByAdapter(const String& mac) const
+Array<Instance*> EthernetPortHelper::getEthernetPortInstancesByAdapter(const String& mac,
+                                                                       const Wanted& wanted) const
 {
     // The log knows it by this name.
     LOG_SCOPE("getEthernetPortInstancesByMacAddress");
@@ -61,10 +63,10 @@ Array<Instance*> EthernetPortHelper::getEthernetPortInstancesByAdapter(const Str
         LOG(WARN, "Adapter not found in the system.");
         return {};
     }
-    return getInstancesByAdapterId(adapter_id, ETHERNETPORT);
+    return getInstancesByAdapterId(adapter_id, ETHERNETPORT, wanted);
 }
 
-void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, Host_Name& host,
+void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, const Wanted& wanted, Host_Name& host,
                                       Fresh_Instances& instances) const
 {
     LOG_SCOPE("getInstancesByAdapterId");
@@ -83,13 +85,13 @@ void EthernetPortHelper::walk_adapter(int adapter_id, classId_t id, Host_Name& h
     for (const Json::Value& element : answer["indexStrings"]) {
         String mac;
         if (guarded(LOG_HERE, entry, [&] { mac = asString(element).c_str(); }))
-            publish(mac, number, id, host, instances);
+            publish(mac, number, id, wanted, host, instances);
         number++;
     }
 }
 
-void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id, Host_Name& host,
-                                 Fresh_Instances& instances) const
+void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id, const Wanted& wanted,
+                                 Host_Name& host, Fresh_Instances& instances) const
 {
     Json::Value answer;
     if (getEthPortDetails(mac, answer) != 0) {
@@ -103,10 +105,10 @@ void EthernetPortHelper::publish(const String& mac, sint32 number, classId_t id,
     switch (id) {
     case ETHERNETPORT:
         port.portType = port_type(mac);
-        instances.append(getEthernetPortInstance(port));
+        instances.append(getEthernetPortInstance(port, wanted));
         break;
     case LANENDPOINT:
-        instances.append(getLANEndpointInstance(port));
+        instances.append(getLANEndpointInstance(port, wanted));
         break;
     default:
         LOG(INFO, "Unhandled class support");

@@ -6,6 +6,7 @@
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
 #include "module/runtime/String.h"
+#include "module/runtime/Wanted.h"
 #include "module/schema/KALDERA_EthernetPort.h"
 #include "module/schema/KALDERA_LANEndpoint.h"
 
@@ -27,17 +28,19 @@ public:
     // the log. Exceptions of `libGetAllAdaptersIndexString` and `libGetAdapterIdByPort` pass.
 
     /// All adapters.
-    Array<Instance*> getInstancesByClass(classId_t id) const;
+    Array<Instance*> getInstancesByClass(classId_t id, const Wanted& wanted = {}) const;
     /// One adapter, by its id from 1.
-    Array<Instance*> getInstancesByAdapterId(int adapter_id, classId_t id) const;
+    Array<Instance*> getInstancesByAdapterId(int adapter_id, classId_t id, const Wanted& wanted = {}) const;
     /// The Ethernet ports of the adapter that the MAC belongs to.
-    Array<Instance*> getEthernetPortInstancesByAdapter(const String& mac) const;
+    Array<Instance*> getEthernetPortInstancesByAdapter(const String& mac, const Wanted& wanted = {}) const;
 
     /// 0 and the answer of `getEthPortByEthMac` in `out`, with its object `ethData`; or -1. Throws nothing.
     int getEthPortDetails(const String& mac, Json::Value& out) const;
 
-    KALDERA_EthernetPort* getEthernetPortInstance(const _ethPortInfo& port) const;
-    KALDERA_LANEndpoint* getLANEndpointInstance(const _ethPortInfo& port) const;
+    // Null for one that is not wanted.
+
+    KALDERA_EthernetPort* getEthernetPortInstance(const _ethPortInfo& port, const Wanted& wanted = {}) const;
+    KALDERA_LANEndpoint* getLANEndpointInstance(const _ethPortInfo& port, const Wanted& wanted = {}) const;
 
     /// CIM's `PortType` of a transceiver: 108 for "10G_BASE-SR", 105 for every other text.
     sint32 getPortType(const char* transceiver) const;
@@ -45,8 +48,9 @@ public:
 private:
     EthernetPortHelper();
 
-    void walk_adapter(int adapter_id, classId_t id, Host_Name& host, Fresh_Instances& instances) const;
-    void publish(const String& mac, sint32 number, classId_t id, Host_Name& host,
+    void walk_adapter(int adapter_id, classId_t id, const Wanted& wanted, Host_Name& host,
+                      Fresh_Instances& instances) const;
+    void publish(const String& mac, sint32 number, classId_t id, const Wanted& wanted, Host_Name& host,
                  Fresh_Instances& instances) const;
     sint32 port_type(const String& mac) const;
 

@@ -17,12 +17,17 @@ sint32 EthernetPortHelper::getPortType(const char* transceiver) const
     return std::string_view(transceiver) == "10G_BASE-SR" ? SHORT_RANGE : ANY_OTHER;
 }
 
-KALDERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(const _ethPortInfo& port) const
+KALDERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(const _ethPortInfo& port,
+                                                                  const Wanted& wanted) const
 {
     LOG_SCOPE("getEthernetPortInstance");
-    Ref<KALDERA_EthernetPort> instance(create_null<KALDERA_EthernetPort>());
+    auto instance = create_wanted(wanted, &KALDERA_EthernetPort::DeviceID, port.mac);
+    if (!instance)
+        return nullptr;
     set_system_keys(*instance, ETHERNETPORT, port.systemName);
     instance->DeviceID.set(port.mac);
+    if (!wanted.whole())
+        return instance.steal();
     instance->PermanentAddress.set(port.permanentAddress);
     instance->NetworkAddresses.set(array_of<String>({port.permanentAddress}));
     instance->LinkTechnology.set(2);
@@ -35,13 +40,18 @@ KALDERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(const _ethPort
     return instance.steal();
 }
 
-KALDERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(const _ethPortInfo& port) const
+KALDERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(const _ethPortInfo& port,
+                                                                const Wanted& wanted) const
 {
     LOG_SCOPE("getLANEndpointInstance");
-    const sint32 status = static_cast<sint32>(port.status);
-    Ref<KALDERA_LANEndpoint> instance(create_null<KALDERA_LANEndpoint>());
+    auto instance = create_wanted(wanted, &KALDERA_LANEndpoint::Name, port.deviceName);
+    if (!instance)
+        return nullptr;
     set_system_keys(*instance, LANENDPOINT, port.systemName);
     instance->Name.set(port.deviceName);
+    if (!wanted.whole())
+        return instance.steal();
+    const sint32 status = static_cast<sint32>(port.status);
     instance->ElementName.set(port.deviceName);
     instance->Description.set(port.deviceName);
     instance->LANID.set(port.deviceName);

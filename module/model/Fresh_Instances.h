@@ -28,7 +28,7 @@ public:
     Fresh_Instances(const Fresh_Instances&) = delete;
     Fresh_Instances& operator=(const Fresh_Instances&) = delete;
 
-    /// Takes the instance over.
+    /// Takes the instance over. Null: one that was seen and is not wanted, which is counted and goes along.
     void append(Instance* instance)
     {
         Ref<Instance> held(instance);

@@ -5,6 +5,7 @@
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
 #include "module/runtime/Prototype.h"
+#include "module/runtime/Wanted.h"
 
 #include <initializer_list>
 #include <string_view>
@@ -22,6 +23,13 @@ T* create_null()
         return instance;
     }());
     return all_null.copy();
+}
+
+/// The same, if an instance with that text, given in parts, in its telling key is wanted; else null.
+template <class T, class... Parts>
+Ref<T> create_wanted(const Wanted& wanted, Property<String> T::*key, const Parts&... parts)
+{
+    return Ref<T>(wanted.may_be(key, parts...) ? create_null<T>() : nullptr);
 }
 
 template <class T>

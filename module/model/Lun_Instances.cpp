@@ -85,13 +85,6 @@ String name(Named_By source, const _hbaLunInfo& lun)
     return "Unable To Fetch";
 }
 
-/// A LUN goes by the path on which it is seen.
-String device_id_of(const _hbaPortInfo& port, const _hbaLunInfo& lun, const String& element)
-{
-    return Joined(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
-                  "_", std::string_view(element.c_str(), element.size()));
-}
-
 /// Signed: a number beyond the positive range shows as a negative one.
 String numbered_name(uint32 number)
 {
@@ -110,70 +103,86 @@ String element_name(uint32 number)
     return number < first_names.size() ? first_names[number] : numbered_name(number);
 }
 
-/// What the three classes have in common.
+/// What the three classes have in common; null for a LUN that is not wanted. A LUN goes by the path on which
+/// it is seen.
 template <class T>
-T* create_lun(classId_t id, const String& identification, const _hbaPortInfo& port, const _hbaLunInfo& lun)
+Ref<T> create_lun(classId_t id, const String& identification, const _hbaPortInfo& port,
+                  const _hbaLunInfo& lun, const Wanted& wanted)
 {
     String element = element_name(lun.number);
-    String device_id = device_id_of(port, lun, element);
-    Ref<T> instance(create_null<T>());
+    const auto with_id = [&](auto use) {
+        return use(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
+                   "_", std::string_view(element.c_str(), element.size()));
+    };
+    Ref<T> instance =
+        with_id([&](const auto&... parts) { return create_wanted(wanted, &T::DeviceID, parts...); });
+    if (!instance)
+        return instance;
+    String device_id = with_id([](const auto&... parts) -> String { return Joined(parts...); });
     set_system_keys(*instance, id, port.systemName);
-    instance->ElementName.set(std::move(element));
-    instance->OtherIdentifyingInfo.set(array_of(device_id));
+    if (wanted.whole()) {
+        instance->ElementName.set(std::move(element));
+        instance->OtherIdentifyingInfo.set(array_of(device_id));
+        instance->IdentifyingDescriptions.set(array_of(identification));
+        instance->OperationalStatus.set(array_of<uint16>({2}));
+    }
     instance->DeviceID.set(std::move(device_id));
-    instance->IdentifyingDescriptions.set(array_of(identification));
-    instance->OperationalStatus.set(array_of<uint16>({2}));
-    return instance.steal();
+    return instance;
 }
 
 } // namespace
 
 KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo& port,
-                                                              const _hbaLunInfo& lun) const
+                                                              const _hbaLunInfo& lun,
+                                                              const Wanted& wanted) const
 {
     LOG_SCOPE("getStorageExtentInstance");
     static const String identification = "It is a unique identification for a Storage Extent";
-    auto* extent = create_lun<KALDERA_StorageExtent>(STORAGEEXTENT, identification, port, lun);
-    if (const Name_Row* row = name_row(lun)) {
-        extent->Name.set(name(row->source, lun));
-        extent->NameFormat.set(row->format);
-        extent->NameNamespace.set(row->name_space);
-    } else {
+    auto extent = create_lun<KALDERA_StorageExtent>(STORAGEEXTENT, identification, port, lun, wanted);
+    const Name_Row* const row = name_row(lun);
+    if (!row)
         LOG(ERR, "Default idType. Should not have reached here. ");
-        extent->Name.set("");
+    if (extent && wanted.whole()) {
+        extent->Name.set(row ? name(row->source, lun) : "");
+        if (row) {
+            extent->NameFormat.set(row->format);
+            extent->NameNamespace.set(row->name_space);
+        }
     }
     LOG(DBG, "Returned instance of StorageExtent for port WWN= %s", port.portWWN);
-    return extent;
+    return extent.steal();
 }
 
-KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const
+KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun,
+                                                      const Wanted& wanted) const
 {
     LOG_SCOPE("getTapeDriveInstance");
     static const String identification = "It is a unique identification for a Tape Drive";
-    auto* drive = create_lun<KALDERA_TapeDrive>(TAPEDRIVE, identification, port, lun);
-    if (const Name_Row* row = name_row(lun)) {
-        drive->Name.set(name(row->source, lun));
-    } else {
+    auto drive = create_lun<KALDERA_TapeDrive>(TAPEDRIVE, identification, port, lun, wanted);
+    const Name_Row* const row = name_row(lun);
+    if (!row)
         LOG(ERR, "Default case for lunInfo.idType. Should not have reached here. ");
-        drive->Name.set("");
-    }
+    if (drive && wanted.whole())
+        drive->Name.set(row ? name(row->source, lun) : "");
     LOG(DBG, "Returned instance of TapeDrive for port WWN= %s", port.portWWN);
-    return drive;
+    return drive.steal();
 }
 
-KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& port,
-                                                          const _hbaLunInfo& lun) const
+KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun,
+                                                          const Wanted& wanted) const
 {
     LOG_SCOPE("getLogicalDiskInstance");
     static const String identification = "It is a unique identification for a Logical Disk";
-    auto* disk = create_lun<KALDERA_LogicalDisk>(LOGICALDISK, identification, port, lun);
-    const std::string_view device = trimmed(lun.deviceName);
-    const bool by_device = !device.empty();
-    disk->Name.set(by_device ? to_String(device) : String(lun.description));
-    disk->NameFormat.set(by_device ? 12 : 1);
-    disk->NameNamespace.set(by_device ? 8 : 1);
+    auto disk = create_lun<KALDERA_LogicalDisk>(LOGICALDISK, identification, port, lun, wanted);
+    if (disk && wanted.whole()) {
+        const std::string_view device = trimmed(lun.deviceName);
+        const bool by_device = !device.empty();
+        disk->Name.set(by_device ? to_String(device) : String(lun.description));
+        disk->NameFormat.set(by_device ? 12 : 1);
+        disk->NameNamespace.set(by_device ? 8 : 1);
+    }
     LOG(DBG, "Returned instance of logicalDisk for port WWN= %s", port.portWWN);
-    return disk;
+    return disk.steal();
 }
 
 } // namespace KPRV

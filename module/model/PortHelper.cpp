@@ -35,6 +35,7 @@ struct PortHelper::Walk
 {
     classId_t id;
     const Walk_Words& words;
+    const Wanted& wanted;
     Host_Name host = Host_Name(256);
     Json::Value request = Json::Value(Json::objectValue);
     Json::Value& address = request["wwn"];
@@ -48,10 +49,10 @@ PortHelper* PortHelper::getPortHelperObject()
     return &helper;
 }
 
-Array<Instance*> PortHelper::getInstancesByClass(classId_t id) const
+Array<Instance*> PortHelper::getInstancesByClass(classId_t id, const Wanted& wanted) const
 {
     LOG_SCOPE("getInstancesByClass");
-    Walk walk = {.id = id, .words = by_id_words};
+    Walk walk = {.id = id, .words = by_id_words, .wanted = wanted};
     return walk_adapters(LOG_HERE, [&](int adapter_id, const Json::Value& list, Fresh_Instances& instances) {
         walk_adapter_by_id(adapter_id, list, walk, instances);
     });
@@ -61,7 +62,8 @@ Array<Instance*> PortHelper::getInstancesByAdapterId(int adapter_id, classId_t i
                                                      const Json::Value& adapters) const
 {
     Fresh_Instances instances;
-    Walk walk = {.id = id, .words = by_id_words};
+    const Wanted everything;
+    Walk walk = {.id = id, .words = by_id_words, .wanted = everything};
     walk_adapter_by_id(adapter_id, member(adapters, "indexStrings"), walk, instances);
     return instances.release();
 }
@@ -74,7 +76,8 @@ void PortHelper::walk_adapter_by_id(int adapter_id, const Json::Value& list, Wal
     walk_adapter(index, walk, instances);
 }
 
-Array<Instance*> PortHelper::getInstancesByAdapterAddress(const String& address, classId_t id) const
+Array<Instance*> PortHelper::getInstancesByAdapterAddress(const String& address, classId_t id,
+                                                          const Wanted& wanted) const
 {
     LOG_SCOPE("getInstancesByAdapterAddress");
     String index;
@@ -82,16 +85,16 @@ Array<Instance*> PortHelper::getInstancesByAdapterAddress(const String& address,
                  [&] { index = ProviderUtil::getIndexInColonFormat(address); }))
         return {};
     Fresh_Instances instances;
-    Walk walk = {.id = id, .words = by_address_words};
+    Walk walk = {.id = id, .words = by_address_words, .wanted = wanted};
     walk_adapter(index, walk, instances);
     return instances.release();
 }
 
-Array<Instance*> PortHelper::getFCPortInstancesByAdapter(const String& address) const
+Array<Instance*> PortHelper::getFCPortInstancesByAdapter(const String& address, const Wanted& wanted) const
 {
     LOG_SCOPE("getFCPortInstancesByAdapter");
     LOG(DBG, "getFCPortInstancesByAdapter invoked with address= %s", address.c_str());
-    return getInstancesByAdapterAddress(address, FCPORT);
+    return getInstancesByAdapterAddress(address, FCPORT, wanted);
 }
 
 void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& instances) const
@@ -133,7 +136,7 @@ void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk
     }
     _hbaPortInfo port;
     if (guarded(LOG_HERE, {"libGetPortByWwn"}, [&] { fill_port(answer, number, walk.host, port); }))
-        publish(walk.id, answer, port, instances);
+        publish(walk.id, walk.wanted, answer, port, instances);
 }
 
 } // namespace KPRV

@@ -7,6 +7,7 @@
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
 #include "module/runtime/String.h"
+#include "module/runtime/Wanted.h"
 #include "module/schema/KALDERA_AlarmDevice.h"
 #include "module/schema/KALDERA_FCPort.h"
 #include "module/schema/KALDERA_FCPortStatistics.h"
@@ -32,22 +33,27 @@ public:
     // that cannot be read is left out, with the reason in the log.
 
     /// All adapters. Exceptions of `libGetAllAdaptersIndexString` pass.
-    Array<Instance*> getInstancesByClass(classId_t id) const;
+    Array<Instance*> getInstancesByClass(classId_t id, const Wanted& wanted = {}) const;
     /// One adapter, by its id from 1 in an answer of `getAllAdaptersIndexString`. Throws nothing.
     Array<Instance*> getInstancesByAdapterId(int adapter_id, classId_t id, const Json::Value& adapters) const;
     /// One adapter. Throws nothing.
-    Array<Instance*> getInstancesByAdapterAddress(const String& address, classId_t id) const;
+    Array<Instance*> getInstancesByAdapterAddress(const String& address, classId_t id,
+                                                  const Wanted& wanted = {}) const;
     /// The ports of one adapter. Throws nothing.
-    Array<Instance*> getFCPortInstancesByAdapter(const String& address) const;
+    Array<Instance*> getFCPortInstancesByAdapter(const String& address, const Wanted& wanted = {}) const;
 
-    KALDERA_FCPort* getFCPortInstance(const _hbaPortInfo& port) const;
+    // Null for one that is not wanted.
+
+    KALDERA_FCPort* getFCPortInstance(const _hbaPortInfo& port, const Wanted& wanted = {}) const;
     KALDERA_FCPortStatistics* getFCPortStatisticsInstance(const _hbaPortInfo& port,
-                                                          const prov_pport_stats_s& statistics,
-                                                          bool fcoe) const;
-    KALDERA_SCSIProtocolEndpoint* getSCSIProtocolEndpointInstance(const _hbaPortInfo& port,
-                                                                  bool initiator) const;
-    KALDERA_LogicalPortGroup* getLogicalPortGroupInstance(const _hbaPortInfo& port) const;
-    KALDERA_AlarmDevice* getAlarmDeviceInstance(const _hbaPortInfo& port, bool beacon_on) const;
+                                                          const prov_pport_stats_s& statistics, bool fcoe,
+                                                          const Wanted& wanted = {}) const;
+    KALDERA_SCSIProtocolEndpoint* getSCSIProtocolEndpointInstance(const _hbaPortInfo& port, bool initiator,
+                                                                  const Wanted& wanted = {}) const;
+    KALDERA_LogicalPortGroup* getLogicalPortGroupInstance(const _hbaPortInfo& port,
+                                                          const Wanted& wanted = {}) const;
+    KALDERA_AlarmDevice* getAlarmDeviceInstance(const _hbaPortInfo& port, bool beacon_on,
+                                                const Wanted& wanted = {}) const;
 
     // Queries of one port or adapter. What fails is told in the log at ERR.
 
@@ -78,12 +84,13 @@ private:
     void walk_adapter_by_id(int adapter_id, const Json::Value& list, Walk& walk,
                             Fresh_Instances& instances) const;
     void walk_port(const Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const;
-    void publish(classId_t id, const Json::Value& answer, _hbaPortInfo& port,
+    void publish(classId_t id, const Wanted& wanted, const Json::Value& answer, _hbaPortInfo& port,
                  Fresh_Instances& instances) const;
-    void publish_endpoints(_hbaPortInfo& port, Fresh_Instances& instances) const;
-    void publish_statistics(const Json::Value& answer, const _hbaPortInfo& port,
+    void publish_endpoints(const Wanted& wanted, _hbaPortInfo& port, Fresh_Instances& instances) const;
+    void publish_statistics(const Wanted& wanted, const Json::Value& answer, const _hbaPortInfo& port,
                             Fresh_Instances& instances) const;
-    void publish_alarm(const Json::Value& answer, const _hbaPortInfo& port, Fresh_Instances& instances) const;
+    void publish_alarm(const Wanted& wanted, const Json::Value& answer, const _hbaPortInfo& port,
+                       Fresh_Instances& instances) const;
 
     const Logged_Life _life;
 };

@@ -17,13 +17,18 @@ String pair_of_names(const _hbaPortInfo& port)
 
 } // namespace
 
-KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port) const
+KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port, const Wanted& wanted) const
 {
     LOG_SCOPE("getFCPortInstance");
-    Ref<KALDERA_FCPort> instance(create_null<KALDERA_FCPort>());
+    auto instance = create_wanted(wanted, &KALDERA_FCPort::DeviceID, port.portWWN);
+    if (!instance)
+        return nullptr;
     set_system_keys(*instance, FCPORT, port.systemName);
-    String address = port.portWWN, names = pair_of_names(port);
+    String address = port.portWWN;
     instance->DeviceID.set(address);
+    if (!wanted.whole())
+        return instance.steal();
+    String names = pair_of_names(port);
     instance->PermanentAddress.set(std::move(address));
     instance->ElementName.set(names);
     instance->Name.set(std::move(names));
@@ -43,39 +48,53 @@ KALDERA_FCPort* PortHelper::getFCPortInstance(const _hbaPortInfo& port) const
 
 KALDERA_FCPortStatistics* PortHelper::getFCPortStatisticsInstance(const _hbaPortInfo& port,
                                                                   const prov_pport_stats_s& statistics,
-                                                                  bool fcoe) const
+                                                                  bool fcoe, const Wanted& wanted) const
 {
     LOG_SCOPE("getFCPortStatisticsInstance");
-    Ref<KALDERA_FCPortStatistics> instance(create_null<KALDERA_FCPortStatistics>());
+    auto instance = create_wanted(wanted, &KALDERA_FCPortStatistics::InstanceID, port.portWWN);
+    if (!instance)
+        return nullptr;
     instance->InstanceID.set(port.portWWN);
+    if (!wanted.whole())
+        return instance.steal();
     instance->ElementName.set("FC Port Statistics");
     set_counters(statistics, fcoe, *instance);
     return instance.steal();
 }
 
 KALDERA_SCSIProtocolEndpoint* PortHelper::getSCSIProtocolEndpointInstance(const _hbaPortInfo& port,
-                                                                          bool initiator) const
+                                                                          bool initiator,
+                                                                          const Wanted& wanted) const
 {
     LOG_SCOPE("getSCSIProtocolEndpointInstance");
-    Ref<KALDERA_SCSIProtocolEndpoint> instance(create_null<KALDERA_SCSIProtocolEndpoint>());
+    auto instance = create_wanted(wanted, &KALDERA_SCSIProtocolEndpoint::Name, port.portWWN);
+    if (!instance)
+        return nullptr;
     set_system_keys(*instance, SCSIPROTOCOLENDPOINT, port.systemName);
     const String address = port.portWWN;
     instance->Name.set(address);
     instance->ElementName.set(address);
+    instance->Role.set(initiator ? 2 : 3);
+    if (!wanted.whole())
+        return instance.steal();
     instance->OperationalStatus.set(array_of({static_cast<uint16>(port.status)}));
     instance->ProtocolIFType.set(1);
     instance->OtherTypeDescription.set("SCSI");
     instance->ConnectionType.set(2);
-    instance->Role.set(initiator ? 2 : 3);
     instance->EnabledState.set(enabled_state(port.status));
     return instance.steal();
 }
 
-KALDERA_LogicalPortGroup* PortHelper::getLogicalPortGroupInstance(const _hbaPortInfo& port) const
+KALDERA_LogicalPortGroup* PortHelper::getLogicalPortGroupInstance(const _hbaPortInfo& port,
+                                                                  const Wanted& wanted) const
 {
     LOG_SCOPE("getLogicalPortGroupInstance");
-    Ref<KALDERA_LogicalPortGroup> instance(create_null<KALDERA_LogicalPortGroup>());
+    auto instance = create_wanted(wanted, &KALDERA_LogicalPortGroup::InstanceID, port.nodeWWN);
+    if (!instance)
+        return nullptr;
     instance->InstanceID.set(port.nodeWWN);
+    if (!wanted.whole())
+        return instance.steal();
     instance->Name.set(port.portWWN);
     instance->NameFormat.set("WWN");
     instance->ElementName.set(pair_of_names(port));
@@ -84,14 +103,19 @@ KALDERA_LogicalPortGroup* PortHelper::getLogicalPortGroupInstance(const _hbaPort
     return instance.steal();
 }
 
-KALDERA_AlarmDevice* PortHelper::getAlarmDeviceInstance(const _hbaPortInfo& port, bool beacon_on) const
+KALDERA_AlarmDevice* PortHelper::getAlarmDeviceInstance(const _hbaPortInfo& port, bool beacon_on,
+                                                        const Wanted& wanted) const
 {
     LOG_SCOPE("getAlarmDeviceInstance");
-    Ref<KALDERA_AlarmDevice> instance(create_null<KALDERA_AlarmDevice>());
+    auto instance = create_wanted(wanted, &KALDERA_AlarmDevice::DeviceID, port.portWWN);
+    if (!instance)
+        return nullptr;
     set_system_keys(*instance, ALARMDEVICE, port.systemName);
-    instance->Description.set(port.systemName);
     const String address = port.portWWN;
     instance->DeviceID.set(address);
+    if (!wanted.whole())
+        return instance.steal();
+    instance->Description.set(port.systemName);
     instance->ElementName.set(address);
     instance->Caption.set(port.symbolicName);
     instance->Urgency.set(3);

@@ -9,29 +9,29 @@
 
 namespace KPRV {
 
-void PortHelper::publish(classId_t id, const Json::Value& answer, _hbaPortInfo& port,
+void PortHelper::publish(classId_t id, const Wanted& wanted, const Json::Value& answer, _hbaPortInfo& port,
                          Fresh_Instances& instances) const
 {
     switch (id) {
     case FCPORT:
-        instances.append(getFCPortInstance(port));
+        instances.append(getFCPortInstance(port, wanted));
         break;
     case SCSIPROTOCOLENDPOINT:
-        publish_endpoints(port, instances);
+        publish_endpoints(wanted, port, instances);
         break;
     case FCPORTSTATISTICS:
-        publish_statistics(answer, port, instances);
+        publish_statistics(wanted, answer, port, instances);
         break;
     case LOGICALPORTGROUP:
-        instances.append(getLogicalPortGroupInstance(port));
+        instances.append(getLogicalPortGroupInstance(port, wanted));
         break;
     case ALARMDEVICE:
-        publish_alarm(answer, port, instances);
+        publish_alarm(wanted, answer, port, instances);
         break;
     case STORAGEEXTENT:
     case TAPEDRIVE:
     case LOGICALDISK:
-        instances.append(TargetHelper::getTargetHelperObject()->getTargetInstances(port, id));
+        instances.append(TargetHelper::getTargetHelperObject()->getTargetInstances(port, id, wanted));
         break;
     default:
         LOG(INFO, "Unhandled class support");
@@ -39,9 +39,9 @@ void PortHelper::publish(classId_t id, const Json::Value& answer, _hbaPortInfo& 
 }
 
 /// The port as an initiator, then each target that it sees.
-void PortHelper::publish_endpoints(_hbaPortInfo& port, Fresh_Instances& instances) const
+void PortHelper::publish_endpoints(const Wanted& wanted, _hbaPortInfo& port, Fresh_Instances& instances) const
 {
-    instances.append(getSCSIProtocolEndpointInstance(port, true));
+    instances.append(getSCSIProtocolEndpointInstance(port, true, wanted));
     Remote_Ports remotes(LOG_HERE, port.localWWN);
     if (!remotes.listed())
         return;
@@ -60,12 +60,12 @@ void PortHelper::publish_endpoints(_hbaPortInfo& port, Fresh_Instances& instance
         guarded(LOG_HERE, {"libGetCompleteRemotePort"}, [&] {
             name_remote_port(remotes.wwn(), port);
             port.status = asInt(member(device, "stateMofValue"));
-            instances.append(getSCSIProtocolEndpointInstance(port, false));
+            instances.append(getSCSIProtocolEndpointInstance(port, false, wanted));
         });
     }
 }
 
-void PortHelper::publish_statistics(const Json::Value& answer, const _hbaPortInfo& port,
+void PortHelper::publish_statistics(const Wanted& wanted, const Json::Value& answer, const _hbaPortInfo& port,
                                     Fresh_Instances& instances) const
 {
     // The name is misspelt in the log, and always was.
@@ -81,10 +81,10 @@ void PortHelper::publish_statistics(const Json::Value& answer, const _hbaPortInf
     }
     prov_pport_stats_s statistics = {};
     if (guarded(LOG_HERE, entry, [&] { read_statistics(counters, fcoe, statistics); }))
-        instances.append(getFCPortStatisticsInstance(port, statistics, fcoe));
+        instances.append(getFCPortStatisticsInstance(port, statistics, fcoe, wanted));
 }
 
-void PortHelper::publish_alarm(const Json::Value& answer, const _hbaPortInfo& port,
+void PortHelper::publish_alarm(const Wanted& wanted, const Json::Value& answer, const _hbaPortInfo& port,
                                Fresh_Instances& instances) const
 {
     if (!hasMember(answer, "isMezz") || !hasMember(answer, "beaconState")) {
@@ -94,7 +94,7 @@ void PortHelper::publish_alarm(const Json::Value& answer, const _hbaPortInfo& po
     // Mezzanine cards have no beacon.
     if (asBool(answer["isMezz"]))
         return;
-    instances.append(getAlarmDeviceInstance(port, asBool(answer["beaconState"])));
+    instances.append(getAlarmDeviceInstance(port, asBool(answer["beaconState"]), wanted));
 }
 
 } // namespace KPRV

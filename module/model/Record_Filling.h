@@ -36,9 +36,14 @@ void copy_member(char (&field)[N], const Json::Value& object, const char* name)
 
 /// Without blanks around it.
 template <size_t N>
+void copy_trimmed(char (&field)[N], const Json::Value& text)
+{
+    copy_text(field, ProviderUtil::trimmed(text_of(text)));
+}
+template <size_t N>
 void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
 {
-    copy_text(field, ProviderUtil::trimmed(text_of(member(object, name))));
+    copy_trimmed(field, member(object, name));
 }
 
 /// Flat form of an address.

@@ -14,6 +14,7 @@ struct TargetHelper::Walk
 {
     const _hbaPortInfo& port;
     classId_t id;
+    const Wanted& wanted;
     Fresh_Instances instances = {};
     bool no_description_seen = false;
 };
@@ -39,14 +40,15 @@ TargetHelper* TargetHelper::getTargetHelperObject()
     return &helper;
 }
 
-Array<Instance*> TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id) const
+Array<Instance*> TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id,
+                                                  const Wanted& wanted) const
 {
     LOG_SCOPE("getTargetInstances");
     Remote_Ports remotes(LOG_HERE, port.portWWN);
     if (!remotes.listed())
         return {};
     LOG(DBG, "libGetAllRemotePorts. Number of rports -  %d", static_cast<int>(remotes.size()));
-    Walk walk = {.port = port, .id = id};
+    Walk walk = {.port = port, .id = id, .wanted = wanted};
     for (unsigned i = 0; i < remotes.size(); i++) {
         Json::Value answer;
         if (!remotes.ask(LOG_HERE, i, answer) || !ProviderUtil::isValidJsonResponse(answer)) {
@@ -95,13 +97,13 @@ void TargetHelper::publish_lun(Walk& walk, const char* address, const Json::Valu
     }
     switch (walk.id) {
     case TAPEDRIVE:
-        walk.instances.append(getTapeDriveInstance(walk.port, lun));
+        walk.instances.append(getTapeDriveInstance(walk.port, lun, walk.wanted));
         break;
     case STORAGEEXTENT:
-        walk.instances.append(getStorageExtentInstance(walk.port, lun));
+        walk.instances.append(getStorageExtentInstance(walk.port, lun, walk.wanted));
         break;
     case LOGICALDISK:
-        walk.instances.append(getLogicalDiskInstance(walk.port, lun));
+        walk.instances.append(getLogicalDiskInstance(walk.port, lun, walk.wanted));
         break;
     default:
         break;

@@ -6,6 +6,7 @@
 #include "module/model/Port_Data.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 #include "module/schema/KALDERA_LogicalDisk.h"
 #include "module/schema/KALDERA_StorageExtent.h"
 #include "module/schema/KALDERA_TapeDrive.h"
@@ -25,11 +26,17 @@ public:
     /// The LUNs behind one port: extents (9) or disks (38) of all targets but tapes and media changers, and
     /// tape drives (16) of these. A remote port or a LUN that cannot be read is left out, with the reason in
     /// the log. Throws nothing.
-    Array<Instance*> getTargetInstances(const _hbaPortInfo& port, classId_t id) const;
+    Array<Instance*> getTargetInstances(const _hbaPortInfo& port, classId_t id,
+                                        const Wanted& wanted = {}) const;
 
-    KALDERA_StorageExtent* getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const;
-    KALDERA_TapeDrive* getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const;
-    KALDERA_LogicalDisk* getLogicalDiskInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun) const;
+    // Null for one that is not wanted.
+
+    KALDERA_StorageExtent* getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun,
+                                                    const Wanted& wanted = {}) const;
+    KALDERA_TapeDrive* getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun,
+                                            const Wanted& wanted = {}) const;
+    KALDERA_LogicalDisk* getLogicalDiskInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun,
+                                                const Wanted& wanted = {}) const;
 
 private:
     TargetHelper();

@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_AdapterSoftwareIdentity>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(ADAPTERSOFTWAREIDENTITY), *handler,
+        return deliver_all(fc_hba_instances(ADAPTERSOFTWAREIDENTITY, handler->wanted()), *handler,
                            SAYING(ERR, "No Adapter Found!"));
     }
 };

@@ -13,7 +13,7 @@ public:
     {
         LOG_SCOPE("enum_instances");
         // The list arrives already paired.
-        return deliver_all(fc_hba_instances(AFFECTEDJOBELEMENT), *handler,
+        return deliver_all(fc_hba_instances(AFFECTEDJOBELEMENT, handler->wanted()), *handler,
                            SAYING(INFO, "Any affectedJobElement association could not be formed."));
     }
 };

@@ -34,7 +34,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_AlarmDevice>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(ALARMDEVICE), *handler,
+        return deliver_all(fc_hba_instances(ALARMDEVICE, handler->wanted()), *handler,
                            SAYING(ERR, "Invalid number of Instances returned"));
     }
 

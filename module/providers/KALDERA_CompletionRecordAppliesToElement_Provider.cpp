@@ -15,7 +15,7 @@ public:
     {
         LOG_SCOPE("enum_instances");
         // The list arrives already paired.
-        return deliver_all(fc_hba_instances(COMPLETIONRECORDAPPLIESTOELEMENT), *handler,
+        return deliver_all(fc_hba_instances(COMPLETIONRECORDAPPLIESTOELEMENT, handler->wanted()), *handler,
                            SAYING(INFO, "No completion records or managed elements are present."));
     }
 };

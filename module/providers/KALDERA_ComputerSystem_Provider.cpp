@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_ComputerSystem>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_one(fc_hba_instances(COMPUTERSYSTEM), *handler,
+        return deliver_one(fc_hba_instances(COMPUTERSYSTEM, handler->wanted()), *handler,
                            SAYING(ERR, "Error: Invalid mapping information"), ENUM_INSTANCES_FAILED);
     }
 };

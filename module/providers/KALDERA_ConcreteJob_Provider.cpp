@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_ConcreteJob>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(CONCRETEJOB), *handler,
+        return deliver_all(fc_hba_instances(CONCRETEJOB, handler->wanted()), *handler,
                            SAYING(INFO, "No jobs are currently running in the system."));
     }
 };

@@ -16,11 +16,14 @@ public:
                                          Enum_Instances_Handler<KALDERA_ControlledBy>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_PortController> adapters(fc_hba_instances(PORTCONTROLLER));
+        using Control = KALDERA_ControlledBy;
+        List<KALDERA_PortController> adapters(fc_hba_instances(PORTCONTROLLER, Wanted::names()));
         TRACE_BUILDING();
-        const Pairs pair(handler, &KALDERA_ControlledBy::Antecedent, &KALDERA_ControlledBy::Dependent);
+        const Pairs pair(handler, &Control::Antecedent, &Control::Dependent);
         for (uint32 i = 0; i < adapters.size(); i++) {
-            List<KALDERA_FCPort> ports(fc_ports_of(adapters[i]->DeviceID.value));
+            const Wanted wanted = handler->wanted().beside<KALDERA_FCPort>(adapters[i], &Control::Antecedent,
+                                                                           &Control::Dependent);
+            List<KALDERA_FCPort> ports(fc_ports_of(adapters[i]->DeviceID.value, wanted));
             for (uint32 j = 0; j < ports.size(); j++)
                 pair(adapters[i], ports[j]);
         }

@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_DiagnosticCompletionRecord>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(DIAGNOSTICCOMPLETIONRECORD), *handler,
+        return deliver_all(fc_hba_instances(DIAGNOSTICCOMPLETIONRECORD, handler->wanted()), *handler,
                            SAYING(INFO, "No completion records are available."));
     }
 };

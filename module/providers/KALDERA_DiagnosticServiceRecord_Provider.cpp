@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_DiagnosticServiceRecord>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(DIAGNOSTICSERVICERECORD), *handler,
+        return deliver_all(fc_hba_instances(DIAGNOSTICSERVICERECORD, handler->wanted()), *handler,
                            SAYING(INFO, "No diagnostic service records are available."));
     }
 };

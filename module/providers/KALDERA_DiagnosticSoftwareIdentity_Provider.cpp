@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_DiagnosticSoftwareIdentity>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(DIAGNOSTICSOFTWAREIDENTITY), *handler,
+        return deliver_all(fc_hba_instances(DIAGNOSTICSOFTWAREIDENTITY, handler->wanted()), *handler,
                            SAYING(WARN, "No diagnostic software is installed"));
     }
 };

@@ -17,7 +17,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_EthLoopbackDiagnosticTest>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(ETHLOOPBACKDIAGNOSTICTEST), *handler,
+        return deliver_all(fc_hba_instances(ETHLOOPBACKDIAGNOSTICTEST, handler->wanted()), *handler,
                            SAYING(WARN, "No ethloopback diagnostic test is available"));
     }
 

@@ -16,12 +16,14 @@ public:
                                          Enum_Instances_Handler<KALDERA_EthernetPortControlledBy>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_PortController> adapters(fc_hba_instances(PORTCONTROLLER));
+        using Control = KALDERA_EthernetPortControlledBy;
+        List<KALDERA_PortController> adapters(fc_hba_instances(PORTCONTROLLER, Wanted::names()));
         TRACE_BUILDING();
-        const Pairs pair(handler, &KALDERA_EthernetPortControlledBy::Antecedent,
-                         &KALDERA_EthernetPortControlledBy::Dependent);
+        const Pairs pair(handler, &Control::Antecedent, &Control::Dependent);
         for (uint32 i = 0; i < adapters.size(); i++) {
-            List<KALDERA_EthernetPort> ports(ethernet_ports_of(adapters[i]->DeviceID.value));
+            const Wanted wanted = handler->wanted().beside<KALDERA_EthernetPort>(
+                adapters[i], &Control::Antecedent, &Control::Dependent);
+            List<KALDERA_EthernetPort> ports(ethernet_ports_of(adapters[i]->DeviceID.value, wanted));
             for (uint32 j = 0; j < ports.size(); j++)
                 pair(adapters[i], ports[j]);
         }

@@ -16,8 +16,13 @@ public:
                                          Enum_Instances_Handler<KALDERA_EthernetPortSystemDevice>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
-        List<KALDERA_EthernetPort> elements(fc_hba_instances(ETHERNETPORT));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM,
+            wanted.end<KALDERA_ComputerSystem>(&KALDERA_EthernetPortSystemDevice::GroupComponent)));
+        List<KALDERA_EthernetPort> elements(fc_hba_instances(
+            ETHERNETPORT,
+            wanted.end<KALDERA_EthernetPort>(&KALDERA_EthernetPortSystemDevice::PartComponent)));
         // Deliberately weak: only a wrong count and an empty list together fail.
         if (systems.size() != 1 && elements.empty())
             return SAYING(ERR, "Invalid mapping information").answer(ENUM_INSTANCES_FAILED);

@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_EthernetPort>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(ETHERNETPORT), *handler,
+        return deliver_all(fc_hba_instances(ETHERNETPORT, handler->wanted()), *handler,
                            SAYING(ERR, "Error: Invalid mapping information"));
     }
 };

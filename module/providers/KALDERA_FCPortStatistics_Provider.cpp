@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_FCPortStatistics>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(FCPORTSTATISTICS), *handler, SAYING(ERR, "No FC Ports Found!"));
+        return deliver_all(fc_hba_instances(FCPORTSTATISTICS, handler->wanted()), *handler,
+                           SAYING(ERR, "No FC Ports Found!"));
     }
 };
 

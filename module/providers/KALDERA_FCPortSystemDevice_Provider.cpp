@@ -16,8 +16,11 @@ public:
                                          Enum_Instances_Handler<KALDERA_FCPortSystemDevice>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
-        List<KALDERA_FCPort> elements(fc_hba_instances(FCPORT));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&KALDERA_FCPortSystemDevice::GroupComponent)));
+        List<KALDERA_FCPort> elements(
+            fc_hba_instances(FCPORT, wanted.end<KALDERA_FCPort>(&KALDERA_FCPortSystemDevice::PartComponent)));
         // Deliberately weak: only a wrong count and an empty list together fail.
         if (systems.size() != 1 && elements.empty())
             return SAYING(ERR, "Error: Invalid mapping information").answer(ENUM_INSTANCES_FAILED);

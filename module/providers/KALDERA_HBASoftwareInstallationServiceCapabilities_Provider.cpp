@@ -14,8 +14,8 @@ public:
                    Enum_Instances_Handler<KALDERA_HBASoftwareInstallationServiceCapabilities>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_one(fc_hba_instances(HBASOFTWAREINSTALLATIONSERVICECAPABILITIES), *handler,
-                           SAYING(ERR, "Error: Invalid mapping information"), ENUM_INSTANCES_OK);
+        return deliver_one(fc_hba_instances(HBASOFTWAREINSTALLATIONSERVICECAPABILITIES, handler->wanted()),
+                           *handler, SAYING(ERR, "Error: Invalid mapping information"), ENUM_INSTANCES_OK);
     }
 };
 

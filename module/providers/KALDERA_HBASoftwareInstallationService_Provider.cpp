@@ -91,7 +91,7 @@ public:
                    Enum_Instances_Handler<KALDERA_HBASoftwareInstallationService>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_one(fc_hba_instances(HBASOFTWAREINSTALLATIONSERVICE), *handler,
+        return deliver_one(fc_hba_instances(HBASOFTWAREINSTALLATIONSERVICE, handler->wanted()), *handler,
                            SAYING(ERR, "Error: Invalid mapping information"), ENUM_INSTANCES_OK);
     }
 

@@ -16,10 +16,14 @@ public:
                                          Enum_Instances_Handler<KALDERA_HostedAccessPoint>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&KALDERA_HostedAccessPoint::Antecedent)));
         if (systems.size() != 1)
             return SAYING(ERR, "Error: Invalid mapping information").answer(ENUM_INSTANCES_FAILED);
-        List<KALDERA_SCSIProtocolEndpoint> elements(fc_hba_instances(SCSIPROTOCOLENDPOINT));
+        List<KALDERA_SCSIProtocolEndpoint> elements(fc_hba_instances(
+            SCSIPROTOCOLENDPOINT,
+            wanted.end<KALDERA_SCSIProtocolEndpoint>(&KALDERA_HostedAccessPoint::Dependent)));
         if (elements.empty())
             return SAYING(WARN, "Invalid number of SCSIProtocolEndPoint instances returned.")
                 .answer(ENUM_INSTANCES_OK);

@@ -16,10 +16,13 @@ public:
                                          Enum_Instances_Handler<KALDERA_HostedCollection>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&KALDERA_HostedCollection::Antecedent)));
         if (systems.size() != 1)
             return SAYING(ERR, "Error: Invalid mapping information").answer(ENUM_INSTANCES_FAILED);
-        List<KALDERA_LogicalPortGroup> elements(fc_hba_instances(LOGICALPORTGROUP));
+        List<KALDERA_LogicalPortGroup> elements(fc_hba_instances(
+            LOGICALPORTGROUP, wanted.end<KALDERA_LogicalPortGroup>(&KALDERA_HostedCollection::Dependent)));
         if (elements.empty())
             return SAYING(WARN, "No Logical Port Groups found!").answer(ENUM_INSTANCES_OK);
         TRACE_BUILDING();

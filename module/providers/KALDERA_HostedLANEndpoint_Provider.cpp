@@ -14,11 +14,14 @@ public:
                                          Enum_Instances_Handler<KALDERA_HostedLANEndpoint>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&KALDERA_HostedLANEndpoint::Antecedent)));
         if (systems.size() != 1)
             return SAYING(ERR, "Error: Invalid number of ComputerSystem instances")
                 .answer(ENUM_INSTANCES_FAILED);
-        List<KALDERA_LANEndpoint> elements(fc_hba_instances(LANENDPOINT));
+        List<KALDERA_LANEndpoint> elements(fc_hba_instances(
+            LANENDPOINT, wanted.end<KALDERA_LANEndpoint>(&KALDERA_HostedLANEndpoint::Dependent)));
         if (elements.empty())
             return SAYING(WARN, "No Ethernet Port Found").answer(ENUM_INSTANCES_OK);
         TRACE_BUILDING();

@@ -16,11 +16,15 @@ public:
                                          Enum_Instances_Handler<KALDERA_InstalledSoftwareIdentity>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&KALDERA_InstalledSoftwareIdentity::System)));
         if (systems.size() != 1)
             return SAYING(ERR, "Error: count of computersystem instance is not 1")
                 .answer(ENUM_INSTANCES_FAILED);
-        List<KALDERA_AdapterSoftwareIdentity> elements(fc_hba_instances(ADAPTERSOFTWAREIDENTITY));
+        List<KALDERA_AdapterSoftwareIdentity> elements(fc_hba_instances(
+            ADAPTERSOFTWAREIDENTITY, wanted.end<KALDERA_AdapterSoftwareIdentity>(
+                                         &KALDERA_InstalledSoftwareIdentity::InstalledSoftware)));
         if (elements.empty())
             return SAYING(ERR, "Error: Invalid mapping information").answer(ENUM_INSTANCES_OK);
         TRACE_BUILDING();

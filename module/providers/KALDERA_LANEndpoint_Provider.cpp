@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_LANEndpoint>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(LANENDPOINT), *handler, SAYING(WARN, "No Ethernet Port Found"));
+        return deliver_all(fc_hba_instances(LANENDPOINT, handler->wanted()), *handler,
+                           SAYING(WARN, "No Ethernet Port Found"));
     }
 };
 

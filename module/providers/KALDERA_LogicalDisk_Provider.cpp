@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_LogicalDisk>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(hdr_instances(LOGICALDISK), *handler, SAYING(ERR, "No LogicalDisks Found!"));
+        return deliver_all(hdr_instances(LOGICALDISK, handler->wanted()), *handler,
+                           SAYING(ERR, "No LogicalDisks Found!"));
     }
 };
 

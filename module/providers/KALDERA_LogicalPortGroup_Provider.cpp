@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_LogicalPortGroup>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(LOGICALPORTGROUP), *handler,
+        return deliver_all(fc_hba_instances(LOGICALPORTGROUP, handler->wanted()), *handler,
                            SAYING(WARN, "No Logical Port Groups found!"));
     }
 };

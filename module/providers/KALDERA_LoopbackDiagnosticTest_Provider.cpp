@@ -17,7 +17,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_LoopbackDiagnosticTest>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(LOOPBACKDIAGNOSTICTEST), *handler,
+        return deliver_all(fc_hba_instances(LOOPBACKDIAGNOSTICTEST, handler->wanted()), *handler,
                            SAYING(WARN, "No loopback diagnostic test is available"));
     }
 

@@ -17,7 +17,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_MemoryDiagnosticTest>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(MEMORYDIAGNOSTICTEST), *handler,
+        return deliver_all(fc_hba_instances(MEMORYDIAGNOSTICTEST, handler->wanted()), *handler,
                            SAYING(WARN, "No memory diagnostic test is available"));
     }
 

@@ -18,7 +18,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_PCILoopbackDiagnosticTest>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(PCILOOPBACKDIAGNOSTICTEST), *handler,
+        return deliver_all(fc_hba_instances(PCILOOPBACKDIAGNOSTICTEST, handler->wanted()), *handler,
                            SAYING(WARN, "No PCI loopback diagnostic test is available"));
     }
 

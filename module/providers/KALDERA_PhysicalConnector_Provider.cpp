@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_PhysicalConnector>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(PHYSICALCONNECTOR), *handler, SAYING(ERR, "No Connector Found!"));
+        return deliver_all(fc_hba_instances(PHYSICALCONNECTOR, handler->wanted()), *handler,
+                           SAYING(ERR, "No Connector Found!"));
     }
 };
 

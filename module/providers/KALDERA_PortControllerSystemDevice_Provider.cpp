@@ -16,11 +16,16 @@ public:
                                          Enum_Instances_Handler<KALDERA_PortControllerSystemDevice>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(fc_hba_instances(
+            COMPUTERSYSTEM,
+            wanted.end<KALDERA_ComputerSystem>(&KALDERA_PortControllerSystemDevice::GroupComponent)));
         if (systems.size() != 1)
             return SAYING(ERR, "Error: Returned instances for ComputerSystem is not 1")
                 .answer(ENUM_INSTANCES_FAILED);
-        List<KALDERA_PortController> elements(fc_hba_instances(PORTCONTROLLER));
+        List<KALDERA_PortController> elements(fc_hba_instances(
+            PORTCONTROLLER,
+            wanted.end<KALDERA_PortController>(&KALDERA_PortControllerSystemDevice::PartComponent)));
         if (elements.empty())
             return SAYING(ERR, "Error: Invalid mapping information").answer(ENUM_INSTANCES_OK);
         LOG(INFO, "Building and returning association instances....\n");

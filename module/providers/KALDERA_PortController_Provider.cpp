@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_PortController>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(PORTCONTROLLER), *handler, SAYING(ERR, "No Adapter Found!"));
+        return deliver_all(fc_hba_instances(PORTCONTROLLER, handler->wanted()), *handler,
+                           SAYING(ERR, "No Adapter Found!"));
     }
 };
 

@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_Product>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(PRODUCT), *handler, SAYING(ERR, "No Adapter Found!"));
+        return deliver_all(fc_hba_instances(PRODUCT, handler->wanted()), *handler,
+                           SAYING(ERR, "No Adapter Found!"));
     }
 };
 

@@ -36,6 +36,8 @@ public:
     {
         std::string_view pair;
         for (uint32 i = 0; i < units.size(); i++) {
+            if (!units[i])
+                continue;
             const std::string_view id = view_of(units[i]->DeviceID.value);
             // The units of a target stand together, and the pair before has one separator in it.
             if (pair.empty() || id.size() <= pair.size() || id[pair.size()] != '_' || !id.starts_with(pair))
@@ -68,12 +70,15 @@ public:
     Enum_Instances_Status enum_instances(const Path*, Enum_Instances_Handler<Path>* handler)
     {
         LOG_SCOPE("enum_instances");
+        const Wanted& wanted = handler->wanted();
         const Message invalid = SAYING(ERR, "Error: Invalid number of instances returned!\n");
-        List<KALDERA_StorageExtent> extents(hdr_instances(STORAGEEXTENT));
-        List<KALDERA_TapeDrive> drives(hdr_instances(TAPEDRIVE));
+        List<KALDERA_StorageExtent> extents(
+            hdr_instances(STORAGEEXTENT, wanted.end<KALDERA_StorageExtent>(&Path::LogicalUnit)));
+        List<KALDERA_TapeDrive> drives(
+            hdr_instances(TAPEDRIVE, wanted.end<KALDERA_TapeDrive>(&Path::LogicalUnit)));
         if (extents.empty() && drives.empty())
             return invalid.answer(ENUM_INSTANCES_OK);
-        List<KALDERA_SCSIProtocolEndpoint> endpoints(fc_hba_instances(SCSIPROTOCOLENDPOINT));
+        List<KALDERA_SCSIProtocolEndpoint> endpoints(fc_hba_instances(SCSIPROTOCOLENDPOINT, Wanted::names()));
         if (endpoints.empty())
             return invalid.answer(ENUM_INSTANCES_OK);
         LOG(DBG, "Number of SCSIPROTOCOLENDPOINT(Initiator and Target)= %d", int(endpoints.size()));

@@ -12,7 +12,7 @@ public:
                                          Enum_Instances_Handler<KALDERA_SCSIProtocolEndpoint>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(fc_hba_instances(SCSIPROTOCOLENDPOINT), *handler,
+        return deliver_all(fc_hba_instances(SCSIPROTOCOLENDPOINT, handler->wanted()), *handler,
                            SAYING(ERR, "No FC Ports Found!"));
     }
 };

@@ -14,7 +14,7 @@ public:
     {
         LOG_SCOPE("enum_instances");
         // The list arrives already paired.
-        return deliver_all(fc_hba_instances(SERVICERECORDAPPLIESTOELEMENT), *handler,
+        return deliver_all(fc_hba_instances(SERVICERECORDAPPLIESTOELEMENT, handler->wanted()), *handler,
                            SAYING(INFO, "No service records or managed elements are present."));
     }
 };

@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_StorageExtent>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(hdr_instances(STORAGEEXTENT), *handler, SAYING(ERR, "No StorageExtents Found!"));
+        return deliver_all(hdr_instances(STORAGEEXTENT, handler->wanted()), *handler,
+                           SAYING(ERR, "No StorageExtents Found!"));
     }
 };
 

@@ -18,12 +18,16 @@ public:
                    Enum_Instances_Handler<KALDERA_StorageResourcesSystemDevice>* handler)
     {
         LOG_SCOPE("enum_instances");
-        List<KALDERA_ComputerSystem> systems(fc_hba_instances(COMPUTERSYSTEM));
-        List<KALDERA_StorageExtent> extents(hdr_instances(STORAGEEXTENT));
-        List<KALDERA_TapeDrive> drives(hdr_instances(TAPEDRIVE));
+        using Device = KALDERA_StorageResourcesSystemDevice;
+        const Wanted& wanted = handler->wanted();
+        List<KALDERA_ComputerSystem> systems(
+            fc_hba_instances(COMPUTERSYSTEM, wanted.end<KALDERA_ComputerSystem>(&Device::GroupComponent)));
+        List<KALDERA_StorageExtent> extents(
+            hdr_instances(STORAGEEXTENT, wanted.end<KALDERA_StorageExtent>(&Device::PartComponent)));
+        List<KALDERA_TapeDrive> drives(
+            hdr_instances(TAPEDRIVE, wanted.end<KALDERA_TapeDrive>(&Device::PartComponent)));
         TRACE_BUILDING();
-        const Pairs pair(handler, &KALDERA_StorageResourcesSystemDevice::GroupComponent,
-                         &KALDERA_StorageResourcesSystemDevice::PartComponent);
+        const Pairs pair(handler, &Device::GroupComponent, &Device::PartComponent);
         join_each(systems, extents, pair);
         return join_each(systems, drives, pair);
     }

@@ -12,7 +12,8 @@ public:
                                          Enum_Instances_Handler<KALDERA_TapeDrive>* handler)
     {
         LOG_SCOPE("enum_instances");
-        return deliver_all(hdr_instances(TAPEDRIVE), *handler, SAYING(ERR, "No TapeDrives Found!"));
+        return deliver_all(hdr_instances(TAPEDRIVE, handler->wanted()), *handler,
+                           SAYING(ERR, "No TapeDrives Found!"));
     }
 };
 

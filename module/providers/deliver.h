@@ -49,7 +49,7 @@ public:
 
     uint32 size() const { return _instances.size(); }
     bool empty() const { return size() == 0; }
-    /// Null for an element that is no T.
+    /// Null for an element that is no T, or not wanted.
     const T* operator[](uint32 i) const { return cast<T>(const_cast<const Instance*>(_instances[i])); }
 
     /// Hands each element over to the handler, in order.

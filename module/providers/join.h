@@ -33,7 +33,7 @@ A* create_association()
     return as_created.copy();
 }
 
-/// Makes associations of two ends and hands each over.
+/// Makes associations of two ends and hands each over. An end that is not wanted, null, joins nothing.
 template <class A, class First, class Second>
 class Pairs
 {
@@ -45,6 +45,8 @@ public:
 
     void operator()(const Instance* first, const Instance* second) const
     {
+        if (!first || !second)
+            return;
         Ref<A> association(create_association<A>());
         set_end(association.ptr(), _first_role, first);
         set_end(association.ptr(), _second_role, second);
@@ -92,8 +94,11 @@ Enum_Instances_Status join_equal(Matches matches, const List<Outer>& outers,
 {
     Position_Index index;
     for (uint32 j = 0; j < inners.size(); j++)
-        index.add(view_of((inners[j]->*inner_key).value), j);
+        if (inners[j])
+            index.add(view_of((inners[j]->*inner_key).value), j);
     for (uint32 i = 0; i < outers.size(); i++) {
+        if (!outers[i])
+            continue;
         const auto* found = index.find(view_of((outers[i]->*outer_key).value));
         for (size_t n = 0; found && n < found->size() && (n == 0 || matches == Matches::ALL); n++)
             pair(outers[i], inners[(*found)[n]]);

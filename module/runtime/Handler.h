@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Instance.h"
+#include "module/runtime/Wanted.h"
 
 namespace KPRV {
 
@@ -14,9 +14,13 @@ template <class T>
 class Instance_Handler
 {
 public:
-    Instance_Handler(Instance_Handler_Proc proc, void* client_data) : _proc(proc), _client_data(client_data)
+    /// `wanted` null: everything.
+    Instance_Handler(Instance_Handler_Proc proc, void* client_data, const Wanted* wanted = nullptr)
+        : _proc(proc), _client_data(client_data), _wanted(wanted ? *wanted : Wanted())
     {
     }
+    /// What the receiver does with: it takes more, and sorts it out.
+    const Wanted& wanted() const { return _wanted; }
     /// Takes over the instance. The ends of an association may be ends of others too, and from then on nobody
     /// writes to them: what they became for the server is used again.
     bool handle(T* instance) { return _proc(instance, 0, _client_data); }
@@ -24,6 +28,7 @@ public:
 private:
     Instance_Handler_Proc _proc;
     void* _client_data;
+    Wanted _wanted;
 };
 
 template <class T>

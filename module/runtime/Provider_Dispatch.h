@@ -52,7 +52,7 @@ int dispatch(const Registration*, int operation, void* arg0, void* arg1, void* a
             return status;
         }
         case OP_ENUM_INSTANCES: {
-            Enum_Instances_Handler<Class> handler(proc(arg2), arg3);
+            Enum_Instances_Handler<Class> handler(proc(arg2), arg3, static_cast<const Wanted*>(arg4));
             const int status = provider->enum_instances(instance(arg1), &handler);
             proc(arg2)(nullptr, status, arg3);
             return status;

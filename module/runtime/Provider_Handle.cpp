@@ -139,15 +139,17 @@ int Provider_Handle::get_instance(const Instance* model, Instance*& instance)
         return status;
 
     Find_By_Key data{model, {}};
-    if (enum_instances(model, Find_By_Key::_proc, &data) != ENUM_INSTANCES_OK || !data.found)
+    if (enum_instances(model, Find_By_Key::_proc, &data, Wanted::object(model)) != ENUM_INSTANCES_OK ||
+        !data.found)
         return GET_INSTANCE_NOT_FOUND;
     instance = data.found.steal();
     return GET_INSTANCE_OK;
 }
 
-int Provider_Handle::enum_instances(const Instance* model, Instance_Handler_Proc proc, void* client_data)
+int Provider_Handle::enum_instances(const Instance* model, Instance_Handler_Proc proc, void* client_data,
+                                    const Wanted& wanted)
 {
-    return _call(OP_ENUM_INSTANCES, model, as_argument(proc), client_data);
+    return _call(OP_ENUM_INSTANCES, model, as_argument(proc), client_data, &wanted);
 }
 
 int Provider_Handle::create_instance(Instance* instance)
@@ -219,7 +221,8 @@ int Provider_Handle::enum_associator_names(const Instance* instance, const Strin
     __set_null_flags(model.ptr(), false, true, 1);
     Find_Associators data{instance,   Fitting_References(instance), result_class, role, result_role, proc,
                           client_data};
-    const int status = enum_instances(model.ptr(), Find_Associators::_proc, &data);
+    const int status =
+        enum_instances(model.ptr(), Find_Associators::_proc, &data, Wanted::touching(instance));
     proc(nullptr, 0, client_data);
 
     switch (status) {
@@ -249,7 +252,7 @@ int Provider_Handle::enum_references(const Instance* instance, const Instance* m
     }
 
     Find_References data{instance, role, proc, client_data};
-    const int status = enum_instances(model, Find_References::_proc, &data);
+    const int status = enum_instances(model, Find_References::_proc, &data, Wanted::touching(instance));
     proc(nullptr, 0, client_data);
 
     switch (status) {

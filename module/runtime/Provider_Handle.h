@@ -23,7 +23,9 @@ public:
     /// Falls back on enumeration and `key_eq` when the provider has no such operation (61); the fallback
     /// answers 0 or 60. On 0 the caller owns the instance.
     int get_instance(const Instance* model, Instance*& instance);
-    int enum_instances(const Instance* model, Instance_Handler_Proc proc, void* client_data);
+    /// Gives what is wanted, and may give more.
+    int enum_instances(const Instance* model, Instance_Handler_Proc proc, void* client_data,
+                       const Wanted& wanted = {});
     int create_instance(Instance* instance);
     int delete_instance(const Instance* instance);
     int modify_instance(const Instance* model, const Instance* instance);

@@ -33,6 +33,11 @@ const CMPIBrokerFT broker_ft = [] {
             on_indication();
         return okay();
     };
+    ft.getInstance = [](const CMPIBroker* broker, const CMPIContext*, const CMPIObjectPath* path,
+                        const char** properties, CMPIStatus* status) {
+        set_okay(status);
+        return self(broker).fetch(path, properties);
+    };
     return ft;
 }();
 
@@ -93,6 +98,15 @@ const CMPIResultFT result_ft = [] {
     return ft;
 }();
 
+const CMPIResultFT fetching_ft = [] {
+    CMPIResultFT ft = result_ft;
+    ft.returnInstance = [](const CMPIResult* result, const CMPIInstance* instance) {
+        broker_of(result).fetched(instance);
+        return okay();
+    };
+    return ft;
+}();
+
 } // namespace
 
 Lean_Broker& Lean_Broker::get()
@@ -101,7 +115,8 @@ Lean_Broker& Lean_Broker::get()
     return broker;
 }
 
-Lean_Broker::Lean_Broker() : _broker{}, _context{this, &context_ft}, _result{this, &result_ft}
+Lean_Broker::Lean_Broker()
+    : _broker{}, _context{this, &context_ft}, _result{this, &result_ft}, _fetching{this, &fetching_ft}
 {
     _broker.hdl = this;
     _broker.bft = &broker_ft;
@@ -147,6 +162,15 @@ void Lean_Broker::deliver(const CMPIObjectPath* path)
     _delivered++;
     if (_keep)
         _paths.push_back(path);
+}
+
+CMPIInstance* Lean_Broker::fetch(const CMPIObjectPath* path, const char** properties)
+{
+    CMPIInstanceMI* const mi =
+        provider_of(object_of<Lean_String>(object_of<Lean_Path>(path)->class_name)->text);
+    _fetched = nullptr;
+    mi->ft->getInstance(mi, &_context, &_fetching, path, properties);
+    return const_cast<CMPIInstance*>(_fetched);
 }
 
 void Lean_Broker::deliver(const char* text)

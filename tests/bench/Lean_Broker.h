@@ -27,6 +27,8 @@ public:
 
     /// Called with each delivered indication, on the thread that delivers it.
     void (*on_indication)() = nullptr;
+    /// Who serves a class that a provider asks the server for.
+    CMPIInstanceMI* (*provider_of)(const char* class_name) = nullptr;
 
     const CMPIBroker* broker() const { return &_broker; }
     const CMPIContext* context() const { return &_context; }
@@ -40,6 +42,8 @@ public:
     void deliver(const char* text);
     /// The kept results in order: class, keys and properties with their types, sorted by name.
     std::vector<std::string> texts() const;
+    const std::vector<const CMPIInstance*>& instances() const { return _instances; }
+    const std::vector<const CMPIObjectPath*>& paths() const { return _paths; }
 
     /// Objects for requests. They live until `begin_call`.
     CMPIObjectPath* path(const char* class_name);
@@ -55,6 +59,9 @@ public:
     void* allocate(size_t size);
     void deliver(const CMPIInstance* instance);
     void deliver(const CMPIObjectPath* path);
+    void fetched(const CMPIInstance* instance) { _fetched = instance; }
+    /// The instance as its provider gives it, in a request of its own; null if it does not.
+    CMPIInstance* fetch(const CMPIObjectPath* path, const char** properties);
 
     static constexpr const char* NAME_SPACE = "root/kaldera";
 
@@ -64,6 +71,8 @@ private:
     CMPIBroker _broker;
     CMPIContext _context;
     CMPIResult _result;
+    CMPIResult _fetching;
+    const CMPIInstance* _fetched = nullptr;
 
     std::vector<std::unique_ptr<char[]>> _blocks;
     char* _next = nullptr;

@@ -50,6 +50,7 @@ Fast_Library::Fast_Library() : Fast_Library(open_library(KLDR_FAST_LIBRARY)) {}
 
 Fast_Library::Fast_Library(void* library)
     : prepare(function<Prepare_Storage>(library, "prepare_storage")),
+      record(function<Record_Calls>(library, "record_calls")),
       get_adapters(function<JsonReqFP>(library, "getAllAdaptersIndexString")),
       get_adapter(function<JsonReqFP>(library, "getHbaByWwn")),
       get_fc_ports(function<JsonReqFP>(library, "getFcPhyPortIndicesByAdapter")),

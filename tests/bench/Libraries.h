@@ -22,6 +22,8 @@ public:
 
     /// What the calls to come answer.
     const Prepare_Storage prepare;
+    /// Who takes note of them.
+    const Record_Calls record;
 
     // The entry points, for the plain twins.
     const JsonReqFP get_adapters;

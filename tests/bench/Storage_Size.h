@@ -1,6 +1,8 @@
 #pragma once
 
 #include <compare>
+#include <functional>
+#include <vector>
 
 namespace KPRV::bench {
 
@@ -20,5 +22,10 @@ struct Storage_Size
 /// What the prepared adapter library exports beside its entry points: the answers of the calls to come are
 /// those of a host of that size.
 using Prepare_Storage = void (*)(const Storage_Size& size);
+
+/// Calls about adapters, ports and what lies behind them, each with its request: to be made again.
+using Recorded_Calls = std::vector<std::function<void()>>;
+/// Where calls are noted from now on; null: nowhere.
+using Record_Calls = void (*)(Recorded_Calls* calls);
 
 } // namespace KPRV::bench

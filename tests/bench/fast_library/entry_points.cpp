@@ -10,6 +10,14 @@ using namespace KPRV::bench;
 
 static const Storage* storage;
 static evtProcessCB event_callback;
+static Recorded_Calls* recorded;
+
+/// Takes note of a call, if somebody records: made again, it produces the same answer and destroys it.
+static void note(JsonReqFP entry_point, const Json::Value& request)
+{
+    if (recorded)
+        recorded->push_back([entry_point, request] { entry_point(request); });
+}
 
 /// Texts and numbers by turns, as the library's larger answers have them.
 static Json::Value members(int count)
@@ -32,6 +40,11 @@ void prepare_storage(const Storage_Size& size)
 {
     static std::map<Storage_Size, Storage>& prepared = *new std::map<Storage_Size, Storage>;
     storage = &prepared.try_emplace(size, size).first->second;
+}
+
+void record_calls(Recorded_Calls* calls)
+{
+    recorded = calls;
 }
 
 Json::Value init_hba_lib(const Json::Value&)
@@ -84,33 +97,39 @@ void send_event(const char* text)
         event_callback(text);
 }
 
-Json::Value getAllAdaptersIndexString(const Json::Value&)
+Json::Value getAllAdaptersIndexString(const Json::Value& request)
 {
+    note(getAllAdaptersIndexString, request);
     return storage->adapters;
 }
 
 Json::Value getHbaByWwn(const Json::Value& request)
 {
+    note(getHbaByWwn, request);
     return storage->adapter(request["wwn"]);
 }
 
 Json::Value getFcPhyPortIndicesByAdapter(const Json::Value& request)
 {
+    note(getFcPhyPortIndicesByAdapter, request);
     return storage->ports_of(request["indexStr"]);
 }
 
 Json::Value getPortByWwn(const Json::Value& request)
 {
+    note(getPortByWwn, request);
     return storage->port(request["wwn"]);
 }
 
 Json::Value getAllRemotePorts(const Json::Value& request)
 {
+    note(getAllRemotePorts, request);
     return storage->remote_ports_of(request["pPortWwn"]);
 }
 
 Json::Value getCompleteRemotePort(const Json::Value& request)
 {
+    note(getCompleteRemotePort, request);
     return storage->remote_port(request["rPortWwn"]);
 }
 

@@ -59,17 +59,17 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
     static FCHBAManager manager;
     return &manager;
 }
-Array<Instance*> FCHBAManager::getInstances(classId_t id) const
+Array<Instance*> FCHBAManager::getInstances(classId_t id, const Wanted&) const
 {
     if (is_storage(id) || is_of_server(id))
         throw std::logic_error("not a class of this manager");
     return fetch(id);
 }
-Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(const String& address) const
+Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(const String& address, const Wanted&) const
 {
     return fetch(std::string("FC ports of ") + address.c_str());
 }
-Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& address) const
+Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(const String& address, const Wanted&) const
 {
     return fetch(std::string("Ethernet ports of ") + address.c_str());
 }
@@ -104,7 +104,7 @@ HDRManager* HDRManager::getHDRManager()
     static HDRManager manager;
     return &manager;
 }
-Array<Instance*> HDRManager::getInstances(classId_t id) const
+Array<Instance*> HDRManager::getInstances(classId_t id, const Wanted&) const
 {
     if (!is_storage(id))
         throw std::logic_error("not a class of this manager");
@@ -134,11 +134,12 @@ EthernetPortHelper* EthernetPortHelper::getEthernetPortHelperObject()
     static EthernetPortHelper helper;
     return &helper;
 }
-Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t) const
+Array<Instance*> EthernetPortHelper::getInstancesByClass(classId_t, const Wanted&) const
 {
     throw std::logic_error("no association asks for the element of a run");
 }
-Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id) const
+Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapter_id, classId_t id,
+                                                             const Wanted&) const
 {
     if (id != ETHERNETPORT)
         throw std::logic_error("only Ethernet ports are asked for");
