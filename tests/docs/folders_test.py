@@ -36,8 +36,7 @@ class Tables(unittest.TestCase):
         for folder in ALLOWED:
             # Those of the command line and the contracts share one.
             home = folder if folder.startswith("module/") else folder.split("/")[0]
-            if folder not in folders.WORKSHOP:
-                self.assertTrue((ROOT / home / "README.md").exists(), folder)
+            self.assertTrue((ROOT / home / "README.md").exists(), folder)
 
 
 class Drawing(unittest.TestCase):
