@@ -7,9 +7,9 @@ namespace KPRV::simulator {
 /// What an adapter depends on.
 struct Adapter_Place
 {
-    std::size_t number;              // from 1
-    std::size_t eth_ports_before;    // how many the adapters before have
-    const Remote_Ports& known_ports; // the host's remote ports
+    std::size_t number;                  // from 1
+    std::size_t eth_ports_before;        // how many the adapters before have
+    const Remote_Port_List& known_ports; // the host's remote ports
 };
 
 /// Builds an adapter from an element of "adapters", out of which it takes the remote ports. Throws

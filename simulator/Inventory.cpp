@@ -49,7 +49,7 @@ Inventory::Inventory(const Json_Text& source)
     check_members(source, parts["postedTests"], simulator::posted_tests_members, "postedTests");
     posted_tests_members = answered_members(parts["postedTests"], simulator::posted_tests_members);
 
-    const Remote_Ports remote_ports = read_remote_ports(source, take_part(parts, "remotePorts"));
+    const Remote_Port_List remote_ports = read_remote_ports(source, take_part(parts, "remotePorts"));
     std::size_t eth_ports = 0;
     for (Json::Value& each : parts["adapters"]) {
         adapters.push_back(read_adapter(source, each, {adapters.size() + 1, eth_ports, remote_ports}));

@@ -5,7 +5,7 @@
 #include "simulator/Json_Text.h"
 #include "simulator/Port_Additions.h"
 #include "simulator/Posted_Tests.h"
-#include "simulator/Remote_Ports.h"
+#include "simulator/Remote_Port_List.h"
 #include "simulator/Reset_Marks.h"
 
 #include <cstddef>
@@ -38,11 +38,11 @@ struct Port
     Json::Value data;     // the answer of getPortByWwn
     Json::Value eth_data; // `ethData` of getEthPortByEthMac; null for an FC port
     std::optional<Optics> optics;
-    Counters counters;         // of an FC port
-    Remote_Ports remote_ports; // of an FC port
-    Json::Value answers;       // answers of the author's own, by entry point
-    Json::Value settings;      // what was written or set of each, by its name in Settings.h
-    Json::Value tests;         // outcomes of hardware tests, by entry point
+    Counters counters;             // of an FC port
+    Remote_Port_List remote_ports; // of an FC port
+    Json::Value answers;           // answers of the author's own, by entry point
+    Json::Value settings;          // what was written or set of each, by its name in Settings.h
+    Json::Value tests;             // outcomes of hardware tests, by entry point
     std::vector<Virtual_Port> virtual_ports;
     std::vector<Virtual_Nic> vnics;
     Path_Records lun_masks;

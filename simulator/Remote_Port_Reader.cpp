@@ -46,7 +46,7 @@ Json::Value lun_list(const Json_Text& source, Json::Value list)
     return list;
 }
 
-Remote_Ports::Shared remote_port(const Json_Text& source, Json::Value written)
+Remote_Port_List::Shared remote_port(const Json_Text& source, Json::Value written)
 {
     check_members(source, written, remote_port_members, "a remote port");
     fill_defaults(written, remote_port_members);
@@ -63,10 +63,10 @@ Remote_Ports::Shared remote_port(const Json_Text& source, Json::Value written)
     return port;
 }
 
-Remote_Ports::Shared known_port(const Json_Text& source, const Json::Value& address,
-                                const Remote_Ports& known)
+Remote_Port_List::Shared known_port(const Json_Text& source, const Json::Value& address,
+                                    const Remote_Port_List& known)
 {
-    Remote_Ports::Shared port = known.find(address.asString());
+    Remote_Port_List::Shared port = known.find(address.asString());
     if (!port)
         source.refuse(address, "unknown remote port " + compact_text(address));
     return port;
@@ -74,9 +74,10 @@ Remote_Ports::Shared known_port(const Json_Text& source, const Json::Value& addr
 
 } // namespace
 
-Remote_Ports read_remote_ports(const Json_Text& source, Json::Value written, const Remote_Ports& known)
+Remote_Port_List read_remote_ports(const Json_Text& source, Json::Value written,
+                                   const Remote_Port_List& known)
 {
-    Remote_Ports ports;
+    Remote_Port_List ports;
     for (Json::Value& each : written) {
         const bool named = each.isString();
         const Json::Value place = each.isObject() ? std::as_const(each)["remotePortWwn"] : each;

@@ -26,8 +26,8 @@ struct Target
     Adapter* adapter = nullptr;
     Port* port = nullptr; // null for an adapter
     const Virtual_Port* virtual_port = nullptr;
-    Remote_Ports::Shared remote_port; // null if the request names none
-    const Json::Value* lun = nullptr; // its element of lunList
+    Remote_Port_List::Shared remote_port; // null if the request names none
+    const Json::Value* lun = nullptr;     // its element of lunList
     const Virtual_Nic* vnic = nullptr;
     std::string path;    // the addresses in lower case, joined by slashes
     Json::Value refusal; // null if all was found; otherwise nothing else counts

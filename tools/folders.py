@@ -26,8 +26,8 @@ COLOURS = {"module": "#e8eef6", "kldrcim": "#f5eee2", "contracts": "#eeeeee", "b
 
 
 def may_include(folder):
-    """A row of the linter's table as the pages have it: folders of the module by their last name."""
-    names = [name.removeprefix("module/") if folder.startswith("module/") else name for name in ALLOWED[folder].split()]
+    """A row of the linter's table as the pages have it: folders below the same one are named without it."""
+    names = [name.removeprefix(folder.split("/")[0] + "/") for name in ALLOWED[folder].split()]
     return "all" if names == ["*"] else " ".join(f"`{name}`" for name in names) or "nothing"
 
 

@@ -107,8 +107,8 @@ def check_arrows(path, lines, complain):
 
 
 def check_traps(path, lines, complain):
-    for pattern, reason, files, rooms in TRAPS:
-        if str(path) in files or path.parts[0] in rooms:
+    for pattern, reason, files, folders in TRAPS:
+        if str(path) in files or path.parts[0] in folders:
             continue
         for number, line in enumerate(lines, 1):
             code = re.sub(r"//.*", "", line)

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Do the tests notice when the module is wrong? Draws small mutations at random places of its rooms, builds each in a copy of
+"""Do the tests notice when the module is wrong? Draws small mutations at random places of its folders, builds each in a copy of
 the sources and runs the tests that should notice. What survives has no test, or makes no difference to anybody: then a comment
 at the line says so, `// Either way (KIND, ...): REASON`."""
 
@@ -17,7 +17,7 @@ from mutants.tree import Broken, Tree
 
 ROOT = os.path.dirname(os.path.dirname(os.path.abspath(__file__)))
 
-# room: its own tests, then those of others that reach it, quickest first.
+# folder: its own tests, then those of others that reach it, quickest first.
 MODULE = ["allocation_failures_test", "faults_test", "module_test", "bad_answers_test"]
 TESTS = {
     "runtime":     ["runtime_test", "cmpi_test", "providers_test", "model_test", "alerts_test", "schema_test", *MODULE],
@@ -46,7 +46,7 @@ class Mutant:
     by: str = ""
 
     @property
-    def room(self):
+    def folder(self):
         return self.path.split("/")[1]
 
     def __str__(self):
@@ -62,10 +62,10 @@ class Mutant:
 
 
 def mutants_of(root, only=None):
-    """Every place of every room, by kind: (path, text, place)."""
+    """Every place of every folder that has tests, by kind: (path, text, place)."""
     found = {kind: [] for kind in reading.KINDS}
-    for room in TESTS:
-        for top, folders, names in os.walk(os.path.join(root, "module", room)):
+    for folder in TESTS:
+        for top, folders, names in os.walk(os.path.join(root, "module", folder)):
             folders.sort()
             for name in sorted(names):
                 path = os.path.relpath(os.path.join(top, name), root)
@@ -127,7 +127,7 @@ class Trial:
                     mutant.verdict = "equivalent"
                 else:
                     mutant.verdict, mutant.by = judge(
-                        mutant.path, mutant.place.apply(mutant.text, mutant.choice), TESTS[mutant.room])
+                        mutant.path, mutant.place.apply(mutant.text, mutant.choice), TESTS[mutant.folder])
                 self.done(mutant)
         except BaseException as failure:
             with self.changed:
@@ -137,11 +137,11 @@ class Trial:
 
 def report(trial, seed, out=print):
     """The table and the survivors. True if the goal is reached."""
-    rows = {room: Counter(each.verdict for each in trial.judged if each.room == room) for room in TESTS}
+    rows = {folder: Counter(each.verdict for each in trial.judged if each.folder == folder) for folder in TESTS}
     rows["all"] = sum(rows.values(), Counter())
     out(f"\n{'folder':<12}{'killed':>8}{'survived':>10}{'equivalent':>12}")
-    for room, row in rows.items():
-        out(f"{room:<12}{row['killed']:>8}{row['survived']:>10}{row['equivalent']:>12}")
+    for folder, row in rows.items():
+        out(f"{folder:<12}{row['killed']:>8}{row['survived']:>10}{row['equivalent']:>12}")
     survivors = [each for each in trial.judged if each.verdict == "survived"]
     if survivors:
         out("\nSurvived:")
@@ -195,7 +195,7 @@ def main(arguments):
     options = parser.parse_args(arguments)
     seed = random.randrange(10**6) if options.seed is None else options.seed
     found = mutants_of(ROOT, options.at)
-    rooms = [options.at[0].split("/")[1]] if options.at else list(TESTS)
+    changed = [options.at[0].split("/")[1]] if options.at else list(TESTS)
     trial = Trial(drawn(found, seed), min(options.count, sum(map(len, found.values()))), lambda text: print(text, flush=True))
     trial.out(f"seed {seed}, {trial.count} of {sum(map(len, found.values()))} places")
     if options.list:
@@ -203,7 +203,7 @@ def main(arguments):
             trial.out(str(next(trial.drawing)))
         return 0
     try:
-        tests = sorted({test for room in rooms for test in TESTS[room]})
+        tests = sorted({test for folder in changed for test in TESTS[folder]})
         trees = prepared_trees(ROOT, os.path.join(ROOT, "build", "mutate"), options.trees, tests)
     except Broken as broken:
         print(f"mutate: not even without a mutation:\n{broken}", file=sys.stderr)

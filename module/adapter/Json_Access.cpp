@@ -105,10 +105,14 @@ bool asBool(const Json::Value& value)
     }
 }
 
-static const Json::Value* find(const Json::Value& object, const char* name)
+namespace {
+
+const Json::Value* find(const Json::Value& object, const char* name)
 {
     return object.isObject() ? object.find(name, name + strlen(name)) : nullptr;
 }
+
+} // namespace
 
 bool hasMember(const Json::Value& object, const char* name)
 {

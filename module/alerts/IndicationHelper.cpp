@@ -49,12 +49,16 @@ bool IndicationHelper::unsubscribeForEventNotifications()
     return deregistered;
 }
 
+namespace {
+
 /// Sets the library's callback; false if it throws.
-static bool set_callback(evtProcessCB callback)
+bool set_callback(evtProcessCB callback)
 {
     return guarded(LOG_HERE, {"libRegisterEventProcessingCb"},
                    [&] { libRegisterEventProcessingCb(callback); });
 }
+
+} // namespace
 
 bool IndicationHelper::registerForEvents()
 {

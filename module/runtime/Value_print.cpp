@@ -2,7 +2,7 @@
 #include "module/runtime/Value.h"
 
 #include "module/runtime/print_instance.h"
-#include "module/runtime/print_value.h"
+#include "module/runtime/print_scalar.h"
 
 namespace KPRV {
 

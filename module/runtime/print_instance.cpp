@@ -1,7 +1,7 @@
 #include "module/runtime/print_instance.h"
 
 #include "module/runtime/features.h"
-#include "module/runtime/print_value.h"
+#include "module/runtime/print_scalar.h"
 
 namespace KPRV {
 

@@ -3,7 +3,7 @@
 #include "module/runtime/assert.h"
 #include "module/runtime/features.h"
 #include "module/runtime/formatted_text.h"
-#include "module/runtime/print_value.h"
+#include "module/runtime/print_scalar.h"
 
 namespace KPRV {
 

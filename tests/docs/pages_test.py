@@ -89,6 +89,15 @@ class Objects(unittest.TestCase):
                 self.assertEqual(told, {name: sizes[at] for name, sizes in self.pins()[record].items()}, record)
 
 
+    def test_the_drawing_has_the_offsets_of_the_example(self):
+        code = read(ROOT / "tests/docs/objects_page.cpp")
+        asserted = {field: sizes for field, *sizes in re.findall(r"offsetof\(Example, ([\w.]+)\) *== at\((\d+), *(\d+)\)", code)}
+        drawn = {field: sizes for field, *sizes in re.findall(r"^\| (\w[\w.]+) [^|]*\|[ >-]+(\d+) +(\d+)\b", read(DESIGN / "objects.md"), re.M)}
+        self.assertGreater(len(asserted), 8)
+        for field, sizes in asserted.items():
+            self.assertEqual(drawn[field], sizes, field)
+
+
 class Doors(unittest.TestCase):
     """docs/design/one_request.md: each function stands in the file that is named with it."""
 

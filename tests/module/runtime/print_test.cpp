@@ -1,5 +1,5 @@
 #include "module/runtime/print_instance.h"
-#include "module/runtime/print_value.h"
+#include "module/runtime/print_scalar.h"
 
 #include "module/runtime/Value.h"
 #include "tests/module/runtime/sample_values.h"
@@ -44,7 +44,7 @@ std::string of(const Instance* x, bool keys_only = false)
 
 } // namespace
 
-TEST(print_value, Strings)
+TEST(print_scalar, Strings)
 {
     const auto quoted = [](const char* text) {
         return written([=](FILE* file) { fprint_string(file, text); });
@@ -55,7 +55,7 @@ TEST(print_value, Strings)
     EXPECT_EQ("\"\\ \x01 \xC3\xA4 '\"", quoted("\\ \x01 \xC3\xA4 '"));
 }
 
-TEST(print_value, Scalars)
+TEST(print_scalar, Scalars)
 {
     EXPECT_EQ("true", scalar(boolean(true)));
     EXPECT_EQ("false", scalar(boolean(false)));
@@ -73,7 +73,7 @@ TEST(print_value, Scalars)
     EXPECT_EQ("\"00000000000500.000000:000\"", scalar(Datetime(5 * Datetime::MIN)));
 }
 
-TEST(print_value, CharactersShowWhenTheyArePrintable)
+TEST(print_scalar, CharactersShowWhenTheyArePrintable)
 {
     EXPECT_EQ("' '", scalar(char16(32)));
     EXPECT_EQ("'~'", scalar(char16(126)));
@@ -82,7 +82,7 @@ TEST(print_value, CharactersShowWhenTheyArePrintable)
     EXPECT_EQ("0xABCD", scalar(char16(0xABCD)));
 }
 
-TEST(print_value, Arrays)
+TEST(print_scalar, Arrays)
 {
     const auto array = [](const auto& x) {
         Value value;
@@ -103,7 +103,7 @@ TEST(print_value, Arrays)
     EXPECT_EQ("{ \"a\", \"\" }", array(texts));
 }
 
-TEST(print_value, DefaultsOfScalars)
+TEST(print_scalar, DefaultsOfScalars)
 {
     const auto literal = [](const Meta_Value& value, Type type) {
         return written([&](FILE* file) { fprint_scalar(file, value, type); });
@@ -124,7 +124,7 @@ TEST(print_value, DefaultsOfScalars)
     EXPECT_EQ("\"00000000000500.000000:000\"", literal(_Sample_Element_Timeout_MV, DATETIME));
 }
 
-TEST(print_value, DefaultsOfArraysStandWithoutBraces)
+TEST(print_scalar, DefaultsOfArraysStandWithoutBraces)
 {
     const auto literal = [](const Meta_Value& value, Type type) {
         return written([&](FILE* file) { fprint_array(file, value, type); });
@@ -226,7 +226,7 @@ TEST(Instance_print, KeysAndEmbeddedObjectsBelow)
               of(x.ptr()));
 }
 
-TEST(print_value, LiteralsOnStandardOutput)
+TEST(print_scalar, LiteralsOnStandardOutput)
 {
     const uint16 codes[] = {4, 5};
     const Meta_Value list = {.array_value = {codes, 2}};

@@ -1,10 +1,10 @@
-#include "simulator/Remote_Ports.h"
+#include "simulator/Remote_Port_List.h"
 
 #include "simulator/Address.h"
 
 namespace KPRV::simulator {
 
-bool Remote_Ports::add(Shared port)
+bool Remote_Port_List::add(Shared port)
 {
     if (!index_.try_emplace(lower_case(port->address), ports_.size()).second)
         return false;
@@ -12,13 +12,13 @@ bool Remote_Ports::add(Shared port)
     return true;
 }
 
-Remote_Ports::Shared Remote_Ports::find(const std::string& address) const
+Remote_Port_List::Shared Remote_Port_List::find(const std::string& address) const
 {
     const auto found = index_.find(lower_case(address));
     return found == index_.end() ? nullptr : ports_[found->second];
 }
 
-Json::Value Remote_Ports::list() const
+Json::Value Remote_Port_List::list() const
 {
     Json::Value answer(Json::arrayValue);
     for (const Shared& port : ports_)

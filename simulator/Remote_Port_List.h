@@ -19,7 +19,7 @@ struct Remote_Port
 };
 
 /// Remote ports in the order in which the library lists them, each found by its address.
-class Remote_Ports
+class Remote_Port_List
 {
 public:
     using Shared = std::shared_ptr<const Remote_Port>;

@@ -1,4 +1,4 @@
-#include "module/runtime/print_value.h"
+#include "module/runtime/print_scalar.h"
 
 #include "module/runtime/type_dispatch.h"
 
