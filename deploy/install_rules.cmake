@@ -6,9 +6,14 @@ install(PROGRAMS ${deployment}/kldr-register DESTINATION sbin)
 install(FILES ${mof} DESTINATION share/kldrprovider/mof)
 install(FILES ${registrations} DESTINATION share/kldrprovider/registration)
 install(FILES ${CMAKE_SOURCE_DIR}/LICENSE DESTINATION share/doc/kldrprovider RENAME copyright)
-# Bash looks for a command's completion by the name of the command; both are in one file.
-install(FILES completion/kldrcim DESTINATION share/bash-completion/completions)
-install(FILES completion/kldrcim DESTINATION share/bash-completion/completions RENAME kldr-register)
+# Where shells look for completion, by the name of the command. Packages for other distributions than Debian's have zsh's in
+# another folder: rpm_folders.cmake.
+install(FILES ${completion}/kldrcim.bash DESTINATION share/bash-completion/completions RENAME kldrcim)
+install(FILES completion/kldr-register DESTINATION share/bash-completion/completions)
+install(FILES ${completion}/kldrcim.zsh DESTINATION share/zsh/vendor-completions RENAME _kldrcim)
+install(FILES ${completion}/kldrcim.fish DESTINATION share/fish/vendor_completions.d)
+install(FILES ${completion}/classes DESTINATION share/kldrprovider/completion)
+install(FILES examples/logrotate examples/kldrcim.service DESTINATION share/doc/kldrprovider/examples)
 install(FILES debian/lintian-overrides DESTINATION share/lintian/overrides RENAME kldrprovider)
 
 # kldr_install_compressed(<file> <folder> <name>): without name and time of the original, so that the same text gives the same file.

@@ -3,6 +3,7 @@ set(CPACK_RPM_COMPONENT_INSTALL ON)
 set(CPACK_RPM_FILE_NAME RPM-DEFAULT)
 set(CPACK_RPM_PACKAGE_LICENSE MIT)
 set(CPACK_RPM_COMPRESSION_TYPE xz)
+list(APPEND CPACK_PRE_BUILD_SCRIPTS ${CMAKE_CURRENT_SOURCE_DIR}/rpm_folders.cmake)
 # The library knows where it stands.
 set(CPACK_RPM_PACKAGE_RELOCATABLE OFF)
 set(CPACK_RPM_PACKAGE_ARCHITECTURE x86_64)
@@ -19,6 +20,7 @@ set(CPACK_RPM_DEBUG_PACKAGE_REQUIRES "kldrprovider = ${PROJECT_VERSION}")
 # Folders of the system's own, and what only Debian reads.
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
     /usr/lib/debug /usr/lib/debug/.build-id /usr/share/doc/kldrprovider-dbgsym /usr/sbin /usr/share/bash-completion /usr/share/bash-completion/completions
+    /usr/share/fish /usr/share/fish/vendor_completions.d /usr/share/zsh /usr/share/zsh/site-functions
     /usr/share/lintian /usr/share/lintian/overrides /usr/share/lintian/overrides/kldrprovider
     /usr/share/man /usr/share/man/man1 /usr/share/man/man5 /usr/share/man/man7 /usr/share/man/man8)
 # Stripped and split already, on no machine in particular, at a time that cpack was told.

@@ -14,6 +14,10 @@ share/bash-completion/completions/kldr-register
 share/bash-completion/completions/kldrcim
 share/doc/kldrprovider/changelog.gz
 share/doc/kldrprovider/copyright
+share/doc/kldrprovider/examples/kldrcim.service
+share/doc/kldrprovider/examples/logrotate
+share/fish/vendor_completions.d/kldrcim.fish
+share/kldrprovider/completion/classes
 share/kldrprovider/mof/kldr_qualifiers.mof
 share/kldrprovider/mof/kldr_structure.mof
 share/kldrprovider/mof/kldrprovider.mof
@@ -26,6 +30,7 @@ share/man/man1/kldrcim.1.gz
 share/man/man5/cimplerc.5.gz
 share/man/man7/kldrprovider.7.gz
 share/man/man8/kldr-register.8.gz
+share/zsh/vendor-completions/_kldrcim
 """.split()
 
 

@@ -61,7 +61,8 @@ class Scripts(unittest.TestCase):
         scripts = [
             BUILD / "deploy/kldr-register",
             *sorted((SOURCE / "deploy/debian").glob("p*")),
-            *sorted((SOURCE / "deploy/completion").iterdir()),
+            BUILD / "deploy/completion/kldrcim.bash",
+            SOURCE / "deploy/completion/kldr-register",
             SOURCE / "dev",
             SOURCE / ".ci/run",
             SOURCE / "tests/servers/machine.sh",

@@ -2,11 +2,12 @@
 
 import functools
 import re
+import shutil
 import tempfile
 import unittest
 from pathlib import Path
 
-from deploy_case import BUILD, CMAKE, WORD_SIZE, output_of
+from deploy_case import BUILD, CMAKE, PROGRAMS, WORD_SIZE, output_of
 from install_test import FILES
 
 CPACK = Path(CMAKE).with_name("cpack")
@@ -35,6 +36,13 @@ class Package(unittest.TestCase):
         files = re.findall(r"^[-l]\S+ .* \./usr/(\S+)(?: -> \S+)?$", listed, re.M)
         self.assertEqual(sorted(files), FILES)
         self.assertNotIn("dzntj", listed)
+
+    @unittest.skipUnless(shutil.which("rpmbuild", path=PROGRAMS), "rpmbuild is not installed")
+    def test_rpms_have_completion_for_zsh_where_other_distributions_look(self):
+        package = next(each for each in pack("RPM") if "debuginfo" not in each.name)
+        listed = output_of("rpm", "-qpl", package).splitlines()
+        self.assertIn("/usr/share/zsh/site-functions/_kldrcim", listed)
+        self.assertEqual([each for each in listed if "vendor-completions" in each], [])
 
     def test_its_control_file(self):
         field = lambda name: output_of("dpkg-deb", "-f", self.package, name).strip()
