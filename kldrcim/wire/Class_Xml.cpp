@@ -1,0 +1,231 @@
+#include "kldrcim/wire/Class_Xml.h"
+
+#include "kldrcim/wire/Instance_Reading.h"
+#include "kldrcim/wire/Qualifiers.h"
+#include "kldrcim/wire/Value_Maps.h"
+#include "kldrcim/wire/Wire_Text.h"
+
+#include <algorithm>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+using Tag = Xml_Tag;
+using At = Xml_Attribute;
+
+/// A class whose features know nobody else: the reader needs no types but those that stand there.
+const No_Catalogue no_catalogue;
+
+class Class_Writer
+{
+public:
+    Class_Writer(Xml_Writer& writer, const Class_Catalogue& catalogue, const Class_Info& info,
+                 const Class_Form& form)
+        : writer_(writer), catalogue_(catalogue), info_(info), form_(form),
+          superclass_(catalogue.find(info.superclass))
+    {
+    }
+
+    void write()
+    {
+        writer_.open(Tag::CLASS).attribute(At::NAME, info_.name);
+        if (!info_.superclass.empty())
+            writer_.attribute(At::SUPERCLASS, info_.superclass);
+        if (form_.qualifiers && info_.is_association)
+            write_qualifier(writer_, "Association");
+        if (form_.qualifiers && info_.is_indication)
+            write_qualifier(writer_, "Indication");
+        for (const Feature_Info& property : info_.properties)
+            if (is_wanted(property))
+                write_property(property);
+        for (const Method_Info& method : info_.methods)
+            if (!form_.local_only || !superclass_ || !superclass_->method(method.name))
+                write_method(method);
+        writer_.close(Tag::CLASS);
+    }
+
+private:
+    bool is_wanted(const Feature_Info& property) const
+    {
+        const bool inherited = superclass_ && superclass_->property(property.name);
+        return (!form_.local_only || !inherited) &&
+               (!form_.properties || std::ranges::any_of(*form_.properties, [&](const std::string& name) {
+                   return same_name(name, property.name);
+               }));
+    }
+
+    void write_origin(const std::string& origin)
+    {
+        if (form_.origins)
+            writer_.attribute(At::CLASSORIGIN, origin);
+        if (!same_name(origin, info_.name))
+            writer_.attribute(At::PROPAGATED, "true");
+    }
+
+    /// Tag, name and type of a property or parameter.
+    void open(const Feature_Info& feature, Tag plain, Tag array, Tag reference, Tag references)
+    {
+        const bool is_array = (feature.type & CMPI_ARRAY) != 0;
+        const bool is_reference = (feature.type & ~CMPI_ARRAY) == CMPI_ref;
+        latest_ = is_reference ? is_array ? references : reference : is_array ? array : plain;
+        writer_.open(latest_).attribute(At::NAME, feature.name);
+        if (!is_reference)
+            writer_.attribute(At::TYPE, wire_type_name(feature.type));
+        else if (!feature.target_class.empty())
+            writer_.attribute(At::REFERENCECLASS, feature.target_class);
+    }
+
+    void write_embedded_class(const Feature_Info& feature)
+    {
+        if ((feature.type & ~CMPI_ARRAY) == CMPI_instance)
+            write_qualifier(writer_, "EmbeddedInstance", feature.target_class);
+    }
+
+    void write_property(const Feature_Info& property)
+    {
+        const std::string origin = origin_of_property(catalogue_, info_.name, property.name);
+        open(property, Tag::PROPERTY, Tag::PROPERTY_ARRAY, Tag::PROPERTY_REFERENCE, Tag::PROPERTY_ARRAY);
+        write_origin(origin);
+        if (form_.qualifiers) {
+            if (property.key)
+                write_qualifier(writer_, "Key");
+            write_embedded_class(property);
+            if (const Value_Map* map = find_value_map(origin, property.name)) {
+                write_qualifier(writer_, "ValueMap", map->numbers);
+                write_qualifier(writer_, "Values", map->words);
+            }
+        }
+        write_value(writer_, property.default_value);
+        writer_.close(latest_);
+    }
+
+    std::string origin_of_method(const std::string& name) const
+    {
+        std::string origin;
+        for (const Class_Info* each = &info_; each && each->method(name);
+             each = catalogue_.find(each->superclass))
+            origin = each->name;
+        return origin;
+    }
+
+    void write_method(const Method_Info& method)
+    {
+        writer_.open(Tag::METHOD).attribute(At::NAME, method.name);
+        if (method.return_type != CMPI_null)
+            writer_.attribute(At::TYPE, wire_type_name(method.return_type));
+        write_origin(origin_of_method(method.name));
+        if (form_.qualifiers && method.is_static)
+            write_qualifier(writer_, "Static");
+        for (const Feature_Info& parameter : method.parameters) {
+            open(parameter, Tag::PARAMETER, Tag::PARAMETER_ARRAY, Tag::PARAMETER_REFERENCE,
+                 Tag::PARAMETER_REFARRAY);
+            if (form_.qualifiers)
+                write_direction(parameter);
+            writer_.close(latest_);
+        }
+        writer_.close(Tag::METHOD);
+    }
+
+    void write_direction(const Feature_Info& parameter)
+    {
+        write_qualifier(writer_, "In", parameter.in ? "TRUE" : "FALSE");
+        if (parameter.out)
+            write_qualifier(writer_, "Out");
+        write_embedded_class(parameter);
+    }
+
+    Xml_Writer& writer_;
+    const Class_Catalogue& catalogue_;
+    const Class_Info& info_;
+    const Class_Form& form_;
+    const Class_Info* superclass_;
+    Tag latest_ = Tag::PROPERTY;
+};
+
+/// The text of a qualifier; nothing if the element has none of that name.
+std::optional<std::string> qualifier(Xml_Node node, std::string_view name)
+{
+    for (const Xml_Node each : node.children())
+        if (each.is(Tag::QUALIFIER) && same_name(each.attribute(At::NAME), name))
+            return std::string(each.child(Tag::VALUE).text());
+    return std::nullopt;
+}
+
+bool flag(Xml_Node node, std::string_view name, bool otherwise = false)
+{
+    const auto text = qualifier(node, name);
+    return text ? same_name(*text, "true") : otherwise;
+}
+
+Feature_Info read_feature(Xml_Node node)
+{
+    Feature_Info info;
+    info.name = node.attribute(At::NAME);
+    const auto embedded = qualifier(node, "EmbeddedInstance");
+    const bool is_reference = node.is(Tag::PROPERTY_REFERENCE) || node.is(Tag::PARAMETER_REFERENCE) ||
+                              node.is(Tag::PARAMETER_REFARRAY);
+    CMPIType type = is_reference ? CMPIType(CMPI_ref) : wire_type_of(node.attribute(At::TYPE));
+    if (info.name.empty() || type == CMPI_null)
+        throw Wire_Error::not_valid("a feature of a class without name or type");
+    if (embedded || node.has(At::EmbeddedObject) || node.has(At::EMBEDDEDOBJECT) ||
+        flag(node, "EmbeddedObject"))
+        type = CMPI_instance;
+    info.target_class =
+        is_reference ? std::string(node.attribute(At::REFERENCECLASS)) : embedded.value_or("");
+    if (node.is(Tag::PROPERTY_ARRAY) || node.is(Tag::PARAMETER_ARRAY) || node.is(Tag::PARAMETER_REFARRAY))
+        type = static_cast<CMPIType>(type | CMPI_ARRAY);
+    info.type = type;
+    info.key = flag(node, "Key");
+    info.in = flag(node, "In", true);
+    info.out = flag(node, "Out");
+    Xml_Node value;
+    for (const Xml_Node each : node.children())
+        if (!each.is(Tag::QUALIFIER))
+            value = each;
+    info.default_value = Instance_Reader(no_catalogue).value(value, type);
+    return info;
+}
+
+Method_Info read_method(Xml_Node node)
+{
+    Method_Info info;
+    info.name = node.attribute(At::NAME);
+    info.is_static = flag(node, "Static");
+    info.return_type = wire_type_of(node.attribute(At::TYPE));
+    for (const Xml_Node each : node.children())
+        if (!each.is(Tag::QUALIFIER))
+            info.parameters.push_back(read_feature(each));
+    return info;
+}
+
+} // namespace
+
+void write_class(Xml_Writer& writer, const Class_Catalogue& catalogue, const Class_Info& info,
+                 const Class_Form& form)
+{
+    Class_Writer(writer, catalogue, info, form).write();
+}
+
+Class_Info read_class(Xml_Node node)
+{
+    if (!node.is(Tag::CLASS) || !node.has(At::NAME))
+        throw Wire_Error::not_valid("no <CLASS> with a name");
+    Class_Info info;
+    info.name = node.attribute(At::NAME);
+    info.superclass = node.attribute(At::SUPERCLASS);
+    info.is_association = flag(node, "Association");
+    info.is_indication = flag(node, "Indication");
+    info.has_provider = true;
+    for (const Xml_Node each : node.children()) {
+        if (each.is(Tag::METHOD))
+            info.methods.push_back(read_method(each));
+        else if (!each.is(Tag::QUALIFIER)) {
+            info.properties.push_back(read_feature(each));
+            info.properties.back().in = info.properties.back().out = false;
+        }
+    }
+    return info;
+}
+
+} // namespace KPRV::kldrcim

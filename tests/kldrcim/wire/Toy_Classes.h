@@ -1,0 +1,79 @@
+#pragma once
+
+#include "broker/values/Class_Catalogue.h"
+
+#include <deque>
+
+namespace KPRV::kldrcim {
+
+using namespace broker;
+
+/// A few classes that have each kind of feature.
+class Toy_Classes : public Class_Catalogue
+{
+public:
+    Toy_Classes()
+    {
+        const auto feature = [](const char* name, int type, bool key = false, const char* target = "") {
+            Feature_Info info;
+            info.name = name;
+            info.type = static_cast<CMPIType>(type);
+            info.key = key;
+            info.target_class = target;
+            info.default_value = Value::null_of(info.type);
+            return info;
+        };
+        const Feature_Info name = feature("Name", CMPI_string, true);
+        const Feature_Info size = feature("Size", CMPI_uint8, true);
+        const Feature_Info parts = feature("Parts", CMPI_instance | CMPI_ARRAY, false, "Toy_Base");
+        Feature_Info color = feature("Color", CMPI_string);
+        color.default_value = Value::text("red & <blue>");
+        Method_Info grow;
+        grow.name = "Grow";
+        grow.is_static = true;
+        grow.return_type = CMPI_uint32;
+        grow.parameters = {feature("By", CMPI_sint16), feature("Into", CMPI_ref, false, "Toy_Base"),
+                           feature("Names", CMPI_stringA), feature("Made", CMPI_instance, false, "Toy_Base")};
+        grow.parameters[0].in = grow.parameters[1].in = grow.parameters[2].in = true;
+        grow.parameters[3].out = true;
+        add("Toy_Base", "", {name}, {});
+        add("Toy_Ball", "Toy_Base", {name, size, color, parts}, {grow});
+        add("Toy_Link", "",
+            {feature("From", CMPI_ref, true, "Toy_Base"), feature("To", CMPI_ref, true, "Toy_Base")}, {});
+        classes_.back().is_association = true;
+        add("CIM_RegisteredSpecification", "", {feature("RegisteredOrganization", CMPI_uint16)}, {});
+    }
+
+    std::vector<std::string> class_names() const override
+    {
+        std::vector<std::string> names;
+        for (const Class_Info& info : classes_)
+            names.push_back(info.name);
+        return names;
+    }
+    const Class_Info* find(std::string_view name) const override
+    {
+        for (const Class_Info& info : classes_)
+            if (same_name(info.name, name))
+                return &info;
+        return nullptr;
+    }
+    std::string module_name() const override { return "toy"; }
+
+private:
+    void add(const char* name, const char* superclass, std::vector<Feature_Info> properties,
+             std::vector<Method_Info> methods)
+    {
+        Class_Info info;
+        info.name = name;
+        info.superclass = superclass;
+        info.has_provider = true;
+        info.properties = std::move(properties);
+        info.methods = std::move(methods);
+        classes_.push_back(std::move(info));
+    }
+
+    std::deque<Class_Info> classes_;
+};
+
+} // namespace KPRV::kldrcim
