@@ -1,6 +1,5 @@
 #include "kldrcim/local/Open_Module.h"
 
-#include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/local/Module_Search.h"
 #include "kldrcim/local/Server_Instances_File.h"
 
@@ -20,11 +19,15 @@ bool is_loaded(const char* library)
 
 } // namespace
 
-std::unique_ptr<Connection> open_module(const Cli_Options& options, std::string& error, std::string& warning)
+std::unique_ptr<Local_Connection> open_module(const Cli_Options& options, std::string& error,
+                                              std::string& warning)
 {
     Host_Options host_options;
     host_options.user = options.user;
     host_options.name_space = options.name_space;
+    // What runs for months has no room for the memory of a test.
+    if (options.verb == "serve")
+        host_options.most_shells = 1024;
     std::unique_ptr<Host> host =
         Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
     if (!host) {
