@@ -1,5 +1,6 @@
 #include "kldrcim/Cli.h"
 
+#include "kldrcim/Cli_Serve.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/local/Open_Module.h"
 #include "kldrcim/verbs/Cli_Arguments.h"
@@ -18,12 +19,13 @@ namespace {
 int run_verb(const Cli_Options& options)
 {
     std::string error, warning;
-    const std::unique_ptr<Connection> connection = open_module(options, error, warning);
+    const std::unique_ptr<Local_Connection> connection = open_module(options, error, warning);
     if (!connection)
         return complain(error, USAGE_ERROR);
     if (!warning.empty())
         complain("warning: " + warning, 0);
-    const int status = find_verb(options.verb)->body(options, *connection);
+    const Verb_Body body = find_verb(options.verb)->body;
+    const int status = body ? body(options, *connection) : serve(options, connection->host());
     for (const std::string& breach : connection->breaches())
         complain("warning: the provider broke the CMPI contract: " + breach, 0);
     if (options.leaks)

@@ -54,6 +54,11 @@ struct Cli_Options
     bool wait = false;
     /// Update firmware without asking.
     bool yes = false;
+    /// serve: ADDRESS:PORT, files of a certificate and its key, and of who may come in.
+    std::string listen;
+    std::string tls_certificate;
+    std::string tls_key;
+    std::string users;
     bool leaks = false;
     bool help = false;
     bool version = false;

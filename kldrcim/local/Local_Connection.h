@@ -26,6 +26,7 @@ public:
     std::vector<std::string> breaches() override { return host_.violations().list(); }
     void report_leaks(std::FILE* out) override { host_.ledger().report(out); }
 
+    Host& host() { return host_; }
     /// True of the module that this program comes with, of which more is known than its library says.
     bool is_own_module() const;
 

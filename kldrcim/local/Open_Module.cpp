@@ -1,6 +1,5 @@
 #include "kldrcim/local/Open_Module.h"
 
-#include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/local/Module_Search.h"
 #include "kldrcim/local/Server_Instances_File.h"
 
@@ -20,13 +19,14 @@ bool is_loaded(const char* library)
 
 } // namespace
 
-std::unique_ptr<Connection> open_module(const Cli_Options& options, std::string& error, std::string& warning)
+std::unique_ptr<Local_Connection> open_module(const Cli_Options& options, std::string& error,
+                                              std::string& warning)
 {
     Host_Options host_options;
     host_options.user = options.user;
     host_options.name_space = options.name_space;
-    // A large answer should not be outweighed by what remembers its objects.
-    host_options.most_shells = 1 << 14;
+    // A large answer should not be outweighed by what remembers its objects, nor should what runs for months.
+    host_options.most_shells = options.verb == "serve" ? 1 << 10 : 1 << 14;
     std::unique_ptr<Host> host =
         Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
     if (!host) {

@@ -21,6 +21,7 @@ struct Cli_Verb
     std::size_t most;
     /// What they are, a line for each form that the verb has.
     const char* arguments;
+    /// Null for the one that asks nobody and is asked itself.
     Verb_Body body;
     /// The operation that the plain verbs stand for; the others do not look at it.
     Operation operation;

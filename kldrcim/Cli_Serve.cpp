@@ -1,0 +1,90 @@
+#include "kldrcim/Cli_Serve.h"
+
+#include "kldrcim/verbs/Cli_Complaints.h"
+
+#ifndef KLDR_SERVE
+
+namespace KPRV::kldrcim {
+
+int serve(const Cli_Options&, Host&)
+{
+    return complain("this kldrcim was built without serve: libmicrohttpd or expat was missing", USAGE_ERROR);
+}
+
+} // namespace KPRV::kldrcim
+
+#else
+
+#include "kldrcim/formats/Output.h"
+#include "kldrcim/server/Http_Server.h"
+#include "kldrcim/verbs/Interruption.h"
+
+#include <cerrno>
+#include <cstring>
+#include <fstream>
+#include <iterator>
+#include <unistd.h>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+std::string own_host_name()
+{
+    char name[256] = {};
+    return gethostname(name, sizeof name - 1) == 0 && name[0] ? name : "localhost";
+}
+
+bool read_file(const std::string& file, std::string& text, std::string& error)
+{
+    std::ifstream in(file, std::ios::binary);
+    text.assign(std::istreambuf_iterator<char>(in), {});
+    if (in.bad() || text.empty())
+        error = file + ": " + (errno != 0 ? std::strerror(errno) : "empty");
+    return error.empty();
+}
+
+/// What stands on the command line, as the server takes it; false with `error`.
+bool read_options(const Cli_Options& options, Http_Options& http, Users_File& users, std::string& error)
+{
+    if (!options.listen.empty() && !parse_listen(options.listen, http))
+        error = "--listen takes ADDRESS:PORT, such as 127.0.0.1:5988 or [::1]:0";
+    else if (options.tls_certificate.empty() != options.tls_key.empty())
+        error = "--tls-cert and --tls-key go together";
+    else if (!options.tls_certificate.empty() &&
+             (!read_file(options.tls_certificate, http.certificate, error) ||
+              !read_file(options.tls_key, http.key, error)))
+        return false;
+    else if (!options.users.empty() && users.read(options.users, error))
+        http.users = &users;
+    if (error.empty() && !is_loopback(http.address) && (http.certificate.empty() || !http.users))
+        error = http.address + " can be reached from outside: that takes --tls-cert, --tls-key and --users";
+    return error.empty();
+}
+
+} // namespace
+
+int serve(const Cli_Options& options, Host& host)
+{
+    Http_Options http_options;
+    Users_File users;
+    std::string error;
+    if (!read_options(options, http_options, users, error))
+        return complain(error, USAGE_ERROR);
+    Interruption interruption;
+    Broker_Space classes(host);
+    Cim_Server server(own_host_name());
+    server.add(classes.name(), classes);
+    const auto http = Http_Server::start(server, http_options, error);
+    if (!http)
+        return complain(error, FAILURE);
+    put("serving " + classes.name() + " at " + http->url() + "\n");
+    flush_output();
+    while (interruption.count() == 0)
+        interruption.wait();
+    return 0;
+}
+
+} // namespace KPRV::kldrcim
+
+#endif

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "broker/values/Receiver.h"
+#include "kldrcim/server/Cim_Call.h"
+#include "kldrcim/wire/Instance_Writing.h"
+
+namespace KPRV::kldrcim {
+
+/// Where a long answer goes while it is still being made.
+class Body_Sink
+{
+public:
+    virtual ~Body_Sink() = default;
+    /// Takes the text away. False if nobody reads any more.
+    virtual bool send(std::string&& text) = 0;
+};
+
+/// The message that answers a call, written as its parts come. The text is sent in pieces once it has grown
+/// long; until then an error replaces all that has been written.
+class Answer
+{
+public:
+    Answer(const Cim_Call& call, Body_Sink& sink);
+
+    /// In front of each object of IRETURNVALUE.
+    Xml_Writer& object();
+    /// Behind each; false if nobody reads any more.
+    bool object_done();
+    /// IRETURNVALUE, also if there is no object. Operations that give nothing back have none.
+    void open_values();
+
+    /// In front of what follows the objects: RETURNVALUE of a method, and parameters.
+    Xml_Writer& behind_values();
+
+    /// The end of a message without error.
+    void succeed();
+    /// True if a part has been sent: then the text has no end, and the connection must be cut.
+    bool fail(CMPIrc rc, const std::string& text);
+
+    /// What has not been sent.
+    std::string take_rest() { return std::move(text_); }
+
+private:
+    void begin();
+
+    const Cim_Call& call_;
+    Body_Sink& sink_;
+    std::string text_;
+    Xml_Writer writer_;
+    bool begun_ = false;
+    bool in_values_ = false;
+    bool sent_ = false;
+};
+
+/// "CIM_ERR_NOT_FOUND" of what a client is told: the codes beyond those of clients become 1.
+CMPIrc wire_status(CMPIrc rc);
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "kldrcim/server/Answer.h"
+#include "module/runtime/Standard_Mutex.h"
+
+#include <condition_variable>
+#include <deque>
+
+namespace KPRV::kldrcim {
+
+/// Between the thread that makes a long answer and the one that sends it. It holds a few megabytes: most
+/// answers fit, so that no provider waits for a client; who makes a longer one waits.
+class Body_Pipe final : public Body_Sink
+{
+public:
+    static constexpr std::size_t most_bytes = std::size_t(4) << 20;
+
+    bool send(std::string&& text) override;
+    /// Nothing more comes. A broken answer has no end.
+    void finish(bool broken);
+
+    /// Nobody reads any more: whoever writes is told.
+    void close();
+
+    /// Waits for something to read; false if all is over.
+    bool wait();
+    /// Waits; 0 at the end.
+    std::size_t read(char* to, std::size_t size);
+    bool is_broken() const;
+
+private:
+    void wait_for_piece() REQUIRES(mutex_);
+
+    mutable Standard_Mutex<> mutex_;
+    std::condition_variable_any changed_;
+    std::deque<std::string> pieces_ GUARDED_BY(mutex_);
+    /// What has been read of the first piece.
+    std::size_t taken_ GUARDED_BY(mutex_) = 0;
+    std::size_t bytes_ GUARDED_BY(mutex_) = 0;
+    bool finished_ GUARDED_BY(mutex_) = false;
+    bool broken_ GUARDED_BY(mutex_) = false;
+    bool closed_ GUARDED_BY(mutex_) = false;
+};
+
+} // namespace KPRV::kldrcim

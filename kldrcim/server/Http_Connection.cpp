@@ -1,0 +1,279 @@
+#include "kldrcim/server/Http_Connection.h"
+
+#include "kldrcim/server/Connection_Watch.h"
+
+#include <algorithm>
+#include <cstring>
+#include <microhttpd.h>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+constexpr std::size_t streamed_piece = std::size_t(64) << 10;
+constexpr std::size_t most_header_bytes = std::size_t(16) << 10;
+constexpr unsigned most_headers = 100;
+/// Of a client that sends on after it has been refused.
+constexpr std::size_t most_ignored = std::size_t(1) << 20;
+constexpr std::chrono::seconds failed_login_pause{1};
+constexpr unsigned idle_seconds = 30;
+
+std::string percent_encoded(const std::string& text)
+{
+    static constexpr char digits[] = "0123456789ABCDEF";
+    std::string result;
+    for (const char c : text) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (byte > 0x20 && byte < 0x7F && c != '%')
+            result += c;
+        else
+            (((result += '%') += digits[byte >> 4]) += digits[byte & 15]);
+    }
+    return result;
+}
+
+struct Header_Size
+{
+    std::size_t bytes = 0;
+    unsigned count = 0;
+};
+
+MHD_Result add_size(void* data, MHD_ValueKind, const char* name, const char* value)
+{
+    auto& size = *static_cast<Header_Size*>(data);
+    size.bytes += std::strlen(name) + (value ? std::strlen(value) : 0) + 4;
+    ++size.count;
+    return MHD_YES;
+}
+
+/// Without port.
+std::string host_of(std::string_view header)
+{
+    if (header.starts_with('['))
+        return std::string(header.substr(0, header.find(']') + 1));
+    return std::string(header.substr(0, header.find(':')));
+}
+
+bool is_xml_in_utf8(std::string_view type)
+{
+    const std::string lower = lower_name(type);
+    const std::string media = lower.substr(0, lower.find_first_of("; "));
+    const std::size_t charset = lower.find("charset=");
+    return (media == "application/xml" || media == "text/xml") &&
+           (charset == std::string::npos || lower.find("utf-8", charset) != std::string::npos);
+}
+
+} // namespace
+
+struct Http_Connection::Callbacks
+{
+    static ssize_t read(void* data, std::uint64_t, char* buffer, std::size_t size)
+    {
+        auto& self = *static_cast<Http_Connection*>(data);
+        const std::size_t count = self.pipe_.read(buffer, size);
+        if (count != 0)
+            return static_cast<ssize_t>(count);
+        if (self.pipe_.is_broken())
+            return MHD_CONTENT_READER_END_WITH_ERROR;
+        const std::size_t rest = std::min(size, self.rest_.size());
+        std::memcpy(buffer, self.rest_.data(), rest);
+        self.rest_.erase(0, rest);
+        return rest == 0 ? MHD_CONTENT_READER_END_OF_STREAM : static_cast<ssize_t>(rest);
+    }
+};
+
+Http_Connection::~Http_Connection()
+{
+    pipe_.close();
+    if (maker_.joinable())
+        maker_.join();
+    server_.watch_->limit(peer_.socket, Connection_Watch::idle);
+}
+
+const char* Http_Connection::header(const char* name) const
+{
+    return MHD_lookup_connection_value(connection_, MHD_HEADER_KIND, name);
+}
+
+void Http_Connection::check_request(const std::string& method) const
+{
+    Header_Size size;
+    MHD_get_connection_values(connection_, MHD_HEADER_KIND, add_size, &size);
+    if (size.bytes > most_header_bytes || size.count > most_headers)
+        throw Http_Refusal{431, nullptr, "too many header fields"};
+    // A page in a browser, which can reach what is on its own host.
+    if (header("Origin"))
+        throw Http_Refusal{403, nullptr, "not for web pages"};
+    const std::string host = host_of(header("Host") ? header("Host") : "localhost");
+    if (is_loopback(server_.options_.address) && !is_loopback(host) && !same_name(host, "localhost") &&
+        !same_name(host, server_.server_.host_name()))
+        throw Http_Refusal{403, nullptr, "the header Host names another host"};
+    if (method == "M-POST")
+        throw Http_Refusal{501, nullptr, "POST alone is known"};
+    if (method != "POST")
+        throw Http_Refusal{405, nullptr, "POST alone is known"};
+    const char* length = header("Content-Length");
+    if (length && header("Transfer-Encoding"))
+        throw Http_Refusal{400, nullptr, "two ways to tell the length"};
+    if (length && std::strtoull(length, nullptr, 10) > server_.options_.body_bytes)
+        throw Http_Refusal{413, nullptr, "the body is too long"};
+    if (const char* encoding = header("Content-Encoding"); encoding && !same_name(encoding, "identity"))
+        throw Http_Refusal{415, nullptr, "no encoding of the body is known"};
+    if (const char* type = header("Content-Type"); type && !is_xml_in_utf8(type))
+        throw Http_Refusal{415, nullptr, "application/xml in UTF-8 is expected"};
+}
+
+bool Http_Connection::authenticate()
+{
+    if (!server_.options_.users)
+        return true;
+    const char* authorization = header("Authorization");
+    if (authorization && peer_.authorization == authorization) {
+        user_ = peer_.user;
+        return true;
+    }
+    char* password = nullptr;
+    char* user = authorization ? MHD_basic_auth_get_username_password(connection_, &password) : nullptr;
+    const bool accepted = user && server_.options_.users->accepts(user, password ? password : "");
+    if (accepted) {
+        peer_.authorization = authorization;
+        peer_.user = user;
+        user_ = user;
+    }
+    if (user)
+        MHD_free(user);
+    if (password)
+        MHD_free(password);
+    // Who tries passwords waits for each.
+    if (!accepted && authorization)
+        std::this_thread::sleep_for(failed_login_pause);
+    return accepted;
+}
+
+bool Http_Connection::begin(const std::string& method)
+{
+    server_.watch_->limit(peer_.socket, Connection_Watch::body);
+    try {
+        check_request(method);
+    } catch (const Http_Refusal& refusal) {
+        return refuse(refusal);
+    }
+    if (!authenticate())
+        return refuse({401, nullptr, ""});
+    reader_ = std::make_unique<Xml_Reader>(Xml_Limits{.bytes = server_.options_.body_bytes});
+    return true;
+}
+
+bool Http_Connection::body(std::string_view piece)
+{
+    body_size_ += piece.size();
+    if (!queued_ && reader_->fault() == Xml_Fault::NONE)
+        reader_->feed(piece);
+    else if (body_size_ > server_.options_.body_bytes + most_ignored)
+        return false;
+    return true;
+}
+
+bool Http_Connection::finish()
+{
+    if (queued_)
+        return true;
+    // From here on it is us who take time.
+    server_.watch_->release(peer_.socket);
+    MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, 0U);
+    try {
+        if (!reader_->finish())
+            throw Http_Refusal{reader_->fault() == Xml_Fault::TOO_LARGE ? 413U : 400U,
+                               reader_->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
+                                                                        : "request-not-well-formed",
+                               reader_->fault_text()};
+        call_ = read_call(reader_->document());
+        check_headers({.operation = header("CIMOperation"),
+                       .method = header("CIMMethod"),
+                       .object = header("CIMObject"),
+                       .protocol_version = header("CIMProtocolVersion")},
+                      call_);
+        answer(call_);
+    } catch (const Http_Refusal& refusal) {
+        refuse(refusal);
+    }
+    MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, idle_seconds);
+    return queued_;
+}
+
+void Http_Connection::answer(const Cim_Call& call)
+{
+    if (Cim_Server::may_be_long(call))
+        return answer_in_pieces(call);
+    Cim_Server::Reply reply = server_.server_.answer(call, user_, pipe_);
+    // A short operation that has become long after all.
+    pipe_.finish(reply.broken);
+    rest_ = std::move(reply.body);
+    if (!pipe_.wait())
+        send(std::move(rest_));
+    else
+        queue(MHD_HTTP_OK, MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece,
+                                                             Callbacks::read, this, nullptr));
+}
+
+void Http_Connection::answer_in_pieces(const Cim_Call& call)
+{
+    maker_ = std::thread([this, &call] {
+        bool broken = true;
+        try {
+            Cim_Server::Reply reply = server_.server_.answer(call, user_, pipe_);
+            rest_ = std::move(reply.body);
+            broken = reply.broken;
+        } catch (...) {
+            failure_ = std::current_exception();
+        }
+        pipe_.finish(broken);
+    });
+    if (pipe_.wait()) {
+        queue(MHD_HTTP_OK, MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece,
+                                                             Callbacks::read, this, nullptr));
+        return;
+    }
+    maker_.join();
+    if (failure_)
+        std::rethrow_exception(failure_);
+    send(std::move(rest_));
+}
+
+bool Http_Connection::queue(unsigned status, MHD_Response* response)
+{
+    if (!response)
+        return false;
+    if (status == MHD_HTTP_OK) {
+        MHD_add_response_header(response, "Content-Type", "application/xml; charset=\"utf-8\"");
+        MHD_add_response_header(response, "CIMOperation", "MethodResponse");
+    }
+    queued_ = MHD_queue_response(connection_, status, response) == MHD_YES;
+    MHD_destroy_response(response);
+    return queued_;
+}
+
+bool Http_Connection::send(std::string body)
+{
+    return queue(MHD_HTTP_OK,
+                 MHD_create_response_from_buffer(body.size(), body.data(), MHD_RESPMEM_MUST_COPY));
+}
+
+bool Http_Connection::refuse(const Http_Refusal& refusal)
+{
+    MHD_Response* response = MHD_create_response_from_buffer(0, nullptr, MHD_RESPMEM_PERSISTENT);
+    if (!response)
+        return false;
+    if (refusal.cim_error)
+        MHD_add_response_header(response, "CIMError", refusal.cim_error);
+    if (!refusal.text.empty())
+        MHD_add_response_header(response, "PGErrorDetail", percent_encoded(refusal.text).c_str());
+    if (refusal.status == MHD_HTTP_METHOD_NOT_ALLOWED)
+        MHD_add_response_header(response, "Allow", "POST");
+    if (refusal.status == MHD_HTTP_UNAUTHORIZED)
+        MHD_add_response_header(response, "WWW-Authenticate", "Basic realm=\"kldrcim\", charset=\"UTF-8\"");
+    MHD_add_response_header(response, "Connection", "close");
+    return queue(refusal.status, response);
+}
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,71 @@
+#pragma once
+
+#include "kldrcim/server/Body_Pipe.h"
+#include "kldrcim/server/Http_Server.h"
+#include "kldrcim/wire/Xml_Reader.h"
+
+#include <thread>
+
+struct MHD_Connection;
+struct MHD_Response;
+
+namespace KPRV::kldrcim {
+
+/// What is known of a connection from one request to the next.
+struct Http_Peer
+{
+    int socket = -1;
+    /// The Authorization that was accepted, so that its hash is computed once.
+    std::string authorization;
+    std::string user;
+};
+
+/// One request on a connection: its headers, its body as it comes, and the answer. Lives until all of the
+/// answer has been sent.
+class Http_Connection
+{
+public:
+    Http_Connection(Http_Server& server, Http_Peer& peer, MHD_Connection* connection)
+        : server_(server), peer_(peer), connection_(connection)
+    {
+    }
+    ~Http_Connection();
+
+    /// After the headers. False to end the connection without a word.
+    bool begin(const std::string& method);
+    /// A piece of the body. False to end the connection.
+    bool body(std::string_view piece);
+    /// After the body.
+    bool finish();
+
+private:
+    struct Callbacks;
+
+    /// Null for a field that there is not.
+    const char* header(const char* name) const;
+    /// Throws `Http_Refusal` at a request that is not for us.
+    void check_request(const std::string& method) const;
+    /// False if the answer says that a password is needed.
+    bool authenticate();
+    void answer(const Cim_Call& call);
+    /// On a thread of its own, sent while it is being made.
+    void answer_in_pieces(const Cim_Call& call);
+    bool refuse(const Http_Refusal& refusal);
+    bool queue(unsigned status, MHD_Response* response);
+    bool send(std::string body);
+
+    Http_Server& server_;
+    Http_Peer& peer_;
+    MHD_Connection* connection_;
+    std::unique_ptr<Xml_Reader> reader_;
+    std::size_t body_size_ = 0;
+    bool queued_ = false;
+    std::optional<std::string> user_;
+    Cim_Call call_;
+    Body_Pipe pipe_;
+    std::string rest_;
+    std::exception_ptr failure_;
+    std::thread maker_;
+};
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,186 @@
+// Enumerations that a client opens and pulls. The provider is asked once, at the beginning: it may hold locks
+// while it hands objects over, and no client's pace may hold up the others.
+#include "kldrcim/server/Object_Answers.h"
+
+#include <algorithm>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+// Numbers of statuses that only these operations have.
+constexpr auto invalid_context = static_cast<CMPIrc>(21);
+constexpr auto invalid_timeout = static_cast<CMPIrc>(22);
+constexpr auto filter_unsupported = static_cast<CMPIrc>(25);
+constexpr auto continuing_unsupported = static_cast<CMPIrc>(26);
+constexpr auto limits_exceeded = static_cast<CMPIrc>(27);
+
+/// More are not given at once, whatever is asked for.
+constexpr std::uint64_t most_objects = 10000;
+
+void write_end(const Operation_Call& call, const std::string& name)
+{
+    Xml_Writer& writer = call.answer.behind_values();
+    write_parameter(writer, {"EndOfSequence", Value::boolean(name.empty())});
+    write_parameter(writer, {"EnumerationContext", Value::text(name)});
+}
+
+/// The next objects.
+void write_objects(const Operation_Call& call, Pull_Context& context, std::uint64_t count)
+{
+    Instance_Form form;
+    form.properties = context.properties;
+    form.seen_as = context.seen_as.empty() ? nullptr : call.space.classes().find(context.seen_as);
+    form.origins = context.with_origins ? &call.space.classes() : nullptr;
+    Object_Answers receiver(call, form, Object_Answers::PULLED);
+    call.answer.open_values();
+    for (; count != 0 && !context.instances.empty(); --count) {
+        receiver.instance(std::move(context.instances.front()));
+        context.instances.pop_front();
+    }
+    for (; count != 0 && !context.paths.empty(); --count) {
+        receiver.path(std::move(context.paths.front()));
+        context.paths.pop_front();
+    }
+}
+
+std::chrono::seconds lifetime_of(const Parameters& parameters)
+{
+    const auto asked = parameters.number("OperationTimeout");
+    const std::chrono::seconds lifetime =
+        asked ? std::chrono::seconds(*asked) : Pull_Contexts::usual_lifetime;
+    if (lifetime.count() == 0 || lifetime > Pull_Contexts::longest_lifetime)
+        throw Wire_Error::status(
+            invalid_timeout, "1 to " + std::to_string(Pull_Contexts::longest_lifetime.count()) + " seconds");
+    return lifetime;
+}
+
+void refuse_filters(const Parameters& parameters)
+{
+    if (!parameters.text("FilterQuery").empty() || !parameters.text("FilterQueryLanguage").empty())
+        throw Wire_Error::status(filter_unsupported, "no filters");
+    if (parameters.flag("ContinueOnError", false))
+        throw Wire_Error::status(continuing_unsupported, "no continuing on errors");
+}
+
+Result open_and_write(const Operation_Call& call, Request request, std::unique_ptr<Pull_Context> context)
+{
+    const std::uint64_t count = std::min(call.parameters.number("MaxObjectCount").value_or(0), most_objects);
+    Collector collector;
+    Result result = call.space.run(std::move(request), &collector);
+    if (!result.ok())
+        return result;
+    std::ranges::move(collector.instances, std::back_inserter(context->instances));
+    std::ranges::move(collector.paths, std::back_inserter(context->paths));
+    context->name_space = call.space.name();
+    if (context->size() <= count) {
+        write_objects(call, *context, count);
+        write_end(call, {});
+        return {};
+    }
+    // The place is taken before anything is given: what is refused must not be lost.
+    Pull_Contexts& contexts = call.server.pull_contexts();
+    const std::string name = contexts.put(std::move(context));
+    context = contexts.take(name);
+    if (!context)
+        return failed(limits_exceeded, "too many open enumerations");
+    write_objects(call, *context, count);
+    contexts.put_back(name, std::move(context));
+    write_end(call, name);
+    return {};
+}
+
+template <Operation Kind>
+Result open(const Operation_Call& call)
+{
+    constexpr bool enumerates =
+        Kind == Operation::ENUMERATE_INSTANCES || Kind == Operation::ENUMERATE_INSTANCE_NAMES;
+    constexpr bool references = Kind == Operation::REFERENCES || Kind == Operation::REFERENCE_NAMES;
+    constexpr bool paths = Kind == Operation::ENUMERATE_INSTANCE_NAMES ||
+                           Kind == Operation::ASSOCIATOR_NAMES || Kind == Operation::REFERENCE_NAMES;
+    refuse_filters(call.parameters);
+    auto context = std::make_unique<Pull_Context>();
+    context->kind = paths ? Pull_Context::PATHS : Pull_Context::INSTANCES;
+    context->lifetime = lifetime_of(call.parameters);
+    context->properties = call.parameters.names("PropertyList");
+    context->with_origins = call.parameters.flag("IncludeClassOrigin", false);
+    Path_Value path;
+    if (enumerates) {
+        path.class_name = call.parameters.required_class_name("ClassName");
+        if (!call.parameters.flag("DeepInheritance", true))
+            context->seen_as = path.class_name;
+    } else {
+        path = call.path("InstanceName");
+    }
+    Request request = call.request(Kind, std::move(path));
+    request.properties = context->properties;
+    request.filter.result_class = call.parameters.class_name("ResultClass");
+    request.filter.role = call.parameters.text("Role");
+    if (!references) {
+        request.filter.association_class = call.parameters.class_name("AssocClass");
+        request.filter.result_role = call.parameters.text("ResultRole");
+    }
+    return open_and_write(call, std::move(request), std::move(context));
+}
+
+std::unique_ptr<Pull_Context> taken(const Operation_Call& call, const std::string& name)
+{
+    call.parameters.required("EnumerationContext");
+    auto context = call.server.pull_contexts().take(name);
+    if (!context)
+        throw Wire_Error::status(invalid_context, "no open enumeration " + name.substr(0, 64));
+    if (same_name(context->name_space, call.space.name()))
+        return context;
+    call.server.pull_contexts().put_back(name, std::move(context));
+    throw Wire_Error::status(invalid_context, "the enumeration is one of another namespace");
+}
+
+template <Pull_Context::Kind Kind>
+Result pull(const Operation_Call& call)
+{
+    call.parameters.required("MaxObjectCount");
+    const std::uint64_t count = std::min(*call.parameters.number("MaxObjectCount"), most_objects);
+    const std::string name = call.parameters.text("EnumerationContext");
+    auto context = taken(call, name);
+    if (context->kind != Kind) {
+        call.server.pull_contexts().put_back(name, std::move(context));
+        return failed(invalid_context, "the enumeration is of another kind");
+    }
+    write_objects(call, *context, count);
+    const bool more = context->size() != 0;
+    if (more)
+        call.server.pull_contexts().put_back(name, std::move(context));
+    write_end(call, more ? name : std::string());
+    return {};
+}
+
+Result close(const Operation_Call& call)
+{
+    taken(call, call.parameters.text("EnumerationContext"));
+    return {};
+}
+
+#define COMMON "OperationTimeout ContinueOnError MaxObjectCount FilterQueryLanguage FilterQuery"
+// clang-format off
+constexpr Operation_Row pull_rows[] = {
+    {"OpenEnumerateInstances",     "ClassName DeepInheritance IncludeClassOrigin PropertyList " COMMON, true, open<Operation::ENUMERATE_INSTANCES>},
+    {"OpenEnumerateInstancePaths", "ClassName " COMMON,                                                 true, open<Operation::ENUMERATE_INSTANCE_NAMES>},
+    {"OpenAssociatorInstances",    "InstanceName AssocClass ResultClass Role ResultRole IncludeClassOrigin PropertyList " COMMON, true, open<Operation::ASSOCIATORS>},
+    {"OpenAssociatorInstancePaths", "InstanceName AssocClass ResultClass Role ResultRole " COMMON,      true, open<Operation::ASSOCIATOR_NAMES>},
+    {"OpenReferenceInstances",     "InstanceName ResultClass Role IncludeClassOrigin PropertyList " COMMON, true, open<Operation::REFERENCES>},
+    {"OpenReferenceInstancePaths", "InstanceName ResultClass Role " COMMON,                             true, open<Operation::REFERENCE_NAMES>},
+    {"PullInstancesWithPath",      "EnumerationContext MaxObjectCount",                                 true, pull<Pull_Context::INSTANCES>},
+    {"PullInstancePaths",          "EnumerationContext MaxObjectCount",                                 true, pull<Pull_Context::PATHS>},
+    {"CloseEnumeration",           "EnumerationContext",                                                false, close},
+};
+// clang-format on
+#undef COMMON
+
+} // namespace
+
+std::span<const Operation_Row> pull_operations()
+{
+    return pull_rows;
+}
+
+} // namespace KPRV::kldrcim
