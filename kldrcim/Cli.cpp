@@ -19,11 +19,12 @@ int run_verb(const Cli_Options& options)
 {
     std::string error, warning;
     const std::unique_ptr<Connection> connection = open_module(options, error, warning);
+    const Cli_Verb& verb = *find_verb(options.verb);
     if (!connection)
-        return complain(error, USAGE_ERROR);
+        return complain(error, verb.without_module);
     if (!warning.empty())
         complain("warning: " + warning, 0);
-    const int status = find_verb(options.verb)->body(options, *connection);
+    const int status = verb.body(options, *connection);
     for (const std::string& breach : connection->breaches())
         complain("warning: the provider broke the CMPI contract: " + breach, 0);
     if (options.leaks)

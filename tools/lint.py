@@ -34,7 +34,7 @@ ALLOWED = {
     "kldrcim/input":      "broker/values",
     "kldrcim/connection": "broker/values",
     "kldrcim/local":      "broker/values broker kldrcim/input kldrcim/connection <json>",
-    "kldrcim/walks":      "broker/values kldrcim/input kldrcim/connection contracts/agent",
+    "kldrcim/walks":      "broker/values kldrcim/input kldrcim/connection contracts/agent <json>",
     "kldrcim/wire":       "broker/values",
     "kldrcim/formats":    "broker/values kldrcim/walks <json>",
     "kldrcim/verbs":      "broker/values kldrcim/input kldrcim/connection kldrcim/walks kldrcim/formats module/runtime",

@@ -2,6 +2,7 @@
 
 #include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Visible_Text.h"
+#include "kldrcim/walks/Property_Values.h"
 
 #include <algorithm>
 #include <cctype>
@@ -67,29 +68,18 @@ Node_State state_of(const State_Word (&words)[Count], std::uint64_t number)
     return {"state " + std::to_string(number), NONE};
 }
 
-/// The number, or the first of an array.
-std::optional<std::uint64_t> number(const Instance_Value& instance, const char* property)
-{
-    const Value* value = instance.property(property);
-    if (value && value->is_array())
-        value = value->elements().empty() ? nullptr : &value->elements().front();
-    if (!value || value->null)
-        return std::nullopt;
-    return value->as_uint();
-}
-
 Node_State operational_state(const Instance_Value& instance)
 {
-    if (const auto operational = number(instance, "OperationalStatus"))
+    if (const auto operational = number_of(instance, "OperationalStatus"))
         return state_of(operational_states, *operational);
-    const auto enabled = number(instance, "EnabledState");
+    const auto enabled = number_of(instance, "EnabledState");
     return enabled ? state_of(enabled_states, *enabled) : Node_State();
 }
 
 /// Of what has a link: its status says more than whether it is enabled.
 Node_State link_state(const Instance_Value& instance)
 {
-    if (number(instance, "OperationalStatus") == STOPPED)
+    if (number_of(instance, "OperationalStatus") == STOPPED)
         return {"disabled", IDLE};
     return operational_state(instance);
 }
@@ -119,7 +109,7 @@ Node_Label adapter_label(const Instance_Value& adapter)
 Node_Label software_label(const Instance_Value& software)
 {
     std::string version = line_of(software, "VersionString");
-    switch (number(software, "Classifications").value_or(0)) {
+    switch (number_of(software, "Classifications").value_or(0)) {
     case 2:
         return {"driver", line_of(software, "InstanceID"), {version}};
     case 10:
@@ -148,7 +138,7 @@ Node_Label port_label(const char* what, const std::string& device, const Instanc
 {
     return with_state({what,
                        colon_form(line_of(port, "DeviceID")),
-                       {device, speed_text(number(port, "Speed").value_or(0))}},
+                       {device, speed_text(number_of(port, "Speed").value_or(0))}},
                       link_state(port));
 }
 

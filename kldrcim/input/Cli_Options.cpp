@@ -25,6 +25,7 @@ constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
     {"table", Cli_Options::Format::TABLE},
     {"json", Cli_Options::Format::JSON},
     {"mof", Cli_Options::Format::MOF},
+    {"plugin", Cli_Options::Format::PLUGIN},
 };
 constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
     {"auto", Cli_Options::Color::AUTO},
@@ -77,11 +78,19 @@ bool add_filter(Cli_Options& options, const std::string& value)
     return !value.empty();
 }
 
-bool set_count(Cli_Options& options, const std::string& value)
+bool add_ignored(Cli_Options& options, const std::string& value)
+{
+    options.ignored.push_back(value);
+    return !value.empty();
+}
+
+/// A number above 0.
+template <unsigned Cli_Options::*Member>
+bool set_number(Cli_Options& options, const std::string& value)
 {
     const char* end = value.data() + value.size();
-    const auto [at, error] = std::from_chars(value.data(), end, options.count);
-    return error == std::errc() && at == end && options.count != 0;
+    const auto [at, error] = std::from_chars(value.data(), end, options.*Member);
+    return error == std::errc() && at == end && options.*Member != 0;
 }
 
 bool set_raw(Cli_Options& options, const std::string& value)
@@ -96,7 +105,7 @@ using Options = Cli_Options;
 // clang-format off
 constexpr Cli_Option option_table[] = {
 //   name            value             set                                  flag                     takes                     common
-    {"--format",     "table|json|mof", set_word<&Options::format, formats>, nullptr,                 "table, json or mof",     true,
+    {"--format",     "table|json|mof|plugin", set_word<&Options::format, formats>, nullptr,          "table, json, mof or plugin", true,
      "how results are written (default: table)"},
     {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
      "ask for these properties only"},
@@ -120,7 +129,7 @@ constexpr Cli_Option option_table[] = {
      "only results that stand in this role"},
     {"--filter",     "NS",             add_filter,                          nullptr,                 "a namespace",            false,
      "a filter in this namespace, instead of --namespace; may be given several times"},
-    {"--count",      "N",              set_count,                           nullptr,                 "a number above 0",       false,
+    {"--count",      "N",              set_number<&Options::count>,         nullptr,                 "a number above 0",       false,
      "end after N indications"},
     {"--software",   nullptr,          nullptr,                             &Options::software,      nullptr,                  false,
      "also firmware and drivers"},
@@ -132,6 +141,10 @@ constexpr Cli_Option option_table[] = {
      "states in colors: auto, always or never (default: auto, on a terminal and without NO_COLOR)"},
     {"--raw",        nullptr,          nullptr,                             &Options::numbers,       nullptr,                  false,
      "numbers alone, without what they mean"},
+    {"--interval",   "SECONDS",        set_number<&Options::interval>,      nullptr,                 "a number above 0",       false,
+     "look twice, so many seconds apart, at what counts errors"},
+    {"--ignore",     "WHAT",           add_ignored,                         nullptr,                 "a finding or an address", false,
+     "leave out what is known: a kind of finding, or an adapter, port or target by its address; may be given several times"},
     {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
      "the whole text of a call"},
     {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,

@@ -16,6 +16,8 @@ struct Cli_Options
         TABLE,
         JSON,
         MOF,
+        /// The one line of a monitoring plugin.
+        PLUGIN,
     };
     enum class Color
     {
@@ -43,6 +45,10 @@ struct Cli_Options
     std::vector<std::string> filters;
     /// Indications after which a watch ends; 0: never.
     unsigned count = 0;
+    /// Seconds between two looks; 0: one look.
+    unsigned interval = 0;
+    /// Findings and addresses that nobody wants to hear of.
+    std::vector<std::string> ignored;
     /// Lines of a tree without box-drawing characters.
     bool ascii = false;
     /// rpc: the whole text of a call, or "-" for standard input.

@@ -144,7 +144,7 @@ TEST(Cli, OneClearLineForEachMistake)
         {"tree --leaks=1", 2, "kldrcim: --leaks takes no value\n"},
         {"tree --color red", 2, "kldrcim: --color takes auto, always or never, not \"red\"\n"},
         {"ei", 2, "kldrcim: usage: kldrcim [options] ei CLASS\n"},
-        {"ei TOY_Item --format xml", 2, "kldrcim: --format takes table, json or mof, not \"xml\"\n"},
+        {"ei TOY_Item --format xml", 2, "kldrcim: --format takes table, json, mof or plugin, not \"xml\"\n"},
         {"ei TOY_Item --nothing", 2, "kldrcim: no option \"--nothing\"; \"kldrcim --help\" lists them\n"},
         {"ei TOY_Item --user", 2, "kldrcim: --user wants a value\n"},
         {"cm TOY_Item Throws", 1,
