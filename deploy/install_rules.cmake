@@ -9,6 +9,7 @@ install(FILES ${CMAKE_SOURCE_DIR}/LICENSE DESTINATION share/doc/kldrprovider REN
 # Bash looks for a command's completion by the name of the command; both are in one file.
 install(FILES completion/kldrcim DESTINATION share/bash-completion/completions)
 install(FILES completion/kldrcim DESTINATION share/bash-completion/completions RENAME kldr-register)
+install(FILES monitoring/kldr_alerts.yml monitoring/kldr_dashboard.json DESTINATION share/doc/kldrprovider/examples)
 install(FILES debian/lintian-overrides DESTINATION share/lintian/overrides RENAME kldrprovider)
 
 # kldr_install_compressed(<file> <folder> <name>): without name and time of the original, so that the same text gives the same file.

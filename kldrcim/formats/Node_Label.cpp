@@ -5,7 +5,6 @@
 #include "kldrcim/walks/Property_Values.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cstdio>
 
 namespace KPRV::kldrcim {
@@ -232,19 +231,6 @@ const char* node_kind_name(Node_Kind kind)
     static const char* const names[] = {"system",  "adapter",       "software",  "card",   "connector",
                                         "fc_port", "ethernet_port", "initiator", "target", "unit"};
     return names[static_cast<int>(kind)];
-}
-
-std::string colon_form(const std::string& address)
-{
-    bool is_address = (address.size() == 12 || address.size() == 16) &&
-                      std::all_of(address.begin(), address.end(),
-                                  [](char c) { return std::isxdigit(static_cast<unsigned char>(c)); });
-    if (!is_address)
-        return address;
-    std::string colons;
-    for (std::size_t i = 0; i < address.size(); i += 2)
-        colons += (i ? ":" : "") + address.substr(i, 2);
-    return colons;
 }
 
 std::string speed_text(std::uint64_t bits_per_second)

@@ -26,6 +26,8 @@ constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
     {"json", Cli_Options::Format::JSON},
     {"mof", Cli_Options::Format::MOF},
     {"plugin", Cli_Options::Format::PLUGIN},
+    {"prometheus", Cli_Options::Format::PROMETHEUS},
+    {"openmetrics", Cli_Options::Format::OPENMETRICS},
 };
 constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
     {"auto", Cli_Options::Color::AUTO},
@@ -93,6 +95,18 @@ bool set_number(Cli_Options& options, const std::string& value)
     return error == std::errc() && at == end && options.*Member != 0;
 }
 
+bool set_format(Cli_Options& options, const std::string& value)
+{
+    options.is_format_said = true;
+    return set_word<&Cli_Options::format, formats>(options, value);
+}
+
+bool set_output(Cli_Options& options, const std::string& value)
+{
+    options.output = value;
+    return !value.empty();
+}
+
 bool set_raw(Cli_Options& options, const std::string& value)
 {
     options.raw = value;
@@ -105,8 +119,9 @@ using Options = Cli_Options;
 // clang-format off
 constexpr Cli_Option option_table[] = {
 //   name            value             set                                  flag                     takes                     common
-    {"--format",     "table|json|mof|plugin", set_word<&Options::format, formats>, nullptr,          "table, json, mof or plugin", true,
-     "how results are written (default: table)"},
+    {"--format",     "table|json|mof|plugin|prometheus|openmetrics", set_format, nullptr,
+     "table, json, mof, plugin, prometheus or openmetrics", true,
+     "how results are written (default: the first that a verb has, mostly table)"},
     {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
      "ask for these properties only"},
     {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
@@ -145,6 +160,8 @@ constexpr Cli_Option option_table[] = {
      "look twice, so many seconds apart, at what counts errors"},
     {"--ignore",     "WHAT",           add_ignored,                         nullptr,                 "a finding or an address", false,
      "leave out what is known: a kind of finding, or an adapter, port or target by its address; may be given several times"},
+    {"--output",     "FILE",           set_output,                          nullptr,                 "a file name",            false,
+     "write into this file, as a whole or not at all, instead of on standard output"},
     {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
      "the whole text of a call"},
     {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,

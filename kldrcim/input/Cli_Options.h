@@ -18,6 +18,9 @@ struct Cli_Options
         MOF,
         /// The one line of a monitoring plugin.
         PLUGIN,
+        /// The two texts of collectors of metrics.
+        PROMETHEUS,
+        OPENMETRICS,
     };
     enum class Color
     {
@@ -27,6 +30,8 @@ struct Cli_Options
     };
 
     Format format = Format::TABLE;
+    /// Otherwise it is the first that the verb has.
+    bool is_format_said = false;
     /// Of a tree: on a terminal, unless it is said.
     Color color = Color::AUTO;
     Property_List properties;
@@ -49,6 +54,8 @@ struct Cli_Options
     unsigned interval = 0;
     /// Findings and addresses that nobody wants to hear of.
     std::vector<std::string> ignored;
+    /// File to write to; empty for standard output.
+    std::string output;
     /// Lines of a tree without box-drawing characters.
     bool ascii = false;
     /// rpc: the whole text of a call, or "-" for standard input.

@@ -89,7 +89,7 @@ bool check_sense(const Cli_Options& options, const Cli_Verb& verb,
             return false;
         }
     const char* const format = name_of(options.format);
-    if (!contains_word(verb.formats, format)) {
+    if (options.is_format_said && !contains_word(verb.formats, format)) {
         error = "--format " + std::string(format) + " makes no sense for " + verb.name;
         return false;
     }

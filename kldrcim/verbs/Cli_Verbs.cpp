@@ -5,6 +5,7 @@
 #include "kldrcim/verbs/Cli_Diag.h"
 #include "kldrcim/verbs/Cli_Flash.h"
 #include "kldrcim/verbs/Cli_Health.h"
+#include "kldrcim/verbs/Cli_Metrics.h"
 #include "kldrcim/verbs/Cli_Operations.h"
 #include "kldrcim/verbs/Cli_Profiles.h"
 #include "kldrcim/verbs/Cli_Rpc.h"
@@ -60,6 +61,8 @@ constexpr Cli_Verb verbs[] = {
      "what is wrong with the host's adapters, ports and targets, the worst first",
      "as of a monitoring plugin: 0 nothing is wrong, 1 warnings, 2 something critical, 3 what nobody can tell, or no module; "
      "wrong usage is 2 as everywhere.", 3},
+    {"metrics",  0, 0,   "",                                        run_metrics,     Op{},                        "prometheus openmetrics", "--output",
+     "the host in numbers, for Prometheus and other collectors of metrics", nullptr},
     {"profiles", 0, 0,   "",                                        write_profiles,  Op{},                        "table json", "--ascii",
      "the registered profiles and what conforms to each, as a tree", nullptr},
     {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",

@@ -76,18 +76,17 @@ constexpr const char* error_counter_names[] = {
     "NOSCount",
 };
 
-/// OK and in service.
-constexpr bool is_in_service(std::uint64_t operational_status)
-{
-    return operational_status == 2 || operational_status == 11;
-}
-
 int badness(Rank rank)
 {
     return rank == Rank::CRITICAL ? 3 : rank == Rank::UNKNOWN ? 2 : rank == Rank::WARNING;
 }
 
 } // namespace
+
+bool is_in_service(std::uint64_t operational_status)
+{
+    return operational_status == 2 || operational_status == 11;
+}
 
 const char* rank_name(Rank rank)
 {

@@ -38,6 +38,9 @@ std::span<const Finding_Kind> finding_kinds();
 /// Null for a name that is none.
 const Finding_Kind* find_finding(const char* name);
 
+/// True for an `OperationalStatus` of what does what it is there for: OK, and in service.
+bool is_in_service(std::uint64_t operational_status);
+
 /// What a status of an element means.
 struct Status_Finding
 {

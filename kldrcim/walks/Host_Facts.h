@@ -1,6 +1,7 @@
 #pragma once
 
 #include "kldrcim/walks/Association_Index.h"
+#include "kldrcim/walks/Optics.h"
 
 namespace KPRV::kldrcim {
 
@@ -22,6 +23,8 @@ struct Port_Facts
     /// Of an FC port that counts; otherwise without properties.
     Instance_Value statistics = {};
     std::vector<Target_Facts> targets = {};
+    /// Nothing unless it was asked for.
+    Optics_Readings optics = {};
 };
 
 struct Adapter_Facts

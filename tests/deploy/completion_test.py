@@ -44,7 +44,7 @@ class Completion(DeployCase):
             self.assertEqual(self.offered(line), [], line)
 
     def test_choices_of_options_and_verbs(self):
-        self.assertEqual(self.offered("kldrcim --format "), ["json", "mof", "plugin", "table"])
+        self.assertEqual(self.offered("kldrcim --format "), ["json", "mof", "openmetrics", "plugin", "prometheus", "table"])
         self.assertEqual(self.offered("kldrcim tree --color a"), ["always", "auto"])
         self.assertEqual(self.offered("kldrcim diag "), ["list", "run"])
         self.assertEqual(self.offered("kldrcim --namespace "), [], "a verb does not stand here")
