@@ -1,6 +1,7 @@
 #include "kldrcim/formats/Health_Text.h"
 
 #include "broker/values/Value_Text.h"
+#include "kldrcim/formats/Counted_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Node_Label.h"
 #include "kldrcim/formats/Visible_Text.h"
@@ -45,15 +46,10 @@ std::string path_of(const Health_Finding& finding)
     return finding.element.path.keys.empty() ? "" : path_text(finding.element.path);
 }
 
-std::string plural(std::size_t number, const char* word)
-{
-    return std::to_string(number) + " " + word + (number == 1 ? "" : "s");
-}
-
 std::string counted(const Health_Report& report)
 {
-    return plural(report.adapters, "adapter") + ", " + plural(report.ports, "port") + ", " +
-           plural(report.targets, "target");
+    return counted_text(report.adapters, "adapter") + ", " + counted_text(report.ports, "port") + ", " +
+           counted_text(report.targets, "target");
 }
 
 std::size_t count_of(const Health_Report& report, Rank rank)

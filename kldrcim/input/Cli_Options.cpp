@@ -34,6 +34,10 @@ constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
     {"always", Cli_Options::Color::ALWAYS},
     {"never", Cli_Options::Color::NEVER},
 };
+constexpr std::pair<const char*, Cli_Options::Luns> lun_words[] = {
+    {"each", Cli_Options::Luns::EACH},
+    {"merged", Cli_Options::Luns::MERGED},
+};
 
 /// One of a few words.
 template <auto Member, auto& Words>
@@ -150,6 +154,8 @@ constexpr Cli_Option option_table[] = {
      "also firmware and drivers"},
     {"--connectors", nullptr,          nullptr,                             &Options::connectors,    nullptr,                  false,
      "also cards and transceivers"},
+    {"--luns",       "each|merged",    set_word<&Options::luns, lun_words>, nullptr,                 "each or merged",         false,
+     "draw a logical unit for each port that sees it, or as one node (default: each)"},
     {"--ascii",      nullptr,          nullptr,                             &Options::ascii,         nullptr,                  false,
      "no box-drawing characters (default where the locale is not UTF-8)"},
     {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,

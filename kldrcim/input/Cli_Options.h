@@ -29,6 +29,12 @@ struct Cli_Options
         NEVER,
     };
 
+    enum class Luns
+    {
+        EACH,
+        MERGED,
+    };
+
     Format format = Format::TABLE;
     /// Otherwise it is the first that the verb has.
     bool is_format_said = false;
@@ -46,6 +52,8 @@ struct Cli_Options
     /// What a tree or graph shows besides ports and storage.
     bool software = false;
     bool connectors = false;
+    /// Whether a unit that several ports see is drawn for each of them, or once.
+    Luns luns = Luns::EACH;
     /// Name spaces of the filters of a watch; empty: that of the classes.
     std::vector<std::string> filters;
     /// Indications after which a watch ends; 0: never.

@@ -5,6 +5,7 @@
 #include "kldrcim/verbs/Cli_Diag.h"
 #include "kldrcim/verbs/Cli_Flash.h"
 #include "kldrcim/verbs/Cli_Health.h"
+#include "kldrcim/verbs/Cli_Luns.h"
 #include "kldrcim/verbs/Cli_Metrics.h"
 #include "kldrcim/verbs/Cli_Operations.h"
 #include "kldrcim/verbs/Cli_Profiles.h"
@@ -55,8 +56,10 @@ constexpr Cli_Verb verbs[] = {
      "their names", nullptr},
     {"tree",     0, 0,   "",                                        draw_tree,       Op{},                        "table json", "--software --connectors --ascii --color",
      "the host with its adapters, ports, targets and logical units, as a tree", nullptr},
-    {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--software --connectors",
+    {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--software --connectors --luns",
      "the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg", nullptr},
+    {"luns",     0, 0,   "",                                        list_units,      Op{},                        "table json", "",
+     "each logical unit once, by its identifier, with the paths that lead to it", nullptr},
     {"health",   0, 0,   "",                                        run_health,      Op{},                        "table json plugin", "--interval --ignore",
      "what is wrong with the host's adapters, ports and targets, the worst first",
      "as of a monitoring plugin: 0 nothing is wrong, 1 warnings, 2 something critical, 3 what nobody can tell, or no module; "

@@ -28,6 +28,14 @@ protected:
         const int status = std::system(command.c_str());
         return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, folder.read("out"), folder.read("error")};
     }
+    /// Bad input: what is wrong with it is said in one line, and nothing else happens.
+    void expect_mistake(const std::string& arguments, const std::string& error)
+    {
+        const Outcome run = kldrcim(arguments);
+        EXPECT_EQ(2, run.status) << arguments;
+        EXPECT_EQ("", run.out) << arguments;
+        EXPECT_EQ("kldrcim: " + error + "\n", run.error) << arguments;
+    }
     /// From now on over this inventory.
     void with(const std::string& json)
     {

@@ -201,23 +201,17 @@ TEST_F(Health_Verb, AProviderThatDoesNotAnswerIsNamed)
 
 TEST_F(Health_Verb, BadInputIsNamed)
 {
-    const std::pair<const char*, const char*> mistakes[] = {
-        {"health --ignore port-no-contct", "--ignore takes a finding or an address, not \"port-no-contct\" "
-                                           "(did you mean \"port-no-contact\"?)"},
-        {"health --ignore 10:00:02", "--ignore takes a finding or an address, not \"10:00:02\""},
-        {"health --ignore ''", "--ignore takes a finding or an address, not \"\""},
-        {"health --interval 0", "--interval takes a number above 0, not \"0\""},
-        {"health --interval 1s", "--interval takes a number above 0, not \"1s\""},
-        {"health --format mof", "--format mof makes no sense for health"},
-        {"health x", "usage: kldrcim [options] health"},
-        {"tree --interval 1", "--interval makes no sense for tree; it is for health"},
-        {"tree --format plugin", "--format plugin makes no sense for tree"},
-    };
-    for (const auto& [arguments, error] : mistakes) {
-        const Outcome run = kldrcim(arguments);
-        EXPECT_EQ(2, run.status) << arguments;
-        EXPECT_EQ(std::string("kldrcim: ") + error + "\n", run.error) << arguments;
-    }
+    expect_mistake("health --ignore port-no-contct",
+                   "--ignore takes a finding or an address, not \"port-no-contct\" "
+                   "(did you mean \"port-no-contact\"?)");
+    expect_mistake("health --ignore 10:00:02", "--ignore takes a finding or an address, not \"10:00:02\"");
+    expect_mistake("health --ignore ''", "--ignore takes a finding or an address, not \"\"");
+    expect_mistake("health --interval 0", "--interval takes a number above 0, not \"0\"");
+    expect_mistake("health --interval 1s", "--interval takes a number above 0, not \"1s\"");
+    expect_mistake("health --format mof", "--format mof makes no sense for health");
+    expect_mistake("health x", "usage: kldrcim [options] health");
+    expect_mistake("tree --interval 1", "--interval makes no sense for tree; it is for health");
+    expect_mistake("tree --format plugin", "--format plugin makes no sense for tree");
 }
 
 } // namespace
