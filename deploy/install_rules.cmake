@@ -14,6 +14,7 @@ install(FILES ${completion}/kldrcim.zsh DESTINATION share/zsh/vendor-completions
 install(FILES ${completion}/kldrcim.fish DESTINATION share/fish/vendor_completions.d)
 install(FILES ${completion}/classes DESTINATION share/kldrprovider/completion)
 install(FILES examples/logrotate examples/kldrcim.service DESTINATION share/doc/kldrprovider/examples)
+install(FILES monitoring/kldr_alerts.yml monitoring/kldr_dashboard.json DESTINATION share/doc/kldrprovider/examples)
 install(FILES debian/lintian-overrides DESTINATION share/lintian/overrides RENAME kldrprovider)
 
 # kldr_install_compressed(<file> <folder> <name>): without name and time of the original, so that the same text gives the same file.

@@ -20,12 +20,12 @@ int run_verb(const Cli_Options& options)
 {
     std::string error, warning;
     const std::unique_ptr<Local_Connection> connection = open_module(options, error, warning);
+    const Cli_Verb& verb = *find_verb(options.verb);
     if (!connection)
-        return complain(error, USAGE_ERROR);
+        return complain(error, verb.without_module);
     if (!warning.empty())
         complain("warning: " + warning, 0);
-    const Verb_Body body = find_verb(options.verb)->body;
-    const int status = body ? body(options, *connection) : serve(options, connection->host());
+    const int status = verb.body ? verb.body(options, *connection) : serve(options, connection->host());
     for (const std::string& breach : connection->breaches())
         complain("warning: the provider broke the CMPI contract: " + breach, 0);
     if (options.leaks)

@@ -34,7 +34,7 @@ ALLOWED = {
     "kldrcim/input":      "broker/values",
     "kldrcim/connection": "broker/values",
     "kldrcim/local":      "broker/values broker kldrcim/input kldrcim/connection <json>",
-    "kldrcim/walks":      "broker/values kldrcim/input kldrcim/connection contracts/agent",
+    "kldrcim/walks":      "broker/values kldrcim/input kldrcim/connection contracts/agent <json>",
     "kldrcim/wire":       "broker/values",
     "kldrcim/server":     "broker/values broker kldrcim/wire module/runtime",
     "kldrcim/formats":    "broker/values kldrcim/walks <json>",

@@ -2,9 +2,9 @@
 
 #include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Visible_Text.h"
+#include "kldrcim/walks/Property_Values.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cstdio>
 
 namespace KPRV::kldrcim {
@@ -67,29 +67,18 @@ Node_State state_of(const State_Word (&words)[Count], std::uint64_t number)
     return {"state " + std::to_string(number), NONE};
 }
 
-/// The number, or the first of an array.
-std::optional<std::uint64_t> number(const Instance_Value& instance, const char* property)
-{
-    const Value* value = instance.property(property);
-    if (value && value->is_array())
-        value = value->elements().empty() ? nullptr : &value->elements().front();
-    if (!value || value->null)
-        return std::nullopt;
-    return value->as_uint();
-}
-
 Node_State operational_state(const Instance_Value& instance)
 {
-    if (const auto operational = number(instance, "OperationalStatus"))
+    if (const auto operational = number_of(instance, "OperationalStatus"))
         return state_of(operational_states, *operational);
-    const auto enabled = number(instance, "EnabledState");
+    const auto enabled = number_of(instance, "EnabledState");
     return enabled ? state_of(enabled_states, *enabled) : Node_State();
 }
 
 /// Of what has a link: its status says more than whether it is enabled.
 Node_State link_state(const Instance_Value& instance)
 {
-    if (number(instance, "OperationalStatus") == STOPPED)
+    if (number_of(instance, "OperationalStatus") == STOPPED)
         return {"disabled", IDLE};
     return operational_state(instance);
 }
@@ -119,7 +108,7 @@ Node_Label adapter_label(const Instance_Value& adapter)
 Node_Label software_label(const Instance_Value& software)
 {
     std::string version = line_of(software, "VersionString");
-    switch (number(software, "Classifications").value_or(0)) {
+    switch (number_of(software, "Classifications").value_or(0)) {
     case 2:
         return {"driver", line_of(software, "InstanceID"), {version}};
     case 10:
@@ -148,7 +137,7 @@ Node_Label port_label(const char* what, const std::string& device, const Instanc
 {
     return with_state({what,
                        colon_form(line_of(port, "DeviceID")),
-                       {device, speed_text(number(port, "Speed").value_or(0))}},
+                       {device, speed_text(number_of(port, "Speed").value_or(0))}},
                       link_state(port));
 }
 
@@ -242,19 +231,6 @@ const char* node_kind_name(Node_Kind kind)
     static const char* const names[] = {"system",  "adapter",       "software",  "card",   "connector",
                                         "fc_port", "ethernet_port", "initiator", "target", "unit"};
     return names[static_cast<int>(kind)];
-}
-
-std::string colon_form(const std::string& address)
-{
-    bool is_address = (address.size() == 12 || address.size() == 16) &&
-                      std::all_of(address.begin(), address.end(),
-                                  [](char c) { return std::isxdigit(static_cast<unsigned char>(c)); });
-    if (!is_address)
-        return address;
-    std::string colons;
-    for (std::size_t i = 0; i < address.size(); i += 2)
-        colons += (i ? ":" : "") + address.substr(i, 2);
-    return colons;
 }
 
 std::string speed_text(std::uint64_t bits_per_second)

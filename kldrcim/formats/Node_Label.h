@@ -1,5 +1,6 @@
 #pragma once
 
+#include "kldrcim/walks/Address_Text.h"
 #include "kldrcim/walks/Topology.h"
 
 namespace KPRV::kldrcim {
@@ -48,9 +49,6 @@ std::string label_line(const Node_Label& label, bool color = false);
 
 /// "fc_port" and its like: the kind for programs.
 const char* node_kind_name(Node_Kind kind);
-
-/// "10:00:02:4b:..." of twelve or sixteen hexadecimal digits; any other text as it is.
-std::string colon_form(const std::string& address);
 
 /// Bits per second as "8 Gb/s" or "2.5 Gb/s"; empty for 0, which stands for unknown.
 std::string speed_text(std::uint64_t bits_per_second);

@@ -25,11 +25,18 @@ constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
     {"table", Cli_Options::Format::TABLE},
     {"json", Cli_Options::Format::JSON},
     {"mof", Cli_Options::Format::MOF},
+    {"plugin", Cli_Options::Format::PLUGIN},
+    {"prometheus", Cli_Options::Format::PROMETHEUS},
+    {"openmetrics", Cli_Options::Format::OPENMETRICS},
 };
 constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
     {"auto", Cli_Options::Color::AUTO},
     {"always", Cli_Options::Color::ALWAYS},
     {"never", Cli_Options::Color::NEVER},
+};
+constexpr std::pair<const char*, Cli_Options::Luns> lun_words[] = {
+    {"each", Cli_Options::Luns::EACH},
+    {"merged", Cli_Options::Luns::MERGED},
 };
 
 /// One of a few words.
@@ -77,11 +84,31 @@ bool add_filter(Cli_Options& options, const std::string& value)
     return !value.empty();
 }
 
-bool set_count(Cli_Options& options, const std::string& value)
+bool add_ignored(Cli_Options& options, const std::string& value)
+{
+    options.ignored.push_back(value);
+    return !value.empty();
+}
+
+/// A number above 0.
+template <unsigned Cli_Options::*Member>
+bool set_number(Cli_Options& options, const std::string& value)
 {
     const char* end = value.data() + value.size();
-    const auto [at, error] = std::from_chars(value.data(), end, options.count);
-    return error == std::errc() && at == end && options.count != 0;
+    const auto [at, error] = std::from_chars(value.data(), end, options.*Member);
+    return error == std::errc() && at == end && options.*Member != 0;
+}
+
+bool set_format(Cli_Options& options, const std::string& value)
+{
+    options.is_format_said = true;
+    return set_word<&Cli_Options::format, formats>(options, value);
+}
+
+bool set_output(Cli_Options& options, const std::string& value)
+{
+    options.output = value;
+    return !value.empty();
 }
 
 bool set_raw(Cli_Options& options, const std::string& value)
@@ -96,8 +123,9 @@ using Options = Cli_Options;
 // clang-format off
 constexpr Cli_Option option_table[] = {
 //   name            value             set                                  flag                     takes                     common
-    {"--format",     "table|json|mof", set_word<&Options::format, formats>, nullptr,                 "table, json or mof",     true,
-     "how results are written (default: table)"},
+    {"--format",     "table|json|mof|plugin|prometheus|openmetrics", set_format, nullptr,
+     "table, json, mof, plugin, prometheus or openmetrics", true,
+     "how results are written (default: the first that a verb has, mostly table)"},
     {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
      "ask for these properties only"},
     {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
@@ -120,18 +148,26 @@ constexpr Cli_Option option_table[] = {
      "only results that stand in this role"},
     {"--filter",     "NS",             add_filter,                          nullptr,                 "a namespace",            false,
      "a filter in this namespace, instead of --namespace; may be given several times"},
-    {"--count",      "N",              set_count,                           nullptr,                 "a number above 0",       false,
+    {"--count",      "N",              set_number<&Options::count>,         nullptr,                 "a number above 0",       false,
      "end after N indications"},
     {"--software",   nullptr,          nullptr,                             &Options::software,      nullptr,                  false,
      "also firmware and drivers"},
     {"--connectors", nullptr,          nullptr,                             &Options::connectors,    nullptr,                  false,
      "also cards and transceivers"},
+    {"--luns",       "each|merged",    set_word<&Options::luns, lun_words>, nullptr,                 "each or merged",         false,
+     "draw a logical unit for each port that sees it, or as one node (default: each)"},
     {"--ascii",      nullptr,          nullptr,                             &Options::ascii,         nullptr,                  false,
      "no box-drawing characters (default where the locale is not UTF-8)"},
     {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,
      "states in colors: auto, always or never (default: auto, on a terminal and without NO_COLOR)"},
     {"--raw",        nullptr,          nullptr,                             &Options::numbers,       nullptr,                  false,
      "numbers alone, without what they mean"},
+    {"--interval",   "SECONDS",        set_number<&Options::interval>,      nullptr,                 "a number above 0",       false,
+     "look twice, so many seconds apart, at what counts errors"},
+    {"--ignore",     "WHAT",           add_ignored,                         nullptr,                 "a finding or an address", false,
+     "leave out what is known: a kind of finding, or an adapter, port or target by its address; may be given several times"},
+    {"--output",     "FILE",           set_output,                          nullptr,                 "a file name",            false,
+     "write into this file, as a whole or not at all, instead of on standard output"},
     {"--raw",        "TEXT",           set_raw,                             nullptr,                 nullptr,                  false,
      "the whole text of a call"},
     {"--list",       nullptr,          nullptr,                             &Options::list_methods,  nullptr,                  false,

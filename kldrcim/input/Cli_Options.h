@@ -16,6 +16,11 @@ struct Cli_Options
         TABLE,
         JSON,
         MOF,
+        /// The one line of a monitoring plugin.
+        PLUGIN,
+        /// The two texts of collectors of metrics.
+        PROMETHEUS,
+        OPENMETRICS,
     };
     enum class Color
     {
@@ -24,7 +29,15 @@ struct Cli_Options
         NEVER,
     };
 
+    enum class Luns
+    {
+        EACH,
+        MERGED,
+    };
+
     Format format = Format::TABLE;
+    /// Otherwise it is the first that the verb has.
+    bool is_format_said = false;
     /// Of a tree: on a terminal, unless it is said.
     Color color = Color::AUTO;
     Property_List properties;
@@ -39,10 +52,18 @@ struct Cli_Options
     /// What a tree or graph shows besides ports and storage.
     bool software = false;
     bool connectors = false;
+    /// Whether a unit that several ports see is drawn for each of them, or once.
+    Luns luns = Luns::EACH;
     /// Name spaces of the filters of a watch; empty: that of the classes.
     std::vector<std::string> filters;
     /// Indications after which a watch ends; 0: never.
     unsigned count = 0;
+    /// Seconds between two looks; 0: one look.
+    unsigned interval = 0;
+    /// Findings and addresses that nobody wants to hear of.
+    std::vector<std::string> ignored;
+    /// File to write to; empty for standard output.
+    std::string output;
     /// Lines of a tree without box-drawing characters.
     bool ascii = false;
     /// rpc: the whole text of a call, or "-" for standard input.

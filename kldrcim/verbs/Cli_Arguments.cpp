@@ -1,6 +1,7 @@
 #include "kldrcim/verbs/Cli_Arguments.h"
 
 #include "kldrcim/input/Nearest_Word.h"
+#include "kldrcim/verbs/Cli_Health.h"
 #include "kldrcim/verbs/Cli_Help.h"
 #include "kldrcim/verbs/Cli_Rpc.h"
 #include "kldrcim/verbs/Cli_Verbs.h"
@@ -88,7 +89,7 @@ bool check_sense(const Cli_Options& options, const Cli_Verb& verb,
             return false;
         }
     const char* const format = name_of(options.format);
-    if (!contains_word(verb.formats, format)) {
+    if (options.is_format_said && !contains_word(verb.formats, format)) {
         error = "--format " + std::string(format) + " makes no sense for " + verb.name;
         return false;
     }
@@ -109,7 +110,8 @@ bool check_arguments(const Cli_Options& options, const Cli_Verb& verb, std::stri
 {
     if (options.arguments.size() < verb.least || options.arguments.size() > verb.most)
         error = usage_line(verb);
-    return error.empty() && (options.verb != "rpc" || check_rpc(options, error));
+    return error.empty() && (options.verb != "rpc" || check_rpc(options, error)) &&
+           check_health_options(options, error);
 }
 
 } // namespace

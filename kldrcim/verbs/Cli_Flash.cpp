@@ -5,12 +5,12 @@
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Visible_Text.h"
+#include "kldrcim/input/Address_Words.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Interruption.h"
-#include "kldrcim/walks/Association_Index.h"
+#include "kldrcim/walks/Host_Facts.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cstdio>
 #include <unistd.h>
 
@@ -24,19 +24,8 @@ constexpr const char* service_class = "KALDERA_HBASoftwareInstallationService";
 constexpr const char* controller_class = "KALDERA_PortController";
 constexpr const char* software_association = "KALDERA_AdapterElementSoftwareIdentity";
 
-/// Codes of the CIM Schema: what is asked for, and which software is firmware.
+/// Code of the CIM Schema: what is asked for.
 constexpr std::uint64_t option_update = 5;
-constexpr std::uint64_t classification_firmware = 10;
-
-/// The digits of an address, without what people put between them.
-std::string address_digits(const std::string& text)
-{
-    std::string digits;
-    for (const char c : text)
-        if (c != ':' && c != '-' && c != '.')
-            digits += static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-    return digits;
-}
 
 std::string device_id(const Path_Value& controller)
 {

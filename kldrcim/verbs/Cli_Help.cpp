@@ -33,6 +33,8 @@ constexpr const char* examples = R"examples(
   kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" \
       --assoc KALDERA_PortControllerSystemDevice
   kldrcim tree --software
+  kldrcim health --interval 10
+  kldrcim metrics --output /var/lib/prometheus/node-exporter/kldr.prom
   kldrcim diag run SerdesLoopbackTest 10:00:02:4b:4c:10:00:00 --wait
   kldrcim watch --count 10 --properties Message,PerceivedSeverity,MessageID
   kldrcim rpc discovery.getPortByWwn 10:00:02:4b:4c:10:00:00

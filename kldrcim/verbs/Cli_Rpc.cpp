@@ -3,9 +3,10 @@
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Format_Table.h"
 #include "kldrcim/formats/Output.h"
-#include "kldrcim/formats/Rpc_Text.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
+#include "kldrcim/walks/Agent.h"
 #include "kldrcim/walks/Rpc_Methods.h"
+#include "kldrcim/walks/Rpc_Text.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -14,10 +15,6 @@
 namespace KPRV::kldrcim {
 
 namespace {
-
-/// The one instance of the agent's class.
-constexpr const char* agent_class = "KALDERA_AgentService";
-constexpr const char* agent_name = "Kaldera Agent Service Provider";
 
 /// Stands between two calls of one command line.
 constexpr const char* next_call = "+";
@@ -37,33 +34,6 @@ std::string read_all(std::FILE* file)
         text.append(buffer, size);
     return text;
 }
-
-/// The method that carries the protocol.
-class Agent
-{
-public:
-    explicit Agent(Connection& connection) : connection_(connection) {}
-
-    /// False with a one-line `error` if the provider answers a failure or no reply.
-    bool call(const std::string& request, std::string& reply, std::string& error)
-    {
-        Path_Value path;
-        path.class_name = agent_class;
-        path.keys = {{"Name", Value::text(agent_name)}};
-        const Result result =
-            connection_.invoke_method(path, "executeMethod", {{"request", Value::text(request)}});
-        const Value* response = find_value(result.out, "response");
-        if (!result.ok() || !response) {
-            error = result.ok() ? "executeMethod gave no response" : failure_text(result);
-            return false;
-        }
-        reply = response->as_text();
-        return true;
-    }
-
-private:
-    Connection& connection_;
-};
 
 std::vector<std::vector<std::string>> split_calls(const std::vector<std::string>& arguments)
 {
@@ -111,25 +81,23 @@ int list_methods(const Cli_Options& options)
     return 0;
 }
 
-int call_raw(Agent& agent, const std::string& text)
+int call_raw(Connection& connection, const std::string& text)
 {
-    std::string reply;
-    std::string error;
-    if (!agent.call(text == "-" ? read_all(stdin) : text, reply, error))
-        return complain(error, 1);
-    put_line(reply);
+    const Result answer = call_agent(connection, text == "-" ? read_all(stdin) : text);
+    if (!answer.ok())
+        return complain(failure_text(answer), FAILURE);
+    put_line(agent_reply(answer));
     return 0;
 }
 
-int call_one(Agent& agent, const std::string& request)
+int call_one(Connection& connection, const std::string& request)
 {
-    std::string text;
-    std::string error;
-    if (!agent.call(request, text, error))
-        return complain(error, 1);
-    const Rpc_Reply reply = read_rpc_reply(text);
+    const Result answer = call_agent(connection, request);
+    if (!answer.ok())
+        return complain(failure_text(answer), FAILURE);
+    const Rpc_Reply reply = read_rpc_reply(agent_reply(answer));
     if (!reply.error.empty())
-        return complain(reply.error, 1);
+        return complain(reply.error, FAILURE);
     put_line(reply.result);
     return 0;
 }
@@ -154,9 +122,8 @@ int run_rpc(const Cli_Options& options, Connection& connection)
 {
     if (options.list_methods)
         return list_methods(options);
-    Agent agent(connection);
     if (options.raw)
-        return call_raw(agent, *options.raw);
+        return call_raw(connection, *options.raw);
     std::vector<std::string> requests;
     std::string error;
     for (const std::vector<std::string>& words : split_calls(options.arguments)) {
@@ -168,7 +135,7 @@ int run_rpc(const Cli_Options& options, Connection& connection)
         requests.push_back(*request);
     }
     for (const std::string& request : requests)
-        if (const int status = call_one(agent, request))
+        if (const int status = call_one(connection, request))
             return status;
     return 0;
 }

@@ -15,8 +15,11 @@ template <class Text_Of>
 int draw(const Cli_Options& options, Connection& connection, bool cross_links, Text_Of text_of)
 {
     Association_Index index(connection);
-    const Topology topology = walk_topology(
-        index, {.software = options.software, .connectors = options.connectors, .cross_links = cross_links});
+    const Topology topology =
+        walk_topology(index, {.software = options.software,
+                              .connectors = options.connectors,
+                              .cross_links = cross_links,
+                              .merge_units = options.luns == Cli_Options::Luns::MERGED});
     const std::vector<Provider_Failure>& failures = index.failures();
     if (!failures.empty() && same_name(failures.front().provider_class, topology_root_class))
         return complain(

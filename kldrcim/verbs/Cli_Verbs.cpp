@@ -4,6 +4,9 @@
 #include "kldrcim/verbs/Cli_Conform.h"
 #include "kldrcim/verbs/Cli_Diag.h"
 #include "kldrcim/verbs/Cli_Flash.h"
+#include "kldrcim/verbs/Cli_Health.h"
+#include "kldrcim/verbs/Cli_Luns.h"
+#include "kldrcim/verbs/Cli_Metrics.h"
 #include "kldrcim/verbs/Cli_Operations.h"
 #include "kldrcim/verbs/Cli_Profiles.h"
 #include "kldrcim/verbs/Cli_Rpc.h"
@@ -53,8 +56,16 @@ constexpr Cli_Verb verbs[] = {
      "their names", nullptr},
     {"tree",     0, 0,   "",                                        draw_tree,       Op{},                        "table json", "--software --connectors --ascii --color",
      "the host with its adapters, ports, targets and logical units, as a tree", nullptr},
-    {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--software --connectors",
+    {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--software --connectors --luns",
      "the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg", nullptr},
+    {"luns",     0, 0,   "",                                        list_units,      Op{},                        "table json", "",
+     "each logical unit once, by its identifier, with the paths that lead to it", nullptr},
+    {"health",   0, 0,   "",                                        run_health,      Op{},                        "table json plugin", "--interval --ignore",
+     "what is wrong with the host's adapters, ports and targets, the worst first",
+     "as of a monitoring plugin: 0 nothing is wrong, 1 warnings, 2 something critical, 3 what nobody can tell, or no module; "
+     "wrong usage is 2 as everywhere.", 3},
+    {"metrics",  0, 0,   "",                                        run_metrics,     Op{},                        "prometheus openmetrics", "--output",
+     "the host in numbers, for Prometheus and other collectors of metrics", nullptr},
     {"profiles", 0, 0,   "",                                        write_profiles,  Op{},                        "table json", "--ascii",
      "the registered profiles and what conforms to each, as a tree", nullptr},
     {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",

@@ -32,6 +32,8 @@ struct Cli_Verb
     const char* summary;
     /// What its exit statuses mean where that is not what they always mean; null for nothing.
     const char* statuses;
+    /// Exit status where there is no module to ask.
+    int without_module = 2;
 };
 
 std::span<const Cli_Verb> cli_verbs();

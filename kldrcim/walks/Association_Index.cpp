@@ -23,13 +23,12 @@ void Association_Index::note_failure(const std::string& class_name, const Result
         failures_.push_back({class_name, result.rc, result.message});
 }
 
-/// The references of an association are its keys, so that names tell all.
-const Association_Index::Links& Association_Index::links(const std::string& association)
+const std::vector<Path_Value>& Association_Index::names(const std::string& class_name)
 {
-    auto [at, is_new] = links_.try_emplace(association);
+    auto [at, is_new] = names_.try_emplace(class_name);
     if (is_new) {
-        Result result = connection_.enumerate_instance_names(association);
-        note_failure(association, result);
+        Result result = connection_.enumerate_instance_names(class_name);
+        note_failure(class_name, result);
         at->second = std::move(result.paths);
     }
     return at->second;
@@ -39,7 +38,8 @@ std::vector<Path_Value> Association_Index::far_ends(const char* association, con
                                                     const Path_Value& object, const char* far_role,
                                                     const char* above_role, const Path_Value* above)
 {
-    const Links& all = links(association);
+    // The references of an association are its keys, so that names tell all.
+    const std::vector<Path_Value>& all = names(association);
     auto [positions, is_new] = positions_.try_emplace(std::string(association) + "." + near_role);
     if (is_new)
         for (std::size_t i = 0; i < all.size(); ++i)

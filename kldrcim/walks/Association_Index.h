@@ -22,6 +22,9 @@ public:
                                      const char* far_role, const char* above_role = nullptr,
                                      const Path_Value* above = nullptr);
 
+    /// The names of the instances of a class, or of the links of an association, which it keeps.
+    const std::vector<Path_Value>& names(const std::string& class_name);
+
     /// The instances of a class.
     const std::vector<Instance_Value>& instances(const std::string& class_name);
 
@@ -37,15 +40,13 @@ private:
         std::vector<Instance_Value> instances;
         std::unordered_map<std::string, std::size_t> by_path;
     };
-    using Links = std::vector<Path_Value>;
     using Positions = std::unordered_map<std::string, std::vector<std::size_t>>;
 
-    const Links& links(const std::string& association);
     const Class_Instances& class_instances(const std::string& class_name);
     void note_failure(const std::string& class_name, const Result& result);
 
     Connection& connection_;
-    std::unordered_map<std::string, Links> links_;
+    std::unordered_map<std::string, std::vector<Path_Value>> names_;
     /// By association and near role: positions in the links by the identity of the near end.
     std::unordered_map<std::string, Positions> positions_;
     std::unordered_map<std::string, Class_Instances> instances_;

@@ -1,8 +1,7 @@
 #include "kldrcim/walks/Diag_Names.h"
 
+#include "kldrcim/input/Address_Words.h"
 #include "kldrcim/input/Typed_Input.h"
-
-#include <cctype>
 
 namespace KPRV::kldrcim {
 
@@ -23,21 +22,11 @@ bool takes(const Element_Kind& kind, const std::string& test_class_name)
     return std::string(kind.test_classes).find(" " + test_class_name + " ") != std::string::npos;
 }
 
-/// Without what stands between the pairs of digits.
-std::string flat_address(const std::string& text)
-{
-    std::string flat;
-    for (const char c : text)
-        if (c != ':' && c != '-')
-            flat += static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-    return flat;
-}
-
 bool find_address(Connection& connection, const Element_Kind& kind, const std::string& flat, Path_Value& path)
 {
     for (const Path_Value& each : connection.enumerate_instance_names(kind.class_name).paths) {
         const Value* const id = each.key("DeviceID");
-        if (!id || flat_address(id->as_text()) != flat)
+        if (!id || address_digits(id->as_text()) != flat)
             continue;
         path = each;
         return true;
@@ -81,7 +70,7 @@ bool find_element(Connection& connection, const std::string& test_class_name, co
 {
     if (text.find('=') != std::string::npos)
         return typed_path(connection.classes(), text, path, error);
-    const std::string flat = flat_address(text);
+    const std::string flat = address_digits(text);
     for (const bool right_kind : {true, false})
         for (const Element_Kind& kind : kinds)
             if (takes(kind, test_class_name) == right_kind && find_address(connection, kind, flat, path))

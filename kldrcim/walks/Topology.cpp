@@ -1,6 +1,7 @@
 #include "kldrcim/walks/Topology.h"
 
 #include "broker/values/Path_Identity.h"
+#include "kldrcim/walks/Unit_Paths.h"
 
 #include <set>
 
@@ -37,10 +38,18 @@ private:
         }
     }
 
+    /// Equal for what is one node.
+    std::string identity_of(Node_Kind kind, const Path_Value& path)
+    {
+        const std::string identifier =
+            options_.merge_units && kind == Node_Kind::UNIT ? unit_identifier(index_.instance(path)) : "";
+        return identifier.empty() ? path_identity(path) : "unit " + identifier;
+    }
+
     /// The node of an object, and whether it is new.
     std::pair<std::size_t, bool> node_of(Node_Kind kind, const Path_Value& path)
     {
-        auto [at, is_new] = known_.try_emplace(path_identity(path), topology_.nodes.size());
+        auto [at, is_new] = known_.try_emplace(identity_of(kind, path), topology_.nodes.size());
         if (is_new)
             topology_.nodes.push_back({kind, index_.instance(path)});
         return {at->second, is_new};

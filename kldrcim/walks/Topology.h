@@ -43,6 +43,8 @@ struct Topology_Options
     bool connectors = false;
     /// Also follow what links nodes outside the tree.
     bool cross_links = false;
+    /// Logical units with one identifier are one node, whoever sees them.
+    bool merge_units = false;
 };
 
 /// Walks. Associations that cannot be asked leave their branches out and are told by `index.failures()`.

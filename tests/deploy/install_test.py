@@ -14,6 +14,8 @@ share/bash-completion/completions/kldr-register
 share/bash-completion/completions/kldrcim
 share/doc/kldrprovider/changelog.gz
 share/doc/kldrprovider/copyright
+share/doc/kldrprovider/examples/kldr_alerts.yml
+share/doc/kldrprovider/examples/kldr_dashboard.json
 share/doc/kldrprovider/examples/kldrcim.service
 share/doc/kldrprovider/examples/logrotate
 share/fish/vendor_completions.d/kldrcim.fish

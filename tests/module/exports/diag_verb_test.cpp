@@ -1,44 +1,18 @@
 // kldrcim diag, as users run it: over the built module and the simulator.
-#include "tests/support/Temp_Folder.h"
-
-#include <gtest/gtest.h>
-
-#include <sys/wait.h>
+#include "tests/module/exports/Kldrcim_Fixture.h"
 
 namespace KPRV {
 namespace {
 
-class Diag_Verb : public ::testing::Test
+class Diag_Verb : public Kldrcim_Fixture
 {
 protected:
-    struct Outcome
-    {
-        int status;
-        std::string out;
-        std::string error;
-    };
-    Outcome kldrcim(const std::string& arguments)
-    {
-        const std::string command =
-            "LD_LIBRARY_PATH=" KLDR_SIMULATOR_FOLDER " KLDR_SIMULATOR_INVENTORY=" + inventory +
-            " " KLDRCIM " " + arguments + " >" + folder.path("out") + " 2>" + folder.path("error");
-        const int status = std::system(command.c_str());
-        return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, folder.read("out"), folder.read("error")};
-    }
     void with_outcome(const std::string& outcome)
     {
-        folder.write("inventory.json", R"({"adapters": [{"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00"},
+        with(R"({"adapters": [{"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00"},
             "fcPorts": [{"wwn": "10:00:02:4b:4c:10:00:00", "diagnostics": {"diagPCILoopbackTest": )" +
-                                           outcome + "}}]}]}");
-        inventory = folder.path("inventory.json");
+             outcome + "}}]}]}");
     }
-    static bool has(const std::string& text, const std::string& words)
-    {
-        return text.find(words) != std::string::npos;
-    }
-
-    Temp_Folder folder;
-    std::string inventory = KLDR_INVENTORIES "/demo.json";
 };
 
 TEST_F(Diag_Verb, ListsTestsAndElements)

@@ -1,4 +1,4 @@
-#include "kldrcim/formats/Rpc_Text.h"
+#include "kldrcim/walks/Rpc_Text.h"
 
 #include "kldrcim/walks/Rpc_Methods.h"
 

@@ -1,0 +1,120 @@
+#include "kldrcim/walks/Unit_Paths.h"
+
+#include "broker/values/Path_Identity.h"
+#include "kldrcim/walks/Health_Plan.h"
+#include "kldrcim/walks/Property_Values.h"
+
+#include <algorithm>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+constexpr const char* path_class = "KALDERA_SCSIInitiatorTargetLogicalUnitPath";
+/// What the module says of a unit whose identifier it could not read.
+constexpr const char* no_identifier = "Unable To Fetch";
+
+/// "2" of "LUN_2".
+std::string lun_of(const Instance_Value& unit)
+{
+    const std::string name = text_of(unit, "ElementName");
+    return name.starts_with("LUN_") ? name.substr(4) : name;
+}
+
+class Path_Walk
+{
+public:
+    explicit Path_Walk(Association_Index& index) : index_(index) {}
+
+    std::vector<Logical_Unit> run()
+    {
+        for (const Path_Value& link : index_.names(path_class)) {
+            const Path_Value* const initiator = end_of(link, "Initiator");
+            const Path_Value* const target = end_of(link, "Target");
+            const Path_Value* const unit = end_of(link, "LogicalUnit");
+            if (initiator && target && unit)
+                add(*initiator, *target, index_.instance(*unit));
+        }
+        return std::move(units_);
+    }
+
+private:
+    static const Path_Value* end_of(const Path_Value& link, const char* role)
+    {
+        const Value* const value = link.key(role);
+        return value ? value->as_path() : nullptr;
+    }
+
+    struct End
+    {
+        std::string address;
+        std::string adapter;
+        Instance_Value troubled;
+    };
+
+    void add(const Path_Value& initiator, const Path_Value& target, Instance_Value unit)
+    {
+        const End& near = end(initiator);
+        const End& far = end(target);
+        Unit_Path path = {near.address, far.address, lun_of(unit), near.adapter,
+                          near.troubled.properties.empty() ? far.troubled : near.troubled};
+        const std::string identifier = unit_identifier(unit);
+        const auto [at, is_new] =
+            known_.try_emplace(identifier.empty() ? path_identity(unit.path) : identifier, units_.size());
+        if (is_new)
+            units_.push_back({std::move(unit), identifier, {}});
+        units_[at->second].paths.push_back(std::move(path));
+    }
+
+    /// What there is to know of an endpoint. The far one is named for both sides: near address, "_", far
+    /// address.
+    const End& end(const Path_Value& path)
+    {
+        const auto [at, is_new] = ends_.try_emplace(path_identity(path));
+        if (!is_new)
+            return at->second;
+        const Instance_Value endpoint = index_.instance(path);
+        const std::string name = text_of(endpoint, "Name");
+        at->second.address = name.substr(name.find('_') + 1);
+        if (const auto status = number_of(endpoint, "OperationalStatus"); status && !is_in_service(*status))
+            at->second.troubled = endpoint;
+        for (const Path_Value& port :
+             index_.far_ends("KALDERA_DeviceSAPImplementation", "Dependent", path, "Antecedent"))
+            for (const Path_Value& adapter :
+                 index_.far_ends("KALDERA_ControlledBy", "Dependent", port, "Antecedent"))
+                at->second.adapter = path_identity(adapter);
+        return at->second;
+    }
+
+    Association_Index& index_;
+    std::vector<Logical_Unit> units_;
+    /// Places of the units by their identifiers.
+    std::unordered_map<std::string, std::size_t> known_;
+    std::unordered_map<std::string, End> ends_;
+};
+
+} // namespace
+
+Redundancy Logical_Unit::redundancy() const
+{
+    const auto working = std::ranges::count_if(paths, &Unit_Path::in_service);
+    if (working < 2)
+        return working == 1 ? Redundancy::ONE_PATH : Redundancy::NO_PATH;
+    const auto first = std::ranges::find_if(paths, &Unit_Path::in_service);
+    const bool is_one = std::ranges::all_of(
+        paths, [&](const Unit_Path& path) { return !path.in_service() || path.adapter == first->adapter; });
+    return is_one ? Redundancy::ONE_ADAPTER : Redundancy::FULL;
+}
+
+std::vector<Logical_Unit> read_units(Association_Index& index)
+{
+    return Path_Walk(index).run();
+}
+
+std::string unit_identifier(const Instance_Value& unit)
+{
+    const std::string name = text_of(unit, "Name");
+    return name == no_identifier ? "" : name;
+}
+
+} // namespace KPRV::kldrcim
