@@ -8,7 +8,8 @@ namespace KPRV::kldrcim {
 
 int serve(const Cli_Options&, Host&)
 {
-    return complain("this kldrcim was built without serve: libmicrohttpd or expat was missing", USAGE_ERROR);
+    return complain("this kldrcim was built without serve: libmicrohttpd, expat or libcurl was missing",
+                    USAGE_ERROR);
 }
 
 } // namespace KPRV::kldrcim
@@ -17,6 +18,7 @@ int serve(const Cli_Options&, Host&)
 
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/server/Http_Server.h"
+#include "kldrcim/server/Subscriptions.h"
 #include "kldrcim/verbs/Interruption.h"
 
 #include <cerrno>
@@ -62,6 +64,18 @@ bool read_options(const Cli_Options& options, Http_Options& http, Users_File& us
     return error.empty();
 }
 
+/// Clients look for the one or the other.
+const std::vector<std::string> interop_names = {"interop", "root/interop"};
+
+/// What the module finds when it asks its server who it is.
+void tell_module(Host& host, Instance_Value manager)
+{
+    for (const char* name_space : {"root/PG_InterOp", "root/interop"}) {
+        manager.path.name_space = name_space;
+        host.store().add(name_space, manager);
+    }
+}
+
 } // namespace
 
 int serve(const Cli_Options& options, Host& host)
@@ -72,13 +86,28 @@ int serve(const Cli_Options& options, Host& host)
     if (!read_options(options, http_options, users, error))
         return complain(error, USAGE_ERROR);
     Interruption interruption;
-    Broker_Space classes(host);
-    Cim_Server server(own_host_name());
-    server.add(classes.name(), classes);
+    const std::string host_name = own_host_name();
+    Broker_Space model(host);
+    const Interop_Classes classes(host.catalogue());
+    Server_Objects objects(host_name, KLDR_VERSION, {interop_names[0], interop_names[1], model.name()});
+    tell_module(host, objects.object_manager());
+    Subscriptions subscriptions(host, classes,
+                                {.system_name = host_name,
+                                 .interop_names = interop_names,
+                                 .state_file = options.state,
+                                 .log = [](const std::string& text) { complain(text, 0); }});
+    if (!subscriptions.restore(error))
+        return complain(error, FAILURE);
+    Interop_Space interop(interop_names[0], classes, {&objects, &subscriptions}, model);
+    Interop_Space root_interop(interop_names[1], classes, {&objects, &subscriptions}, model);
+    Cim_Server server(host_name);
+    server.add(model.name(), model);
+    server.add(interop.name(), interop);
+    server.add(root_interop.name(), root_interop);
     const auto http = Http_Server::start(server, http_options, error);
     if (!http)
         return complain(error, FAILURE);
-    put("serving " + classes.name() + " at " + http->url() + "\n");
+    put("serving " + model.name() + " at " + http->url() + "\n");
     flush_output();
     while (interruption.count() == 0)
         interruption.wait();

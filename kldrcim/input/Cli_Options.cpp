@@ -184,6 +184,8 @@ constexpr Cli_Option option_table[] = {
      "its key (PEM)"},
     {"--users",      "FILE",           set_text<&Options::users>,           nullptr,                 nullptr,                  false,
      "lines user:hash of those who may connect, the hash as crypt makes it (default: nobody is asked)"},
+    {"--state",      "FILE",           set_text<&Options::state>,           nullptr,                 nullptr,                  false,
+     "keeps the clients' subscriptions from one start to the next (default: they end with the program)"},
     {"--leaks",      nullptr,          nullptr,                             &Options::leaks,         nullptr,                  true,
      "say on standard error which CMPI objects the provider did not release"},
     {"--help",       nullptr,          nullptr,                             &Options::help,          nullptr,                  true,

@@ -80,6 +80,8 @@ struct Cli_Options
     std::string tls_certificate;
     std::string tls_key;
     std::string users;
+    /// Where subscriptions are kept; empty for nowhere.
+    std::string state;
     bool leaks = false;
     bool help = false;
     bool version = false;

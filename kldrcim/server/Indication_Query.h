@@ -1,0 +1,49 @@
+#pragma once
+
+#include "broker/values/Class_Catalogue.h"
+
+#include <memory>
+#include <optional>
+
+namespace KPRV::kldrcim {
+
+using namespace broker;
+
+/// What is wrong with a query: status 14 for its language, 15 for itself.
+struct Query_Error
+{
+    CMPIrc rc = CMPI_RC_OK;
+    std::string text;
+};
+
+/// A query of a subscription, in WQL or in the part of DMTF:CQL that looks the same:
+///
+///     SELECT *|NAME[, NAME...] FROM CLASS [WHERE CONDITION]
+///
+/// A condition compares a property with a text, number, TRUE, FALSE or NULL (= <> != < <= > >= LIKE, IS [NOT]
+/// NULL), or asks what class an embedded instance is of (ISA); with AND, OR, NOT and parentheses. What is
+/// null compares to neither true nor false, as in SQL.
+class Indication_Query
+{
+public:
+    /// Nothing with `error` for a query that cannot be understood.
+    static std::optional<Indication_Query> parse(const std::string& text, const std::string& language,
+                                                 Query_Error& error);
+
+    const std::string& class_name() const { return class_name_; }
+
+    bool matches(const Instance_Value& indication, const Class_Catalogue& classes) const;
+    /// Drops the properties that are not asked for, but for those of its sequence.
+    void project(Instance_Value& indication) const;
+
+    class Condition;
+
+private:
+    friend class Query_Parser;
+
+    std::string class_name_;
+    std::vector<std::string> properties_;
+    std::shared_ptr<const Condition> condition_;
+};
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,75 @@
+#pragma once
+
+#include "broker/Subscription.h"
+#include "kldrcim/server/Indication_Exporter.h"
+#include "kldrcim/server/Indication_Query.h"
+#include "kldrcim/server/Interop_Space.h"
+
+namespace KPRV::kldrcim {
+
+/// Filters, listeners and subscriptions of clients: what they have created, kept in a file from one start to
+/// the next, and the way of an indication from the module to each listener that has asked for it.
+class Subscriptions final : public Interop_Objects
+{
+public:
+    struct Options
+    {
+        /// Of the keys that clients leave out.
+        std::string system_name;
+        /// Names under which the interop name space is known.
+        std::vector<std::string> interop_names;
+        /// Empty: nothing is kept.
+        std::string state_file = {};
+        Indication_Exporter::Log log = [](const std::string&) {};
+        Delivery_Function deliver = deliver_by_http;
+    };
+
+    Subscriptions(Host& host, const Interop_Classes& classes, Options options);
+    ~Subscriptions() override;
+
+    /// What the file holds; false with `error` if it cannot be read. Subscriptions that the module refuses
+    /// are told to the log and dropped.
+    bool restore(std::string& error);
+
+    bool owns(std::string_view class_name) const override;
+    std::vector<Instance_Value> instances() const override;
+    Result create(Instance_Value instance) override;
+    Result modify(const Instance_Value& instance, const Property_List& properties) override;
+    Result remove(const Path_Value& path) override;
+
+private:
+    enum class Kind
+    {
+        FILTER,
+        LISTENER,
+        SUBSCRIPTION,
+    };
+    struct Active;
+
+    Kind kind_of(std::string_view class_name) const;
+    Instance_Value* find(const Path_Value& path) REQUIRES(mutex_);
+    Result add(Instance_Value instance) REQUIRES(mutex_);
+    Result check_filter(const Instance_Value& filter) const;
+    Result activate(const Instance_Value& subscription) REQUIRES(mutex_);
+    void deactivate(const Path_Value& path) REQUIRES(mutex_);
+    Result use_provider_classes(const std::string& class_name, std::vector<std::string>& used)
+        REQUIRES(mutex_);
+    void leave_provider_class(const std::string& provider_class) REQUIRES(mutex_);
+    bool is_in_use(const Path_Value& path) const REQUIRES(mutex_);
+    void complete(Instance_Value& instance) const;
+    CMPIrc distribute(const Instance_Value& indication);
+    void keep() REQUIRES(mutex_);
+
+    Host& host_;
+    const Interop_Classes& classes_;
+    const Options options_;
+    /// Held across calls of the module, which must not be those that deliver: these take the other one.
+    mutable Standard_Mutex<> mutex_;
+    std::vector<Instance_Value> instances_ GUARDED_BY(mutex_);
+    std::map<std::string, std::pair<std::unique_ptr<Subscription>, unsigned>> providers_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> delivery_mutex_;
+    std::vector<std::shared_ptr<Active>> active_ GUARDED_BY(delivery_mutex_);
+    std::map<std::string, std::weak_ptr<Indication_Exporter>> exporters_ GUARDED_BY(mutex_);
+};
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,137 @@
+#include "kldrcim/server/Indication_Exporter.h"
+
+#include <atomic>
+#include <gtest/gtest.h>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+/// A listener that takes what it is told to take.
+class Listener
+{
+public:
+    Delivery take(const std::string& message)
+    {
+        const Auto_Lock lock(mutex_);
+        ++attempts_;
+        changed_.notify_all();
+        if (refusals_ > 0) {
+            --refusals_;
+            return Delivery::AGAIN;
+        }
+        messages_.push_back(message);
+        return Delivery::DONE;
+    }
+    void refuse(unsigned count)
+    {
+        const Auto_Lock lock(mutex_);
+        refusals_ = count;
+    }
+    void wait_for_attempts(unsigned count)
+    {
+        const Auto_Lock lock(mutex_);
+        while (attempts_ < count)
+            changed_.wait(mutex_);
+    }
+    std::vector<std::string> messages()
+    {
+        const Auto_Lock lock(mutex_);
+        return messages_;
+    }
+
+    Delivery_Function function()
+    {
+        return [this](const std::string&, const std::string& message, const std::function<bool()>&) {
+            return take(message);
+        };
+    }
+
+private:
+    Standard_Mutex<> mutex_;
+    std::condition_variable_any changed_;
+    std::vector<std::string> messages_ GUARDED_BY(mutex_);
+    unsigned attempts_ GUARDED_BY(mutex_) = 0;
+    unsigned refusals_ GUARDED_BY(mutex_) = 0;
+};
+
+constexpr Delivery_Patience short_patience{
+    .quick = 3, .pause = std::chrono::milliseconds(1), .long_pause = std::chrono::milliseconds(2)};
+
+bool has_number(const std::string& message, std::int64_t number)
+{
+    return message.find("NAME=\"SequenceNumber\" TYPE=\"sint64\"><VALUE>" + std::to_string(number) +
+                        "</VALUE>") != std::string::npos;
+}
+
+} // namespace
+
+TEST(Indication_Exporter, NumbersWhatItSends)
+{
+    Listener listener;
+    Indication_Exporter exporter(
+        "http://l/", "context", [](const std::string&) {}, listener.function());
+    for (int i = 0; i < 3; ++i)
+        exporter.put({{.class_name = "Alert"}, {}});
+    listener.wait_for_attempts(3);
+    while (listener.messages().size() < 3)
+        std::this_thread::yield();
+    for (std::int64_t i = 0; i < 3; ++i)
+        EXPECT_TRUE(has_number(listener.messages()[i], i)) << listener.messages()[i];
+    EXPECT_NE(std::string::npos, listener.messages()[0].find("<VALUE>context</VALUE>"));
+}
+
+TEST(Indication_Exporter, TriesAgainInOrderAndSaysSoOnce)
+{
+    Listener listener;
+    listener.refuse(7);
+    std::atomic<unsigned> lines = 0;
+    Indication_Exporter exporter(
+        "http://l/", "c", [&](const std::string&) { ++lines; }, listener.function(), short_patience);
+    exporter.put({{.class_name = "Alert"}, {}});
+    exporter.put({{.class_name = "Alert"}, {}});
+    listener.wait_for_attempts(9);
+    while (listener.messages().size() < 2)
+        std::this_thread::yield();
+    EXPECT_TRUE(has_number(listener.messages()[0], 0));
+    EXPECT_TRUE(has_number(listener.messages()[1], 1));
+    EXPECT_EQ(1U, lines);
+}
+
+TEST(Indication_Exporter, DropsTheOldestOfTooMany)
+{
+    Listener listener;
+    listener.refuse(~0U);
+    std::atomic<unsigned> lines = 0;
+    Indication_Exporter exporter(
+        "http://l/", "c",
+        [&](const std::string& text) { lines += text.find("dropped") != text.npos ? 1 : 0; },
+        listener.function(), short_patience);
+    const std::size_t count = Indication_Exporter::most_waiting + 10;
+    for (std::size_t i = 0; i < count; ++i)
+        exporter.put({{.class_name = "Alert"}, {}});
+    EXPECT_EQ(1U, lines);
+    listener.refuse(0);
+    while (listener.messages().size() < Indication_Exporter::most_waiting)
+        std::this_thread::yield();
+    EXPECT_TRUE(has_number(listener.messages()[0], 0)) << "on its way when it became too many";
+    EXPECT_TRUE(has_number(listener.messages()[1], 11));
+    EXPECT_TRUE(has_number(listener.messages().back(), static_cast<std::int64_t>(count) - 1));
+}
+
+TEST(Indication_Exporter, EndsWithAFullQueue)
+{
+    Listener listener;
+    listener.refuse(~0U);
+    const auto begin = std::chrono::steady_clock::now();
+    {
+        Indication_Exporter exporter(
+            "http://l/", "c", [](const std::string&) {}, listener.function());
+        for (int i = 0; i < 100; ++i)
+            exporter.put({{.class_name = "Alert"}, {}});
+        listener.wait_for_attempts(1);
+    }
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(1));
+}
+
+} // namespace KPRV::kldrcim
