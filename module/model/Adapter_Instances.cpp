@@ -96,11 +96,12 @@ KALDERA_PortController* AdapterHelper::getPortControllerInstance(const _adapterD
     controller->DeviceID.set(adapter.address());
     if (!wanted.whole())
         return controller.steal();
+    static const Lasting_Array<String> disabled = {"The adapter is disabled"};
+    static const Lasting_Array<String> in_service = {"The adapter is in service"};
     const bool stopped = adapter.status == 10;
     controller->Name.set(adapter.serialNumber);
     controller->OperationalStatus.set(array_of({static_cast<uint16>(adapter.status)}));
-    controller->StatusDescriptions.set(
-        array_of<String>({stopped ? "The adapter is disabled" : "The adapter is in service"}));
+    controller->StatusDescriptions.set(stopped ? disabled : in_service);
     controller->EnabledState.set(stopped ? 3 : 2);
     describe(*controller, kind(adapter));
     // Alone among the four, a controller is listed by its serial number.
@@ -155,6 +156,7 @@ AdapterHelper::getAdapterSoftwareIdentityInstance(const _adapterData& adapter, s
                                                   bool network, const Wanted& wanted) const
 {
     LOG_SCOPE("getAdapterSoftwareIdentityInstance");
+    static const Lasting_Array<String> identity_info = {"SoftwareID", "SoftwareStatus"};
     const Software texts = software(adapter, type, network);
     auto identity = create_wanted(wanted, &KALDERA_AdapterSoftwareIdentity::InstanceID, texts.id);
     if (!identity)
@@ -167,7 +169,7 @@ AdapterHelper::getAdapterSoftwareIdentityInstance(const _adapterData& adapter, s
     describe(*identity, to_String(texts.title));
     identity->Name.set(to_String(texts.name));
     identity->Manufacturer.set(adapter.vendor);
-    identity->IdentityInfoType.set(array_of<String>({"SoftwareID", "SoftwareStatus"}));
+    identity->IdentityInfoType.set(identity_info);
     identity->IdentityInfoValue.set(array_of<String>({to_String(texts.identity), "Primary"}));
     return identity.steal();
 }

@@ -4,6 +4,7 @@
 #include "module/adapter/ProviderUtil.h"
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
+#include "module/runtime/Lasting_Array.h"
 #include "module/runtime/Prototype.h"
 #include "module/runtime/Wanted.h"
 

@@ -106,9 +106,10 @@ String element_name(uint32 number)
 /// What the three classes have in common; null for a LUN that is not wanted. A LUN goes by the path on which
 /// it is seen.
 template <class T>
-Ref<T> create_lun(classId_t id, const String& identification, const _hbaPortInfo& port,
+Ref<T> create_lun(classId_t id, const Array<String>& identification, const _hbaPortInfo& port,
                   const _hbaLunInfo& lun, const Wanted& wanted)
 {
+    static const Lasting_Array<uint16> okay = {2};
     String element = element_name(lun.number);
     const auto with_id = [&](auto use) {
         return use(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
@@ -123,8 +124,8 @@ Ref<T> create_lun(classId_t id, const String& identification, const _hbaPortInfo
     if (wanted.whole()) {
         instance->ElementName.set(std::move(element));
         instance->OtherIdentifyingInfo.set(array_of(device_id));
-        instance->IdentifyingDescriptions.set(array_of(identification));
-        instance->OperationalStatus.set(array_of<uint16>({2}));
+        instance->IdentifyingDescriptions.set(identification);
+        instance->OperationalStatus.set(okay);
     }
     instance->DeviceID.set(std::move(device_id));
     return instance;
@@ -137,7 +138,8 @@ KALDERA_StorageExtent* TargetHelper::getStorageExtentInstance(const _hbaPortInfo
                                                               const Wanted& wanted) const
 {
     LOG_SCOPE("getStorageExtentInstance");
-    static const String identification = "It is a unique identification for a Storage Extent";
+    static const Lasting_Array<String> identification = {
+        "It is a unique identification for a Storage Extent"};
     auto extent = create_lun<KALDERA_StorageExtent>(STORAGEEXTENT, identification, port, lun, wanted);
     const Name_Row* const row = name_row(lun);
     if (!row)
@@ -157,7 +159,7 @@ KALDERA_TapeDrive* TargetHelper::getTapeDriveInstance(const _hbaPortInfo& port, 
                                                       const Wanted& wanted) const
 {
     LOG_SCOPE("getTapeDriveInstance");
-    static const String identification = "It is a unique identification for a Tape Drive";
+    static const Lasting_Array<String> identification = {"It is a unique identification for a Tape Drive"};
     auto drive = create_lun<KALDERA_TapeDrive>(TAPEDRIVE, identification, port, lun, wanted);
     const Name_Row* const row = name_row(lun);
     if (!row)
@@ -172,7 +174,7 @@ KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& po
                                                           const Wanted& wanted) const
 {
     LOG_SCOPE("getLogicalDiskInstance");
-    static const String identification = "It is a unique identification for a Logical Disk";
+    static const Lasting_Array<String> identification = {"It is a unique identification for a Logical Disk"};
     auto disk = create_lun<KALDERA_LogicalDisk>(LOGICALDISK, identification, port, lun, wanted);
     if (disk && wanted.whole()) {
         const std::string_view device = trimmed(lun.deviceName);

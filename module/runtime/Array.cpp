@@ -94,6 +94,11 @@ void make_room(__Array_Rep*& rep, uint64 wanted)
     const uint32 n = static_cast<uint32>(wanted);
     if (is_empty_array(rep)) {
         rep = allocate(rep->traits, std::max(n, rep->capacity));
+    } else if (is_lasting(rep)) {
+        __Array_Rep* const own = allocate(rep->traits, std::max(n, rep->size));
+        construct_elements(rep->traits, __data(own), __data(rep), rep->size);
+        own->size = rep->size;
+        rep = own;
     } else if (rep->capacity < n) {
         rep = static_cast<__Array_Rep*>(
             allocated(realloc(static_cast<void*>(rep), block_size(rep->traits, n))));
@@ -122,7 +127,7 @@ void __construct(__Array_Rep*& rep, const __Array_Traits* traits, const void* da
 
 void __destruct(__Array_Rep* rep)
 {
-    if (is_empty_array(rep))
+    if (is_empty_array(rep) || is_lasting(rep))
         return;
     destruct_elements(rep, 0, rep->size);
     free(rep);
@@ -130,6 +135,8 @@ void __destruct(__Array_Rep* rep)
 
 __Array_Rep* _clone(const __Array_Rep* rep)
 {
+    if (is_lasting(rep))
+        return const_cast<__Array_Rep*>(rep);
     return make(rep->traits, __data(rep), rep->size);
 }
 
@@ -184,10 +191,17 @@ void __prepend(__Array_Rep*& rep, const void* data, uint32 n)
     __insert(rep, 0, data, n);
 }
 
-void __remove(__Array_Rep* rep, uint32 pos, uint32 n)
+void __own(__Array_Rep*& rep)
+{
+    if (is_lasting(rep))
+        make_room(rep, rep->size);
+}
+
+void __remove(__Array_Rep*& rep, uint32 pos, uint32 n)
 {
     if (pos >= rep->size)
         return;
+    __own(rep);
     const uint32 tail = rep->size - pos;
     n = std::min(n, tail);
     destruct_elements(rep, pos, n);
@@ -239,7 +253,7 @@ bool __equal(const __Array_Rep* a, const __Array_Rep* b)
     return true;
 }
 
-void __clear(__Array_Rep* rep)
+void __clear(__Array_Rep*& rep)
 {
     __remove(rep, 0, rep->size);
 }

@@ -14,6 +14,13 @@ struct __Array_Rep
     uint32 capacity;
 };
 
+/// True for the block of a `Lasting_Array`, which has less room than elements, so that nothing fits into it:
+/// copies share it, nobody but its owner frees it, and whatever would write takes a block of its own first.
+inline bool is_lasting(const __Array_Rep* rep)
+{
+    return rep->capacity < rep->size;
+}
+
 /// Where the elements begin: 16 on 32-bit platforms, 24 on 64-bit ones (a word behind the head stays free).
 inline constexpr size_t __ARRAY_HEAD = sizeof(void*) == 4 ? 16 : 24;
 
@@ -31,14 +38,16 @@ void __reserve(__Array_Rep*& rep, uint32 n);
 void __insert(__Array_Rep*& rep, uint32 pos, const void* data, uint32 n);
 void __append(__Array_Rep*& rep, const void* data, uint32 n);
 void __prepend(__Array_Rep*& rep, const void* data, uint32 n);
-void __remove(__Array_Rep* rep, uint32 pos, uint32 n);
+void __remove(__Array_Rep*& rep, uint32 pos, uint32 n);
 /// A null fill, or traits without construct, zeroes new elements.
 void __resize(__Array_Rep*& rep, uint32 n, const void* fill);
 /// Index of the first equal element, `NPOS` if absent. Without an equal function a match answers 1, whatever
 /// its index: callers rely on the answer being a yes, not a place.
 uint32 __find(const __Array_Rep* rep, const void* element);
 bool __equal(const __Array_Rep* a, const __Array_Rep* b);
-void __clear(__Array_Rep* rep);
+void __clear(__Array_Rep*& rep);
+/// Gives a handle on a lasting block a block of its own.
+void __own(__Array_Rep*& rep);
 
 inline void* __data(__Array_Rep* rep)
 {
@@ -82,7 +91,12 @@ public:
     uint32 size() const { return _rep->size; }
     uint32 capacity() const { return _rep->capacity; }
     bool empty() const { return _rep->size == 0; }
-    T* data() { return static_cast<T*>(__data(_rep)); }
+    T* data()
+    {
+        if (is_lasting(_rep)) [[unlikely]]
+            __own(_rep);
+        return static_cast<T*>(__data(_rep));
+    }
     const T* data() const { return static_cast<const T*>(__data(const_cast<const __Array_Rep*>(_rep))); }
     /// No bounds test.
     T& operator[](uint32 i) { return data()[i]; }

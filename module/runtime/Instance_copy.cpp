@@ -168,7 +168,9 @@ bool holds_nothing(const Instance* instance)
                         [&] { return memcmp(value, static_cast<const void*>(&none), sizeof none) == 0; },
                         [] { return true; });
                 },
-                [&](Array_Feature f) { return is_empty_array(f.array(instance)); },
+                [&](Array_Feature f) {
+                    return is_empty_array(f.array(instance)) || is_lasting(f.array(instance));
+                },
                 [&](Reference_Feature f) { return f.target(instance) == nullptr; },
                 [](Reference_Array_Feature) { return false; },
                 [](Method_Feature) { return true; },
