@@ -15,7 +15,7 @@ enum : size_t
     DESCRIPTION,
     NUMBER,
     PRODUCT_ID,
-    SERIAL_NUMBER,
+    PRODUCT_SERIAL_NUMBER,
     VENDOR,
     NUM_LUN_MEMBERS
 };
@@ -45,9 +45,9 @@ bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_descr
     // One LUN without a description puts all that follow in the same walk under these rules, those with a
     // description, too: the names of LUNs that clients already keep depend on it.
     if (no_description_seen) {
-        if (members.has(SERIAL_NUMBER))
-            copy_text(lun.serialNumber, asView(members[SERIAL_NUMBER]));
-        lun.idType = members.has(SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
+        if (members.has(PRODUCT_SERIAL_NUMBER))
+            copy_text(lun.serialNumber, asView(members[PRODUCT_SERIAL_NUMBER]));
+        lun.idType = members.has(PRODUCT_SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
     }
     return true;
 }

@@ -15,10 +15,10 @@ enum : size_t
     MAX_FRAME_SIZE,
     NODE_WWN,
     OPERATING_SPEED,
-    STATUS,
+    PORT_STATUS,
     PORT_TYPE,
     SUPPORTED_SPEEDS,
-    WWN,
+    PORT_WWN,
     NUM_PORT_MEMBERS
 };
 constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
@@ -45,11 +45,11 @@ sint64 operating_speed(const Json::Value& gigabits)
 void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
     const Members<NUM_PORT_MEMBERS> members(answer, port_members);
-    copy_flat(port.localWWN, text_of(members[WWN]));
+    copy_flat(port.localWWN, text_of(members[PORT_WWN]));
     copy_text(port.portWWN, port.localWWN);
     copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
     copy_text(port.symbolicName, asView(members[SYMBOLIC_NAME]));
-    port.status = asInt(members[STATUS]);
+    port.status = asInt(members[PORT_STATUS]);
     port.systemName = host.get();
     port.portType = asInt(members[PORT_TYPE]);
     port.maxFrameSize = asInt(members[MAX_FRAME_SIZE]);
