@@ -1,3 +1,5 @@
+// How an indication goes out to one listener, over HTTP.
+
 #include "kldrcim/server/Indication_Exporter.h"
 
 #include <curl/curl.h>

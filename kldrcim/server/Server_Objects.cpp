@@ -1,3 +1,5 @@
+// What the server tells of itself in the interop namespace: its object manager, namespaces and communication.
+
 #include "kldrcim/server/Interop_Space.h"
 
 namespace KPRV::kldrcim {
