@@ -1,6 +1,7 @@
 #include "kldrcim/Cli.h"
 
 #include "kldrcim/Cli_Serve.h"
+#include "kldrcim/client/Open_Server.h"
 #include "kldrcim/formats/Output.h"
 #include "kldrcim/local/Open_Module.h"
 #include "kldrcim/verbs/Cli_Arguments.h"
@@ -9,23 +10,68 @@
 #include "kldrcim/verbs/Cli_Verbs.h"
 
 #include <cerrno>
+#include <cstdlib>
 #include <cstring>
 #include <new>
+#include <span>
 
 namespace KPRV::kldrcim {
 
 namespace {
 
-int run_verb(const Cli_Options& options)
+/// Who is asked, a module or a server. False with a one-line `error` for options that make no sense together.
+bool choose(Cli_Options& options, std::string& error)
+{
+    const char* const usual = std::getenv("KLDRCIM_URL");
+    if (usual && options.url.empty() && options.module.empty() && options.verb != "serve")
+        options.url = usual;
+    const std::pair<const char*, bool> of_a_module[] = {
+        {"--module", !options.module.empty()},
+        {"--server-instances", !options.server_instances.empty()},
+        {"--leaks", options.leaks},
+        {"--user", options.user.has_value()},
+        {"serve", options.verb == "serve"}};
+    const std::pair<const char*, bool> of_a_server[] = {{"--password-file", !options.password_file.empty()},
+                                                        {"--cacert", !options.ca_file.empty()},
+                                                        {"--insecure", options.insecure}};
+    const bool is_remote = !options.url.empty();
+    for (const auto& [name, is_given] :
+         is_remote ? std::span(of_a_module) : std::span<const std::pair<const char*, bool>>(of_a_server))
+        if (is_given)
+            error = std::string(name) + " makes no sense " +
+                    (is_remote ? "with --url: it is for a module in this process" : "without --url");
+    return error.empty();
+}
+
+int run_body(const Cli_Verb& verb, const Cli_Options& options, Connection& connection, Host* host)
+{
+    try {
+        return verb.body ? verb.body(options, connection) : serve(options, *host);
+    } catch (const Connection_Error& error) {
+        flush_output();
+        return complain(error.what(), verb.without_module);
+    }
+}
+
+int run_verb(Cli_Options options)
 {
     std::string error, warning;
-    const std::unique_ptr<Local_Connection> connection = open_module(options, error, warning);
+    if (!choose(options, error))
+        return complain(error, USAGE_ERROR);
     const Cli_Verb& verb = *find_verb(options.verb);
+    std::unique_ptr<Connection> connection;
+    Host* host = nullptr;
+    if (!options.url.empty()) {
+        connection = open_server(options, error, warning);
+    } else if (auto local = open_module(options, error, warning)) {
+        host = &local->host();
+        connection = std::move(local);
+    }
     if (!connection)
         return complain(error, verb.without_module);
     if (!warning.empty())
         complain("warning: " + warning, 0);
-    const int status = verb.body ? verb.body(options, *connection) : serve(options, connection->host());
+    const int status = run_body(verb, options, *connection, host);
     for (const std::string& breach : connection->breaches())
         complain("warning: the provider broke the CMPI contract: " + breach, 0);
     if (options.leaks)

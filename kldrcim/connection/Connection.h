@@ -52,6 +52,8 @@ public:
     /// Its file or address.
     virtual std::string location() const = 0;
 
+    /// True if the module, and what it remembers, goes with this process.
+    virtual bool is_in_process() const { return true; }
     /// True while a thread of the module is at work that ends with this process: whoever leaves now cuts it
     /// off.
     virtual bool is_at_work() { return false; }

@@ -130,6 +130,17 @@ constexpr Cli_Option option_table[] = {
      "ask for these properties only"},
     {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
      "namespace of the classes (default: root/kaldera)"},
+    {"--url",        "URL",            set_text<&Options::url>,             nullptr,                 nullptr,                  true,
+     "ask the CIM server at http[s]://[USER@]HOST[:PORT], instead of a module in this process (default: KLDRCIM_URL, if that is set "
+     "and --module is not)"},
+    {"--password-file", "FILE",        set_text<&Options::password_file>,   nullptr,                 nullptr,                  true,
+     "its first line is the password of USER (default: ask at the terminal)"},
+    {"--cacert",     "FILE",           set_text<&Options::ca_file>,         nullptr,                 nullptr,                  true,
+     "certificates by which the server's may be signed (default: the system's)"},
+    {"--insecure",   nullptr,          nullptr,                             &Options::insecure,      nullptr,                  true,
+     "do not look at the server's certificate: whoever answers is believed"},
+    {"--timeout",    "SECONDS",        set_number<&Options::timeout>,       nullptr,                 "a number above 0",       true,
+     "how long the server may be silent (default: 60; ten times as long in a method)"},
     {"--module",     "FILE",           set_text<&Options::module>,          nullptr,                 nullptr,                  true,
      "provider library (default: libkldrprovider_Module.so beside this program, then in ../lib/cim and /usr/lib/cim, then on "
      "the library search path)"},

@@ -85,6 +85,13 @@ struct Cli_Options
     bool leaks = false;
     bool help = false;
     bool version = false;
+    /// Address of a CIM server; empty for a module in this process.
+    std::string url;
+    std::string password_file;
+    std::string ca_file;
+    bool insecure = false;
+    /// Seconds for which a server may be silent.
+    unsigned timeout = 60;
     std::string verb;
     /// What follows the verb.
     std::vector<std::string> arguments;

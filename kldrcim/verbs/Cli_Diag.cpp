@@ -109,8 +109,8 @@ bool takes_out_of_service(Connection& connection, const Path_Value& test)
            has_characteristic(result.instances[0], OUT_OF_SERVICE);
 }
 
-/// The test and its job live in this process: whatever ends the verb, the element is brought back first. A
-/// signal is an order to come to that end, a second one to leave at once.
+/// A test and its job that live in this process: whatever ends the verb, the element is brought back first. A
+/// signal is an order to come to that end, a second one to leave at once. A server goes on without us.
 class Running_Test
 {
 public:
@@ -127,11 +127,16 @@ public:
         while (connection_.is_at_work())
             wait();
     }
-    /// For a moment.
-    void wait()
+    /// For a moment. False if there is nothing to wait for any more.
+    bool wait()
     {
         constexpr auto MOMENT = std::chrono::milliseconds(100);
         interruption_.wait(MOMENT);
+        if (!connection_.is_in_process()) {
+            if (interruption_.count() != 0)
+                complain("interrupted: the server goes on with the test", 0);
+            return interruption_.count() == 0;
+        }
         if (interruption_.count() > 1)
             leave();
         if (interruption_.count() == 1 && !told_) {
@@ -142,6 +147,7 @@ public:
                          : "interrupted: waiting for the end of the test; a second signal ends it",
                      0);
         }
+        return true;
     }
     /// The signal that has come; 0 for none.
     int signal() const { return interruption_.latest(); }
@@ -187,8 +193,10 @@ int run(const Cli_Options& options, Connection& connection)
     flush_output();
     int status = 0;
     if (options.wait) {
-        status = report(follow_job(connection, job, [&] { running.wait(); }));
-    } else {
+        const Run_Report outcome = follow_job(connection, job, [&] { return running.wait(); });
+        if (connection.is_in_process() || !running.signal())
+            status = report(outcome);
+    } else if (connection.is_in_process()) {
         // A server would go on; this one is the module's process, and its end would leave the element out of
         // service.
         complain("the test and its job live in this process, which waits for the end of the test and then "

@@ -124,6 +124,9 @@ private:
         if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
             text += ": " + connection_.subject() + " has no class " + unknown_class(request) +
                     "; \"kldrcim classes\" lists them";
+        else if (result.rc == CMPI_RC_ERR_INVALID_NAMESPACE)
+            text += ": " + connection_.subject() + " has no namespace " +
+                    (request.path.name_space.empty() ? options_.name_space : request.path.name_space);
         else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
             text += ": " + request.path.class_name + " has no method " + request.method;
         return text;

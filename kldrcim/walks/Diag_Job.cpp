@@ -14,6 +14,8 @@ namespace {
 using Clock = std::chrono::steady_clock;
 constexpr std::uint64_t JOB_OVER = 7;
 constexpr std::uint64_t PASSED = 2;
+constexpr const char* running = "running";
+constexpr int most_looks = 50;
 
 std::string state_words(const Result& job)
 {
@@ -21,7 +23,7 @@ std::string state_words(const Result& job)
         job.ok() && !job.instances.empty() ? job.instances[0].property("JobState") : nullptr;
     if (!state)
         return "unknown";
-    return state->as_uint() == JOB_OVER ? "completed" : "running";
+    return state->as_uint() == JOB_OVER ? "completed" : running;
 }
 
 /// Shows how a job gets on.
@@ -79,18 +81,8 @@ void collect(Connection& connection, const char* class_name, const std::string& 
     }
 }
 
-} // namespace
-
-Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<void()>& pause)
+Run_Report records_of(Connection& connection, const Path_Value& job)
 {
-    {
-        Progress progress;
-        while (connection.is_at_work()) {
-            progress.show(state_words(connection.get_instance(job)));
-            pause();
-        }
-        progress.show(state_words(connection.get_instance(job)));
-    }
     Run_Report report;
     const Value* const id = job.key("InstanceID");
     for (const char* class_name : {"KALDERA_DiagnosticServiceRecord", "KALDERA_DiagnosticCompletionRecord"})
@@ -100,6 +92,41 @@ Run_Report follow_job(Connection& connection, const Path_Value& job, const std::
         return std::ranges::count(report.records, outcome, &Run_Record::outcome);
     };
     report.passed = count("failed") == 0 && count("passed") > 0;
+    return report;
+}
+
+bool has_result(const Run_Report& report)
+{
+    return std::ranges::any_of(report.records, [](const Run_Record& each) { return !each.outcome.empty(); });
+}
+
+/// True until the end of a run: in this process of its thread, not only of its job.
+bool is_running(Connection& connection, const Path_Value& job)
+{
+    return connection.is_in_process() ? connection.is_at_work()
+                                      : state_words(connection.get_instance(job)) == running;
+}
+
+} // namespace
+
+Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<bool()>& pause)
+{
+    bool goes_on = true;
+    {
+        Progress progress;
+        while (goes_on && is_running(connection, job)) {
+            progress.show(state_words(connection.get_instance(job)));
+            goes_on = pause();
+        }
+        progress.show(state_words(connection.get_instance(job)));
+    }
+    Run_Report report = records_of(connection, job);
+    // A job is closed before its results are written; in this process its thread has been waited for.
+    for (int looks = 0; !connection.is_in_process() && looks < most_looks && goes_on && !has_result(report);
+         ++looks) {
+        goes_on = pause();
+        report = records_of(connection, job);
+    }
     return report;
 }
 

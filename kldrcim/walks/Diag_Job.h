@@ -30,7 +30,7 @@ struct Run_Report
 
 /// Follows a run to its end and collects its records. Meanwhile standard error shows the job's state and how
 /// long it has been at work: on a terminal in one line that changes, else a line for each state. `pause` is
-/// called between two looks.
-Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<void()>& pause);
+/// called between two looks; false is enough, and the report has what there is.
+Run_Report follow_job(Connection& connection, const Path_Value& job, const std::function<bool()>& pause);
 
 } // namespace KPRV::kldrcim

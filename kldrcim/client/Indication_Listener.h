@@ -1,0 +1,44 @@
+#pragma once
+
+#include "kldrcim/connection/Connection.h"
+#include "module/runtime/Standard_Mutex.h"
+
+#include <cstdint>
+
+struct MHD_Daemon;
+
+namespace KPRV::kldrcim {
+
+/// A small HTTP server that takes the indications of a CIM server. Each name space has a path of its own,
+/// which nobody guesses: whoever knows none is refused.
+class Indication_Listener
+{
+public:
+    /// Null with `error` if it cannot listen at the address, which is one of this machine.
+    static std::unique_ptr<Indication_Listener> start(const std::string& address, Indication_Sink sink,
+                                                      std::string& error);
+    /// Waits for what is being taken.
+    ~Indication_Listener();
+
+    /// Where indications of the name space are to be sent.
+    std::string add(const std::string& name_space);
+
+private:
+    struct Callbacks;
+
+    Indication_Listener(std::string address, Indication_Sink sink);
+    /// Nothing for a path that leads nowhere.
+    std::optional<std::string> name_space_of(const std::string& path) const;
+    /// The status of HTTP for a body that came to that path.
+    unsigned take(const std::string& path, const std::string& body) const;
+
+    const std::string address_;
+    const Indication_Sink sink_;
+    const std::string secret_;
+    mutable Standard_Mutex<> mutex_;
+    std::vector<std::string> name_spaces_ GUARDED_BY(mutex_);
+    std::uint16_t port_ = 0;
+    MHD_Daemon* daemon_ = nullptr;
+};
+
+} // namespace KPRV::kldrcim

@@ -1,0 +1,76 @@
+// Passwords: never an argument, which everybody on the machine can read.
+#include "kldrcim/client/Password.h"
+
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <fstream>
+#include <memory>
+#include <termios.h>
+#include <unistd.h>
+
+namespace KPRV::kldrcim {
+
+namespace {
+
+/// What is typed is not shown, for a scope.
+class Silence
+{
+public:
+    explicit Silence(int terminal) : terminal_(terminal), is_set_(tcgetattr(terminal, &before_) == 0)
+    {
+        termios silent = before_;
+        silent.c_lflag &= ~static_cast<tcflag_t>(ECHO);
+        if (is_set_)
+            tcsetattr(terminal_, TCSAFLUSH, &silent);
+    }
+    ~Silence()
+    {
+        if (is_set_)
+            tcsetattr(terminal_, TCSAFLUSH, &before_);
+    }
+    Silence(const Silence&) = delete;
+    Silence& operator=(const Silence&) = delete;
+
+private:
+    const int terminal_;
+    termios before_ = {};
+    const bool is_set_;
+};
+
+} // namespace
+
+std::optional<std::string> password_of_file(const std::string& file, std::string& error)
+{
+    std::ifstream in(file);
+    std::string line;
+    if (!std::getline(in, line) && line.empty()) {
+        error = file + ": " + (errno && !in.eof() ? std::strerror(errno) : "no password in it");
+        return std::nullopt;
+    }
+    if (line.ends_with('\r'))
+        line.pop_back();
+    return line;
+}
+
+std::optional<std::string> password_of_terminal(const std::string& prompt, std::string& error)
+{
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> terminal(std::fopen("/dev/tty", "r+"),
+                                                                   &std::fclose);
+    if (!terminal) {
+        error = "no terminal to ask for the password at; --password-file names a file that holds it";
+        return std::nullopt;
+    }
+    std::fputs(prompt.c_str(), terminal.get());
+    std::fflush(terminal.get());
+    std::string password;
+    {
+        const Silence silence(fileno(terminal.get()));
+        for (int c = std::fgetc(terminal.get()); c != EOF && c != '\n'; c = std::fgetc(terminal.get()))
+            password += static_cast<char>(c);
+    }
+    std::fputs("\n", terminal.get());
+    return password;
+}
+
+} // namespace KPRV::kldrcim

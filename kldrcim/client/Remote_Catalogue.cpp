@@ -1,0 +1,52 @@
+// The classes of a server, by GetClass.
+#include "kldrcim/client/Remote_Catalogue.h"
+
+#include "kldrcim/client/Cim_Answer.h"
+#include "kldrcim/client/Cim_Request.h"
+#include "kldrcim/wire/Class_Xml.h"
+
+namespace KPRV::kldrcim {
+
+Remote_Catalogue::Remote_Catalogue(const Http_Settings& settings, std::string name_space)
+    : name_space_(std::move(name_space)), http_(settings)
+{
+}
+
+std::vector<std::string> Remote_Catalogue::class_names() const
+{
+    const Auto_Lock lock(mutex_);
+    if (!names_) {
+        names_.emplace();
+        Cim_Answer answer(http_, [&](Xml_Node node) {
+            names_->emplace_back(node.attribute(Xml_Attribute::NAME));
+            return true;
+        });
+        // A server that does not tell has none that could be listed.
+        answer.ask(write_class_names_request(name_space_), No_Catalogue());
+    }
+    return *names_;
+}
+
+const Class_Info* Remote_Catalogue::find(std::string_view name) const
+{
+    const Auto_Lock lock(mutex_);
+    auto [at, is_new] = classes_.try_emplace(lower_name(name));
+    if (is_new)
+        at->second = ask(std::string(name));
+    return at->second.get();
+}
+
+std::unique_ptr<Class_Info> Remote_Catalogue::ask(const std::string& name) const
+{
+    std::unique_ptr<Class_Info> info;
+    if (name.empty())
+        return info;
+    Cim_Answer answer(http_, [&](Xml_Node node) {
+        info = std::make_unique<Class_Info>(read_class(node));
+        return true;
+    });
+    const Result result = answer.ask(write_class_request(name_space_, name), No_Catalogue());
+    return result.ok() ? std::move(info) : nullptr;
+}
+
+} // namespace KPRV::kldrcim
