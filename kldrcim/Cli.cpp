@@ -18,9 +18,11 @@ namespace {
 
 int run_verb(const Cli_Options& options)
 {
+    const Cli_Verb& verb = *find_verb(options.verb);
+    if (verb.body_alone)
+        return verb.body_alone(options);
     std::string error, warning;
     const std::unique_ptr<Local_Connection> connection = open_module(options, error, warning);
-    const Cli_Verb& verb = *find_verb(options.verb);
     if (!connection)
         return complain(error, verb.without_module);
     if (!warning.empty())
