@@ -55,10 +55,12 @@ int run_body(const Cli_Verb& verb, const Cli_Options& options, Connection& conne
 
 int run_verb(Cli_Options options)
 {
+    const Cli_Verb& verb = *find_verb(options.verb);
+    if (verb.body_alone)
+        return verb.body_alone(options);
     std::string error, warning;
     if (!choose(options, error))
         return complain(error, USAGE_ERROR);
-    const Cli_Verb& verb = *find_verb(options.verb);
     std::unique_ptr<Connection> connection;
     Host* host = nullptr;
     if (!options.url.empty()) {

@@ -3,6 +3,7 @@
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Format_Table.h"
 #include "kldrcim/formats/Output.h"
+#include "kldrcim/input/Text_File.h"
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/walks/Agent.h"
 #include "kldrcim/walks/Rpc_Methods.h"
@@ -24,15 +25,6 @@ void put_line(const std::string& text)
     put(text);
     if (text.empty() || text.back() != '\n')
         put("\n");
-}
-
-std::string read_all(std::FILE* file)
-{
-    std::string text;
-    char buffer[4096];
-    while (const std::size_t size = std::fread(buffer, 1, sizeof buffer, file))
-        text.append(buffer, size);
-    return text;
 }
 
 std::vector<std::vector<std::string>> split_calls(const std::vector<std::string>& arguments)
@@ -83,7 +75,11 @@ int list_methods(const Cli_Options& options)
 
 int call_raw(Connection& connection, const std::string& text)
 {
-    const Result answer = call_agent(connection, text == "-" ? read_all(stdin) : text);
+    std::string error;
+    const auto request = text == "-" ? read_text_file(text, error) : text;
+    if (!request)
+        return complain("standard input: " + error, USAGE_ERROR);
+    const Result answer = call_agent(connection, *request);
     if (!answer.ok())
         return complain(failure_text(answer), FAILURE);
     put_line(agent_reply(answer));

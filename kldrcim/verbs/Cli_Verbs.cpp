@@ -3,6 +3,7 @@
 #include "kldrcim/verbs/Cli_Classes.h"
 #include "kldrcim/verbs/Cli_Conform.h"
 #include "kldrcim/verbs/Cli_Diag.h"
+#include "kldrcim/verbs/Cli_Diff.h"
 #include "kldrcim/verbs/Cli_Flash.h"
 #include "kldrcim/verbs/Cli_Health.h"
 #include "kldrcim/verbs/Cli_Luns.h"
@@ -60,6 +61,9 @@ constexpr Cli_Verb verbs[] = {
      "the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg", nullptr},
     {"luns",     0, 0,   "",                                        list_units,      Op{},                        "table json", "",
      "each logical unit once, by its identifier, with the paths that lead to it", nullptr},
+    {"diff",     2, 2,   "OLD NEW",                                 nullptr,         Op{},                        "table json", "",
+     "what came, went and changed between two files that \"tree --format json\" wrote; \"-\" is standard input",
+     "0 they are equal, 1 they differ, 2 one cannot be read.", 2, diff_inventories},
     {"health",   0, 0,   "",                                        run_health,      Op{},                        "table json plugin", "--interval --ignore",
      "what is wrong with the host's adapters, ports and targets, the worst first",
      "as of a monitoring plugin: 0 nothing is wrong, 1 warnings, 2 something critical, 3 what nobody can tell, or no module; "

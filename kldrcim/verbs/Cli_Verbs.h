@@ -34,6 +34,8 @@ struct Cli_Verb
     const char* statuses;
     /// Exit status where there is no module to ask.
     int without_module = 2;
+    /// What it does where nobody is asked; then there is no other body.
+    int (*body_alone)(const Cli_Options& options) = nullptr;
 };
 
 std::span<const Cli_Verb> cli_verbs();

@@ -11,7 +11,6 @@ namespace KPRV::kldrcim {
 namespace {
 
 constexpr const char* path_class = "KALDERA_SCSIInitiatorTargetLogicalUnitPath";
-/// What the module says of a unit whose identifier it could not read.
 constexpr const char* no_identifier = "Unable To Fetch";
 
 /// "2" of "LUN_2".
@@ -111,10 +110,15 @@ std::vector<Logical_Unit> read_units(Association_Index& index)
     return Path_Walk(index).run();
 }
 
+bool is_unit_identifier(const std::string& name)
+{
+    return !name.empty() && name != no_identifier;
+}
+
 std::string unit_identifier(const Instance_Value& unit)
 {
     const std::string name = text_of(unit, "Name");
-    return name == no_identifier ? "" : name;
+    return is_unit_identifier(name) ? name : "";
 }
 
 } // namespace KPRV::kldrcim

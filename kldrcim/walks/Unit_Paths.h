@@ -46,6 +46,9 @@ struct Logical_Unit
 /// Each unit once, in the order in which the paths are enumerated.
 std::vector<Logical_Unit> read_units(Association_Index& index);
 
+/// False for an empty name, and for what the module says of a unit whose identifier it could not read.
+bool is_unit_identifier(const std::string& name);
+
 /// What makes a unit the same whoever sees it; empty if it tells nothing of the kind.
 std::string unit_identifier(const Instance_Value& unit);
 
