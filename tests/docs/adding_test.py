@@ -26,7 +26,7 @@ EDITS = {
         ("module/adapter/classId_t.h", INSTEAD, "MAXCLASSID == 39", "MAXCLASSID == 40"),
         ("module/managers/FCHBAManager.cpp", BEHIND, "    {PRODUCT,                                    Needs::DRIVER,   by_adapter_helper},\n",
          "    {BRACKET,                                    Needs::DRIVER,   by_adapter_helper},\n"),
-        ("module/model/AdapterHelper.h", BEHIND, "    KALDERA_Product* getProductInstance(const _adapterData& adapter) const;\n",
+        ("module/model/AdapterHelper.h", BEHIND, "    KALDERA_Product* getProductInstance(const _adapterData& adapter, const Wanted& wanted = {}) const;\n",
          "    KALDERA_Bracket* getBracketInstance(const _adapterData& adapter) const;\n"),
         ("module/model/AdapterHelper.h", BEHIND, '#include "module/schema/KALDERA_AdapterSoftwareIdentity.h"\n',
          '#include "module/schema/KALDERA_Bracket.h"\n'),
