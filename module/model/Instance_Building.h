@@ -5,6 +5,7 @@
 #include "module/runtime/Array.h"
 #include "module/runtime/Instance.h"
 #include "module/runtime/Prototype.h"
+#include "module/runtime/Ref.h"
 #include "module/runtime/Wanted.h"
 
 #include <initializer_list>
@@ -18,9 +19,9 @@ template <class T>
 T* create_null()
 {
     static const Prototype<T> all_null([] {
-        T* const instance = create<T>(false);
-        clear(instance);
-        return instance;
+        Ref<T> instance(create<T>(false));
+        clear(instance.ptr());
+        return instance.steal();
     }());
     return all_null.copy();
 }
