@@ -66,11 +66,8 @@ Array<Instance*> DiagnosticHelper::getInstancesByClass(classId_t id)
     case PCILOOPBACKDIAGNOSTICTEST:
     case ETHLOOPBACKDIAGNOSTICTEST:
         return tests_of_class(id);
-    case DIAGNOSTICSOFTWAREIDENTITY: {
-        Fresh_Instances one;
-        one.append(getDiagnosticSoftwareIdentityInstance());
-        return one.release();
-    }
+    case DIAGNOSTICSOFTWAREIDENTITY:
+        return only(getDiagnosticSoftwareIdentityInstance());
     case CONCRETEJOB:
         return getDiagnosticJobInstances();
     case DIAGNOSTICSERVICERECORD:

@@ -40,8 +40,8 @@ Instance* applies_to_element(const DiagnosticHelper& helper, const DiagnosticRec
 Instance* affected_by(const DiagnosticHelper& helper, const DiagnosticJob& job)
 {
     Ref<KALDERA_AffectedJobElement> pair(create<KALDERA_AffectedJobElement>(true));
-    if (Instance* const element = find_tested_element(job)) {
-        pair->AffectedElement = cast<CIM_ManagedElement>(element);
+    if (Ref<Instance> element{find_tested_element(job)}) {
+        pair->AffectedElement = cast<CIM_ManagedElement>(element.steal());
         pair->AffectingElement = cast<CIM_Job>(static_cast<Instance*>(helper.getConcreteJobInstance(job)));
     }
     return pair.steal();

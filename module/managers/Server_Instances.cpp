@@ -1,6 +1,7 @@
 // Of `ServerManager`, what describes the server: its object manager, namespaces, protocol, our software,
 // the agent's service.
 #include "module/managers/ServerManager.h"
+#include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
 #include "module/runtime/Ref.h"
 #include "module/runtime/cimom.h"
@@ -21,13 +22,6 @@ const char* const prov_build_version = "3.2.3.0";
 namespace {
 
 constexpr uint16 OPERATIONAL_STATUS_OK = 2;
-
-Array<Instance*> only(Instance* instance)
-{
-    Array<Instance*> instances;
-    instances.append(instance);
-    return instances;
-}
 
 String host_text()
 {

@@ -1,5 +1,6 @@
 #include "module/model/AccessPointHelper.h"
 
+#include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
 #include "module/model/Record_Filling.h"
 #include "module/runtime/Ref.h"
@@ -26,11 +27,10 @@ Array<Instance*> AccessPointHelper::getInstancesByClass(classId_t) const
     }
     _adapterData adapter = {};
     adapter.systemName = host;
-    Instance* point = getRemoteServiceAccessPointInstance(adapter);
+    Ref<KALDERA_RemoteServiceAccessPoint> point(getRemoteServiceAccessPointInstance(adapter));
     if (!point)
         return {};
-    Array<Instance*> instances;
-    instances.append(point);
+    Array<Instance*> instances = only(point.steal());
     LOG(INFO, "Number of instances: %d", static_cast<int>(instances.size()));
     return instances;
 }

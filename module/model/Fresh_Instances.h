@@ -35,9 +35,22 @@ public:
         _instances.push_back(instance);
         held.steal();
     }
+    /// Takes all of them over, also where there is no room for them.
     void append(const Array<Instance*>& instances)
     {
+        struct Given
+        {
+            ~Given()
+            {
+                if (still_ours)
+                    for (Instance* instance : instances)
+                        destroyer(instance);
+            }
+            const Array<Instance*>& instances;
+            bool still_ours = true;
+        } given{instances};
         _instances.insert(_instances.end(), instances.begin(), instances.end());
+        given.still_ours = false;
     }
     uint32 size() const { return static_cast<uint32>(_instances.size()); }
 
@@ -53,5 +66,13 @@ private:
     // An array grows by exactly what is appended, which is too slow for the LUNs of a large host.
     std::vector<Instance*> _instances;
 };
+
+/// A list of the one instance, which it takes over; the receiver owns it.
+inline Array<Instance*> only(Instance* instance)
+{
+    Fresh_Instances one;
+    one.append(instance);
+    return one.release();
+}
 
 } // namespace KPRV

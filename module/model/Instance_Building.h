@@ -6,6 +6,7 @@
 #include "module/runtime/Instance.h"
 #include "module/runtime/Lasting_Array.h"
 #include "module/runtime/Prototype.h"
+#include "module/runtime/Ref.h"
 #include "module/runtime/Wanted.h"
 
 #include <initializer_list>
@@ -19,9 +20,9 @@ template <class T>
 T* create_null()
 {
     static const Prototype<T> all_null([] {
-        T* const instance = create<T>(false);
-        clear(instance);
-        return instance;
+        Ref<T> instance(create<T>(false));
+        clear(instance.ptr());
+        return instance.steal();
     }());
     return all_null.copy();
 }
