@@ -9,15 +9,6 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-/// What stands before a line: the last child of its parent ends the parent's line of descent.
-struct Twigs
-{
-    const char* child;
-    const char* last_child;
-    const char* passing;
-    const char* nothing;
-};
-
 constexpr Twigs boxes = {"├─ ", "└─ ", "│  ", "   "};
 constexpr Twigs plain = {"|- ", "`- ", "|  ", "   "};
 
@@ -34,11 +25,16 @@ void add(std::string& text, const Twigs& twigs, const Text_Branch& branch, const
 
 } // namespace
 
+const Twigs& twigs(bool ascii)
+{
+    return ascii ? plain : boxes;
+}
+
 std::string branch_text(const std::vector<Text_Branch>& roots, bool ascii)
 {
     std::string text;
     for (const Text_Branch& root : roots)
-        add(text, ascii ? plain : boxes, root, "", "");
+        add(text, twigs(ascii), root, "", "");
     return text;
 }
 

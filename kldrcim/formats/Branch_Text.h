@@ -5,6 +5,17 @@
 
 namespace KPRV::kldrcim {
 
+/// What stands before a line: the last child of its parent ends the parent's line of descent.
+struct Twigs
+{
+    const char* child;
+    const char* last_child;
+    const char* passing;
+    const char* nothing;
+};
+
+const Twigs& twigs(bool ascii);
+
 /// A line with those that hang from it.
 struct Text_Branch
 {

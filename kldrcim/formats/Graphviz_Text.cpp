@@ -1,6 +1,10 @@
 // A topology as a graph.
 #include "kldrcim/formats/Node_Label.h"
+#include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Topology_Text.h"
+
+#include <algorithm>
+#include <unordered_set>
 
 namespace KPRV::kldrcim {
 
@@ -19,6 +23,7 @@ constexpr Look looks[] = {
     {Node_Kind::CONNECTOR, "cds", "#fbe8c8"},     {Node_Kind::FC_PORT, "box", "#b5d3ee"},
     {Node_Kind::ETHERNET_PORT, "box", "#bfe3c0"}, {Node_Kind::INITIATOR, "ellipse", "#d4e5f5"},
     {Node_Kind::TARGET, "ellipse", "#e2d1ee"},    {Node_Kind::UNIT, "cylinder", "#f6d5d5"},
+    {Node_Kind::UNITS, "cylinder", "#f6d5d5"},
 };
 
 constexpr bool in_order()
@@ -68,30 +73,100 @@ std::string label_lines(const Node_Label& label)
     return text;
 }
 
-std::string name_of(std::size_t node)
+/// Numbers the nodes as a walk from the roots meets them, and writes the links along which it goes.
+class Graph_Writer
 {
-    return "n" + std::to_string(node + 1);
-}
+public:
+    explicit Graph_Writer(const Topology& topology) : topology_(topology), order_(topology.nodes.size(), 0) {}
+
+    void write()
+    {
+        for (const Number root : topology_.roots)
+            walk(root, 0);
+        for (const Number node : met_)
+            put("  " + name_of(node) + " [" + topology_.nodes[node].text + "];\n");
+        for (const Edge& edge : edges_)
+            put_edge(edge);
+        for (const Topology::Step_Links& each : topology_.steps)
+            if (each.step->taken == Topology_Step::CROSS_LINK)
+                for (const Topology::Link& link : in_order(each.links))
+                    put_edge({link.from, link.to, each.step, false});
+    }
+
+private:
+    using Number = Topology::Number;
+
+    struct Edge
+    {
+        Number from;
+        Number to;
+        const Topology_Step* step;
+        /// The edge by which the walk first came to its end.
+        bool in_tree;
+    };
+
+    std::string name_of(Number node) const { return "n" + std::to_string(order_[node]); }
+
+    void put_edge(const Edge& edge) const
+    {
+        put("  " + name_of(edge.from) + " -> " + name_of(edge.to) + " [label=\"" +
+            escaped(edge.step->association) + "\"" +
+            (edge.in_tree ? "" : ", style=dashed, constraint=false") + "];\n");
+    }
+
+    /// A node that the walk meets again has been gone through, but for what it shows below another one.
+    void walk(Number node, Number above)
+    {
+        if (order_[node] == 0) {
+            met_.push_back(node);
+            order_[node] = met_.size();
+        }
+        for (const Topology::Step_Links& each : topology_.steps)
+            for (const Number child : topology_.below(each, node, above)) {
+                const bool is_new = order_[child] == 0;
+                if (known_.insert(std::uint64_t(node) << 32 | child).second)
+                    edges_.push_back({node, child, each.step, is_new});
+                walk(child, node);
+            }
+    }
+
+    /// Between what is drawn anyway.
+    std::vector<Topology::Link> in_order(const std::vector<Topology::Link>& links) const
+    {
+        std::vector<Topology::Link> drawn;
+        for (const Topology::Link& link : links)
+            if (order_[link.from] != 0 && order_[link.to] != 0)
+                drawn.push_back(link);
+        std::ranges::stable_sort(drawn, {}, [&](const Topology::Link& link) { return order_[link.from]; });
+        return drawn;
+    }
+
+    const Topology& topology_;
+    /// From 1 on; 0 for what was not met.
+    std::vector<std::size_t> order_;
+    std::vector<Number> met_;
+    std::vector<Edge> edges_;
+    std::unordered_set<std::uint64_t> known_;
+};
 
 } // namespace
 
-std::string graphviz_text(const Topology& topology)
+std::string graphviz_node_text(Node_Kind kind, const Instance_Value& instance)
 {
-    std::string text = "digraph topology {\n"
-                       "  rankdir=LR;\n"
-                       "  node [style=filled, fontname=\"sans-serif\"];\n"
-                       "  edge [fontname=\"sans-serif\", fontsize=9];\n";
-    for (std::size_t i = 0; i < topology.nodes.size(); ++i) {
-        const Look& look = looks[static_cast<int>(topology.nodes[i].kind)];
-        const Node_Label label = node_label(topology.nodes[i]);
-        text += "  " + name_of(i) + " [label=\"" + label_lines(label) + "\", shape=" + look.shape +
-                ", fillcolor=\"" + look.color + "\"" + outline(label.condition) + "];\n";
-    }
-    for (const Topology::Edge& edge : topology.edges)
-        text += "  " + name_of(edge.from) + " -> " + name_of(edge.to) + " [label=\"" +
-                escaped(edge.association) + "\"" + (edge.in_tree ? "" : ", style=dashed, constraint=false") +
-                "];\n";
-    return text + "}\n";
+    const Look& look = looks[static_cast<int>(kind)];
+    const Node_Label label = node_label({kind, instance});
+    return "label=\"" + label_lines(label) + "\", shape=" + look.shape + ", fillcolor=\"" + look.color +
+           "\"" + outline(label.condition);
+}
+
+void write_graphviz(const Topology& topology)
+{
+    put("digraph topology {\n"
+        "  rankdir=LR;\n"
+        "  node [style=filled, fontname=\"sans-serif\"];\n"
+        "  edge [fontname=\"sans-serif\", fontsize=9];\n");
+    Graph_Writer(topology).write();
+    put("}\n");
 }
 
 } // namespace KPRV::kldrcim

@@ -171,7 +171,14 @@ Node_Label unit_label(const Instance_Value& unit)
             {product_of(id, element), line_of(unit, "Name")}};
 }
 
-Node_Label label_of(const Topology::Node& node)
+/// "1 LUN", "64 LUNs".
+Node_Label units_label(const Instance_Value& units)
+{
+    const std::uint64_t count = number_of(units, "Count").value_or(0);
+    return {std::to_string(count) + (count == 1 ? " LUN" : " LUNs"), "", {}};
+}
+
+Node_Label label_of(const Node_Facts& node)
 {
     switch (node.kind) {
     case Node_Kind::SYSTEM:
@@ -192,6 +199,8 @@ Node_Label label_of(const Topology::Node& node)
         return endpoint_label("initiator", node.instance);
     case Node_Kind::TARGET:
         return endpoint_label("target", node.instance);
+    case Node_Kind::UNITS:
+        return units_label(node.instance);
     default:
         return unit_label(node.instance);
     }
@@ -205,7 +214,16 @@ std::string line_of(const Instance_Value& instance, const char* property)
     return value && !value->null ? visible_text(plain_text(*value)) : "";
 }
 
-Node_Label node_label(const Topology::Node& node)
+const std::vector<std::string>& label_properties()
+{
+    static const std::vector<std::string> names = {
+        "Caption",      "Classifications", "Description", "DeviceID",     "ElementName",       "EnabledState",
+        "InstanceID",   "Manufacturer",    "Model",       "Name",         "OperationalStatus", "PartNumber",
+        "SerialNumber", "Speed",           "Tag",         "VersionString"};
+    return names;
+}
+
+Node_Label node_label(const Node_Facts& node)
 {
     Node_Label label = label_of(node);
     std::erase(label.facts, "");
@@ -228,8 +246,9 @@ std::string label_line(const Node_Label& label, bool color)
 
 const char* node_kind_name(Node_Kind kind)
 {
-    static const char* const names[] = {"system",  "adapter",       "software",  "card",   "connector",
-                                        "fc_port", "ethernet_port", "initiator", "target", "unit"};
+    static const char* const names[] = {"system",    "adapter", "software",      "card",
+                                        "connector", "fc_port", "ethernet_port", "initiator",
+                                        "target",    "unit",    "units"};
     return names[static_cast<int>(kind)];
 }
 

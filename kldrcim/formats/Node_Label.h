@@ -39,7 +39,17 @@ struct Node_Label
     Condition condition = Condition::NONE;
 };
 
-Node_Label node_label(const Topology::Node& node);
+/// What is known of a node while its label is made.
+struct Node_Facts
+{
+    Node_Kind kind;
+    const Instance_Value& instance;
+};
+
+Node_Label node_label(const Node_Facts& node);
+
+/// The properties that labels are made of.
+const std::vector<std::string>& label_properties();
 
 /// A property's text on one line; empty for a null or missing one.
 std::string line_of(const Instance_Value& instance, const char* property);

@@ -1,66 +1,129 @@
-// The tree of a topology, for people and as JSON.
+// The tree of a topology, for people and as JSON. Both write as they go.
 #include "broker/values/Value_Text.h"
 #include "kldrcim/formats/Branch_Text.h"
 #include "kldrcim/formats/Format_Json.h"
 #include "kldrcim/formats/Node_Label.h"
+#include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Topology_Text.h"
 
 namespace KPRV::kldrcim {
 
 namespace {
 
-using Branch = Topology::Branch;
+using Number = Topology::Number;
 
-/// The branches that have a line, those of initiators in the place of the initiators.
-std::vector<const Branch*> shown(const Topology& topology, const std::vector<Branch>& branches)
+/// A node where the tree shows it.
+struct Occurrence
 {
-    std::vector<const Branch*> result;
-    for (const Branch& branch : branches) {
-        if (topology.nodes[branch.node].kind != Node_Kind::INITIATOR) {
-            result.push_back(&branch);
+    Number node;
+    Number above;
+};
+
+/// What has a line below a node, what is below initiators in their place.
+std::vector<Occurrence> shown_below(const Topology& topology, const Occurrence& occurrence)
+{
+    std::vector<Occurrence> result;
+    for (const Number node : topology.below(occurrence.node, occurrence.above)) {
+        const Occurrence child = {node, occurrence.node};
+        if (topology.nodes[node].kind != Node_Kind::INITIATOR) {
+            result.push_back(child);
             continue;
         }
-        std::vector<const Branch*> behind = shown(topology, branch.children);
+        const std::vector<Occurrence> behind = shown_below(topology, child);
         result.insert(result.end(), behind.begin(), behind.end());
     }
     return result;
 }
 
-std::vector<Text_Branch> lines_of(const Topology& topology, const std::vector<Branch>& branches, bool color)
+class Tree_Writer
 {
-    std::vector<Text_Branch> lines;
-    for (const Branch* branch : shown(topology, branches))
-        lines.push_back({label_line(node_label(topology.nodes[branch->node]), color),
-                         lines_of(topology, branch->children, color)});
-    return lines;
+public:
+    Tree_Writer(const Topology& topology, const Twigs& twigs) : topology_(topology), twigs_(twigs) {}
+
+    /// `before_` is what stands before the lines below.
+    void write(const Occurrence& occurrence)
+    {
+        put(topology_.nodes[occurrence.node].text);
+        put("\n");
+        const std::vector<Occurrence> below = shown_below(topology_, occurrence);
+        for (std::size_t i = 0; i < below.size(); ++i) {
+            const bool is_last = i + 1 == below.size();
+            const std::size_t size = before_.size();
+            put(before_);
+            put(is_last ? twigs_.last_child : twigs_.child);
+            before_ += is_last ? twigs_.nothing : twigs_.passing;
+            write(below[i]);
+            before_.resize(size);
+        }
+    }
+
+private:
+    const Topology& topology_;
+    const Twigs& twigs_;
+    std::string before_;
+};
+
+/// The lines behind the first moved to the right.
+std::string moved(const std::string& lines, unsigned indent)
+{
+    std::string text;
+    for (const char c : lines) {
+        text += c;
+        if (c == '\n')
+            text.append(indent, ' ');
+    }
+    return text;
 }
 
-std::string json_of(const Topology& topology, const Branch& branch, unsigned indent)
+void write_json(const Topology& topology, const Occurrence& occurrence, unsigned indent)
 {
-    const Topology::Node& node = topology.nodes[branch.node];
-    Node_Label label = node_label(node);
-    std::vector<std::string> children;
-    for (const Branch* child : shown(topology, branch.children))
-        children.push_back(json_of(topology, *child, indent + 4));
-    return json_branch({node_kind_name(node.kind), label.what, label.name, label.facts,
-                        path_text(node.instance.path), std::move(children)},
-                       indent);
+    const std::vector<Occurrence> below = shown_below(topology, occurrence);
+    const std::string text = moved(topology.nodes[occurrence.node].text, indent);
+    if (below.empty())
+        return put(text);
+    // Before the line that closes the object.
+    put(text.substr(0, text.rfind('\n')));
+    const std::string line = "\n" + std::string(indent + 2, ' ');
+    put("," + line + "\"children\": [");
+    for (std::size_t i = 0; i < below.size(); ++i) {
+        put((i ? "," : "") + line + "  ");
+        write_json(topology, below[i], indent + 4);
+    }
+    put(line + "]\n" + std::string(indent, ' ') + "}");
 }
 
 } // namespace
 
-std::string tree_text(const Topology& topology, bool ascii, bool color)
+std::string tree_node_text(Node_Kind kind, const Instance_Value& instance, bool color)
 {
-    return branch_text(lines_of(topology, topology.roots, color), ascii);
+    return label_line(node_label({kind, instance}), color);
 }
 
-std::string tree_json(const Topology& topology)
+std::string json_node_text(Node_Kind kind, const Instance_Value& instance)
 {
-    bool one = topology.roots.size() == 1;
-    std::vector<std::string> roots;
-    for (const Branch& root : topology.roots)
-        roots.push_back(json_of(topology, root, one ? 0 : 2));
-    return (one ? roots.front() : json_array(roots)) + "\n";
+    const Node_Label label = node_label({kind, instance});
+    const std::string path = kind == Node_Kind::UNITS ? "" : path_text(instance.path);
+    return json_branch({node_kind_name(kind), label.what, label.name, label.facts, path, {}});
+}
+
+void write_tree(const Topology& topology, bool ascii)
+{
+    for (const Number root : topology.roots)
+        Tree_Writer(topology, twigs(ascii)).write({root, 0});
+}
+
+void write_tree_json(const Topology& topology)
+{
+    if (topology.roots.size() == 1) {
+        write_json(topology, {topology.roots.front(), 0}, 0);
+        return put("\n");
+    }
+    put("[");
+    for (const Number root : topology.roots) {
+        put(root == topology.roots.front() ? "\n  " : ",\n  ");
+        write_json(topology, {root, 0}, 2);
+    }
+    put(topology.roots.empty() ? "]\n" : "\n]\n");
 }
 
 } // namespace KPRV::kldrcim

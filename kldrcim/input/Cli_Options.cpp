@@ -36,6 +36,7 @@ constexpr std::pair<const char*, Cli_Options::Color> colors[] = {
 };
 constexpr std::pair<const char*, Cli_Options::Luns> lun_words[] = {
     {"each", Cli_Options::Luns::EACH},
+    {"count", Cli_Options::Luns::COUNT},
     {"merged", Cli_Options::Luns::MERGED},
 };
 
@@ -97,6 +98,13 @@ bool set_number(Cli_Options& options, const std::string& value)
     const char* end = value.data() + value.size();
     const auto [at, error] = std::from_chars(value.data(), end, options.*Member);
     return error == std::errc() && at == end && options.*Member != 0;
+}
+
+template <std::string Cli_Options::*Member>
+bool set_name(Cli_Options& options, const std::string& value)
+{
+    options.*Member = value;
+    return !value.empty();
 }
 
 bool set_format(Cli_Options& options, const std::string& value)
@@ -165,8 +173,14 @@ constexpr Cli_Option option_table[] = {
      "also firmware and drivers"},
     {"--connectors", nullptr,          nullptr,                             &Options::connectors,    nullptr,                  false,
      "also cards and transceivers"},
-    {"--luns",       "each|merged",    set_word<&Options::luns, lun_words>, nullptr,                 "each or merged",         false,
-     "draw a logical unit for each port that sees it, or as one node (default: each)"},
+    {"--adapter",    "ADDRESS",        set_name<&Options::adapter>,         nullptr,                 "an address",             false,
+     "only this adapter, by its DeviceID, with or without colons"},
+    {"--port",       "ADDRESS",        set_name<&Options::port>,            nullptr,                 "an address",             false,
+     "only this port, by its DeviceID, with or without colons, and its adapter"},
+    {"--depth",      "N",              set_number<&Options::depth>,         nullptr,                 "a number above 0",       false,
+     "levels below the host: 1 adapters, 2 ports, 3 targets, 4 logical units"},
+    {"--luns",       "each|count|merged", set_word<&Options::luns, lun_words>, nullptr,              "each, count or merged",  false,
+     "each logical unit (default), or how many a target has; merged: in a graph, one that several ports see is one node"},
     {"--ascii",      nullptr,          nullptr,                             &Options::ascii,         nullptr,                  false,
      "no box-drawing characters (default where the locale is not UTF-8)"},
     {"--color",      "WHEN",           set_word<&Options::color, colors>,   nullptr,                 "auto, always or never",  false,

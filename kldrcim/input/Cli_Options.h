@@ -32,6 +32,7 @@ struct Cli_Options
     enum class Luns
     {
         EACH,
+        COUNT,
         MERGED,
     };
 
@@ -52,8 +53,13 @@ struct Cli_Options
     /// What a tree or graph shows besides ports and storage.
     bool software = false;
     bool connectors = false;
-    /// Whether a unit that several ports see is drawn for each of them, or once.
+    /// Each logical unit, how many, or one that several ports see as one node.
     Luns luns = Luns::EACH;
+    /// Levels below the host; 0 for all.
+    unsigned depth = 0;
+    /// Addresses of the only adapter and port to show; empty for all.
+    std::string adapter;
+    std::string port;
     /// Name spaces of the filters of a watch; empty: that of the classes.
     std::vector<std::string> filters;
     /// Indications after which a watch ends; 0: never.

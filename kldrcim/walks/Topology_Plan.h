@@ -15,6 +15,8 @@ enum class Node_Kind
     INITIATOR,
     TARGET,
     UNIT,
+    /// A number of units, in their place.
+    UNITS,
 };
 
 /// One kind of step from a node to those below it.

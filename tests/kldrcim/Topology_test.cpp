@@ -1,4 +1,5 @@
 // The walk over the small host: what it finds, and what it asks.
+#include "kldrcim/formats/Output.h"
 #include "kldrcim/formats/Topology_Text.h"
 #include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/walks/Profile_Tree.h"
@@ -22,8 +23,17 @@ protected:
 
     static std::size_t nodes(const Topology& topology, Node_Kind kind)
     {
-        return static_cast<std::size_t>(std::count_if(topology.nodes.begin(), topology.nodes.end(),
-                                                      [&](const auto& node) { return node.kind == kind; }));
+        return static_cast<std::size_t>(
+            std::count_if(topology.nodes.begin(), topology.nodes.end(),
+                          [&](const auto& node) { return node.is_met && node.kind == kind; }));
+    }
+
+    Topology walk(Topology_Options options)
+    {
+        options.text_of = [](Node_Kind kind, const Instance_Value& instance) {
+            return tree_node_text(kind, instance, false);
+        };
+        return walk_topology(*connection, options);
     }
 
     std::optional<Local_Connection> connection;
@@ -31,9 +41,7 @@ protected:
 
 TEST_F(Topology_Test, AsksEachClassOnce)
 {
-    Association_Index index(*connection);
-    walk_topology(index, {.software = true, .connectors = true, .cross_links = true});
-    EXPECT_TRUE(index.failures().empty());
+    EXPECT_TRUE(walk({.software = true, .connectors = true, .cross_links = true}).failures.empty());
     for (const std::string& name : host->catalogue().class_names()) {
         // Profiles have a tree of their own.
         bool of_the_plan = name.starts_with("KALDERA_") && name.find("Profile") == name.npos;
@@ -55,8 +63,7 @@ TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
 
 TEST_F(Topology_Test, DoesNotAskForWhatIsNotShown)
 {
-    Association_Index index(*connection);
-    Topology topology = walk_topology(index, {});
+    const Topology topology = walk({});
     for (const char* name :
          {"KALDERA_AdapterElementSoftwareIdentity", "KALDERA_AdapterSoftwareIdentity", "KALDERA_Realizes",
           "KALDERA_PhysicalPackage", "KALDERA_HostedDependency", "KALDERA_EthernetPortRealizes"})
@@ -67,16 +74,16 @@ TEST_F(Topology_Test, DoesNotAskForWhatIsNotShown)
 
 TEST_F(Topology_Test, WhatIsSeenThroughTwoPortsIsOneNode)
 {
-    Association_Index index(*connection);
-    Topology topology = walk_topology(index, {});
+    const Topology topology = walk({});
     EXPECT_EQ(2u, nodes(topology, Node_Kind::TARGET));
     EXPECT_EQ(3u, nodes(topology, Node_Kind::UNIT));
-    EXPECT_EQ(2, std::count_if(topology.edges.begin(), topology.edges.end(),
-                               [](const auto& edge) { return !edge.in_tree; }));
-    // All nodes but the root have exactly one edge of the tree.
-    EXPECT_EQ(topology.nodes.size() - 1,
-              static_cast<std::size_t>(std::count_if(topology.edges.begin(), topology.edges.end(),
-                                                     [](const auto& edge) { return edge.in_tree; })));
+    std::size_t links = 0, met = 0;
+    for (const Topology::Step_Links& each : topology.steps)
+        links += each.links.size();
+    for (const Topology::Node& node : topology.nodes)
+        met += node.is_met;
+    // Besides one link to each node but the root, two to what is seen through the other port.
+    EXPECT_EQ(met - 1 + 2, links);
 }
 
 TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
@@ -114,8 +121,11 @@ TEST_F(Topology_Test, FailuresAreToldOnce)
 
 TEST_F(Topology_Test, NoSystemIsNoTree)
 {
-    EXPECT_EQ("", tree_text({}, false, false));
-    EXPECT_EQ("[]\n", tree_json({}));
+    testing::internal::CaptureStdout();
+    write_tree({}, false);
+    write_tree_json({});
+    flush_output();
+    EXPECT_EQ("[]\n", testing::internal::GetCapturedStdout());
 }
 
 } // namespace

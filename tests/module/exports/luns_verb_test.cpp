@@ -152,8 +152,8 @@ TEST_F(Luns_Verb, AGraphDrawsEachUnitOrEachOnce)
 
 TEST_F(Luns_Verb, BadInputIsNamed)
 {
-    expect_mistake("graph --luns twice", "--luns takes each or merged, not \"twice\"");
-    expect_mistake("tree --luns merged", "--luns makes no sense for tree; it is for graph");
+    expect_mistake("graph --luns twice", "--luns takes each, count or merged, not \"twice\"");
+    expect_mistake("tree --luns merged", "--luns merged makes no sense for tree; it is for graph");
     expect_mistake("luns --format mof", "--format mof makes no sense for luns");
     expect_mistake("luns 6024", "usage: kldrcim [options] luns");
 }

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "broker/values/Value.h"
+
+#include <unordered_map>
+
+namespace KPRV::kldrcim {
+
+using namespace broker;
+
+/// Numbers for objects, from 0 on: whoever holds many of them in many places holds each identity once.
+class Object_Numbers
+{
+public:
+    using Number = std::uint32_t;
+    static constexpr Number none = ~Number(0);
+
+    /// That of the object; a new one if it has none yet.
+    Number of(const Path_Value& path);
+    /// `none` if it has none.
+    Number find(const Path_Value& path) const;
+    std::size_t size() const { return class_of_.size(); }
+    /// As the first path named it.
+    const std::string& class_name(Number number) const { return classes_[class_of_[number]]; }
+
+private:
+    std::unordered_map<std::string, Number> numbers_;
+    std::vector<std::uint16_t> class_of_;
+    std::vector<std::string> classes_;
+};
+
+} // namespace KPRV::kldrcim
