@@ -169,8 +169,9 @@ class Failure(unittest.TestCase):
         page = ROOT / "CONTRIBUTING.md"
         table = rows(page, "folder", "returns on failure", "may throw", "logs", "owns")
         self.assertGreater(len(table), 10)
-        # What the agent throws inside stands below.
-        below = {"module/agent/": re.search(r"^The methods of the agent throw.*?\n\n", read(page), re.M | re.S)[0]}
+        # What these throw inside stands below.
+        below = {folder: re.search(rf"^{begin}.*?\n\n", read(page), re.M | re.S)[0] for folder, begin in
+                 (("module/agent/", "The methods of the agent throw"), ("kldrcim/", "The command line throws"))}
         for folder, _, throws, _, _ in map(bare, table):
             files = [file for file in (ROOT / folder).rglob("*") if file.suffix in (".h", ".cpp")]
             self.assertTrue((ROOT / folder).is_dir(), folder)
