@@ -4,6 +4,7 @@
 #include "kldrcim/connection/Connection.h"
 
 #include <algorithm>
+#include <cstring>
 #include <curl/curl.h>
 #include <new>
 
@@ -166,7 +167,12 @@ std::string Http_Client::own_address() const
 void Http_Client::fail(int code, const char* details, std::chrono::seconds patience) const
 {
     const std::string where = settings_.url.text();
-    const std::string why = *details ? details : curl_easy_strerror(static_cast<CURLcode>(code));
+    long number = 0;
+    curl_easy_getinfo(handle_, CURLINFO_OS_ERRNO, &number);
+    const std::string why = code == CURLE_COULDNT_CONNECT && number != 0
+                                ? std::strerror(static_cast<int>(number))
+                            : *details ? details
+                                       : curl_easy_strerror(static_cast<CURLcode>(code));
     switch (code) {
     case CURLE_OUT_OF_MEMORY:
         throw std::bad_alloc();

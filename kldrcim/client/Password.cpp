@@ -6,6 +6,7 @@
 #include <cstring>
 #include <fstream>
 #include <memory>
+#include <sys/stat.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -42,6 +43,12 @@ private:
 
 std::optional<std::string> password_of_file(const std::string& file, std::string& error)
 {
+    struct stat status;
+    if (stat(file.c_str(), &status) == 0 && S_ISREG(status.st_mode) &&
+        (status.st_mode & (S_IRWXG | S_IRWXO))) {
+        error = file + ": others may read or change it (chmod 600)";
+        return std::nullopt;
+    }
     std::ifstream in(file);
     std::string line;
     if (!std::getline(in, line) && line.empty()) {

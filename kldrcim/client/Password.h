@@ -5,7 +5,7 @@
 
 namespace KPRV::kldrcim {
 
-/// The first line of a file. Nothing with a one-line `error`.
+/// The first line of a file that is closed to others. Nothing with a one-line `error`.
 std::optional<std::string> password_of_file(const std::string& file, std::string& error);
 
 /// What is typed at the terminal, unseen. Nothing with `error`, also where there is no terminal.

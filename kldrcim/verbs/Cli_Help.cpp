@@ -25,7 +25,7 @@ constexpr const char* exit_status =
     R"(0 success, also if only some of several associations failed (a warning names them), or if the reader of a pipe has gone.
 1 the provider or the host answered a CIM status, the agent an error, or an update failed, which is named on standard error; )"
     R"(the output could not be written.
-2 usage, no such test, element or adapter, or the module could not be loaded.)";
+2 usage, no such test, element or adapter, or the module could not be loaded, the server not be asked.)";
 
 constexpr const char* examples = R"examples(
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
