@@ -1,6 +1,7 @@
 // The extension_table of operating system services: thin covers over POSIX threads.
 #include "broker/Broker.h"
 
+#include <bit>
 #include <cstring>
 #include <pthread.h>
 #include <time.h>
@@ -16,12 +17,12 @@ char* resolve_file_name(const char* base)
 
 void* as_handle(pthread_t thread)
 {
-    return reinterpret_cast<void*>(thread);
+    return std::bit_cast<void*>(thread);
 }
 
 pthread_t as_thread(void* handle)
 {
-    return reinterpret_cast<pthread_t>(handle);
+    return std::bit_cast<pthread_t>(handle);
 }
 
 void* new_thread(CMPIThreadFunc start, void* parameter, int detached)

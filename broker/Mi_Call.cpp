@@ -275,7 +275,7 @@ private:
     {
         ++returned_;
         try {
-            return (receiver_.*receive)(std::move(object));
+            return (receiver_.*receive)(std::forward<Object>(object));
         } catch (...) {
             failure_ = std::current_exception();
             return false;

@@ -11,9 +11,9 @@
 
 #include <cerrno>
 #include <cstdlib>
-#include <cstring>
 #include <new>
 #include <span>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -108,7 +108,8 @@ int run_cli(const std::vector<std::string>& arguments)
         // A reader that has had enough is no failure.
         return failure.error == EPIPE
                    ? 0
-                   : complain(std::string("write error: ") + std::strerror(failure.error), FAILURE);
+                   : complain(std::string("write error: ") + std::generic_category().message(failure.error),
+                              FAILURE);
     } catch (const std::bad_alloc&) {
         return complain("out of memory", FAILURE);
     } catch (const std::exception& error) {

@@ -22,9 +22,9 @@ int serve(const Cli_Options&, Host&)
 #include "kldrcim/verbs/Interruption.h"
 
 #include <cerrno>
-#include <cstring>
 #include <fstream>
 #include <iterator>
+#include <system_error>
 #include <unistd.h>
 
 namespace KPRV::kldrcim {
@@ -42,7 +42,7 @@ bool read_file(const std::string& file, std::string& text, std::string& error)
     std::ifstream in(file, std::ios::binary);
     text.assign(std::istreambuf_iterator<char>(in), {});
     if (in.bad() || text.empty())
-        error = file + ": " + (errno != 0 ? std::strerror(errno) : "empty");
+        error = file + ": " + (errno != 0 ? std::generic_category().message(errno) : "empty");
     return error.empty();
 }
 

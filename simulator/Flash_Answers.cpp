@@ -4,11 +4,11 @@
 #include "simulator/State_Events.h"
 
 #include <cerrno>
-#include <cstring>
 #include <fstream>
 #include <sstream>
 #include <string_view>
 #include <sys/stat.h>
+#include <system_error>
 
 namespace KPRV::simulator {
 
@@ -45,13 +45,13 @@ Image read_image(const std::string& file)
 {
     struct stat64 status;
     if (stat64(file.c_str(), &status) != 0)
-        return {{}, std::strerror(errno)};
+        return {{}, std::generic_category().message(errno)};
     // Anything else could keep the reader waiting.
     if (!S_ISREG(status.st_mode))
         return {{}, "not a regular file"};
     std::ifstream stream(file, std::ios::binary);
     if (!stream)
-        return {{}, std::strerror(errno)};
+        return {{}, std::generic_category().message(errno)};
     std::string head(4096, '\0');
     stream.read(head.data(), static_cast<std::streamsize>(head.size()));
     head.resize(static_cast<std::size_t>(stream.gcount()));
@@ -70,7 +70,7 @@ std::string version_of(const Image& image)
             line.pop_back();
         if (!line.starts_with(name))
             continue;
-        const std::string version = line.substr(name.size());
+        std::string version = line.substr(name.size());
         if (!version.empty() && version.size() <= 32 && version.find_first_not_of(characters) == version.npos)
             return version;
     }

@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <fstream>
 #include <memory>
 #include <sstream>
+#include <system_error>
 
 namespace KPRV::simulator {
 
@@ -58,7 +58,7 @@ Json_Text Json_Text::of_file(const std::string& path)
     // An empty file gives nothing to insert, which counts as a failure of the insertion alone.
     if (file && (text << file.rdbuf() || file.peek() == std::ifstream::traits_type::eof()) && !file.bad())
         return {path, text.str()};
-    throw Refused(path + ":0: cannot be read: " + std::strerror(errno));
+    throw Refused(path + ":0: cannot be read: " + std::generic_category().message(errno));
 }
 
 Json::Value Json_Text::parse() const

@@ -35,6 +35,7 @@ std::string json_array(const std::vector<std::string>& elements, unsigned indent
 std::string json_object(const std::vector<std::pair<std::string, std::string>>& members, unsigned indent)
 {
     std::vector<std::string> lines;
+    lines.reserve(members.size());
     for (const auto& [name, value] : members)
         lines.push_back(json_string(name) + ": " + value);
     return between("{}", lines, indent);
@@ -58,6 +59,7 @@ std::string json_branch(const Json_Branch& branch, unsigned indent)
 std::string json_values(const std::vector<Named_Value>& values, unsigned indent)
 {
     std::vector<std::pair<std::string, std::string>> members;
+    members.reserve(values.size());
     for (const Named_Value& entry : values)
         members.emplace_back(entry.name, json_text(entry.value, indent + 2));
     return json_object(members, indent);

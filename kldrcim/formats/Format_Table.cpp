@@ -57,6 +57,7 @@ std::string row_of(const std::vector<std::string>& cells, const std::vector<std:
 std::string head_of(const std::vector<std::string>& headings, const std::vector<std::size_t>& widths)
 {
     std::vector<std::string> rule;
+    rule.reserve(widths.size());
     for (const std::size_t width : widths)
         rule.emplace_back(width, '-');
     return row_of(headings, widths) + row_of(rule, widths);
@@ -95,6 +96,7 @@ Instances_Table::Instances_Table(const std::vector<Instance_Value>& first,
     if (headings_.empty() || headings_.size() > most_columns)
         return;
     std::vector<std::vector<std::string>> rows;
+    rows.reserve(first.size());
     for (const Instance_Value& instance : first)
         rows.push_back(cells(instance));
     widths_ = widths_of(headings_, rows);

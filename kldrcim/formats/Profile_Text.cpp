@@ -83,6 +83,7 @@ std::string json_of(const Profile_Branch& branch, unsigned indent)
 std::string profile_text(const std::vector<Profile_Branch>& roots, bool ascii)
 {
     std::vector<Text_Branch> lines;
+    lines.reserve(roots.size());
     for (const Profile_Branch& root : roots)
         lines.push_back(lines_of(root, nullptr));
     return branch_text(lines, ascii);
@@ -92,6 +93,7 @@ std::string profile_json(const std::vector<Profile_Branch>& roots)
 {
     const bool one = roots.size() == 1;
     std::vector<std::string> objects;
+    objects.reserve(roots.size());
     for (const Profile_Branch& root : roots)
         objects.push_back(json_of(root, one ? 0 : 2));
     return (one ? objects.front() : json_array(objects)) + "\n";

@@ -140,6 +140,7 @@ std::string units_text(const std::vector<Logical_Unit>& units)
 std::string units_json(const std::vector<Logical_Unit>& units)
 {
     std::vector<std::string> elements;
+    elements.reserve(units.size());
     for (const Logical_Unit& unit : units)
         elements.push_back(unit_json(unit));
     std::vector<std::pair<std::string, std::string>> members = {{"units", json_array(elements, 2)},

@@ -10,10 +10,11 @@ Class_Words::Class_Words(std::string_view class_name, Words words)
 {
     if (words == Words::LEFT_OUT)
         return;
-    const auto found = std::ranges::equal_range(
-        mapped_features(), lower_name(class_name), {},
-        [](const Mapped_Feature& each) { return std::string_view(each.class_name); });
-    features_ = {found.begin(), found.end()};
+    const std::string name = lower_name(class_name);
+    const auto class_of = [](const Mapped_Feature& each) { return std::string_view(each.class_name); };
+    // Not equal_range: clang 14 knows no range of two iterators.
+    features_ = {std::ranges::lower_bound(mapped_features(), name, {}, class_of),
+                 std::ranges::upper_bound(mapped_features(), name, {}, class_of)};
 }
 
 std::span<const Value_Meaning> Class_Words::of(std::string_view feature) const

@@ -6,12 +6,12 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <fstream>
 #include <json/json.h>
 #include <memory>
 #include <sstream>
 #include <stdexcept>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -233,7 +233,7 @@ bool read_server_instances(const std::string& file, const Class_Catalogue& catal
     std::ifstream stream(file, std::ios::binary);
     std::ostringstream text;
     if (!stream || (!(text << stream.rdbuf()) && stream.bad())) {
-        error = file + ": cannot be read: " + std::strerror(errno);
+        error = file + ": cannot be read: " + std::generic_category().message(errno);
         return false;
     }
     try {

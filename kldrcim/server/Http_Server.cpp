@@ -6,9 +6,9 @@
 #include <arpa/inet.h>
 #include <cerrno>
 #include <charconv>
-#include <cstring>
 #include <microhttpd.h>
 #include <netinet/in.h>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -173,8 +173,9 @@ bool Http_Server::listen(std::string& error)
         MHD_OPTION_NOTIFY_CONNECTION, Callbacks::connection, this, MHD_OPTION_NOTIFY_COMPLETED,
         Callbacks::completed, nullptr, MHD_OPTION_ARRAY, more.data(), MHD_OPTION_END);
     if (!daemon_) {
-        error = "cannot listen on " + options_.address + ":" + std::to_string(options_.port) + ": " +
-                (errno != 0 ? std::strerror(errno) : "the certificate or key cannot be used");
+        error =
+            "cannot listen on " + options_.address + ":" + std::to_string(options_.port) + ": " +
+            (errno != 0 ? std::generic_category().message(errno) : "the certificate or key cannot be used");
         return false;
     }
     port_ = MHD_get_daemon_info(daemon_, MHD_DAEMON_INFO_BIND_PORT)->port;

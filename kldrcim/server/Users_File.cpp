@@ -6,6 +6,7 @@
 #include <fstream>
 #include <memory>
 #include <sys/stat.h>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -14,7 +15,7 @@ bool Users_File::read(const std::string& file, std::string& error)
     struct stat status;
     std::ifstream in(file);
     if (!in || stat(file.c_str(), &status) != 0) {
-        error = file + ": " + std::strerror(errno);
+        error = file + ": " + std::generic_category().message(errno);
         return false;
     }
     if ((status.st_mode & (S_IROTH | S_IWOTH | S_IWGRP)) != 0) {

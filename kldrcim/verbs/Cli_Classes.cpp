@@ -50,6 +50,7 @@ std::vector<Class_Row> class_rows(const std::string& pattern, Connection& connec
 std::string json_strings(const std::vector<std::string>& texts)
 {
     std::vector<std::string> elements;
+    elements.reserve(texts.size());
     for (const std::string& text : texts)
         elements.push_back(json_string(text));
     return json_array(elements, 4);
@@ -65,12 +66,14 @@ int list_classes(const Cli_Options& options, Connection& connection)
         class_rows(options.arguments.empty() ? "*" : options.arguments[0], connection);
     if (options.format != Cli_Options::Format::JSON) {
         std::vector<std::vector<std::string>> rows;
+        rows.reserve(classes.size());
         for (const Class_Row& row : classes)
             rows.push_back({row.name, row.superclass, joined(row.kinds), joined(row.keys)});
         put(rows_as_table({"Class", "Superclass", "Provider", "Keys"}, rows));
         return 0;
     }
     std::vector<std::string> elements;
+    elements.reserve(classes.size());
     for (const Class_Row& row : classes)
         elements.push_back(json_object({{"class", json_string(row.name)},
                                         {"superclass", json_string(row.superclass)},

@@ -6,7 +6,7 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/walks/Topology_Plan.h"
 
-#include <cstring>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -22,7 +22,8 @@ int run_metrics(const Cli_Options& options, Connection& connection)
     if (options.output.empty())
         put(text);
     else if (const int error = write_whole_file(options.output, text))
-        return complain("cannot write " + options.output + ": " + std::strerror(error), FAILURE);
+        return complain("cannot write " + options.output + ": " + std::generic_category().message(error),
+                        FAILURE);
     return 0;
 }
 

@@ -56,7 +56,7 @@ String IndicationHelper::set_catalogue_texts(KALDERA_AlertIndication& alert, sin
     Array<String> actions;
     actions.append(getEventActionById(key));
     alert.RecommendedActions.set(actions);
-    const String message_id = getMessageIDById(key);
+    String message_id = getMessageIDById(key);
     alert.MessageID.set(message_id);
     LOG(INFO, "Message ID = %s", message_id.c_str());
     return message_id;

@@ -88,7 +88,7 @@ int Thread::_create(Thread& thread, Function function, void* argument, bool deta
         delete parent;
         return status;
     }
-    record.release();
+    static_cast<void>(record.release()); // the new thread's
     memcpy(thread._opaque, &handle, sizeof(handle));
     return 0;
 }

@@ -147,7 +147,7 @@ private:
     void _set(const T& x)
     {
         // Copied first: it may lie in what is released.
-        const T hold(x);
+        const T hold(x); // NOLINT(performance-unnecessary-copy-initialization)
         _release();
         new (_bytes) T(hold);
         _become(static_cast<Type>(Type_Code<T>::value));

@@ -17,7 +17,7 @@ struct Small_Number
 /// Most numbers are small: their texts need no writing.
 constexpr std::array<Small_Number, 128> _uint_strings = [] {
     std::array<Small_Number, 128> table = {};
-    for (uint8 x = 0; x < table.size(); x++) {
+    for (size_t x = 0; x < table.size(); x++) {
         Small_Number& row = table[x];
         if (x >= 100)
             row.text[row.size++] = static_cast<char>('0' + x / 100);

@@ -33,7 +33,7 @@ String from_tftp(const String& rest)
         throw Install_Failure{"malformed tftp URI"};
     const String host = rest.substr(0, slash);
     // Remote and local name are the same text.
-    const String file = rest.substr(slash + 1, NPOS);
+    String file = rest.substr(slash + 1, NPOS);
     if (file.empty())
         throw Install_Failure{"malformed tftp URI"};
     if (ProviderUtil::TftpGetFile(host.c_str(), file.c_str()) != 0)

@@ -91,6 +91,10 @@ if(KLDR_SANITIZE MATCHES "undefined")
   list(APPEND KLDR_TEST_OPTIONS -fno-sanitize=undefined)
 endif()
 
+# They go first in a build folder that has not seen yet how long its tests take: begun last, one of them would end alone.
+set(KLDR_LONG_TESTS module_test faults_test bad_answers_test bad_answers_alone_test allocation_failures_test missing_symbols_test
+    module_diagnostics_test broker_test alerts_test simulator_test)
+
 # kldr_test(<name> SOURCES ... LIBS ... [ENV K=V ...] [DEPENDS target ...]): a GoogleTest program, run by CTest in its build
 # folder, among no processes but its own.
 function(kldr_test name)
@@ -109,6 +113,9 @@ function(kldr_test name)
     list(APPEND ARG_ENV "LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0")
   endif()
   set_tests_properties(${name} PROPERTIES TIMEOUT 900 ENVIRONMENT "${ARG_ENV}")
+  if(name IN_LIST KLDR_LONG_TESTS)
+    set_tests_properties(${name} PROPERTIES COST 10)
+  endif()
 endfunction()
 
 # GoogleTest comes as source, so that it is built for the word size and the sanitizer in hand. Without its package there are no
