@@ -145,9 +145,9 @@ int flash(const Cli_Options& options, Connection& connection)
     if (!options.yes && isatty(STDIN_FILENO) && !is_wanted(update))
         return complain(update.adapter + ": not updated", FAILURE);
     flush_output();
-    // An image that an adapter has in part may be its end.
-    complain(update.adapter + ": updating; SIGINT, SIGTERM and SIGHUP wait for the end of it", 0);
+    // An image that an adapter has in part may be its end. Who reads the promise may count on it.
     const Signals_Held_Back held_back;
+    complain(update.adapter + ": updating; SIGINT, SIGTERM and SIGHUP wait for the end of it", 0);
     const Value install_options =
         Value::array(CMPI_uint16, {Value::unsigned_number(CMPI_uint16, option_update)});
     const Result answer = connection.invoke_method(services.paths.front(), "InstallFromURI",

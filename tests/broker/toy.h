@@ -2,6 +2,7 @@
 
 #include "contracts/cmpi/cmpimacs.h"
 
+#include <atomic>
 #include <string>
 
 /// A provider library for the tests of the host, as a stranger would write one: it knows CMPI and nothing of
@@ -14,8 +15,19 @@ inline CMPIStatus failed(CMPIrc rc)
     return {rc, nullptr};
 }
 
-/// Set by the factory.
-extern const CMPIBroker* broker;
+/// The broker that the factories were given, each anew, while other threads use it.
+class Broker_Slot
+{
+public:
+    void operator=(const CMPIBroker* broker) { broker_ = broker; }
+    operator const CMPIBroker*() const { return broker_; }
+    const CMPIBroker* operator->() const { return broker_; }
+
+private:
+    std::atomic<const CMPIBroker*> broker_ = nullptr;
+};
+
+extern Broker_Slot broker;
 
 /// What the method entry was called with.
 struct Call

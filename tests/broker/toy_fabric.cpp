@@ -9,7 +9,7 @@
 
 namespace toy {
 
-const CMPIBroker* broker;
+Broker_Slot broker;
 
 namespace {
 

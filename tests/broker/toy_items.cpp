@@ -5,7 +5,7 @@
 
 namespace toy {
 
-const CMPIBroker* broker;
+Broker_Slot broker;
 
 namespace {
 

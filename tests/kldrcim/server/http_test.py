@@ -21,6 +21,8 @@ from serving import (
     value_parameter,
 )
 
+#: Sanitizers have memory of their own, of which nothing is promised.
+SANITIZED = bool(os.environ.get("KLDR_SANITIZE"))
 NAMES = intrinsic("EnumerateInstanceNames", class_parameter("ClassName", "CIM_FCPort"))
 FCPORT = class_parameter("ClassName", "CIM_FCPort")
 
@@ -176,7 +178,8 @@ class Requests(Serving_Case):
         many = "<VALUE.ARRAY>" + "<VALUE/>" * 500000 + "</VALUE.ARRAY>"
         body = intrinsic("EnumerateInstances", FCPORT + f'<IPARAMVALUE NAME="PropertyList">{many}</IPARAMVALUE>')
         self.assertEqual(self.status(body)[0], 200)
-        self.assertLess(self.served.resident("VmHWM") - before, 10 * len(body))
+        if not SANITIZED:
+            self.assertLess(self.served.resident("VmHWM") - before, 10 * len(body))
 
 
 class Slowness(Serving_Case):
@@ -276,7 +279,7 @@ class Streams(Serving_Case):
         self.assertIn(b"Transfer-Encoding: chunked", answer[:500])
         self.assertEqual(answer.count(b"<VALUE.NAMEDINSTANCE>"), 100000)
         self.assertTrue(answer.rstrip().endswith(b"</CIM>\n\r\n0"), answer[-100:])
-        if "LSAN_OPTIONS" not in os.environ:
+        if not SANITIZED:
             self.assertLess(self.served.resident("VmHWM") - before, 10 << 20)
 
     def test_client_that_leaves(self):
