@@ -27,6 +27,20 @@ std::string json_string(const std::string& text)
     return Json::valueToQuotedString(text.c_str());
 }
 
+std::string json_line(const std::string& text)
+{
+    std::string line;
+    bool is_indent = false;
+    for (const char c : text) {
+        is_indent = c == '\n' || (is_indent && c == ' ');
+        if (!is_indent)
+            line += c;
+        else if (c == '\n' && line.ends_with(','))
+            line += ' ';
+    }
+    return line + "\n";
+}
+
 std::string json_array(const std::vector<std::string>& elements, unsigned indent)
 {
     return between("[]", elements, indent);

@@ -20,6 +20,9 @@ std::string json_words(std::span<const Value_Meaning> meanings, const Value& val
 
 std::string json_string(const std::string& text);
 
+/// A composed text on one line, with its end: no text inside holds a line break.
+std::string json_line(const std::string& text);
+
 /// Composed texts between brackets, one a line; "[]" or "{}" if there are none.
 std::string json_array(const std::vector<std::string>& elements, unsigned indent = 0);
 std::string json_object(const std::vector<std::pair<std::string, std::string>>& members, unsigned indent = 0);

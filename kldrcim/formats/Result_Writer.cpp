@@ -5,6 +5,8 @@
 #include "kldrcim/formats/Format_Table.h"
 #include "kldrcim/formats/Output.h"
 
+#include <optional>
+
 namespace KPRV::kldrcim {
 
 namespace {
@@ -47,6 +49,27 @@ public:
         put(path_text(path) + "\n");
         return true;
     }
+};
+
+class Json_Lines_Writer final : public Result_Writer
+{
+public:
+    explicit Json_Lines_Writer(Words words) : words_(words) {}
+
+    bool instance(Instance_Value&& instance) override
+    {
+        put(json_line(json_instance(instance, 0, words_)));
+        return true;
+    }
+    bool path(Path_Value&& path) override
+    {
+        put(json_string(path_text(path)) + "\n");
+        return true;
+    }
+    void end(bool) override {}
+
+private:
+    const Words words_;
 };
 
 class Mof_Writer final : public Line_Writer
@@ -114,6 +137,11 @@ private:
 std::unique_ptr<Result_Writer> json_writer(Words words)
 {
     return std::make_unique<Json_Writer>(words);
+}
+
+std::unique_ptr<Result_Writer> json_lines_writer(Words words)
+{
+    return std::make_unique<Json_Lines_Writer>(words);
 }
 
 std::unique_ptr<Result_Writer> mof_writer()

@@ -20,6 +20,9 @@ public:
 /// A JSON array: of instances as objects, of paths as texts.
 std::unique_ptr<Result_Writer> json_writer(Words words);
 
+/// One object or text a line.
+std::unique_ptr<Result_Writer> json_lines_writer(Words words);
+
 /// One `instance of` behind the other; of paths a line each.
 std::unique_ptr<Result_Writer> mof_writer();
 

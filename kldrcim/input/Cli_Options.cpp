@@ -24,6 +24,7 @@ std::vector<std::string> split_list(const std::string& text)
 constexpr std::pair<const char*, Cli_Options::Format> formats[] = {
     {"table", Cli_Options::Format::TABLE},
     {"json", Cli_Options::Format::JSON},
+    {"jsonl", Cli_Options::Format::JSONL},
     {"mof", Cli_Options::Format::MOF},
     {"plugin", Cli_Options::Format::PLUGIN},
     {"prometheus", Cli_Options::Format::PROMETHEUS},
@@ -91,6 +92,17 @@ bool add_ignored(Cli_Options& options, const std::string& value)
     return !value.empty();
 }
 
+bool add_condition(Cli_Options& options, const std::string& value)
+{
+    return split_where_clause(value, options.conditions.emplace_back());
+}
+
+bool set_sort(Cli_Options& options, const std::string& value)
+{
+    options.sort = value;
+    return !value.empty() && value != "-";
+}
+
 /// A number above 0.
 template <unsigned Cli_Options::*Member>
 bool set_number(Cli_Options& options, const std::string& value)
@@ -131,9 +143,9 @@ using Options = Cli_Options;
 // clang-format off
 constexpr Cli_Option option_table[] = {
 //   name            value             set                                  flag                     takes                     common
-    {"--format",     "table|json|mof|plugin|prometheus|openmetrics", set_format, nullptr,
-     "table, json, mof, plugin, prometheus or openmetrics", true,
-     "how results are written (default: the first that a verb has, mostly table)"},
+    {"--format",     "table|json|jsonl|mof|plugin|prometheus|openmetrics", set_format, nullptr,
+     "table, json, jsonl, mof, plugin, prometheus or openmetrics", true,
+     "how results are written (default: the first that a verb has, mostly table); jsonl is JSON with one result a line"},
     {"--properties", "A,B,C",          set_properties,                      nullptr,                 nullptr,                  true,
      "ask for these properties only"},
     {"--namespace",  "NS",             set_text<&Options::name_space>,      nullptr,                 nullptr,                  true,
@@ -167,6 +179,13 @@ constexpr Cli_Option option_table[] = {
      "only results that stand in this role"},
     {"--filter",     "NS",             add_filter,                          nullptr,                 "a namespace",            false,
      "a filter in this namespace, instead of --namespace; may be given several times"},
+    {"--where",      "NAME=VALUE",     add_condition,                       nullptr,                 "NAME=VALUE, NAME!=VALUE or NAME~PATTERN", false,
+     "only results whose property is VALUE, by number, text or word, is not (NAME!=VALUE), or matches PATTERN, in which * and ? "
+     "match as in file names (NAME~PATTERN); of an array any element; may be given several times, and all must hold"},
+    {"--sort",       "[-]NAME",        set_sort,                            nullptr,                 "the name of a property, or a minus sign and a name", false,
+     "in the order of this property; with a minus sign before it the greatest first"},
+    {"--count",      nullptr,          nullptr,                             &Options::total,         nullptr,                  false,
+     "how many results there are, and nothing else"},
     {"--count",      "N",              set_number<&Options::count>,         nullptr,                 "a number above 0",       false,
      "end after N indications"},
     {"--software",   nullptr,          nullptr,                             &Options::software,      nullptr,                  false,

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "broker/values/Request.h"
+#include "kldrcim/input/Where_Clause.h"
 
 #include <span>
 
@@ -15,6 +16,8 @@ struct Cli_Options
     {
         TABLE,
         JSON,
+        /// One object a line.
+        JSONL,
         MOF,
         /// The one line of a monitoring plugin.
         PLUGIN,
@@ -75,6 +78,13 @@ struct Cli_Options
     /// rpc: the whole text of a call, or "-" for standard input.
     std::optional<std::string> raw;
     bool list_methods = false;
+    /// All must hold of a result.
+    std::vector<Where_Clause> conditions;
+    /// The property to sort by, with a minus sign before it for the greatest first; empty for the order in
+    /// which results come.
+    std::string sort;
+    /// How many results there are, and nothing else.
+    bool total = false;
     /// Numbers alone, without what they mean.
     bool numbers = false;
     /// Follow the job of a test that was started.

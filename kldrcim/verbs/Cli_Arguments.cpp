@@ -5,6 +5,7 @@
 #include "kldrcim/verbs/Cli_Help.h"
 #include "kldrcim/verbs/Cli_Rpc.h"
 #include "kldrcim/verbs/Cli_Verbs.h"
+#include "kldrcim/verbs/Result_Filter.h"
 
 #include <algorithm>
 
@@ -44,7 +45,8 @@ const Cli_Verb* verb_among(const std::vector<std::string>& arguments)
         const Cli_Option* const option = find_option(arguments[i], nullptr);
         if (!option || i + 1 == arguments.size())
             continue;
-        if (depends_on_verb(arguments[i]) ? !find_verb(arguments[i + 1]) : !option->flag)
+        if (depends_on_verb(arguments[i]) ? !is_option(arguments[i + 1]) && !find_verb(arguments[i + 1])
+                                          : !option->flag)
             ++i;
     }
     return nullptr;
@@ -111,7 +113,7 @@ bool check_arguments(const Cli_Options& options, const Cli_Verb& verb, std::stri
     if (options.arguments.size() < verb.least || options.arguments.size() > verb.most)
         error = usage_line(verb);
     return error.empty() && (options.verb != "rpc" || check_rpc(options, error)) &&
-           check_health_options(options, error);
+           check_health_options(options, error) && check_filter_options(options, error);
 }
 
 } // namespace

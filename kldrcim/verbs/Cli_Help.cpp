@@ -30,6 +30,7 @@ constexpr const char* exit_status =
 constexpr const char* examples = R"examples(
   kldrcim ei KALDERA_FCPort --properties DeviceID,PortType,Speed
   kldrcim ein KALDERA_FCPort
+  kldrcim ei KALDERA_FCPort --where 'OperationalStatus!=In Service'
   kldrcim ain "$(kldrcim ein KALDERA_ComputerSystem)" \
       --assoc KALDERA_PortControllerSystemDevice
   kldrcim tree --software

@@ -5,6 +5,7 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
 #include "kldrcim/verbs/Cli_Verbs.h"
+#include "kldrcim/verbs/Result_Filter.h"
 
 namespace KPRV::kldrcim {
 
@@ -25,18 +26,26 @@ public:
         request.operation = find_verb(options_.verb)->operation;
         if (!read_request(request))
             return complain(error_, USAGE_ERROR);
-        const auto writer = answers_with_many(request.operation) ? make_writer(options_) : nullptr;
-        const Result result = connection_.run(request, writer.get());
+        std::optional<Result_Filter> filter;
+        if (answers_with_many(request.operation))
+            filter.emplace(options_, make_writer(options_));
+        const Result result = connection_.run(request, filter ? &*filter : nullptr);
         // What came before a failure is worth reading; that it is not all is told behind it.
-        if (writer)
-            writer->end(result.ok());
+        if (filter)
+            filter->end(result.ok());
         if (!result.ok()) {
             flush_output();
             return complain(status_text(request, result), FAILURE);
         }
         write(request, result);
         warn_of(result.failures);
-        return 0;
+        const std::string missed = filter ? filter->missed_name(catalogue_) : "";
+        if (missed.empty())
+            return 0;
+        flush_output();
+        return complain("no result has a " + std::string(brings_names(request) ? "key" : "property") + " \"" +
+                            missed + "\"",
+                        USAGE_ERROR);
     }
 
 private:
@@ -47,11 +56,12 @@ private:
         if (!typed_path(catalogue_, argument(0), request.path, error_) ||
             (!request.path.name_space.empty() && !connection_.serves(request.path.name_space, error_)))
             return false;
-        request.properties = options_.properties;
+        request.properties = properties_for(options_);
         if (is_association_operation(request.operation))
             return read_filter(request);
-        if (request.properties &&
-            !check_properties(catalogue_, request.path.class_name, *request.properties, error_))
+        if ((request.properties &&
+             !check_properties(catalogue_, request.path.class_name, *request.properties, error_)) ||
+            !check_filter(options_, catalogue_, request.path.class_name, brings_names(request), error_))
             return false;
         switch (request.operation) {
         case Operation::CREATE_INSTANCE:
@@ -64,6 +74,13 @@ private:
         default:
             return true;
         }
+    }
+
+    static bool brings_names(const Request& request)
+    {
+        return request.operation == Operation::ENUMERATE_INSTANCE_NAMES ||
+               request.operation == Operation::ASSOCIATOR_NAMES ||
+               request.operation == Operation::REFERENCE_NAMES;
     }
 
     /// The instances that come back are of other classes than the path, so that property names stay

@@ -24,6 +24,8 @@ std::unique_ptr<Result_Writer> make_writer(const Cli_Options& options)
     switch (options.format) {
     case Format::JSON:
         return json_writer(words_of(options));
+    case Format::JSONL:
+        return json_lines_writer(words_of(options));
     case Format::MOF:
         return mof_writer();
     default:
@@ -38,6 +40,8 @@ void write_instance(const Cli_Options& options, const std::vector<Instance_Value
         return;
     if (options.format == Format::JSON)
         put(json_instance(instances.front(), 0, words_of(options)) + "\n");
+    else if (options.format == Format::JSONL)
+        put(json_line(json_instance(instances.front(), 0, words_of(options))));
     else if (options.format == Format::MOF)
         put(mof_instance(instances.front()));
     else

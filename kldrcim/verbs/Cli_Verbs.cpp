@@ -23,21 +23,24 @@ namespace {
 constexpr std::size_t any = ~std::size_t(0);
 
 constexpr const char* all_formats = "table json mof";
-constexpr const char* ends_options = "--assoc --role --result --result-role";
-constexpr const char* ends_with_words = "--assoc --role --result --result-role --raw";
-constexpr const char* links_options = "--assoc --role";
-constexpr const char* links_with_words = "--assoc --role --raw";
+constexpr const char* many_formats = "table json jsonl mof";
+constexpr const char* names_options = "--where --sort --count";
+constexpr const char* many_options = "--where --sort --count --raw";
+constexpr const char* ends_options = "--assoc --role --result --result-role --where --sort --count";
+constexpr const char* ends_with_words = "--assoc --role --result --result-role --where --sort --count --raw";
+constexpr const char* links_options = "--assoc --role --where --sort --count";
+constexpr const char* links_with_words = "--assoc --role --where --sort --count --raw";
 
 using Op = Operation;
 
 // clang-format off
 constexpr Cli_Verb verbs[] = {
 //   name        arguments                                          body             operation                    formats       options
-    {"ei",       1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCES,     all_formats,  "--raw",
+    {"ei",       1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCES,     many_formats,  many_options,
      "enumerate instances", nullptr},
-    {"ein",      1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCE_NAMES, all_formats, "",
+    {"ein",      1, 1,   "CLASS",                                   run_operation,   Op::ENUMERATE_INSTANCE_NAMES, many_formats, names_options,
      "enumerate instance names", nullptr},
-    {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            all_formats,  "--raw",
+    {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            many_formats,  "--raw",
      "get one instance", nullptr},
     {"ci",       2, any, "CLASS NAME=VALUE...",                     run_operation,   Op::CREATE_INSTANCE,         all_formats,  "",
      "create an instance", nullptr},
@@ -47,13 +50,13 @@ constexpr Cli_Verb verbs[] = {
      "delete an instance", nullptr},
     {"cm",       2, any, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "--raw",
      "call a method; PATH may name a class alone for a static one", nullptr},
-    {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             all_formats,  ends_with_words,
+    {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             many_formats,  ends_with_words,
      "instances associated with one (associators)", nullptr},
-    {"ain",      1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATOR_NAMES,        all_formats,  ends_options,
+    {"ain",      1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATOR_NAMES,        many_formats,  ends_options,
      "their names", nullptr},
-    {"ri",       1, 1,   "PATH",                                    run_operation,   Op::REFERENCES,              all_formats,  links_with_words,
+    {"ri",       1, 1,   "PATH",                                    run_operation,   Op::REFERENCES,              many_formats,  links_with_words,
      "associations that refer to an instance (references)", nullptr},
-    {"rin",      1, 1,   "PATH",                                    run_operation,   Op::REFERENCE_NAMES,         all_formats,  links_options,
+    {"rin",      1, 1,   "PATH",                                    run_operation,   Op::REFERENCE_NAMES,         many_formats,  links_options,
      "their names", nullptr},
     {"tree",     0, 0,   "",                                        draw_tree,       Op{},                        "table json", "--adapter --port --depth --luns --software --connectors --ascii --color",
      "the host with its adapters, ports, targets and logical units, as a tree", nullptr},
@@ -74,7 +77,7 @@ constexpr Cli_Verb verbs[] = {
      "the registered profiles and what conforms to each, as a tree", nullptr},
     {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",
      "what a client of the Storage HBA profile expects, beside what it finds", "1 something mandatory is missing."},
-    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        all_formats,  "--filter --count --raw",
+    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        many_formats,  "--filter --count= --raw",
      "subscribe to indications (default: KALDERA_AlertIndication) and write each as it comes, until interrupted", nullptr},
     {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        all_formats,  "--wait",
      "the hardware tests, and the ports and adapters that they can be run on\n"

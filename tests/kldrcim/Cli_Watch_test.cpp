@@ -30,6 +30,9 @@ TEST(Cli_Watch, WritesTheFormatsOfTheOtherVerbs)
     EXPECT_EQ("root/toy:TOY_Alert", parsed["path"].asString());
     const Outcome mof = kldrcim("watch TOY_Alert --count 1 --format mof");
     EXPECT_EQ(0u, mof.out.find("instance of TOY_Alert {\n    Text = \"smoke\";\n")) << mof.out;
+    EXPECT_EQ("{\"class\": \"TOY_Alert\", \"path\": \"root/toy:TOY_Alert\", \"properties\": {\"Text\": "
+              "\"smoke\"}}\n",
+              kldrcim("watch TOY_Alert --count 1 --format jsonl").out);
     const Outcome none = kldrcim("watch TOY_Alert --count 1 --properties Other");
     EXPECT_EQ("root/toy:TOY_Alert\n\n", none.out);
 }
@@ -57,8 +60,9 @@ TEST(Cli_Watch, KnowsItsOptions)
         EXPECT_EQ(0u, run.error.find("kldrcim: --count takes a number above 0, not \"")) << run.error;
     }
     EXPECT_EQ("kldrcim: --filter takes a namespace, not \"\"\n", kldrcim("watch --filter ''").error);
-    EXPECT_EQ("kldrcim: --count makes no sense for ei; it is for watch\n",
-              kldrcim("ei TOY_Item --count 1").error);
+    EXPECT_EQ("kldrcim: --count wants a value\n", kldrcim("watch --count").error);
+    EXPECT_EQ("kldrcim: --sort makes no sense for watch; it is for ei ein ai ain ri rin\n",
+              kldrcim("watch --sort Text").error);
     EXPECT_EQ("kldrcim: usage: kldrcim [options] watch [CLASS]\n", kldrcim("watch A B").error);
 }
 

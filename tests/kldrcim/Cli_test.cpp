@@ -145,7 +145,7 @@ TEST(Cli, OneClearLineForEachMistake)
         {"tree --color red", 2, "kldrcim: --color takes auto, always or never, not \"red\"\n"},
         {"ei", 2, "kldrcim: usage: kldrcim [options] ei CLASS\n"},
         {"ei TOY_Item --format xml", 2,
-         "kldrcim: --format takes table, json, mof, plugin, prometheus or openmetrics, not \"xml\"\n"},
+         "kldrcim: --format takes table, json, jsonl, mof, plugin, prometheus or openmetrics, not \"xml\"\n"},
         {"ei TOY_Item --nothing", 2, "kldrcim: no option \"--nothing\"; \"kldrcim --help\" lists them\n"},
         {"ei TOY_Item --user", 2, "kldrcim: --user wants a value\n"},
         {"cm TOY_Item Throws", 1,

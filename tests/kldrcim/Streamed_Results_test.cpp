@@ -12,7 +12,7 @@
 namespace KPRV::kldrcim {
 namespace {
 
-constexpr const char* formats[] = {"table", "json", "mof"};
+constexpr const char* formats[] = {"table", "json", "jsonl", "mof"};
 
 std::string many(unsigned count)
 {
