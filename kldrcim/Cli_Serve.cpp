@@ -16,7 +16,9 @@ int serve(const Cli_Options&, Host&)
 
 #else
 
+#include "kldrcim/formats/Metrics_Text.h"
 #include "kldrcim/formats/Output.h"
+#include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/server/Http_Server.h"
 #include "kldrcim/server/Subscriptions.h"
 #include "kldrcim/verbs/Interruption.h"
@@ -76,6 +78,20 @@ void tell_module(Host& host, Instance_Value manager)
     }
 }
 
+/// The host in numbers, for a collector.
+Http_Page metrics_page(Host& host, const std::string& accept)
+{
+    Local_Connection connection(host);
+    const Host_Readings readings = read_host(connection);
+    if (readings.host.system.properties.empty())
+        throw Http_Refusal{503, nullptr, "the module does not answer"};
+    const Metrics_Notation notation =
+        lower_name(accept).find("application/openmetrics-text") != std::string::npos
+            ? Metrics_Notation::OPENMETRICS
+            : Metrics_Notation::PROMETHEUS;
+    return {media_type(notation), metrics_text(readings, notation)};
+}
+
 } // namespace
 
 int serve(const Cli_Options& options, Host& host)
@@ -85,6 +101,7 @@ int serve(const Cli_Options& options, Host& host)
     std::string error;
     if (!read_options(options, http_options, users, error))
         return complain(error, USAGE_ERROR);
+    http_options.metrics = [&host](const std::string& accept) { return metrics_page(host, accept); };
     Interruption interruption;
     const std::string host_name = own_host_name();
     Broker_Space model(host);

@@ -17,6 +17,7 @@ constexpr unsigned most_headers = 100;
 constexpr std::size_t most_ignored = std::size_t(1) << 20;
 constexpr std::chrono::seconds failed_login_pause{1};
 constexpr unsigned idle_seconds = 30;
+constexpr const char* metrics_path = "/metrics";
 
 std::string percent_encoded(const std::string& text)
 {
@@ -95,7 +96,7 @@ const char* Http_Connection::header(const char* name) const
     return MHD_lookup_connection_value(connection_, MHD_HEADER_KIND, name);
 }
 
-void Http_Connection::check_request(const std::string& method) const
+void Http_Connection::check_client() const
 {
     Header_Size size;
     MHD_get_connection_values(connection_, MHD_HEADER_KIND, add_size, &size);
@@ -108,6 +109,16 @@ void Http_Connection::check_request(const std::string& method) const
     if (is_loopback(server_.options_.address) && !is_loopback(host) && !same_name(host, "localhost") &&
         !same_name(host, server_.server_.host_name()))
         throw Http_Refusal{403, nullptr, "the header Host names another host"};
+}
+
+bool Http_Connection::is_page(const Http_Line& line) const
+{
+    return server_.options_.metrics && line.path == metrics_path &&
+           (line.method == "GET" || line.method == "HEAD");
+}
+
+void Http_Connection::check_message(const std::string& method) const
+{
     if (method == "M-POST")
         throw Http_Refusal{501, nullptr, "POST alone is known"};
     if (method != "POST")
@@ -150,24 +161,28 @@ bool Http_Connection::authenticate()
     return accepted;
 }
 
-bool Http_Connection::begin(const std::string& method)
+bool Http_Connection::begin(const Http_Line& line)
 {
     server_.watch_->limit(peer_.socket, Connection_Watch::body);
+    const bool is_message = !is_page(line);
     try {
-        check_request(method);
+        check_client();
+        if (is_message)
+            check_message(line.method);
     } catch (const Http_Refusal& refusal) {
         return refuse(refusal);
     }
     if (!authenticate())
         return refuse({401, nullptr, ""});
-    reader_ = std::make_unique<Xml_Reader>(Xml_Limits{.bytes = server_.options_.body_bytes});
+    if (is_message)
+        reader_ = std::make_unique<Xml_Reader>(Xml_Limits{.bytes = server_.options_.body_bytes});
     return true;
 }
 
 bool Http_Connection::body(std::string_view piece)
 {
     body_size_ += piece.size();
-    if (!queued_ && reader_->fault() == Xml_Fault::NONE)
+    if (!queued_ && reader_ && reader_->fault() == Xml_Fault::NONE)
         reader_->feed(piece);
     else if (body_size_ > server_.options_.body_bytes + most_ignored)
         return false;
@@ -182,23 +197,42 @@ bool Http_Connection::finish()
     server_.watch_->release(peer_.socket);
     MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, 0U);
     try {
-        if (!reader_->finish())
-            throw Http_Refusal{reader_->fault() == Xml_Fault::TOO_LARGE ? 413U : 400U,
-                               reader_->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
-                                                                        : "request-not-well-formed",
-                               reader_->fault_text()};
-        call_ = read_call(reader_->document());
-        check_headers({.operation = header("CIMOperation"),
-                       .method = header("CIMMethod"),
-                       .object = header("CIMObject"),
-                       .protocol_version = header("CIMProtocolVersion")},
-                      call_);
-        answer(call_);
+        if (reader_)
+            answer_message();
+        else
+            answer_page();
     } catch (const Http_Refusal& refusal) {
         refuse(refusal);
     }
     MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, idle_seconds);
     return queued_;
+}
+
+void Http_Connection::answer_page()
+{
+    const char* const accept = header("Accept");
+    Http_Page page = server_.options_.metrics(accept ? accept : "");
+    MHD_Response* const response =
+        MHD_create_response_from_buffer(page.text.size(), page.text.data(), MHD_RESPMEM_MUST_COPY);
+    if (response)
+        MHD_add_response_header(response, "Content-Type", page.media_type.c_str());
+    queue(MHD_HTTP_OK, response);
+}
+
+void Http_Connection::answer_message()
+{
+    if (!reader_->finish())
+        throw Http_Refusal{reader_->fault() == Xml_Fault::TOO_LARGE ? 413U : 400U,
+                           reader_->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
+                                                                    : "request-not-well-formed",
+                           reader_->fault_text()};
+    call_ = read_call(reader_->document());
+    check_headers({.operation = header("CIMOperation"),
+                   .method = header("CIMMethod"),
+                   .object = header("CIMObject"),
+                   .protocol_version = header("CIMProtocolVersion")},
+                  call_);
+    answer(call_);
 }
 
 void Http_Connection::answer(const Cim_Call& call)
@@ -212,8 +246,8 @@ void Http_Connection::answer(const Cim_Call& call)
     if (!pipe_.wait())
         send(std::move(rest_));
     else
-        queue(MHD_HTTP_OK, MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece,
-                                                             Callbacks::read, this, nullptr));
+        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece, Callbacks::read,
+                                                        this, nullptr));
 }
 
 void Http_Connection::answer_in_pieces(const Cim_Call& call)
@@ -230,8 +264,8 @@ void Http_Connection::answer_in_pieces(const Cim_Call& call)
         pipe_.finish(broken);
     });
     if (pipe_.wait()) {
-        queue(MHD_HTTP_OK, MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece,
-                                                             Callbacks::read, this, nullptr));
+        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece, Callbacks::read,
+                                                        this, nullptr));
         return;
     }
     maker_.join();
@@ -244,19 +278,23 @@ bool Http_Connection::queue(unsigned status, MHD_Response* response)
 {
     if (!response)
         return false;
-    if (status == MHD_HTTP_OK) {
-        MHD_add_response_header(response, "Content-Type", "application/xml; charset=\"utf-8\"");
-        MHD_add_response_header(response, "CIMOperation", "MethodResponse");
-    }
     queued_ = MHD_queue_response(connection_, status, response) == MHD_YES;
     MHD_destroy_response(response);
     return queued_;
 }
 
+bool Http_Connection::queue_message(MHD_Response* response)
+{
+    if (response) {
+        MHD_add_response_header(response, "Content-Type", "application/xml; charset=\"utf-8\"");
+        MHD_add_response_header(response, "CIMOperation", "MethodResponse");
+    }
+    return queue(MHD_HTTP_OK, response);
+}
+
 bool Http_Connection::send(std::string body)
 {
-    return queue(MHD_HTTP_OK,
-                 MHD_create_response_from_buffer(body.size(), body.data(), MHD_RESPMEM_MUST_COPY));
+    return queue_message(MHD_create_response_from_buffer(body.size(), body.data(), MHD_RESPMEM_MUST_COPY));
 }
 
 bool Http_Connection::refuse(const Http_Refusal& refusal)

@@ -20,6 +20,14 @@ struct Http_Peer
     std::string user;
 };
 
+/// What a request begins with.
+struct Http_Line
+{
+    std::string method;
+    /// Without what follows a question mark.
+    std::string path;
+};
+
 /// One request on a connection: its headers, its body as it comes, and the answer. Lives until all of the
 /// answer has been sent.
 class Http_Connection
@@ -32,7 +40,7 @@ public:
     ~Http_Connection();
 
     /// After the headers. False to end the connection without a word.
-    bool begin(const std::string& method);
+    bool begin(const Http_Line& line);
     /// A piece of the body. False to end the connection.
     bool body(std::string_view piece);
     /// After the body.
@@ -43,20 +51,28 @@ private:
 
     /// Null for a field that there is not.
     const char* header(const char* name) const;
-    /// Throws `Http_Refusal` at a request that is not for us.
-    void check_request(const std::string& method) const;
+    /// Throws `Http_Refusal` at a client that has no business here.
+    void check_client() const;
+    /// Throws `Http_Refusal` at a request that is no message.
+    void check_message(const std::string& method) const;
+    bool is_page(const Http_Line& line) const;
     /// False if the answer says that a password is needed.
     bool authenticate();
+    void answer_page();
+    void answer_message();
     void answer(const Cim_Call& call);
     /// On a thread of its own, sent while it is being made.
     void answer_in_pieces(const Cim_Call& call);
     bool refuse(const Http_Refusal& refusal);
     bool queue(unsigned status, MHD_Response* response);
+    /// An answer to a message.
+    bool queue_message(MHD_Response* response);
     bool send(std::string body);
 
     Http_Server& server_;
     Http_Peer& peer_;
     MHD_Connection* connection_;
+    /// Null unless a message is expected.
     std::unique_ptr<Xml_Reader> reader_;
     std::size_t body_size_ = 0;
     bool queued_ = false;

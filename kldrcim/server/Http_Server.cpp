@@ -97,11 +97,12 @@ struct Http_Server::Callbacks
         *context = nullptr;
     }
 
-    static MHD_Result request(void* data, MHD_Connection* connection, const char*, const char* method,
+    static MHD_Result request(void* data, MHD_Connection* connection, const char* path, const char* method,
                               const char*, const char* upload, std::size_t* upload_size, void** request)
     {
         try {
-            return step(*static_cast<Http_Server*>(data), connection, method, upload, *upload_size, *request)
+            return step(*static_cast<Http_Server*>(data), connection, {method, path}, upload, *upload_size,
+                        *request)
                        ? (*upload_size = 0, MHD_YES)
                        : MHD_NO;
         } catch (const std::exception&) {
@@ -110,8 +111,8 @@ struct Http_Server::Callbacks
         }
     }
 
-    static bool step(Http_Server& server, MHD_Connection* connection, const char* method, const char* upload,
-                     std::size_t size, void*& request)
+    static bool step(Http_Server& server, MHD_Connection* connection, const Http_Line& line,
+                     const char* upload, std::size_t size, void*& request)
     {
         auto* current = static_cast<Http_Connection*>(request);
         if (current)
@@ -122,7 +123,7 @@ struct Http_Server::Callbacks
             return false;
         current = new Http_Connection(server, *static_cast<Http_Peer*>(info->socket_context), connection);
         request = current;
-        return current->begin(method);
+        return current->begin(line);
     }
 
     static void completed(void*, MHD_Connection*, void** request, MHD_RequestTerminationCode)

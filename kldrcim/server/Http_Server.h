@@ -4,6 +4,7 @@
 #include "kldrcim/server/Users_File.h"
 
 #include <atomic>
+#include <functional>
 
 struct MHD_Daemon;
 
@@ -11,6 +12,17 @@ namespace KPRV::kldrcim {
 
 class Http_Connection;
 class Connection_Watch;
+
+/// What a plain GET answers.
+struct Http_Page
+{
+    std::string media_type;
+    std::string text;
+};
+
+/// Makes a page anew, on the thread of the connection that asks; several may ask at once. `accept` is the
+/// field Accept, empty if there is none. Throws `Http_Refusal` if there is nothing to show.
+using Http_Page_Source = std::function<Http_Page(const std::string& accept)>;
 
 struct Http_Options
 {
@@ -22,6 +34,8 @@ struct Http_Options
     std::string key = {};
     /// Null: nobody is asked for a password.
     const Users_File* users = nullptr;
+    /// What GET /metrics answers; empty for nothing.
+    Http_Page_Source metrics = {};
 
     unsigned connections = 64;
     /// Of one other host.

@@ -1,14 +1,12 @@
 """What collectors make of `kldrcim metrics`: promtool, the node exporter and Prometheus itself, each of the real ones, on loopback
 and for a short time."""
 
-import http.server
 import json
 import os
 import re
 import socket
 import subprocess
 import tempfile
-import threading
 import time
 import unittest
 import urllib.error
@@ -21,7 +19,6 @@ from deploy_case import BUILD, ENVIRONMENT, SOURCE, output_of
 
 EXAMPLES = SOURCE / "deploy/monitoring"
 INVENTORIES = sorted((SOURCE / "simulator/inventories").glob("*.json"))
-OPENMETRICS = "application/openmetrics-text; version=1.0.0; charset=utf-8"
 SECONDS = 60
 
 
@@ -234,37 +231,20 @@ def running(*command, cwd):
             program.kill()
 
 
-class Once(http.server.BaseHTTPRequestHandler):
-    """Answers each scrape with a host read anew, as a server does that is asked for OpenMetrics."""
-
-    def do_GET(self):
-        wanted = "openmetrics" if "application/openmetrics-text" in self.headers.get("Accept", "") else "prometheus"
-        self.server.asked.add(wanted)
-        body = metrics("--format", wanted).encode()
-        self.send_response(200)
-        self.send_header("Content-Type", OPENMETRICS if wanted == "openmetrics" else "text/plain; version=0.0.4")
-        self.send_header("Content-Length", str(len(body)))
-        self.end_headers()
-        self.wfile.write(body)
-
-    def log_message(self, *arguments):
-        pass
-
-
 class Collected(unittest.TestCase):
-    """One Prometheus that scrapes a host by itself and another through the files of a node exporter."""
+    """One Prometheus that scrapes `kldrcim serve`, openly and by TLS with a password, and another host through the files of a
+    node exporter."""
 
     @classmethod
     def setUpClass(cls):
         folder = tempfile.TemporaryDirectory()
         cls.addClassCleanup(folder.cleanup)
         cls.folder = Path(folder.name)
-        cls.web = http.server.ThreadingHTTPServer(("127.0.0.1", 0), Once)
-        cls.web.asked = set()
-        threading.Thread(target=cls.web.serve_forever, daemon=True).start()
-        cls.addClassCleanup(cls.web.server_close)
-        cls.addClassCleanup(cls.web.shutdown)
-
+        cls.make_guard()
+        serve, guarded = free_port(), free_port()
+        cls.start(BUILD / "kldrcim", "serve", "--listen", f"127.0.0.1:{serve}")
+        cls.start(BUILD / "kldrcim", "serve", "--listen", f"127.0.0.1:{guarded}",
+                  "--tls-cert", "cert.pem", "--tls-key", "key.pem", "--users", "users")
         files = cls.folder / "files"
         files.mkdir()
         metrics("--output", files / "kldr.prom", inventory=SOURCE / "simulator/inventories/rich.json")
@@ -275,12 +255,25 @@ class Collected(unittest.TestCase):
             "global": {"scrape_interval": "2s", "scrape_timeout": "2s", "evaluation_interval": "1s"},
             "rule_files": [str(EXAMPLES / "kldr_alerts.yml")],
             "scrape_configs": [
-                {"job_name": "serve", "static_configs": [{"targets": [f"127.0.0.1:{cls.web.server_port}"]}]},
+                {"job_name": "serve", "static_configs": [{"targets": [f"127.0.0.1:{serve}"]}]},
+                {"job_name": "guarded", "scheme": "https", "tls_config": {"ca_file": "cert.pem"},
+                 "basic_auth": {"username": "prometheus", "password_file": "password"},
+                 "static_configs": [{"targets": [f"127.0.0.1:{guarded}"]}]},
                 {"job_name": "files", "static_configs": [{"targets": [f"127.0.0.1:{exporter}"]}]},
             ],
         }), encoding="utf-8")
         cls.start("prometheus", "--config.file=prometheus.yml", f"--storage.tsdb.path={cls.folder / 'data'}",
                   f"--web.listen-address=127.0.0.1:{cls.port}")
+
+    @classmethod
+    def make_guard(cls):
+        """Certificate, password and users."""
+        key = ("-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:P-256", "-nodes", "-keyout", "key.pem", "-out", "cert.pem")
+        output_of("openssl", "req", "-x509", *key, "-subj", "/CN=host", "-addext", "subjectAltName=IP:127.0.0.1", cwd=cls.folder)
+        (cls.folder / "password").write_text("secret", encoding="ascii")
+        done = output_of("openssl", "passwd", "-6", "secret")
+        (cls.folder / "users").write_text(f"prometheus:{done}", encoding="ascii")
+        (cls.folder / "users").chmod(0o600)
 
     @classmethod
     def start(cls, *command):
@@ -315,11 +308,14 @@ class Collected(unittest.TestCase):
         )
         self.assertEqual(self.query('sum(kldr_target_logical_units{job="serve"})'), {(): "8"})
         self.assertEqual(self.query('kldr_module_info{job="serve"}'), {(("version", "3.2.3.0"),): "1"})
-        # Prometheus prefers it, and understands that a counter is one.
-        self.assertEqual(self.web.asked, {"openmetrics"})
-        kinds = self.ask("targets/metadata", metric="kldr_port_crc_errors_total")
-        self.assertIn("counter", {each["type"] for each in kinds} | {each["type"] for each in self.ask("targets/metadata", metric="kldr_port_crc_errors")})
         self.query('up{job="serve"} == 1')
+        # Prometheus prefers OpenMetrics, where a counter is announced without what its samples end in.
+        kinds = {(each["target"]["job"], each["type"]) for each in self.ask("targets/metadata", metric="kldr_port_crc_errors")}
+        self.assertIn(("serve", "counter"), kinds)
+
+    def test_a_scrape_by_tls_with_a_password(self):
+        self.query('up{job="guarded"} == 1')
+        self.assertEqual(self.query('sum(kldr_target_logical_units{job="guarded"})'), {(): "8"})
 
     def test_a_file_comes_through_the_node_exporter(self):
         self.assertEqual(self.query('node_textfile_scrape_error{job="files"}'), {(): "0"})

@@ -1,9 +1,7 @@
 """CIM operations over HTTP: what a message and its headers may be, and what is refused."""
 
-import base64
 import http.client
 import os
-import subprocess
 import tempfile
 import time
 import unittest
@@ -12,6 +10,7 @@ from serving import (
     PATIENCE,
     Served,
     Serving_Case,
+    basic,
     class_parameter,
     error_code,
     intrinsic,
@@ -19,6 +18,7 @@ from serving import (
     read_all,
     request,
     value_parameter,
+    write_users,
 )
 
 #: Sanitizers have memory of their own, of which nothing is promised.
@@ -214,12 +214,7 @@ class Passwords(unittest.TestCase):
     def setUp(self):
         self.folder = tempfile.TemporaryDirectory()
         self.users = os.path.join(self.folder.name, "users")
-        done = subprocess.run(
-            ["/usr/bin/openssl", "passwd", "-6", "-stdin"], input="pä:ss\n", capture_output=True, text=True, check=True
-        )
-        with open(self.users, "w", encoding="utf-8") as file:
-            file.write(f"# who may\nänne:{done.stdout}")
-        os.chmod(self.users, 0o600)
+        write_users(self.users, "änne", "pä:ss")
 
     def tearDown(self):
         self.folder.cleanup()
@@ -228,8 +223,7 @@ class Passwords(unittest.TestCase):
         served = Served("--users", self.users)
 
         def status(user, password):
-            text = base64.b64encode(f"{user}:{password}".encode()).decode()
-            return served.post(NAMES, Authorization=f"Basic {text}")[0]
+            return served.post(NAMES, Authorization=basic(user, password))[0]
 
         code, fields, _ = served.post(NAMES)
         self.assertEqual(code, 401)

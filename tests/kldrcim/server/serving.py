@@ -1,10 +1,12 @@
 """What the tests of `kldrcim serve` share: the program on a port of its own, and requests as bytes."""
 
+import base64
 import http.client
 import os
 import re
 import signal
 import socket
+import ssl
 import subprocess
 import tempfile
 import unittest
@@ -37,10 +39,11 @@ class Served:
             text=True,
         )
         line = self.process.stdout.readline()
-        found = re.search(r"(https?)://127\.0\.0\.1:(\d+)", line)
+        found = re.search(r"(https?)://[0-9.]+:(\d+)", line)
         if not found:
             self.stop()
             raise AssertionError(f"not serving: {line!r} {self.said!r}")
+        self.is_tls = found[1] == "https"
         self.port = int(found[2])
         self.url = found[0]
 
@@ -70,23 +73,45 @@ class Served:
             connection.sendall(data)
             return read_all(connection)
 
-    def post(self, body, **headers):
-        """Status, header fields and body of the answer to a message."""
-        connection = http.client.HTTPConnection("127.0.0.1", self.port, timeout=PATIENCE)
-        fields = {"Content-Type": 'application/xml; charset="utf-8"'}
-        fields |= {name.replace("_", "-"): value for name, value in headers.items()}
+    def ask(self, method, path, body=None, tls=None, **headers):
+        """Status, header fields and body of the answer; `tls` says who is trusted, by default nobody is asked who it is."""
+        if self.is_tls:
+            tls = tls or ssl._create_unverified_context()
+            connection = http.client.HTTPSConnection("127.0.0.1", self.port, timeout=PATIENCE, context=tls)
+        else:
+            connection = http.client.HTTPConnection("127.0.0.1", self.port, timeout=PATIENCE)
         try:
-            connection.request("POST", "/cimom", body.encode() if isinstance(body, str) else body, fields)
+            connection.request(method, path, body, {name.replace("_", "-"): value for name, value in headers.items()})
             answer = connection.getresponse()
             return answer.status, answer.headers, answer.read().decode()
         finally:
             connection.close()
+
+    def post(self, body, tls=None, **headers):
+        """The answer to a message."""
+        fields = {"Content_Type": 'application/xml; charset="utf-8"'} | headers
+        return self.ask("POST", "/cimom", body.encode() if isinstance(body, str) else body, tls, **fields)
 
     def call(self, operation, parameters="", namespace=None):
         """The body of the answer to an operation."""
         status, _, body = self.post(intrinsic(operation, parameters, namespace or self.namespace))
         assert status == 200, (status, body)
         return body
+
+
+def write_users(file, user, password):
+    """A file for --users."""
+    done = subprocess.run(
+        ["/usr/bin/openssl", "passwd", "-6", "-stdin"], input=f"{password}\n", capture_output=True, text=True, check=True
+    )
+    with open(file, "w", encoding="utf-8") as users:
+        users.write(f"# who may\n{user}:{done.stdout}")
+    os.chmod(file, 0o600)
+
+
+def basic(user, password):
+    """The header field Authorization."""
+    return "Basic " + base64.b64encode(f"{user}:{password}".encode()).decode()
 
 
 def read_all(connection):
