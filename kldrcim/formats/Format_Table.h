@@ -1,6 +1,6 @@
 #pragma once
 
-#include "kldrcim/formats/Value_Words.h"
+#include "kldrcim/words/Value_Words.h"
 
 namespace KPRV::kldrcim {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "broker/values/Receiver.h"
-#include "kldrcim/formats/Value_Words.h"
+#include "kldrcim/words/Value_Words.h"
 
 #include <memory>
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "broker/values/Class_Catalogue.h"
-#include "kldrcim/formats/Value_Words.h"
 #include "kldrcim/input/Where_Clause.h"
+#include "kldrcim/words/Value_Words.h"
 
 namespace KPRV::kldrcim {
 

@@ -2,8 +2,8 @@
 
 #include "kldrcim/wire/Instance_Reading.h"
 #include "kldrcim/wire/Qualifiers.h"
-#include "kldrcim/wire/Value_Maps.h"
 #include "kldrcim/wire/Wire_Text.h"
+#include "kldrcim/words/Value_Words.h"
 
 #include <algorithm>
 
@@ -91,13 +91,23 @@ private:
             if (property.key)
                 write_qualifier(writer_, "Key");
             write_embedded_class(property);
-            if (const Value_Map* map = find_value_map(origin, property.name)) {
-                write_qualifier(writer_, "ValueMap", map->numbers);
-                write_qualifier(writer_, "Values", map->words);
-            }
+            write_words(property.name);
         }
         write_value(writer_, property.default_value);
         writer_.close(latest_);
+    }
+
+    void write_words(const std::string& feature)
+    {
+        std::vector<std::string> numbers, words;
+        for (const Value_Meaning& meaning : words_.of(feature)) {
+            numbers.push_back(value_map_text(meaning));
+            words.push_back(meaning.word);
+        }
+        if (words.empty())
+            return;
+        write_qualifier(writer_, "ValueMap", numbers);
+        write_qualifier(writer_, "Values", words);
     }
 
     std::string origin_of_method(const std::string& name) const
@@ -117,6 +127,8 @@ private:
         write_origin(origin_of_method(method.name));
         if (form_.qualifiers && method.is_static)
             write_qualifier(writer_, "Static");
+        if (form_.qualifiers)
+            write_words(method.name);
         for (const Feature_Info& parameter : method.parameters) {
             open(parameter, Tag::PARAMETER, Tag::PARAMETER_ARRAY, Tag::PARAMETER_REFERENCE,
                  Tag::PARAMETER_REFARRAY);
@@ -140,6 +152,7 @@ private:
     const Class_Info& info_;
     const Class_Form& form_;
     const Class_Info* superclass_;
+    const Class_Words words_{info_.name};
     Tag latest_ = Tag::PROPERTY;
 };
 

@@ -1,4 +1,4 @@
-#include "kldrcim/formats/Value_Words.h"
+#include "kldrcim/words/Value_Words.h"
 
 #include <gtest/gtest.h>
 
@@ -20,6 +20,16 @@ TEST(Value_Words, NumbersRangesAndTheRest)
     const auto type = Class_Words("KALDERA_FCPort").of("PortType");
     EXPECT_STREQ("Vendor Reserved", word_of(type, number(16000)));
     EXPECT_EQ("15999", worded_text(type, number(15999)));
+}
+
+TEST(Value_Words, TheirNumbersAsTheQualifierHasThem)
+{
+    EXPECT_EQ("11", value_map_text({11, 11, ""}));
+    EXPECT_EQ("0", value_map_text({0, 0, ""}));
+    EXPECT_EQ("13..32767", value_map_text({13, 32767, ""}));
+    EXPECT_EQ("32768..", value_map_text({32768, 4294967295U, ""}));
+    EXPECT_EQ("..9", value_map_text({0, 9, ""}));
+    EXPECT_EQ("..", value_map_text({0, 4294967295U, ""}));
 }
 
 TEST(Value_Words, TheNearestClassIsTheOneThatCounts)

@@ -27,4 +27,4 @@ def emit(classes, maps, output):
     body.append("static constexpr Mapped_Feature features[] = {")
     body += [f'    {{"{class_name}", "{feature}", {symbol}}},' for class_name, feature, symbol in sorted(rows)]
     body += ["};", "std::span<const Mapped_Feature> mapped_features()", "{", "    return features;", "}", "} // namespace kldrcim"]
-    output.add("kldrcim/value_map_table.cpp", cpp.namespaced(["kldrcim/formats/Value_Words.h"], body))
+    output.add("kldrcim/value_map_table.cpp", cpp.namespaced(["kldrcim/words/Value_Words.h"], body))

@@ -3,6 +3,7 @@
 #include "broker/values/Value.h"
 
 #include <span>
+#include <string>
 
 namespace KPRV::kldrcim {
 
@@ -22,6 +23,9 @@ struct Value_Meaning
     std::uint32_t most;
     const char* word;
 };
+
+/// As the qualifier `ValueMap` has it: "11", "13..32767", "32768..", ".." for all that is left.
+std::string value_map_text(const Value_Meaning& meaning);
 
 /// A property, or a method for what it returns, in a class that has it. Names in lower case.
 struct Mapped_Feature

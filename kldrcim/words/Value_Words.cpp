@@ -1,10 +1,21 @@
-#include "kldrcim/formats/Value_Words.h"
+#include "kldrcim/words/Value_Words.h"
 
 #include "broker/values/Value_Text.h"
 
 #include <algorithm>
+#include <limits>
 
 namespace KPRV::kldrcim {
+
+std::string value_map_text(const Value_Meaning& meaning)
+{
+    if (meaning.least == meaning.most)
+        return std::to_string(meaning.least);
+    const bool has_least = meaning.least != 0,
+               has_most = meaning.most != std::numeric_limits<std::uint32_t>::max();
+    return (has_least ? std::to_string(meaning.least) : "") + ".." +
+           (has_most ? std::to_string(meaning.most) : "");
+}
 
 Class_Words::Class_Words(std::string_view class_name, Words words)
 {
