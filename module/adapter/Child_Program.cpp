@@ -10,10 +10,17 @@
 #include <string>
 #include <vector>
 
-// A server may ignore SIGCHLD, or wait for every child that it has: the status of a child of its own would be
-// lost. So the program is the child of a process in between, which waits for it and tells the status through
-// a pipe. In both processes stand only calls that are safe where other threads of the server held locks at
-// the fork.
+// How it works. A server may ignore SIGCHLD, or wait for every child that it has: the status of a child of
+// its own would be lost. So the program is the child of a process in between, which waits for it and tells
+// the status through a pipe; the server reads there until the status or the end of the pipe comes. Only then
+// does it wait for the process in between, and whether somebody else has done so before makes no difference.
+//
+// Other threads of the server may hold locks at the fork, those of the heap too. So all that allocates is
+// done before: the search path is cut into places, and the arguments stand ready. What follows in both
+// processes is safe after a fork: signals are blocked on the way there, so that no handler of the server runs
+// in a process that is not the server; dispositions and mask go back to a process's first ones, descriptors
+// but three are closed, and the places are tried one after the other. A program that is nowhere ends as a
+// shell would have it.
 
 namespace KPRV {
 

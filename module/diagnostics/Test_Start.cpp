@@ -1,4 +1,15 @@
 // Of `DiagnosticHelper`, the checks before a run, its job, and the start of its thread.
+//
+// How it works. A client's call is over at once: it gets the name of a job, and the test goes on without it.
+// The call looks whether a job is running, at the element's address and at the test's name, in that order,
+// and each refusal has its code. Then the input of the run is made ready, a job enters the helper's one place
+// for it, and a thread begins. Nobody joins that thread, and nothing stops it: the module is pinned, so that
+// its code stays when a server closes it, and its input outlives it.
+//
+// The thread (`Test_Runners.cpp`) takes the element out of service if it was in, lets the library test, and
+// puts it back; what it does and finds becomes records, which clients read meanwhile. It closes its job
+// before it writes the result: who sees the job ended may find that record a moment later. Whatever ends the
+// thread early closes the job as well, or no test would ever start again.
 #include "module/diagnostics/DiagnosticHelper.h"
 
 #include "module/adapter/Json_Access.h"
