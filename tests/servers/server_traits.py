@@ -45,9 +45,11 @@ class Traits:
     #: The module is registered for alerts in the interop name space too. The server matches what is delivered in one name space
     #: with the filters of all, so that filters in two of them bring each alert twice.
     alerts_in_interop: bool = False
-    #: Each delivered alert is handed to a thread of the server, and on a busy machine one overtakes another. The module numbers
-    #: them before, so that a client can tell.
-    alerts_overtake: bool = False
+    #: Each delivered alert is handed to a thread of the server, and on a busy machine one overtakes others, as many as this at the
+    #: most. The module numbers them before, so that a client can tell.
+    alerts_overtake: int = 0
+    #: The server puts a number of its own in place of the module's.
+    numbers_alerts: bool = False
     #: Properties of an alert, in lower case, that the server fills where the module leaves them null.
     fills_in_alerts: set = field(default_factory=set)
 
@@ -66,10 +68,12 @@ TRAITS = {
         removed_superclasses={"CIM_LogEntry"},
         void_is_a_list=True,
         alerts_in_interop=True,
+        alerts_overtake=16,
+        numbers_alerts=True,
         fills_in_alerts={"indicationfiltername", "sequencecontext"},
         own_in_interop={"KALDERA_ObjectManager", "KALDERA_Namespace", "KALDERA_CIMXMLCommunicationMechanism"},
     ),
-    "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_", thread_pool=80, alerts_overtake=True),
+    "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_", thread_pool=80, alerts_overtake=16),
 }
 
 
