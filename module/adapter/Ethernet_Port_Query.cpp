@@ -22,7 +22,7 @@ int query_ethernet_port(Call_Site site, const String& mac, Json::Value& out)
     if (ProviderUtil::isValidJsonResponse(out) && hasMember(out, "ethData") &&
         isObjectOrNull(member(out, "ethData")))
         return 0;
-    log(Log_Level::ERR, site.file, site.line, "Ethernet Port Info is NOT available");
+    LOG_LINE(ERR, site.file, site.line, "Ethernet Port Info is NOT available");
     return -1;
 }
 

@@ -104,22 +104,22 @@ CMPIStatus CMPI_Adapter::cleanup(CMPI_Adapter* adapter, const CMPIContext*, bool
 
 void CMPI_Adapter::ent(const char* file, uint32 line, const char* function)
 {
-    log(Log_Level::DBG, file, line, "enter: %s()", function);
+    LOG_LINE(DBG, file, line, "enter: %s()", function);
 }
 
 void CMPI_Adapter::ret(const char* file, uint32 line, const char* function)
 {
-    log(Log_Level::DBG, file, line, "return: %s()", function);
+    LOG_LINE(DBG, file, line, "return: %s()", function);
 }
 
 void CMPI_Adapter::ret(const char* file, uint32 line, const char* function, CMPIrc rc)
 {
-    log(Log_Level::DBG, file, line, "return: %s(): %s", function, _rc_to_str(rc));
+    LOG_LINE(DBG, file, line, "return: %s(): %s", function, _rc_to_str(rc));
 }
 
 void CMPI_Adapter::ret(const char* file, uint32 line, const char* function, CMPIrc rc, const char* text)
 {
-    log(Log_Level::DBG, file, line, "return: %s(): %s %s", function, _rc_to_str(rc), text);
+    LOG_LINE(DBG, file, line, "return: %s(): %s %s", function, _rc_to_str(rc), text);
 }
 
 void CMPI_Adapter::trc(const char* file, uint32 line, const char*, const char* format, ...)

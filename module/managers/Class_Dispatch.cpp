@@ -9,17 +9,17 @@ namespace KPRV {
 Array<Instance*> dispatch_class(Call_Site site, std::span<const Class_Row> rows, classId_t id,
                                 const Wanted& wanted)
 {
-    log(Log_Level::INFO, site.file, site.line, "Requested classId : %d", static_cast<int>(id));
-    log(Log_Level::INFO, site.file, site.line, "Requested class is: %s", ProviderUtil::getClassName(id));
+    LOG_LINE(INFO, site.file, site.line, "Requested classId : %d", static_cast<int>(id));
+    LOG_LINE(INFO, site.file, site.line, "Requested class is: %s", ProviderUtil::getClassName(id));
 
     const auto row = std::ranges::find(rows, id, &Class_Row::id);
     if (row == rows.end()) {
-        log(Log_Level::INFO, site.file, site.line, "Requested class is NOT supported.");
+        LOG_LINE(INFO, site.file, site.line, "Requested class is NOT supported.");
         return {};
     }
     if (row->needs == Needs::DRIVER && !ProviderUtil::getDriverStatus()) {
-        log(Log_Level::ERR, site.file, site.line,
-            "Driver is not installed or there is a zntl mismatch hence no instances returned");
+        LOG_LINE(ERR, site.file, site.line,
+                 "Driver is not installed or there is a zntl mismatch hence no instances returned");
         return {};
     }
     return row->source(id, wanted);

@@ -16,7 +16,7 @@ Array<Instance*> walk_adapters(Call_Site site, Visit visit)
         return {};
     const int count = static_cast<int>(list->size());
     if (count == 0)
-        log(Log_Level::WARN, site.file, site.line, "No adapters in the system. ");
+        LOG_LINE(WARN, site.file, site.line, "No adapters in the system. ");
     Fresh_Instances instances;
     for (int adapter_id = 1; adapter_id <= count; adapter_id++)
         visit(adapter_id, *list, instances);

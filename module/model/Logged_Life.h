@@ -15,10 +15,7 @@ public:
     Logged_Life& operator=(const Logged_Life&) = delete;
 
 private:
-    void tell(const char* what) const
-    {
-        log(Log_Level::DBG, _site.file, _site.line, "Inside %s %s", _name, what);
-    }
+    void tell(const char* what) const { LOG_LINE(DBG, _site.file, _site.line, "Inside %s %s", _name, what); }
 
     const char* _name;
     Call_Site _site;

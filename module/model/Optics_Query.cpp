@@ -18,7 +18,7 @@ int query_optics(Call_Site site, const String& address, const char* needed, Json
         return -1;
     if (ProviderUtil::isValidJsonResponse(out) && (!needed || hasMember(out, needed)))
         return 0;
-    log(Log_Level::ERR, site.file, site.line, "Unable to get SFP info for %s", address.c_str());
+    LOG_LINE(ERR, site.file, site.line, "Unable to get SFP info for %s", address.c_str());
     return -1;
 }
 

@@ -26,7 +26,7 @@ struct Message
         say();
         return status;
     }
-    void trace(const char* words) const { log(Log_Level::DBG, site.file, site.line, "%s", words); }
+    void trace(const char* words) const { LOG_LINE(DBG, site.file, site.line, "%s", words); }
 };
 
 #define SAYING(level, text) (::KPRV::Message{LOG_HERE, ::KPRV::Log_Level::level, text})

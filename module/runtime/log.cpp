@@ -37,9 +37,7 @@ constinit std::atomic<bool> _log_enabled_state = true;
 static constinit Standard_Mutex<> _mutex;
 static bool _initialized GUARDED_BY(_mutex);
 static Log_Level _level GUARDED_BY(_mutex);
-/// What is above needs neither the mutex nor a look at the rest: the level while the log is open, otherwise
-/// the highest, since each line is then an attempt to open it.
-static constinit std::atomic<Log_Level> _threshold = Log_Level::DBG;
+constinit std::atomic<Log_Level> _log_threshold = Log_Level::DBG;
 static FILE* _log_file_handle GUARDED_BY(_mutex);
 static File_Lock* _lock GUARDED_BY(_mutex);
 
@@ -93,7 +91,7 @@ static void configure() REQUIRES(_mutex)
         _log_file_handle = open_messages(configuration.messages);
     if (_log_file_handle) {
         _initialized = true;
-        _threshold = _level;
+        _log_threshold = _level;
     } else {
         delete _lock;
         _lock = nullptr;
@@ -153,11 +151,6 @@ static void write_line(Log_Level level, const char* file, size_t line, const cha
     va_end(again);
 }
 
-bool log_uses(Log_Level level)
-{
-    return level <= _threshold.load(std::memory_order_relaxed);
-}
-
 void vlog(Log_Level level, const char* file, size_t line, const char* format, va_list arguments) noexcept
 {
     if (!log_uses(level))
@@ -215,7 +208,7 @@ int log_set_level(const char* name)
     const Auto_Log_Mutex guard;
     _level = level;
     if (_initialized)
-        _threshold = level;
+        _log_threshold = level;
     return 0;
 }
 
@@ -229,7 +222,7 @@ void close_log()
     fclose(_log_file_handle);
     _log_file_handle = nullptr;
     _initialized = false;
-    _threshold = Log_Level::DBG;
+    _log_threshold = Log_Level::DBG;
 }
 
 /// A server may load and unload the module many times in one process: the log must not keep a descriptor of

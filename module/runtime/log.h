@@ -33,9 +33,14 @@ int log_enable(bool flag);
 /// Read by call sites before they build a `Log_Call_Frame`.
 extern std::atomic<bool> _log_enabled_state;
 
-/// False if a line of that level would be dropped: for callers whose arguments are dear. An attempt to open
-/// the log counts as a use of the line.
-bool log_uses(Log_Level level);
+/// What is above is dropped: the configured level while the log is open, otherwise the highest, since each
+/// line is then an attempt to open it.
+extern std::atomic<Log_Level> _log_threshold;
+/// False if a line of that level would be dropped: then neither it nor its arguments need be made.
+inline bool log_uses(Log_Level level)
+{
+    return level <= _log_threshold.load(std::memory_order_relaxed);
+}
 /// Sets the level in memory only: the configuration file overrides it. -1 for an unknown name.
 int log_set_level(const char* name);
 int _validate_log_level(const char* name, Log_Level& level);
@@ -59,15 +64,23 @@ struct Call_Site
     uint32 line;
 };
 
+/// LOG_LINE(ERR, file, line, "format", ...): one line at the level, as one of that place. The arguments are
+/// made only if the line is used.
+#define LOG_LINE(level, file, line, ...)                                                                     \
+    do {                                                                                                     \
+        if (::KPRV::log_uses(::KPRV::Log_Level::level))                                                      \
+            ::KPRV::log(::KPRV::Log_Level::level, file, line, __VA_ARGS__);                                  \
+    } while (0)
+
 /// Trace of a function: "Entering: %s" now, "Returning: %s" at the end of the scope, both at DBG.
 class Log_Scope
 {
 public:
     explicit Log_Scope(const char* function, Call_Site site) : _function(function), _site(site)
     {
-        log(Log_Level::DBG, _site.file, _site.line, "Entering: %s", _function);
+        LOG_LINE(DBG, _site.file, _site.line, "Entering: %s", _function);
     }
-    ~Log_Scope() { log(Log_Level::DBG, _site.file, _site.line, "Returning: %s", _function); }
+    ~Log_Scope() { LOG_LINE(DBG, _site.file, _site.line, "Returning: %s", _function); }
     Log_Scope(const Log_Scope&) = delete;
     Log_Scope& operator=(const Log_Scope&) = delete;
 
@@ -78,8 +91,8 @@ private:
 
 } // namespace KPRV
 
-/// LOG(ERR, "format", ...): one line at the level, with the base name of this file and its line.
-#define LOG(level, ...) ::KPRV::log(::KPRV::Log_Level::level, __FILE_NAME__, __LINE__, __VA_ARGS__)
+/// LOG(ERR, "format", ...): the same with the base name of this file and its line.
+#define LOG(level, ...) LOG_LINE(level, __FILE_NAME__, __LINE__, __VA_ARGS__)
 
 #define LOG_HERE (::KPRV::Call_Site{__FILE_NAME__, __LINE__})
 
