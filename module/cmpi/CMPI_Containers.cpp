@@ -87,40 +87,44 @@ int CMPI_Container::_not_made(const char* name)
     return -1;
 }
 
+template <class Final>
+int CMPI_Container::_set_cell(Final& container, const Instance* instance, const Cell& cell)
+{
+    CMPIData data = {};
+    if (cell.kind == Cell_Kind::TEXT && !_gives_back) {
+        data.type = CMPI_string;
+        data.value.string = CMNewString(_broker, cell.in<String>(instance).c_str(), nullptr);
+        if (!data.value.string)
+            return _not_made(cell.feature->name);
+    } else if (cell.kind == Cell_Kind::PLAIN) {
+        data.type = cmpi_type_words[cell.type];
+        cell.copy_bytes(instance, &data.value);
+    } else if (cell.kind == Cell_Kind::ARRAY && !_gives_back) {
+        if (array_to_cmpi_data(_broker, instance, cell, data) != 0)
+            return _not_made(cell.feature->name);
+    } else if (cell.kind != Cell_Kind::REFERENCE || !_find_end(instance, cell, data)) {
+        return Container::set_cell(instance, cell);
+    }
+    return container._set(cell.feature->name, data);
+}
+
+bool CMPI_Container::_find_end(const Instance* instance, const Cell& cell, CMPIData& data) const
+{
+    if (!_ends)
+        return false;
+    data.type = CMPI_ref;
+    data.value.ref = _ends->find(cell.feature->name, cell.in<Instance*>(instance));
+    return data.value.ref;
+}
+
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
     CMPIData data = {};
-    // The short ways, which nearly all properties go. Nothing is made for a plain one; the widest has 64
-    // bits.
-    if (const void* const bytes = value.plain_bytes()) {
-        data.type = cmpi_type_words[value.type];
-        memcpy(&data.value, bytes, sizeof(uint64));
-        return _set(name, data);
-    }
-    if (const String* const text = value.peek<String>(); text && !_gives_back) {
-        data.type = CMPI_string;
-        data.value.string = CMNewString(_broker, text->c_str(), nullptr);
-        return data.value.string ? _set(name, data) : _not_made(name);
-    }
-    return _set_any(name, value, flags);
-}
-
-int CMPI_Container::_set_any(const char* name, const Value& value, uint32 flags)
-{
-    CMPIData data = {};
-    Instance* end = nullptr;
-    if (_ends && (flags & FLAG_REFERENCE) && value.get_value(end) == 0) {
-        if (CMPIObjectPath* const path = _ends->find(name, end)) {
-            data.type = CMPI_ref;
-            data.value.ref = path;
-            return _set(name, data);
-        }
-    }
     Made_Objects made;
     if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr,
                       _depth) != 0)
         return _not_made(name);
-    if (end && data.type == CMPI_ref)
+    if (Instance* end = nullptr; _ends && data.type == CMPI_ref && value.get_value(end) == 0)
         _ends->note(name, end, data.value.ref);
     return _set(name, data);
 }
@@ -145,6 +149,11 @@ const char* CMPIInstance_Container::peek_name(uint32 index, String&)
     }
 }
 
+int CMPIInstance_Container::set_cell(const Instance* instance, const Cell& cell)
+{
+    return _set_cell(*this, instance, cell);
+}
+
 CMPICount CMPIInstance_Container::_count()
 {
     return CMGetPropertyCount(_instance, nullptr);
@@ -157,10 +166,15 @@ CMPIData CMPIInstance_Container::_at(CMPICount index, CMPIString** name)
 
 int CMPIInstance_Container::_set(const char* name, const CMPIData& data)
 {
-    if (CMSetProperty(_instance, name, &data.value, data.type).rc == CMPI_RC_OK)
+    if (CMSetProperty(_instance, name, &data.value, data.type).rc == CMPI_RC_OK) [[likely]]
         return 0;
     LOG_CONVERSION(WARN, "CMSetProperty() failed: %s", name);
     return -1;
+}
+
+int CMPIObjectPath_Container::set_cell(const Instance* instance, const Cell& cell)
+{
+    return _set_cell(*this, instance, cell);
 }
 
 CMPICount CMPIObjectPath_Container::_count()
@@ -203,6 +217,11 @@ void CMPIObjectPath_Container::_relax(Value::Type type, Value& value)
         narrow<uint64>(type, value);
     else if (value.type == int(SINT64) && type == int(UINT32))
         narrow<sint64>(type, value);
+}
+
+int CMPIArgs_Container::set_cell(const Instance* instance, const Cell& cell)
+{
+    return _set_cell(*this, instance, cell);
 }
 
 CMPICount CMPIArgs_Container::_count()

@@ -18,7 +18,7 @@ public:
     const char* peek_name(uint32 index, String& hold) override;
     int get_value(uint32 index, Value::Type type, Value& value) override;
     int get_reference(uint32 index, const Meta_Reference* reference, Value::Type type, Value& value) override;
-    int set_value(const char* name, const Value& value, uint32 flags) override;
+    int set_value(const char* name, const Value& value, uint32 flags) final;
 
     /// From now on the objects that `set_value` makes are given back once they have been set, which copies
     /// them. For a thread that no request's end cleans up behind.
@@ -43,6 +43,13 @@ protected:
     /// Lets a value pass as one of another type where servers are known to send it so.
     virtual void _relax(Value::Type type, Value& value);
 
+    /// `set_cell` of the container, whose own type tells where its `_set` is. The short ways, which nearly
+    /// all properties go, are made here.
+    template <class Final>
+    int _set_cell(Final& container, const Instance* instance, const Cell& cell);
+    /// The path of a reference, if it is known.
+    bool _find_end(const Instance* instance, const Cell& cell, CMPIData& data) const;
+
     bool _in_bounds(uint32 index);
     /// -1, with a log line.
     static int _not_made(const char* name);
@@ -53,15 +60,13 @@ protected:
 private:
     /// `wanted`: what an instance must be of, if that is known.
     int _get(uint32 index, Value::Type type, const Meta_Class* wanted, Value& value);
-    /// Values that go the long way; apart, so that the others find a small function.
-    int _set_any(const char* name, const Value& value, uint32 flags);
 
     bool _gives_back = false;
     unsigned _depth = 0;
     Shared_Ends* _ends = nullptr;
 };
 
-class CMPIInstance_Container : public CMPI_Container
+class CMPIInstance_Container final : public CMPI_Container
 {
 public:
     CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker,
@@ -71,8 +76,10 @@ public:
     }
     /// The only reader that is guarded against a throwing server.
     const char* peek_name(uint32 index, String& hold) override;
+    int set_cell(const Instance* instance, const Cell& cell) override;
 
 protected:
+    friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;
     int _set(const char* name, const CMPIData& data) override;
@@ -81,7 +88,7 @@ private:
     const CMPIInstance* _instance;
 };
 
-class CMPIObjectPath_Container : public CMPI_Container
+class CMPIObjectPath_Container final : public CMPI_Container
 {
 public:
     CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker,
@@ -89,8 +96,10 @@ public:
         : CMPI_Container(repository, broker, name_space), _path(path)
     {
     }
+    int set_cell(const Instance* instance, const Cell& cell) override;
 
 protected:
+    friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;
     int _set(const char* name, const CMPIData& data) override;
@@ -101,7 +110,7 @@ private:
     const CMPIObjectPath* _path;
 };
 
-class CMPIArgs_Container : public CMPI_Container
+class CMPIArgs_Container final : public CMPI_Container
 {
 public:
     CMPIArgs_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
@@ -109,11 +118,13 @@ public:
         : CMPI_Container(repository, broker, name_space), _args(args)
     {
     }
+    int set_cell(const Instance* instance, const Cell& cell) override;
 
     /// Where a feature named exactly "return_value" goes, which is no argument. Type 0 until then.
     CMPIData return_value = {};
 
 protected:
+    friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;
     int _set(const char* name, const CMPIData& data) override;

@@ -72,9 +72,8 @@ static int scalar_to_data(const Maker& maker, const Value& value, CMPIType word,
 }
 
 template <class T>
-static int array_to_data(const Maker& maker, const Value& value, CMPIType element_word, CMPIData& data)
+static int array_to_data(const Maker& maker, const Array<T>& elements, CMPIType element_word, CMPIData& data)
 {
-    const Array<T>& elements = *value.peek<Array<T>>();
     CMPIArray* const array = new_array(maker, elements.size(), element_word, data);
     if (!array)
         return -1;
@@ -137,8 +136,18 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
     return visit_type(Type(scalar), [&](auto tag) {
         using T = typename decltype(tag)::type;
         return value.type & Value::ARRAY_BIT
-                   ? array_to_data<T>(maker, value, cmpi_type_words[tag.code], data)
+                   ? array_to_data(maker, *value.peek<Array<T>>(), cmpi_type_words[tag.code], data)
                    : scalar_to_data<T>(maker, value, cmpi_type_words[tag.code], data);
+    });
+}
+
+int array_to_cmpi_data(const CMPIBroker* broker, const Instance* instance, const Cell& cell, CMPIData& data)
+{
+    data = CMPIData();
+    return visit_type(cell.element_type(), [&](auto tag) {
+        using T = typename decltype(tag)::type;
+        return array_to_data(Maker{broker, nullptr}, cell.in<Array<T>>(instance), cmpi_type_words[tag.code],
+                             data);
     });
 }
 

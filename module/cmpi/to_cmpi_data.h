@@ -1,5 +1,6 @@
 #pragma once
 
+#include "module/runtime/Class_Plan.h"
 #include "module/runtime/Meta_Repository.h"
 #include "module/runtime/Value.h"
 
@@ -16,6 +17,10 @@ class Made_Objects;
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                   const Value& value, uint32 flags, CMPIData& data, Made_Objects* made = nullptr,
                   unsigned depth = 0);
+
+/// The same of a cell that holds an array of a CIM type and is not null, from where it stands. Nothing is
+/// noted.
+int array_to_cmpi_data(const CMPIBroker* broker, const Instance* instance, const Cell& cell, CMPIData& data);
 
 template <class T>
 struct to_cmpi_scalar;

@@ -73,6 +73,8 @@ const Class_Plan* make_plan(const Meta_Class* meta_class) REQUIRES(room_mutex)
         return nullptr;
     plan->owner = meta_class;
     plan->features = meta_class->meta_features;
+    plan->refers = std::ranges::any_of(
+        features_of(meta_class), [](const Meta_Feature* feature) { return feature->flags & FLAG_REFERENCE; });
     for (const Cells cells : {Cells::ALL, Cells::KEYS, Cells::HOLDERS}) {
         if (!fill_group(meta_class, cells, *plan))
             return nullptr;
@@ -143,6 +145,11 @@ bool belongs(const Cell& cell, Cells cells)
 
 const Class_Plan* plan_of(const Meta_Class* meta_class)
 {
+    // Mostly it stands in its place; that it has one, it owes to what is looked at below.
+    const Class_Plan* const first = places[place_of(meta_class)].load(std::memory_order_acquire);
+    if (first && first->owner == meta_class && first->features == meta_class->meta_features &&
+        atomic_get(meta_class->refs) == 0) [[likely]]
+        return first;
     // A record that is counted may go, and another may take its place. A method's ends before the repository.
     const bool lasts = meta_class->flags & FLAG_METHOD || meta_class->meta_repository;
     if (atomic_get(meta_class->refs) != 0 || !lasts)

@@ -7,6 +7,13 @@ namespace KPRV {
 
 Container::~Container() = default;
 
+int Container::set_cell(const Instance* instance, const Cell& cell)
+{
+    Lent_Value value;
+    value.show(instance, cell);
+    return set_value(cell.feature->name, *value, cell.feature->flags);
+}
+
 int Container::convert(const Instance* instance, uint32 mask)
 {
     if (!instance) {
@@ -14,26 +21,15 @@ int Container::convert(const Instance* instance, uint32 mask)
         return -1;
     }
     const Meta_Class* meta_class = instance->__meta_class;
-    Lent_Value value;
+    const bool keys = mask == FLAG_KEY;
     const auto put = [&](const Cell& cell) {
-        const Meta_Feature* const feature = cell.feature;
-        if (mask && !(feature->flags & mask))
+        if (!keys && mask && !(cell.feature->flags & mask))
             return;
-        value.show(instance, cell);
-        if (set_value(feature->name, *value, feature->flags) != 0)
-            LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
+        if (set_cell(instance, cell) != 0)
+            LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, cell.feature->name);
     };
-    // Most cells are null, and nulls never leave the instance.
-    visit_cells(meta_class, mask == FLAG_KEY ? Cells::KEYS : Cells::ALL, [&](const Cell& cell) INLINE {
-        // As `is_null`, but for a property it is one byte that is looked at.
-        if (cell.kind != Cell_Kind::REFERENCE) [[likely]] {
-            if (cell.null(instance)) [[likely]]
-                return;
-        } else if (cell.is_null(instance)) {
-            return;
-        }
-        put(cell);
-    });
+    // Nulls never leave the instance.
+    visit_values(instance, keys ? Cells::KEYS : Cells::ALL, put);
     return 0;
 }
 

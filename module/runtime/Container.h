@@ -1,5 +1,6 @@
 #pragma once
 
+#include "module/runtime/Class_Plan.h"
 #include "module/runtime/Value.h"
 
 namespace KPRV {
@@ -29,6 +30,9 @@ public:
     {
         return get_value(index, type, value);
     }
+
+    /// `set_value` of what the cell holds, which is not null; for containers that need no value to take it.
+    virtual int set_cell(const Instance* instance, const Cell& cell);
 
     /// Export: each feature with a flag of the mask (0: all) and a value goes to `set_value`. A feature that
     /// fails is logged and left out. -1 only for a null instance.

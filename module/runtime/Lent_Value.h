@@ -20,22 +20,8 @@ public:
     /// Shows another cell, which is not null.
     void show(const Instance* instance, const Cell& cell)
     {
-        const void* const bytes = &cell.in<char>(instance);
         memset(_value._bytes, 0, sizeof _value._bytes);
-        // A copy of a known size is one instruction.
-        switch (cell.size) {
-        case 1:
-            memcpy(_value._bytes, bytes, 1);
-            break;
-        case 2:
-            memcpy(_value._bytes, bytes, 2);
-            break;
-        case 4:
-            memcpy(_value._bytes, bytes, 4);
-            break;
-        default:
-            memcpy(_value._bytes, bytes, 8);
-        }
+        cell.copy_bytes(instance, _value._bytes);
         _value.type = static_cast<Value::Type>(cell.type);
     }
 

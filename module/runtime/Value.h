@@ -99,8 +99,6 @@ public:
 
     /// Loads this value from a cell. -1 for a method feature.
     int set(const Instance* instance, const Meta_Feature* feature);
-    /// Any scalar but a text or a datetime: its eight bytes, those behind it zero.
-    const void* plain_bytes() const { return type >= 0 && type < int(STRING) ? _bytes : nullptr; }
     /// Stores this value into a cell of the instance. -1, with a log line, when it does not fit. A cell that
     /// held an instance is not released: this is for cells that have just been nulled.
     int get(Instance* instance, const Meta_Feature* feature) const;
