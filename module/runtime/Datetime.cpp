@@ -18,11 +18,10 @@ namespace KPRV {
 
 static_assert(sizeof(time_t) == 8);
 
-namespace {
+// Two references that nobody gives back forbid to write to it.
+constinit Datetime_Rep Datetime::_zero = {2, 0, 0, 0};
 
-/// The one rep of every zero interval that was never written, so that a datetime cell costs nothing until it
-/// has a value. It is never counted, and its two references forbid to write to it.
-constinit Datetime_Rep zero_interval = {2, 0, 0, 0};
+namespace {
 
 Datetime_Rep* make(uint64 usec, sint32 offset, uint32 is_timestamp)
 {
@@ -31,14 +30,14 @@ Datetime_Rep* make(uint64 usec, sint32 offset, uint32 is_timestamp)
 
 Datetime_Rep* share(Datetime_Rep* rep)
 {
-    if (rep != &zero_interval)
+    if (rep != &Datetime::_zero)
         atomic_inc(rep->refs);
     return rep;
 }
 
 void release(Datetime_Rep* rep)
 {
-    if (rep != &zero_interval && atomic_release(rep->refs))
+    if (rep != &Datetime::_zero && atomic_release(rep->refs))
         delete rep;
 }
 
@@ -88,8 +87,6 @@ struct Split
 };
 
 } // namespace
-
-Datetime::Datetime() : _rep(&zero_interval) {}
 
 Datetime::Datetime(const Datetime& x) : _rep(share(x._rep)) {}
 

@@ -28,8 +28,12 @@ public:
     static constexpr uint64 HOUR = 60 * MIN;
     static constexpr uint64 DAY = 24 * HOUR;
 
+    /// The one rep of every zero interval that was never written, so that a datetime cell costs nothing until
+    /// it has a value. It is never counted.
+    static Datetime_Rep _zero;
+
     /// A zero interval.
-    Datetime();
+    Datetime() : _rep(&_zero) {}
     Datetime(const Datetime& x);
     /// From the 25-character CIM text. A text that does not parse leaves a zero timestamp, not a zero
     /// interval.

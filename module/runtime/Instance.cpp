@@ -44,13 +44,10 @@ __Array_Rep* default_array(Type type, const Meta_Value* value)
         });
 }
 
-/// Builds an empty cell.
+/// Builds an empty cell that is no text.
 void construct(Instance* instance, const Cell& cell)
 {
     switch (cell.kind) {
-    case Cell_Kind::TEXT:
-        new (&cell.in<String>(instance)) String();
-        break;
     case Cell_Kind::MOMENT:
         new (&cell.in<Datetime>(instance)) Datetime();
         break;
@@ -97,6 +94,12 @@ struct Default_Giver
     {
     }
 };
+
+/// True of what many cells hold and none releases; of most cells of an instance.
+bool is_shared_by_all(const void* held)
+{
+    return held == &String::_empty || is_of_empty_arrays(held) || held == &Datetime::_zero;
+}
 
 /// Releases what a cell holds that is no text.
 void release(Instance* instance, const Cell& cell)
@@ -145,7 +148,12 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
     instance->__refs = 1;
     instance->__meta_class = meta_class;
     new (&instance->__name_space) String();
-    visit_cells(meta_class, Cells::HOLDERS, [=](const Cell& cell) { construct(instance, cell); });
+    visit_cells(meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
+        if (cell.kind == Cell_Kind::TEXT)
+            new (&cell.in<String>(instance)) String();
+        else
+            construct(instance, cell);
+    });
     if (defaults) {
         for (const Meta_Feature* feature : features_of(meta_class))
             visit_feature(feature, Default_Giver{instance});
@@ -155,9 +163,11 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
 void __destruct(Instance* instance)
 {
     visit_cells(instance->__meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
+        if (is_shared_by_all(cell.handle(instance))) [[likely]]
+            return;
         if (cell.kind == Cell_Kind::TEXT)
             cell.in<String>(instance).~String();
-        else if (cell.kind != Cell_Kind::ARRAY || !is_empty_array(cell.in<__Array_Rep*>(instance)))
+        else
             release(instance, cell);
     });
     unref(instance->__meta_class);

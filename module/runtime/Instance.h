@@ -84,19 +84,23 @@ void __set_name_space_recursive(Instance* instance, const String& name_space, bo
 /// Creates missing scalar references, with defaults.
 void __create_refs(Instance* instance);
 
+template <class T>
+bool is_instance_of(const Instance* instance)
+{
+    const Meta_Class* const wanted = &T::static_meta_class;
+    return instance->__meta_class == wanted || is_subclass(wanted, instance->__meta_class);
+}
+
 /// Tested down-cast: null if the instance (which may be null) is not a T.
 template <class T>
 T* cast(Instance* instance)
 {
-    return instance && is_subclass(&T::static_meta_class, instance->__meta_class) ? static_cast<T*>(instance)
-                                                                                  : nullptr;
+    return instance && is_instance_of<T>(instance) ? static_cast<T*>(instance) : nullptr;
 }
 template <class T>
 const T* cast(const Instance* instance)
 {
-    return instance && is_subclass(&T::static_meta_class, instance->__meta_class)
-               ? static_cast<const T*>(instance)
-               : nullptr;
+    return instance && is_instance_of<T>(instance) ? static_cast<const T*>(instance) : nullptr;
 }
 
 /// Typed forms, for generated classes and for method records.

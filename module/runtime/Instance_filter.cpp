@@ -10,6 +10,13 @@ void __set_null_flags(Instance* instance, bool include_keys, bool include_non_ke
 {
     if (!include_keys && !include_non_keys)
         return;
+    if (include_keys && include_non_keys) {
+        visit_cells(instance->__meta_class, Cells::ALL, [=](const Cell& cell) INLINE {
+            if (cell.kind < Cell_Kind::REFERENCE)
+                cell.null(instance) = null_value;
+        });
+        return;
+    }
     visit_cells(instance->__meta_class, include_non_keys ? Cells::ALL : Cells::KEYS,
                 [=](const Cell& cell) INLINE {
                     if (cell.kind < Cell_Kind::REFERENCE && (include_keys || !is_key(cell.feature)))

@@ -18,6 +18,8 @@ void __visit(Instance* instance, void (*function)(Instance* instance, void* data
     if (!instance)
         return;
     function(instance, data);
+    if (const Class_Plan* const plan = plan_of(instance->__meta_class); plan && !plan->refers)
+        return;
     visit_cells(instance->__meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
         if (cell.kind == Cell_Kind::REFERENCE)
             __visit(cell.in<Instance*>(instance), function, data);

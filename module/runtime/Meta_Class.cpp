@@ -27,14 +27,14 @@ const Meta_Class* find_meta_class(const Meta_Class* meta_class, const char* name
 
 bool is_subclass(const Meta_Class* ancestor, const Meta_Class* descendant)
 {
-    // Other records of that name count as the root too: copies made at run time.
-    if (ancestor == &Instance::static_meta_class || name_eq(ancestor->name, Instance::static_meta_class.name))
-        return true;
     // Mostly the very record is found, for which no name need be compared.
     for (const Meta_Class* p = descendant; p; p = super_of(p)) {
         if (p == ancestor)
             return true;
     }
+    // Other records of that name count as the root too: copies made at run time.
+    if (ancestor == &Instance::static_meta_class || name_eq(ancestor->name, Instance::static_meta_class.name))
+        return true;
     for (const Meta_Class* p = descendant; p; p = super_of(p)) {
         if (name_eq(p->name, ancestor->name))
             return true;
