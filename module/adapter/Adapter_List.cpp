@@ -9,10 +9,12 @@ namespace KPRV {
 const Json::Value* query_adapter_list(Call_Site site, Json::Value& response)
 {
     response = libGetAllAdaptersIndexString(Json::Value());
-    if (ProviderUtil::isValidJsonResponse(response) && hasMember(response, "indexStrings") &&
-        isArrayOrNull(member(response, "indexStrings")))
-        return &member(response, "indexStrings");
-    log(Log_Level::ERR, site.file, site.line, "libGetAllAdaptersIndexString returns NULL.");
+    if (ProviderUtil::isValidJsonResponse(response)) {
+        const Json::Value* const list = find_member(response, "indexStrings");
+        if (list && isArrayOrNull(*list))
+            return list;
+    }
+    LOG_LINE(ERR, site.file, site.line, "libGetAllAdaptersIndexString returns NULL.");
     return nullptr;
 }
 

@@ -1,6 +1,7 @@
 #include "module/adapter/Json_Access.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <cstring>
 #include <limits>
 
@@ -74,9 +75,12 @@ std::string asString(const Json::Value& value)
     return std::string(asView(value));
 }
 
-Json::Value text_value(const Json::Value& value)
+void take_text(Json::Value& value, Json::Value& to)
 {
-    return value.isString() ? value : Json::Value(asString(value));
+    if (value.isString())
+        to.swap(value);
+    else
+        to = asString(value);
 }
 
 int asInt(const Json::Value& value)
@@ -105,25 +109,43 @@ bool asBool(const Json::Value& value)
     }
 }
 
-namespace {
-
-const Json::Value* find(const Json::Value& object, const char* name)
+const Json::Value* find_member(const Json::Value& object, const char* name)
 {
     return object.isObject() ? object.find(name, name + strlen(name)) : nullptr;
 }
 
-} // namespace
-
 bool hasMember(const Json::Value& object, const char* name)
 {
-    return find(object, name) != nullptr;
+    return find_member(object, name) != nullptr;
 }
 
 const Json::Value& member(const Json::Value& object, const char* name)
 {
-    const Json::Value* const found = find(object, name);
+    const Json::Value* const found = find_member(object, name);
     return found ? *found : Json::Value::nullSingleton();
 }
+
+namespace {
+
+/// Of two texts of one size. Names are short: to compare them here takes less than a call.
+[[gnu::always_inline]] inline bool is_same(const char* a, const char* b, size_t size)
+{
+    const auto same = [=]<class Part>(Part, size_t at) {
+        Part x, y;
+        memcpy(&x, a + at, sizeof x);
+        memcpy(&y, b + at, sizeof y);
+        return x == y;
+    };
+    // The last part may overlap the one before.
+    constexpr size_t LONG = sizeof(uint64_t), SHORT = sizeof(uint32_t);
+    if (size >= LONG && size <= 2 * LONG)
+        return same(uint64_t(), 0) && same(uint64_t(), size - LONG);
+    if (size >= SHORT && size < LONG)
+        return same(uint32_t(), 0) && same(uint32_t(), size - SHORT);
+    return memcmp(a, b, size) == 0;
+}
+
+} // namespace
 
 void find_members(const Json::Value& object, std::span<const std::string_view> names,
                   const Json::Value** found)
@@ -132,19 +154,20 @@ void find_members(const Json::Value& object, std::span<const std::string_view> n
     if (!object.isObject())
         return;
     // An object keeps its members in the same order. Counted, since comparing iterators is a call, too.
-    size_t place = 0;
+    const std::string_view* wanted = names.data();
+    const std::string_view* const end = wanted + names.size();
     auto member = object.begin();
-    for (auto count = object.size(); count > 0 && place < names.size(); --count, ++member) {
+    for (auto count = object.size(); count > 0 && wanted != end; --count, ++member) {
         const char* name_end = nullptr;
-        const char* const name_begin = member.memberName(&name_end);
-        const std::string_view name(name_begin, size_t(name_end - name_begin));
-        if (names[place] != name) {
-            while (place < names.size() && names[place] < name)
-                place++;
-            if (place == names.size() || names[place] != name)
+        const char* const name = member.memberName(&name_end);
+        const size_t size = size_t(name_end - name);
+        if (wanted->size() != size || !is_same(wanted->data(), name, size)) [[unlikely]] {
+            const std::string_view other(name, size);
+            wanted = std::find_if_not(wanted, end, [=](std::string_view each) { return each < other; });
+            if (wanted == end || *wanted != other)
                 continue;
         }
-        found[place++] = &*member;
+        found[wanted++ - names.data()] = &*member;
     }
 }
 

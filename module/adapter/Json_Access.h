@@ -7,6 +7,7 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace KPRV {
 
@@ -29,8 +30,8 @@ bool isObjectOrNull(const Json::Value& value);
 // and a number no string; a number that does not fit, and every other mismatch, throws `Not_Convertible`.
 
 std::string asString(const Json::Value& value);
-/// The same text as a value.
-Json::Value text_value(const Json::Value& value);
+/// The same text into `to`; what `value` holds then is no matter. A text is not copied.
+void take_text(Json::Value& value, Json::Value& to);
 /// The same text where it stands, as long as the value stands.
 std::string_view asView(const Json::Value& value);
 /// A fraction is cut off.
@@ -44,6 +45,12 @@ bool asBool(const Json::Value& value);
 bool hasMember(const Json::Value& object, const char* name);
 /// The member, or null if it is absent or the value is no object. Never adds a member.
 const Json::Value& member(const Json::Value& object, const char* name);
+/// The member, or a null pointer if it is absent or the value is no object.
+const Json::Value* find_member(const Json::Value& object, const char* name);
+inline Json::Value* find_member(Json::Value& object, const char* name)
+{
+    return const_cast<Json::Value*>(find_member(std::as_const(object), name));
+}
 /// Several members of one object in one pass over it, which is cheaper than to look each of them up. `names`
 /// are in ascending order of their bytes; a null pointer in `found` stands for an absent member.
 void find_members(const Json::Value& object, std::span<const std::string_view> names,

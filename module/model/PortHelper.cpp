@@ -104,25 +104,25 @@ void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& 
     if (!guarded_call(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, libGetFcPhyPortIndicesByAdapter, request,
                       answer))
         return;
-    const Json::Value& ports = member(answer, "indexStrings");
+    Json::Value* const ports = find_member(answer, "indexStrings");
     const char* failure = !ProviderUtil::isValidJsonResponse(answer) ? walk.words.bad_answer
-                          : !hasMember(answer, "indexStrings")       ? walk.words.no_list
-                          : !isArrayOrNull(ports)                    ? walk.words.no_array
+                          : !ports                                   ? walk.words.no_list
+                          : !isArrayOrNull(*ports)                   ? walk.words.no_array
                                                                      : nullptr;
     if (failure) {
         LOG(ERR, "%s", failure);
         return;
     }
-    LOG(DBG, "numOfPorts = %u", ports.size());
+    LOG(DBG, "numOfPorts = %u", ports->size());
     sint32 number = 0;
-    for (const Json::Value& address : ports)
+    // The requests take the addresses out of it.
+    for (Json::Value& address : *ports)
         walk_port(address, number++, walk, instances);
 }
 
-void PortHelper::walk_port(const Json::Value& address, sint32 number, Walk& walk,
-                           Fresh_Instances& instances) const
+void PortHelper::walk_port(Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const
 {
-    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, [&] { walk.address = text_value(address); }))
+    if (!guarded(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, [&] { take_text(address, walk.address); }))
         return;
     bool answered;
     const Json::Value answer =

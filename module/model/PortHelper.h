@@ -83,7 +83,7 @@ private:
     void walk_adapter(const String& index, Walk& walk, Fresh_Instances& instances) const;
     void walk_adapter_by_id(int adapter_id, const Json::Value& list, Walk& walk,
                             Fresh_Instances& instances) const;
-    void walk_port(const Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const;
+    void walk_port(Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const;
     void publish(classId_t id, const Wanted& wanted, const Json::Value& answer, _hbaPortInfo& port,
                  Fresh_Instances& instances) const;
     void publish_endpoints(const Wanted& wanted, _hbaPortInfo& port, Fresh_Instances& instances) const;

@@ -16,7 +16,7 @@ Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json
         _list = libGetAllRemotePorts(_request);
     });
     if (answered && !listed())
-        log(Log_Level::ERR, site.file, site.line, "libGetAllRemotePorts returns NULL.");
+        LOG_LINE(ERR, site.file, site.line, "libGetAllRemotePorts returns NULL.");
 }
 
 bool Remote_Ports::ask(Call_Site site, unsigned index, Json::Value& answer)
@@ -25,7 +25,9 @@ bool Remote_Ports::ask(Call_Site site, unsigned index, Json::Value& answer)
     _wwn.clear();
     if (!guarded(site, {"libGetAllRemotePorts"}, [&] { _wwn = asString(remote_wwn); }))
         return false;
-    _request["rPortWwn"] = remote_wwn;
+    if (!_asked)
+        _asked = &_request["rPortWwn"];
+    *_asked = remote_wwn;
     return guarded_call(site, {"libGetCompleteRemotePort"}, libGetCompleteRemotePort, _request, answer);
 }
 

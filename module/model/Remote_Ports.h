@@ -17,6 +17,9 @@ public:
     /// none.
     Remote_Ports(Call_Site site, const char* port_wwn);
 
+    Remote_Ports(const Remote_Ports&) = delete;
+    Remote_Ports& operator=(const Remote_Ports&) = delete;
+
     /// False if the library did not answer with a list.
     bool listed() const { return _list.isArray(); }
     unsigned size() const { return _list.size(); }
@@ -30,6 +33,7 @@ public:
 private:
     Json::Value _list;
     Json::Value _request;
+    Json::Value* _asked = nullptr; ///< The member of the request that changes, from the first question on.
     std::string _wwn;
 };
 

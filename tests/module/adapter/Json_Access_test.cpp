@@ -129,7 +129,13 @@ TEST(Json_Access, texts_where_they_stand)
     EXPECT_EQ(asView(json("null")), "");
     EXPECT_EQ(asView(json("true")), "true");
     EXPECT_THROW(asView(json("5")), Not_Convertible);
-    EXPECT_EQ(text_value(json("'x'")), Json::Value("x"));
-    EXPECT_EQ(text_value(json("null")), Json::Value(""));
-    EXPECT_THROW(text_value(json("[]")), Not_Convertible);
+    const auto taken = [](Json::Value value) {
+        Json::Value to("former");
+        take_text(value, to);
+        return to;
+    };
+    EXPECT_EQ(taken(json("'x'")), Json::Value("x"));
+    EXPECT_EQ(taken(json("null")), Json::Value(""));
+    EXPECT_EQ(taken(json("true")), Json::Value("true"));
+    EXPECT_THROW(taken(json("[]")), Not_Convertible);
 }
