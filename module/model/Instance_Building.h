@@ -28,10 +28,15 @@ T* create_null()
 }
 
 /// The same, if an instance with that text, given in parts, in its telling key is wanted; else null.
-template <class T, class... Parts>
-Ref<T> create_wanted(const Wanted& wanted, Property<String> T::*key, const Parts&... parts)
+template <class T>
+Ref<T> create_wanted(const Wanted& wanted, Property<String> T::*key, std::span<const std::string_view> parts)
 {
-    return Ref<T>(wanted.may_be(key, parts...) ? create_null<T>() : nullptr);
+    return Ref<T>(wanted.may_be(key, parts) ? create_null<T>() : nullptr);
+}
+template <class T>
+Ref<T> create_wanted(const Wanted& wanted, Property<String> T::*key, std::string_view text)
+{
+    return create_wanted(wanted, key, {&text, 1});
 }
 
 template <class T>

@@ -26,27 +26,27 @@ static_assert(std::ranges::is_sorted(lun_members));
 
 } // namespace
 
-bool fill_lun(const Json::Value& element, const char* remote_wwn, bool& no_description_seen, _hbaLunInfo& lun)
+bool fill_lun(const Json::Value& element, bool& no_description_seen, _hbaLunInfo& lun)
 {
     constexpr uint32 BY_PRODUCT = 0, UNKNOWN = 10;
+    constexpr size_t VENDOR_SIZE = 8, PRODUCT_SIZE = 16, TEXT_SIZE = 64;
     const Members<NUM_LUN_MEMBERS> members(element, lun_members);
     if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
         return false;
-    copy_text(lun.remoteWWN, remote_wwn);
     lun.number = asUInt(members[NUMBER]);
-    copy_text(lun.vendor, asView(members[VENDOR]));
-    copy_text(lun.productID, asView(members[PRODUCT_ID]));
+    lun.vendor = cut_text(members[VENDOR], VENDOR_SIZE);
+    lun.productID = cut_text(members[PRODUCT_ID], PRODUCT_SIZE);
     lun.idType = asUInt(members[ID_TYPE]);
 
     if (members.has(DESCRIPTION))
-        copy_text(lun.description, asView(members[DESCRIPTION]));
+        lun.description = cut_text(members[DESCRIPTION], TEXT_SIZE);
     else
         no_description_seen = true;
     // One LUN without a description puts all that follow in the same walk under these rules, those with a
     // description, too: the names of LUNs that clients already keep depend on it.
     if (no_description_seen) {
         if (members.has(PRODUCT_SERIAL_NUMBER))
-            copy_text(lun.serialNumber, asView(members[PRODUCT_SERIAL_NUMBER]));
+            lun.serialNumber = cut_text(members[PRODUCT_SERIAL_NUMBER], TEXT_SIZE);
         lun.idType = members.has(PRODUCT_SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
     }
     return true;

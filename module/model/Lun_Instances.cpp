@@ -49,36 +49,21 @@ const Name_Row* name_row(const _hbaLunInfo& lun)
     return row == std::end(name_rows) ? nullptr : row;
 }
 
-std::string_view trimmed(const char* text)
+std::string_view trimmed(std::string_view text)
 {
     return ProviderUtil::trimmed(text);
 }
 
-/// Texts one behind the other, in more room than the fields that name a LUN fill together.
-class Joined
-{
-public:
-    template <class... Parts>
-    explicit Joined(const Parts&... parts)
-    {
-        (add(parts), ...);
-    }
-    operator String() const { return to_String({_text, _size}); }
-
-private:
-    void add(std::string_view part) { _size += copy_cut(_text + _size, sizeof _text - _size, part); }
-
-    char _text[sizeof(_hbaPortInfo::portWWN) + sizeof(_hbaLunInfo)];
-    size_t _size = 0;
-};
-
 String name(Named_By source, const _hbaLunInfo& lun)
 {
     switch (source) {
-    case Named_By::PRODUCT:
-        return Joined(trimmed(lun.vendor), "+", trimmed(lun.productID), "+", trimmed(lun.serialNumber));
+    case Named_By::PRODUCT: {
+        const std::string_view parts[] = {trimmed(lun.vendor), "+", trimmed(lun.productID), "+",
+                                          trimmed(lun.serialNumber)};
+        return String::joined(parts);
+    }
     case Named_By::DESCRIPTION:
-        return lun.description;
+        return to_String(lun.description);
     case Named_By::NOTHING:
         break;
     }
@@ -110,16 +95,15 @@ Ref<T> create_lun(classId_t id, const Array<String>& identification, const _hbaP
                   const _hbaLunInfo& lun, const Wanted& wanted)
 {
     static const Lasting_Array<uint16> okay = {2};
+    if (!wanted.may_begin_with(&T::DeviceID, lun.path))
+        return Ref<T>();
     String element = element_name(lun.number);
-    const auto with_id = [&](auto use) {
-        return use(port.portWWN, "_", lun.remoteWWN, "_", trimmed(lun.vendor), "_", trimmed(lun.productID),
-                   "_", std::string_view(element.c_str(), element.size()));
-    };
-    Ref<T> instance =
-        with_id([&](const auto&... parts) { return create_wanted(wanted, &T::DeviceID, parts...); });
+    const std::string_view device_parts[] = {
+        lun.path, trimmed(lun.vendor), "_", trimmed(lun.productID), "_", {element.c_str(), element.size()}};
+    Ref<T> instance = create_wanted(wanted, &T::DeviceID, device_parts);
     if (!instance)
         return instance;
-    String device_id = with_id([](const auto&... parts) -> String { return Joined(parts...); });
+    String device_id = String::joined(device_parts);
     set_system_keys(*instance, id, port.systemName);
     if (wanted.whole()) {
         instance->ElementName.set(std::move(element));
@@ -179,7 +163,7 @@ KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& po
     if (disk && wanted.whole()) {
         const std::string_view device = trimmed(lun.deviceName);
         const bool by_device = !device.empty();
-        disk->Name.set(by_device ? to_String(device) : String(lun.description));
+        disk->Name.set(by_device ? to_String(device) : to_String(lun.description));
         disk->NameFormat.set(by_device ? 12 : 1);
         disk->NameNamespace.set(by_device ? 8 : 1);
     }

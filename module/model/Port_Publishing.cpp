@@ -31,7 +31,7 @@ void PortHelper::publish(classId_t id, const Wanted& wanted, const Json::Value& 
     case STORAGEEXTENT:
     case TAPEDRIVE:
     case LOGICALDISK:
-        instances.append(TargetHelper::getTargetHelperObject()->getTargetInstances(port, id, wanted));
+        TargetHelper::getTargetHelperObject()->getTargetInstances(port, id, wanted, instances);
         break;
     default:
         LOG(INFO, "Unhandled class support");

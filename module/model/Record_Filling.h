@@ -3,6 +3,7 @@
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/ProviderUtil.h"
 
+#include <cstring>
 #include <string_view>
 
 namespace KPRV {
@@ -28,6 +29,13 @@ inline std::string_view text_of(const Json::Value& value)
     return text.substr(0, text.find('\0'));
 }
 
+/// The same of its first `most` bytes.
+inline std::string_view cut_text(const Json::Value& value, size_t most)
+{
+    const std::string_view text = asView(value).substr(0, most);
+    return text.substr(0, text.find('\0'));
+}
+
 template <size_t N>
 void copy_member(char (&field)[N], const Json::Value& object, const char* name)
 {
@@ -50,13 +58,16 @@ void copy_trimmed(char (&field)[N], const Json::Value& object, const char* name)
 template <size_t N>
 void copy_flat(char (&field)[N], std::string_view address)
 {
-    size_t size = 0;
-    for (const char c : address) {
-        if (size == N - 1)
-            break;
-        // No branch on the colons: addresses are read for every port and target.
-        field[size] = c;
-        size += c != ':';
+    size_t size = 0, at = 0;
+    // Addresses are read for every port and target: two digits and a colon at a time.
+    const auto is_pair = [&] {
+        return address[at] != ':' && address[at + 1] != ':' && address[at + 2] == ':';
+    };
+    for (; at + 2 < address.size() && size + 2 < N && is_pair(); at += 3, size += 2)
+        memcpy(field + size, address.data() + at, 2);
+    for (; at < address.size() && size < N - 1; at++) {
+        field[size] = address[at];
+        size += address[at] != ':';
     }
     field[size] = '\0';
 }

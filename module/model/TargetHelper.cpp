@@ -15,7 +15,7 @@ struct TargetHelper::Walk
     const _hbaPortInfo& port;
     classId_t id;
     const Wanted& wanted;
-    Fresh_Instances instances = {};
+    Fresh_Instances& instances;
     bool no_description_seen = false;
 };
 
@@ -40,15 +40,15 @@ TargetHelper* TargetHelper::getTargetHelperObject()
     return &helper;
 }
 
-Array<Instance*> TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id,
-                                                  const Wanted& wanted) const
+void TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id, const Wanted& wanted,
+                                      Fresh_Instances& instances) const
 {
     LOG_SCOPE("getTargetInstances");
     Remote_Ports remotes(LOG_HERE, port.portWWN);
     if (!remotes.listed())
-        return {};
+        return;
     LOG(DBG, "libGetAllRemotePorts. Number of rports -  %d", static_cast<int>(remotes.size()));
-    Walk walk = {.port = port, .id = id, .wanted = wanted};
+    Walk walk = {.port = port, .id = id, .wanted = wanted, .instances = instances};
     for (unsigned i = 0; i < remotes.size(); i++) {
         Json::Value answer;
         if (!remotes.ask(LOG_HERE, i, answer) || !ProviderUtil::isValidJsonResponse(answer)) {
@@ -58,7 +58,6 @@ Array<Instance*> TargetHelper::getTargetInstances(const _hbaPortInfo& port, clas
         LOG(DBG, "Loop for the rport index =   %d", static_cast<int>(i));
         guarded(LOG_HERE, entry, [&] { publish_target(walk, i, remotes.wwn(), answer); });
     }
-    return walk.instances.release();
 }
 
 void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
@@ -76,22 +75,24 @@ void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
         return;
     }
     LOG(DBG, "rPortWwns[%d]=%s", static_cast<int>(index), wwn);
-    const Json::Value& luns = member(answer, "lunList");
-    if (!hasMember(answer, "lunList") || !isArrayOrNull(luns)) {
+    const Json::Value* const luns = find_member(answer, "lunList");
+    if (!luns || !isArrayOrNull(*luns)) {
         LOG(ERR, "No LUN Info is available for Rport %s.", wwn);
         return;
     }
-    LOG(DBG, "Number of Luns = %d.", static_cast<int>(luns.size()));
-    char address[sizeof(_hbaLunInfo::remoteWWN)];
+    LOG(DBG, "Number of Luns = %d.", static_cast<int>(luns->size()));
+    char address[24];
     copy_flat(address, wwn);
-    for (const Json::Value& element : luns)
-        guarded(LOG_HERE, entry, [&] { publish_lun(walk, address, element); });
+    const std::string path = std::string(walk.port.portWWN) + "_" + address + "_";
+    for (const Json::Value& element : *luns)
+        guarded(LOG_HERE, entry, [&] { publish_lun(walk, path, element); });
 }
 
-void TargetHelper::publish_lun(Walk& walk, const char* address, const Json::Value& element) const
+void TargetHelper::publish_lun(Walk& walk, const std::string& path, const Json::Value& element) const
 {
     _hbaLunInfo lun = {};
-    if (!fill_lun(element, address, walk.no_description_seen, lun)) {
+    lun.path = path;
+    if (!fill_lun(element, walk.no_description_seen, lun)) {
         LOG(ERR, "LUN info is NOT available");
         return;
     }

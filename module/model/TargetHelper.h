@@ -15,6 +15,8 @@
 
 namespace KPRV {
 
+class Fresh_Instances;
+
 /// Publishes what a local FC port sees through the fabric: each LUN of each target, as an extent, a disk or a
 /// tape drive. Nothing is kept between calls. Instances belong to the caller; what the tables of the builders
 /// do not name is null.
@@ -26,8 +28,8 @@ public:
     /// The LUNs behind one port: extents (9) or disks (38) of all targets but tapes and media changers, and
     /// tape drives (16) of these. A remote port or a LUN that cannot be read is left out, with the reason in
     /// the log. Throws nothing.
-    Array<Instance*> getTargetInstances(const _hbaPortInfo& port, classId_t id,
-                                        const Wanted& wanted = {}) const;
+    void getTargetInstances(const _hbaPortInfo& port, classId_t id, const Wanted& wanted,
+                            Fresh_Instances& instances) const;
 
     // Null for one that is not wanted.
 
@@ -43,7 +45,7 @@ private:
 
     struct Walk;
     void publish_target(Walk& walk, unsigned index, const char* wwn, const Json::Value& answer) const;
-    void publish_lun(Walk& walk, const char* address, const Json::Value& element) const;
+    void publish_lun(Walk& walk, const std::string& path, const Json::Value& element) const;
 
     const Logged_Life _life;
 };

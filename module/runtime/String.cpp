@@ -99,6 +99,22 @@ String::String(const char* a, const char* b, const char* c) : _rep(&_empty)
     finish(_rep, total);
 }
 
+String String::joined(std::span<const std::string_view> parts)
+{
+    uint64 total = 0;
+    for (const std::string_view part : parts)
+        total += part.size();
+    String joined;
+    if (total == 0)
+        return joined;
+    joined._rep = allocate(checked(total));
+    char* end = characters(joined._rep);
+    for (const std::string_view part : parts)
+        end += part.copy(end, part.size());
+    finish(joined._rep, static_cast<uint32>(total));
+    return joined;
+}
+
 void String::_release(String_Rep* rep)
 {
     if (rep != &_empty && atomic_release(rep->refs))

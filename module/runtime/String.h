@@ -3,6 +3,8 @@
 #include "module/runtime/Atomic.h"
 #include "module/runtime/Types.h"
 
+#include <span>
+#include <string_view>
 #include <utility>
 
 namespace KPRV {
@@ -39,6 +41,8 @@ public:
     String(const char* text, size_t n);
     String(const char* a, const char* b);
     String(const char* a, const char* b, const char* c);
+    /// The parts one behind the other.
+    static String joined(std::span<const std::string_view> parts);
     ~String()
     {
         if (_rep != &_empty)

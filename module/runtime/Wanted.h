@@ -3,6 +3,8 @@
 #include "module/runtime/Instance.h"
 #include "module/runtime/Property.h"
 
+#include <algorithm>
+#include <span>
 #include <string_view>
 
 namespace KPRV {
@@ -30,17 +32,25 @@ public:
     bool whole() const { return _whole; }
 
     /// False if no object is wanted that has the text, given in parts, in that key.
-    template <class T, class... Parts>
-    bool may_be(Property<String> T::*key, const Parts&... parts) const
+    template <class T>
+    bool may_be(Property<String> T::*key, std::span<const std::string_view> parts) const
     {
-        if (_nothing)
-            return false;
-        const T* const object = cast<T>(_object);
-        if (!object || (object->*key).null)
-            return true;
-        const String& text = (object->*key).value;
-        std::string_view rest(text.c_str(), text.size());
-        return (... && begins_with(rest, parts)) && rest.empty();
+        const String* const text = wanted_text(key);
+        if (_nothing || !text)
+            return !_nothing;
+        std::string_view rest(text->c_str(), text->size());
+        return std::ranges::all_of(parts, [&](std::string_view part) { return begins_with(rest, part); }) &&
+               rest.empty();
+    }
+
+    /// The same of the beginning of that text: for callers to whom the whole of it is dear.
+    template <class T>
+    bool may_begin_with(Property<String> T::*key, std::string_view beginning) const
+    {
+        const String* const text = wanted_text(key);
+        if (_nothing || !text)
+            return !_nothing;
+        return std::string_view(text->c_str(), text->size()).starts_with(beginning);
     }
 
     // Of associations: what is wanted of the lists that they are joined from, each by name.
@@ -71,6 +81,14 @@ private:
     static Wanted nothing();
     /// The object with those keys by name, or everything if there is none.
     static Wanted named(const Instance* object);
+
+    /// What that key must be; null for any text.
+    template <class T>
+    const String* wanted_text(Property<String> T::*key) const
+    {
+        const T* const object = cast<T>(_object);
+        return object && !(object->*key).null ? &(object->*key).value : nullptr;
+    }
 
     static bool begins_with(std::string_view& text, std::string_view part)
     {

@@ -22,10 +22,11 @@ struct Lun_Instances : testing::Test
     Lun_Instances()
     {
         copy_text(port.portWWN, "W");
-        copy_text(lun.vendor, " V ");
-        copy_text(lun.productID, " P ");
-        copy_text(lun.serialNumber, " S ");
-        copy_text(lun.description, " D ");
+        lun.path = "W__";
+        lun.vendor = " V ";
+        lun.productID = " P ";
+        lun.serialNumber = " S ";
+        lun.description = " D ";
     }
 };
 
@@ -77,13 +78,13 @@ TEST_F(Lun_Instances, a_disk_goes_by_its_device_name_if_it_has_one)
 {
     lun.idType = 5;
     for (const char* name : {"", "   "}) {
-        copy_text(lun.deviceName, name);
+        lun.deviceName = name;
         Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
         EXPECT_EQ(disk["Name"], " D ");
         EXPECT_EQ(disk["NameFormat"], "1");
         EXPECT_EQ(disk["NameNamespace"], "1");
     }
-    copy_text(lun.deviceName, " /dev/sdb ");
+    lun.deviceName = " /dev/sdb ";
     Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
     EXPECT_EQ(disk["Name"], "/dev/sdb");
     EXPECT_EQ(disk["NameFormat"], "12");
@@ -107,24 +108,15 @@ TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
     }
 }
 
-TEST_F(Lun_Instances, names_of_full_fields_are_whole)
+TEST_F(Lun_Instances, long_names_are_whole)
 {
-    // What is longer is cut where the record is filled.
-    const auto fill = [](auto& field, size_t size, char with) {
-        copy_text(field, std::string(size + 1, with));
-        return std::string(size, with);
-    };
-    const std::string vendor = fill(lun.vendor, 8, 'v');
-    const std::string product = fill(lun.productID, 16, 'p');
-    const std::string serial = fill(lun.serialNumber, 64, 's');
-    const std::string remote = fill(lun.remoteWWN, 23, 'r');
-    const std::string local = fill(port.portWWN, 47, 'l');
-    const std::string description = fill(lun.description, 64, 'd');
-    const std::string device = fill(lun.deviceName, 64, 'n');
-    lun.number = 2147483648;
+    const std::string vendor(8, 'v'), product(16, 'p'), serial(64, 's'), description(64, 'd'),
+        device(64, 'n');
+    const std::string path = std::string(47, 'l') + "_" + std::string(23, 'r') + "_";
+    lun = {2147483648, path, vendor, product, serial, device, description, 0};
     Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
     EXPECT_EQ(extent["Name"], vendor + "+" + product + "+" + serial);
-    EXPECT_EQ(extent["DeviceID"], local + "_" + remote + "_" + vendor + "_" + product + "_LUN_-2147483648");
+    EXPECT_EQ(extent["DeviceID"], path + vendor + "_" + product + "_LUN_-2147483648");
     lun.idType = 2;
     EXPECT_EQ(taken(helper->getStorageExtentInstance(port, lun))["Name"], description);
     EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["Name"], device);

@@ -368,4 +368,18 @@ TEST(String, HandlesThatShareMayBeUsedFromDifferentThreads)
     EXPECT_STREQ("abc", shared.c_str());
 }
 
+TEST(String, PartsAreJoinedInTheirOrder)
+{
+    const auto joined = [](std::initializer_list<std::string_view> parts) {
+        return String::joined({parts.begin(), parts.size()});
+    };
+    EXPECT_EQ(String(), joined({}));
+    EXPECT_EQ(String::_empty.data, joined({"", ""}).c_str());
+    EXPECT_STREQ("a_bc", joined({"a", "_", "", "bc"}).c_str());
+    const String exact = joined({std::string(40, 'x'), std::string(24, 'y')});
+    EXPECT_EQ(64u, exact.size());
+    EXPECT_EQ(64u, exact.capacity());
+    EXPECT_STREQ((std::string(40, 'x') + std::string(24, 'y')).c_str(), exact.c_str());
+}
+
 } // namespace KPRV

@@ -18,7 +18,8 @@ Ref<Sample_Link> linked(const char* element, const char* port)
 
 bool may_be(const Wanted& wanted, const char* name)
 {
-    return wanted.may_be(&Sample_Port::Name, name);
+    const std::string_view text = name;
+    return wanted.may_be(&Sample_Port::Name, {&text, 1});
 }
 
 } // namespace
@@ -45,12 +46,31 @@ TEST(Wanted, AKeyMayBeGivenInParts)
 {
     const Ref<Sample_Port> model(make_port("port_7"));
     const Wanted wanted = Wanted::object(model.ptr());
-    const auto may_be = [&](auto... parts) { return wanted.may_be(&Sample_Port::Name, parts...); };
+    const auto may_be = [&](auto... parts) {
+        const std::string_view texts[] = {parts...};
+        return wanted.may_be(&Sample_Port::Name, texts);
+    };
     EXPECT_TRUE(may_be("port", "_", "7"));
     EXPECT_TRUE(may_be("", "port_7", ""));
     EXPECT_FALSE(may_be("port", "_"));
     EXPECT_FALSE(may_be("port", "_", "7", "7"));
     EXPECT_FALSE(may_be("port", "7", "_"));
+}
+
+TEST(Wanted, TheBeginningOfAKeyTellsMostObjectsApart)
+{
+    const Ref<Sample_Port> model(make_port("port_7"));
+    const auto may_begin = [](const Wanted& wanted, std::string_view beginning) {
+        return wanted.may_begin_with(&Sample_Port::Name, beginning);
+    };
+    for (const char* beginning : {"", "p", "port_", "port_7"})
+        EXPECT_TRUE(may_begin(Wanted::object(model.ptr()), beginning)) << beginning;
+    for (const char* other : {"P", "ort", "port_78"})
+        EXPECT_FALSE(may_begin(Wanted::object(model.ptr()), other)) << other;
+    EXPECT_TRUE(may_begin(Wanted(), "q"));
+    EXPECT_TRUE(may_begin(Wanted::names(), "q"));
+    model->Name.null = 1;
+    EXPECT_TRUE(may_begin(Wanted::object(model.ptr()), "q"));
 }
 
 TEST(Wanted, ANullKeyOrAnotherClassTellsNothing)
