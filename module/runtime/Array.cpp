@@ -1,10 +1,9 @@
 #include "module/runtime/Array.h"
 
-#include "module/runtime/allocated.h"
+#include "module/runtime/Answer_Blocks.h"
 #include "module/runtime/empty_arrays.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <cstring>
 #include <functional>
 #include <limits>
@@ -39,7 +38,7 @@ size_t block_size(const __Array_Traits* traits, uint32 capacity)
 
 __Array_Rep* allocate(const __Array_Traits* traits, uint32 capacity)
 {
-    return new (allocated(malloc(block_size(traits, capacity)))) __Array_Rep{traits, 0, capacity};
+    return new (take_block(block_size(traits, capacity))) __Array_Rep{traits, 0, capacity};
 }
 
 void construct_elements(const __Array_Traits* traits, void* dest, const void* src, uint32 n)
@@ -101,7 +100,7 @@ void make_room(__Array_Rep*& rep, uint64 wanted)
         rep = own;
     } else if (rep->capacity < n) {
         rep = static_cast<__Array_Rep*>(
-            allocated(realloc(static_cast<void*>(rep), block_size(rep->traits, n))));
+            resize_block(rep, block_size(rep->traits, rep->capacity), block_size(rep->traits, n)));
         rep->capacity = n;
     }
 }
@@ -130,7 +129,7 @@ void __destruct(__Array_Rep* rep)
     if (is_empty_array(rep) || is_lasting(rep))
         return;
     destruct_elements(rep, 0, rep->size);
-    free(rep);
+    give_block(rep);
 }
 
 __Array_Rep* _clone(const __Array_Rep* rep)

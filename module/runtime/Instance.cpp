@@ -1,5 +1,6 @@
 #include "module/runtime/Instance.h"
 
+#include "module/runtime/Answer_Blocks.h"
 #include "module/runtime/Atomic.h"
 #include "module/runtime/Class_Plan.h"
 #include "module/runtime/empty_arrays.h"
@@ -129,7 +130,7 @@ void release(Instance* instance, const Cell& cell)
 
 Instance* create(const Meta_Class* meta_class, bool defaults)
 {
-    Instance* instance = static_cast<Instance*>(::operator new(meta_class->size));
+    Instance* instance = static_cast<Instance*>(take_block(meta_class->size));
     __default_construct(meta_class, instance, true, defaults);
     return instance;
 }
@@ -189,7 +190,7 @@ void unref(const Instance* instance)
 void destroy(Instance* instance)
 {
     __destruct(instance);
-    ::operator delete(instance);
+    give_block(instance);
 }
 
 void destroyer(Instance* instance)

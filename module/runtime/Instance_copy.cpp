@@ -1,6 +1,7 @@
 // Of `Instance`, the ways to a copy: whole, by keys, into another one.
 #include "module/runtime/Instance.h"
 
+#include "module/runtime/Answer_Blocks.h"
 #include "module/runtime/empty_arrays.h"
 #include "module/runtime/features.h"
 #include "module/runtime/type_dispatch.h"
@@ -145,7 +146,7 @@ struct Clearer
 Instance* copy_of_bytes(const Instance* instance)
 {
     const uint32 size = instance->__meta_class->size;
-    Instance* copy = static_cast<Instance*>(::operator new(size));
+    Instance* copy = static_cast<Instance*>(take_block(size));
     memcpy(static_cast<void*>(copy), static_cast<const void*>(instance), size);
     copy->__refs = 1;
     return copy;

@@ -1,4 +1,5 @@
 #include "module/runtime/Provider_Handle.h"
+#include "module/runtime/Answer_Blocks.h"
 #include "module/runtime/Operation.h"
 #include "module/runtime/Ref.h"
 #include "module/runtime/association_walk.h"
@@ -149,6 +150,7 @@ int Provider_Handle::get_instance(const Instance* model, Instance*& instance)
 int Provider_Handle::enum_instances(const Instance* model, Instance_Handler_Proc proc, void* client_data,
                                     const Wanted& wanted)
 {
+    const Answer_Blocks blocks;
     return _call(OP_ENUM_INSTANCES, model, as_argument(proc), client_data, &wanted);
 }
 

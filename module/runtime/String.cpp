@@ -1,5 +1,6 @@
 #include "module/runtime/String.h"
 
+#include "module/runtime/Answer_Blocks.h"
 #include "module/runtime/strutil.h"
 
 #include <algorithm>
@@ -41,8 +42,7 @@ size_t length_of(const char* text)
 String_Rep* allocate(uint32 n)
 {
     const uint32 cap = checked(_next_pow_2(n));
-    void* block = ::operator new(size_t(cap) + EXTRA);
-    return new (block) String_Rep{1, 0, cap, {}};
+    return new (take_block(size_t(cap) + EXTRA)) String_Rep{1, 0, cap, {}};
 }
 
 /// The characters, which go on behind the four that the record declares.
@@ -118,7 +118,7 @@ String String::joined(std::span<const std::string_view> parts)
 void String::_release(String_Rep* rep)
 {
     if (rep != &_empty && atomic_release(rep->refs))
-        ::operator delete(rep);
+        give_block(rep);
 }
 
 String& String::operator=(const char* text)
