@@ -115,6 +115,22 @@ TEST(log, nothing_happens_without_home)
     EXPECT_FALSE(fs::exists(home.path(".cimple")));
 }
 
+TEST(log, arguments_of_a_line_that_is_not_used_are_not_made)
+{
+    const Home home;
+    home.level("ERR");
+    int made = 0;
+    LOG(ERR, "%d", ++made);
+    LOG(DBG, "%d", ++made);
+    EXPECT_EQ(1, made);
+    // Each line may be the one that opens the log.
+    close_log();
+    LOG(DBG, "%d", ++made);
+    LOG(DBG, "%d", ++made);
+    EXPECT_EQ(2, made);
+    EXPECT_EQ(1u, split(home.messages()).size());
+}
+
 TEST(log, configuration_is_tried_by_every_call)
 {
     Home home;
