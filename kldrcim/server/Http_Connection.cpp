@@ -111,10 +111,9 @@ void Http_Connection::check_client() const
         throw Http_Refusal{403, nullptr, "the header Host names another host"};
 }
 
-bool Http_Connection::is_page(const Http_Line& line) const
+bool Http_Connection::has_page(const std::string& path) const
 {
-    return server_.options_.metrics && line.path == metrics_path &&
-           (line.method == "GET" || line.method == "HEAD");
+    return server_.options_.metrics && path == metrics_path;
 }
 
 void Http_Connection::check_message(const std::string& method) const
@@ -122,7 +121,7 @@ void Http_Connection::check_message(const std::string& method) const
     if (method == "M-POST")
         throw Http_Refusal{501, nullptr, "POST alone is known"};
     if (method != "POST")
-        throw Http_Refusal{405, nullptr, "POST alone is known"};
+        throw Http_Refusal{405, nullptr, "the header Allow names the methods that are known here"};
     const char* length = header("Content-Length");
     if (length && header("Transfer-Encoding"))
         throw Http_Refusal{400, nullptr, "two ways to tell the length"};
@@ -164,7 +163,8 @@ bool Http_Connection::authenticate()
 bool Http_Connection::begin(const Http_Line& line)
 {
     server_.watch_->limit(peer_.socket, Connection_Watch::body);
-    const bool is_message = !is_page(line);
+    const bool is_message = !has_page(line.path) || (line.method != "GET" && line.method != "HEAD");
+    allowed_ = has_page(line.path) ? "GET, HEAD, POST" : "POST";
     try {
         check_client();
         if (is_message)
@@ -307,7 +307,7 @@ bool Http_Connection::refuse(const Http_Refusal& refusal)
     if (!refusal.text.empty())
         MHD_add_response_header(response, "PGErrorDetail", percent_encoded(refusal.text).c_str());
     if (refusal.status == MHD_HTTP_METHOD_NOT_ALLOWED)
-        MHD_add_response_header(response, "Allow", "POST");
+        MHD_add_response_header(response, "Allow", allowed_);
     if (refusal.status == MHD_HTTP_UNAUTHORIZED)
         MHD_add_response_header(response, "WWW-Authenticate", "Basic realm=\"kldrcim\", charset=\"UTF-8\"");
     MHD_add_response_header(response, "Connection", "close");

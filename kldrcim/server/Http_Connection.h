@@ -55,7 +55,8 @@ private:
     void check_client() const;
     /// Throws `Http_Refusal` at a request that is no message.
     void check_message(const std::string& method) const;
-    bool is_page(const Http_Line& line) const;
+    /// True for a path that has a page.
+    bool has_page(const std::string& path) const;
     /// False if the answer says that a password is needed.
     bool authenticate();
     void answer_page();
@@ -75,6 +76,8 @@ private:
     /// Null unless a message is expected.
     std::unique_ptr<Xml_Reader> reader_;
     std::size_t body_size_ = 0;
+    /// The methods that the path takes.
+    const char* allowed_ = "POST";
     bool queued_ = false;
     std::optional<std::string> user_;
     Cim_Call call_;

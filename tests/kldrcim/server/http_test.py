@@ -91,9 +91,11 @@ class Requests(Serving_Case):
             self.assertEqual(status, 501 if "VERSION" not in body and "<CIM/>" in body else 400, body)
             self.assertIn(error, ("request-not-valid", "unsupported-cim-version"), body)
 
-    def test_multiple_requests(self):
-        both = "<MULTIREQ>" + request("EnumerateInstanceNames", FCPORT) * 2 + "</MULTIREQ>"
-        self.assertEqual(self.status(message(both)), (501, "multiple-requests-unsupported"))
+    def test_methods_of_pages(self):
+        """What a path takes stands in Allow."""
+        for path, allowed in (("/metrics", "GET, HEAD, POST"), ("/cimom", "POST")):
+            status, fields, _ = self.served.ask("PUT", path, "x")
+            self.assertEqual((status, fields["Allow"]), (405, allowed))
 
     def test_comments_and_unknown_attributes(self):
         odd = NAMES.replace("<CIM ", "<!-- c --><CIM other='1' ").replace("<SIMPLEREQ>", "<?pi x?><SIMPLEREQ xml:lang='de'>")
