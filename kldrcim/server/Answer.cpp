@@ -22,24 +22,34 @@ CMPIrc wire_status(CMPIrc rc)
     return known ? rc : CMPIrc(CMPI_RC_ERR_FAILED);
 }
 
-Answer::Answer(const Cim_Call& call, Body_Sink& sink) : call_(call), sink_(sink), writer_(text_) {}
-
-void Answer::begin()
+Answer::Answer(const Cim_Message& message, Body_Sink& sink) : message_(message), sink_(sink), writer_(text_)
 {
-    if (begun_)
-        return;
-    begun_ = true;
     text_ += xml_declaration;
     writer_.open(Tag::CIM).attribute(At::CIMVERSION, "2.0").attribute(At::DTDVERSION, "2.0");
-    writer_.open(Tag::MESSAGE).attribute(At::ID, call_.id).attribute(At::PROTOCOLVERSION, "1.0");
+    writer_.open(Tag::MESSAGE).attribute(At::ID, message_.id).attribute(At::PROTOCOLVERSION, "1.0");
+    if (message_.is_multiple)
+        writer_.open(Tag::MULTIRSP);
+    // The end of the tag belongs to what stands before a call.
+    writer_.text({});
+}
+
+void Answer::begin(const Cim_Call& call)
+{
+    call_ = &call;
+    from_ = text_.size();
+    in_values_ = sent_ = false;
+    open_response();
+}
+
+void Answer::open_response()
+{
     writer_.open(Tag::SIMPLERSP);
-    writer_.open(call_.is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
-        .attribute(At::NAME, call_.name);
+    writer_.open(call_->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
+        .attribute(At::NAME, call_->name);
 }
 
 void Answer::open_values()
 {
-    begin();
     if (!in_values_)
         writer_.open(Tag::IRETURNVALUE);
     in_values_ = true;
@@ -54,17 +64,21 @@ Xml_Writer& Answer::object()
 bool Answer::object_done()
 {
     writer_.text("\n");
+    sent_ = sent_ || text_.size() >= piece_size;
+    return send_if_long();
+}
+
+bool Answer::send_if_long()
+{
     if (text_.size() < piece_size)
         return true;
-    sent_ = true;
-    const bool read = sink_.send(std::move(text_));
+    unread_ = !sink_.send(std::move(text_));
     text_.clear();
-    return read;
+    return !unread_;
 }
 
 Xml_Writer& Answer::behind_values()
 {
-    begin();
     if (in_values_)
         writer_.close(Tag::IRETURNVALUE);
     in_values_ = false;
@@ -74,11 +88,10 @@ Xml_Writer& Answer::behind_values()
 void Answer::succeed()
 {
     behind_values()
-        .close(call_.is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
-        .close(Tag::SIMPLERSP)
-        .close(Tag::MESSAGE)
-        .close(Tag::CIM);
-    text_ += '\n';
+        .close(call_->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
+        .close(Tag::SIMPLERSP);
+    if (message_.is_multiple)
+        send_if_long();
 }
 
 bool Answer::fail(CMPIrc rc, const std::string& text)
@@ -87,9 +100,9 @@ bool Answer::fail(CMPIrc rc, const std::string& text)
         return true;
     // A tag that is not at its end would go on in the new text.
     writer_.text({});
-    text_.clear();
-    begun_ = in_values_ = false;
-    begin();
+    text_.erase(from_);
+    in_values_ = false;
+    open_response();
     const CMPIrc status = wire_status(rc);
     std::string description = text.empty() ? status_name(rc) : text;
     if (status != rc && !text.empty())
@@ -100,6 +113,14 @@ bool Answer::fail(CMPIrc rc, const std::string& text)
         .close(Tag::ERROR);
     succeed();
     return false;
+}
+
+void Answer::end()
+{
+    if (message_.is_multiple)
+        writer_.close(Tag::MULTIRSP);
+    writer_.close(Tag::MESSAGE).close(Tag::CIM);
+    text_ += '\n';
 }
 
 } // namespace KPRV::kldrcim

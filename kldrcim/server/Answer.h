@@ -15,12 +15,15 @@ public:
     virtual bool send(std::string&& text) = 0;
 };
 
-/// The message that answers a call, written as its parts come. The text is sent in pieces once it has grown
-/// long; until then an error replaces all that has been written.
+/// The message that answers a message, written as its parts come, one call after the other. The text is sent
+/// in pieces once it has grown long; until then an error replaces all that has been written of a call.
 class Answer
 {
 public:
-    Answer(const Cim_Call& call, Body_Sink& sink);
+    Answer(const Cim_Message& message, Body_Sink& sink);
+
+    /// In front of all that answers a call.
+    void begin(const Cim_Call& call);
 
     /// In front of each object of IRETURNVALUE.
     Xml_Writer& object();
@@ -32,24 +35,35 @@ public:
     /// In front of what follows the objects: RETURNVALUE of a method, and parameters.
     Xml_Writer& behind_values();
 
-    /// The end of a message without error.
+    /// The end of what answers a call, without error.
     void succeed();
     /// True if a part has been sent: then the text has no end, and the connection must be cut.
     bool fail(CMPIrc rc, const std::string& text);
+
+    /// The end of the message.
+    void end();
+
+    /// True once a piece has been sent that nobody took.
+    bool is_unread() const { return unread_; }
 
     /// What has not been sent.
     std::string take_rest() { return std::move(text_); }
 
 private:
-    void begin();
+    void open_response();
+    /// False if nobody reads any more.
+    bool send_if_long();
 
-    const Cim_Call& call_;
+    const Cim_Message& message_;
+    const Cim_Call* call_ = nullptr;
     Body_Sink& sink_;
     std::string text_;
     Xml_Writer writer_;
-    bool begun_ = false;
+    /// Where in the text the answer to the call begins, unless a part of it has been sent.
+    std::size_t from_ = 0;
     bool in_values_ = false;
     bool sent_ = false;
+    bool unread_ = false;
 };
 
 /// "CIM_ERR_NOT_FOUND" of what a client is told: the codes beyond those of clients become 1.

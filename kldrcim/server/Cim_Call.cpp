@@ -14,6 +14,8 @@ using At = Xml_Attribute;
 
 /// No class has so many properties.
 constexpr std::size_t most_names = 1000;
+/// Of one message.
+constexpr std::size_t most_calls = 1000;
 
 [[noreturn]] void refuse_message(const std::string& text)
 {
@@ -94,24 +96,13 @@ bool names_object(std::string_view header, const Cim_Call& call)
 
 } // namespace
 
-Cim_Call read_call(const Xml_Document& document)
+namespace {
+
+Cim_Call read_call(Xml_Node request)
 {
-    const Xml_Node root = document.root();
-    if (!root.is(Tag::CIM))
-        refuse_message("no <CIM>");
-    check_version(root.attribute(At::CIMVERSION), "2", "unsupported-cim-version");
-    check_version(root.attribute(At::DTDVERSION), "2", "unsupported-dtd-version");
-    const Xml_Node message = only_child(root, "<MESSAGE>");
-    if (!message.has(At::ID))
-        refuse_message("<MESSAGE> without ID");
-    check_version(message.attribute(At::PROTOCOLVERSION), "1", "unsupported-protocol-version");
-    const Xml_Node request = only_child(message, "request");
-    if (request.is(Tag::MULTIREQ))
-        throw Http_Refusal{501, "multiple-requests-unsupported", "one request in a message"};
     if (!request.is(Tag::SIMPLEREQ))
         throw Http_Refusal{400, "unsupported-operation", "no request of an operation"};
     Cim_Call call;
-    call.id = message.attribute(At::ID);
     call.element = call_of(request);
     call.is_extrinsic = call.element.is(Tag::METHODCALL);
     call.name = call.element.attribute(At::NAME);
@@ -131,12 +122,50 @@ Cim_Call read_call(const Xml_Document& document)
     return call;
 }
 
-void check_headers(const Cim_Headers& headers, const Cim_Call& call)
+} // namespace
+
+Cim_Message read_message(const Xml_Document& document)
+{
+    const Xml_Node root = document.root();
+    if (!root.is(Tag::CIM))
+        refuse_message("no <CIM>");
+    check_version(root.attribute(At::CIMVERSION), "2", "unsupported-cim-version");
+    check_version(root.attribute(At::DTDVERSION), "2", "unsupported-dtd-version");
+    const Xml_Node element = only_child(root, "<MESSAGE>");
+    if (!element.has(At::ID))
+        refuse_message("<MESSAGE> without ID");
+    check_version(element.attribute(At::PROTOCOLVERSION), "1", "unsupported-protocol-version");
+    const Xml_Node request = only_child(element, "request");
+    Cim_Message message;
+    message.id = element.attribute(At::ID);
+    message.is_multiple = request.is(Tag::MULTIREQ);
+    if (!message.is_multiple) {
+        message.calls.push_back(read_call(request));
+        return message;
+    }
+    for (const Xml_Node each : request.children()) {
+        if (message.calls.size() == most_calls)
+            throw Http_Refusal{413, nullptr, "more than " + std::to_string(most_calls) + " requests"};
+        message.calls.push_back(read_call(each));
+    }
+    // Some clients send one as they would send many.
+    if (message.calls.empty())
+        refuse_message("<MULTIREQ> without a request");
+    return message;
+}
+
+void check_headers(const Cim_Headers& headers, const Cim_Message& message)
 {
     if (headers.operation && !same_name(headers.operation, "MethodCall"))
         throw Http_Refusal{400, "unsupported-operation", "CIMOperation is not MethodCall"};
     if (headers.protocol_version)
         check_version(headers.protocol_version, "1", "unsupported-protocol-version");
+    if (message.is_multiple ? headers.method || headers.object : headers.batch != nullptr)
+        throw Http_Refusal{400, "header-mismatch",
+                           "CIMBatch is for messages with several requests, CIMMethod and CIMObject for one"};
+    if (message.is_multiple)
+        return;
+    const Cim_Call& call = message.calls.front();
     if (headers.method && !same_name(percent_decoded(headers.method), call.name))
         throw Http_Refusal{400, "header-mismatch", "CIMMethod names another method than the message"};
     if (headers.object && !names_object(percent_decoded(headers.object), call))

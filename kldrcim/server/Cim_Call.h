@@ -15,10 +15,9 @@ struct Http_Refusal
     std::string text;
 };
 
-/// What a message asks for. Its nodes belong to the document.
+/// One request. Its nodes belong to the document.
 struct Cim_Call
 {
-    std::string id;
     /// Of a method of a class; else the name is that of an operation.
     bool is_extrinsic = false;
     std::string name;
@@ -29,8 +28,18 @@ struct Cim_Call
     Xml_Node element;
 };
 
+/// What a message asks for.
+struct Cim_Message
+{
+    std::string id;
+    /// Several requests in one, which are answered one after the other.
+    bool is_multiple = false;
+    /// At least one.
+    std::vector<Cim_Call> calls;
+};
+
 /// Throws `Http_Refusal`.
-Cim_Call read_call(const Xml_Document& document);
+Cim_Message read_message(const Xml_Document& document);
 
 /// The header fields that say what the message says; absent ones are null.
 struct Cim_Headers
@@ -39,10 +48,12 @@ struct Cim_Headers
     const char* method = nullptr;
     const char* object = nullptr;
     const char* protocol_version = nullptr;
+    /// In the place of method and object where a message has several requests.
+    const char* batch = nullptr;
 };
 
 /// What is there must agree with the message. Throws `Http_Refusal`.
-void check_headers(const Cim_Headers& headers, const Cim_Call& call);
+void check_headers(const Cim_Headers& headers, const Cim_Message& message);
 
 /// The parameters of an operation. What is wrong with them is thrown as `Wire_Error`: status 7 for one that
 /// the operation has not, 4 for one that is there twice, that is missing or that has another value.

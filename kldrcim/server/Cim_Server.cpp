@@ -59,38 +59,52 @@ Cim_Space* Cim_Server::find_space(const std::string& name) const
     return nullptr;
 }
 
-bool Cim_Server::may_be_long(const Cim_Call& call)
+bool Cim_Server::may_be_long(const Cim_Message& message)
 {
+    const Cim_Call& call = message.calls.front();
     const Operation_Row* row = call.is_extrinsic ? nullptr : find_row(call.name);
-    return row && row->may_be_long;
+    return message.is_multiple || (row && row->may_be_long);
 }
 
-Cim_Server::Reply Cim_Server::answer(const Cim_Call& call, const std::optional<std::string>& user,
+bool Cim_Server::answer_call(const Cim_Call& call, const std::optional<std::string>& user, Answer& answer)
+{
+    const Operation_Row* row = call.is_extrinsic ? nullptr : find_row(call.name);
+    if (!row && !call.is_extrinsic)
+        throw Wire_Error::status(CMPI_RC_ERR_NOT_SUPPORTED, "no operation " + call.name.substr(0, 64));
+    Cim_Space* const space = find_space(call.name_space);
+    if (!space)
+        throw Wire_Error::status(CMPI_RC_ERR_INVALID_NAMESPACE, call.name_space);
+    const Parameters parameters(call, row ? row->parameters : "");
+    const Operation_Call operation{*this, *space, call, parameters, user, answer};
+    const Result result = row ? row->body(operation) : call_method(operation);
+    if (!result.ok())
+        return answer.fail(result.rc, text_of(result));
+    answer.succeed();
+    return false;
+}
+
+Cim_Server::Reply Cim_Server::answer(const Cim_Message& message, const std::optional<std::string>& user,
                                      Body_Sink& sink)
 {
-    Answer answer(call, sink);
+    Answer answer(message, sink);
     Reply reply;
-    try {
-        const Operation_Row* row = call.is_extrinsic ? nullptr : find_row(call.name);
-        if (!row && !call.is_extrinsic)
-            throw Wire_Error::status(CMPI_RC_ERR_NOT_SUPPORTED, "no operation " + call.name.substr(0, 64));
-        Cim_Space* const space = find_space(call.name_space);
-        if (!space)
-            throw Wire_Error::status(CMPI_RC_ERR_INVALID_NAMESPACE, call.name_space);
-        const Parameters parameters(call, row ? row->parameters : "");
-        const Operation_Call operation{*this, *space, call, parameters, user, answer};
-        const Result result = row ? row->body(operation) : call_method(operation);
-        if (result.ok())
-            answer.succeed();
-        else
-            reply.broken = answer.fail(result.rc, text_of(result));
-    } catch (const Wire_Error& error) {
-        if (error.is_not_valid())
-            throw Http_Refusal{400, "request-not-valid", error.what()};
-        reply.broken = answer.fail(error.rc(), error.what());
-    } catch (const std::exception& error) {
-        reply.broken = answer.fail(CMPI_RC_ERR_FAILED, error.what());
+    for (const Cim_Call& call : message.calls) {
+        answer.begin(call);
+        try {
+            reply.broken = answer_call(call, user, answer);
+        } catch (const Wire_Error& error) {
+            if (error.is_not_valid() && &call == &message.calls.front())
+                throw Http_Refusal{400, "request-not-valid", error.what()};
+            reply.broken =
+                answer.fail(error.is_not_valid() ? CMPI_RC_ERR_INVALID_PARAMETER : error.rc(), error.what());
+        } catch (const std::exception& error) {
+            reply.broken = answer.fail(CMPI_RC_ERR_FAILED, error.what());
+        }
+        // What was asked for by somebody who has gone is not begun.
+        if (reply.broken || answer.is_unread())
+            return reply;
     }
+    answer.end();
     reply.body = answer.take_rest();
     return reply;
 }

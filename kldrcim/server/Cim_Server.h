@@ -28,17 +28,20 @@ public:
         bool broken = false;
     };
 
-    /// `user` is the authenticated one, if there is any. Throws `Http_Refusal`.
-    Reply answer(const Cim_Call& call, const std::optional<std::string>& user, Body_Sink& sink);
+    /// `user` is the authenticated one, if there is any. Throws `Http_Refusal`, but not for a later one of
+    /// several requests: what those before it have done is told.
+    Reply answer(const Cim_Message& message, const std::optional<std::string>& user, Body_Sink& sink);
 
     /// True if the answer may be long.
-    static bool may_be_long(const Cim_Call& call);
+    static bool may_be_long(const Cim_Message& message);
 
     const std::string& host_name() const { return host_name_; }
     Pull_Contexts& pull_contexts() { return pull_contexts_; }
 
 private:
     Cim_Space* find_space(const std::string& name) const;
+    /// True if the answer is broken.
+    bool answer_call(const Cim_Call& call, const std::optional<std::string>& user, Answer& answer);
 
     std::string host_name_;
     std::vector<std::pair<std::string, Cim_Space*>> spaces_;

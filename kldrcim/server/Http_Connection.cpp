@@ -226,20 +226,21 @@ void Http_Connection::answer_message()
                            reader_->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
                                                                     : "request-not-well-formed",
                            reader_->fault_text()};
-    call_ = read_call(reader_->document());
+    message_ = read_message(reader_->document());
     check_headers({.operation = header("CIMOperation"),
                    .method = header("CIMMethod"),
                    .object = header("CIMObject"),
-                   .protocol_version = header("CIMProtocolVersion")},
-                  call_);
-    answer(call_);
+                   .protocol_version = header("CIMProtocolVersion"),
+                   .batch = header("CIMBatch")},
+                  message_);
+    answer(message_);
 }
 
-void Http_Connection::answer(const Cim_Call& call)
+void Http_Connection::answer(const Cim_Message& message)
 {
-    if (Cim_Server::may_be_long(call))
-        return answer_in_pieces(call);
-    Cim_Server::Reply reply = server_.server_.answer(call, user_, pipe_);
+    if (Cim_Server::may_be_long(message))
+        return answer_in_pieces(message);
+    Cim_Server::Reply reply = server_.server_.answer(message, user_, pipe_);
     // A short operation that has become long after all.
     pipe_.finish(reply.broken);
     rest_ = std::move(reply.body);
@@ -250,12 +251,12 @@ void Http_Connection::answer(const Cim_Call& call)
                                                         this, nullptr));
 }
 
-void Http_Connection::answer_in_pieces(const Cim_Call& call)
+void Http_Connection::answer_in_pieces(const Cim_Message& message)
 {
-    maker_ = std::thread([this, &call] {
+    maker_ = std::thread([this, &message] {
         bool broken = true;
         try {
-            Cim_Server::Reply reply = server_.server_.answer(call, user_, pipe_);
+            Cim_Server::Reply reply = server_.server_.answer(message, user_, pipe_);
             rest_ = std::move(reply.body);
             broken = reply.broken;
         } catch (...) {

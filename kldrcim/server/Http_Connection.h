@@ -61,9 +61,9 @@ private:
     bool authenticate();
     void answer_page();
     void answer_message();
-    void answer(const Cim_Call& call);
+    void answer(const Cim_Message& message);
     /// On a thread of its own, sent while it is being made.
-    void answer_in_pieces(const Cim_Call& call);
+    void answer_in_pieces(const Cim_Message& message);
     bool refuse(const Http_Refusal& refusal);
     bool queue(unsigned status, MHD_Response* response);
     /// An answer to a message.
@@ -80,7 +80,7 @@ private:
     const char* allowed_ = "POST";
     bool queued_ = false;
     std::optional<std::string> user_;
-    Cim_Call call_;
+    Cim_Message message_;
     Body_Pipe pipe_;
     std::string rest_;
     std::exception_ptr failure_;

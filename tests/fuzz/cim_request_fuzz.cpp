@@ -48,8 +48,8 @@ void answer(Cim_Server& server, const Xml_Document& document)
 {
     Reading_Sink sink;
     try {
-        const Cim_Call call = read_call(document);
-        const Cim_Server::Reply reply = server.answer(call, std::nullopt, sink);
+        const Cim_Message message = read_message(document);
+        const Cim_Server::Reply reply = server.answer(message, std::nullopt, sink);
         FUZZ_EXPECT(!reply.broken);
         FUZZ_EXPECT(sink.reader.feed(reply.body) && sink.reader.finish());
     } catch (const Http_Refusal& refusal) {

@@ -2,6 +2,7 @@
 
 import http.client
 import os
+import re
 import tempfile
 import time
 import unittest
@@ -15,6 +16,7 @@ from serving import (
     error_code,
     intrinsic,
     message,
+    parameter,
     read_all,
     request,
     value_parameter,
@@ -25,6 +27,10 @@ from serving import (
 SANITIZED = bool(os.environ.get("KLDR_SANITIZE"))
 NAMES = intrinsic("EnumerateInstanceNames", class_parameter("ClassName", "CIM_FCPort"))
 FCPORT = class_parameter("ClassName", "CIM_FCPort")
+
+
+def several(*calls):
+    return "<MULTIREQ>" + "".join(calls) + "</MULTIREQ>"
 
 
 def post_bytes(body, *fields, version="1.1", method="POST"):
@@ -182,6 +188,79 @@ class Requests(Serving_Case):
         self.assertEqual(self.status(body)[0], 200)
         if not SANITIZED:
             self.assertLess(self.served.resident("VmHWM") - before, 10 * len(body))
+
+
+class Several_Requests(Serving_Case):
+    """A message with several requests has an answer to each, in their order."""
+
+    def ask(self, *calls, **headers):
+        return self.served.post(message(several(*calls)), **headers)
+
+    def codes(self, *calls):
+        """The statuses of the answers."""
+        status, _, body = self.ask(*calls)
+        self.assertEqual(status, 200)
+        self.assertEqual(body.count("<MULTIRSP>"), 1)
+        answers = re.findall(r"<SIMPLERSP>.*?</SIMPLERSP>", body, re.S)
+        return [error_code(each) for each in answers], answers
+
+    def test_answers(self):
+        codes, answers = self.codes(
+            request("EnumerateInstanceNames", FCPORT),
+            request("GetClass", class_parameter("ClassName", "CIM_None")),
+            request("GetClass", FCPORT),
+        )
+        self.assertEqual(codes, [0, 6, 0])
+        self.assertEqual(answers[0].count("<INSTANCENAME"), 5)
+        self.assertIn('IMETHODRESPONSE NAME="GetClass"', answers[2])
+        self.assertNotIn("INSTANCENAME", answers[1])
+
+    def test_one_is_answered_as_many_are(self):
+        self.assertEqual(self.codes(request("EnumerateInstanceNames", FCPORT))[0], [0])
+
+    def test_methods(self):
+        service = '<INSTANCENAME CLASSNAME="KALDERA_AgentService"><KEYBINDING NAME="Name">' \
+            "<KEYVALUE>Kaldera Agent Service Provider</KEYVALUE></KEYBINDING></INSTANCENAME>"
+        path = request("x").split("<LOCALNAMESPACEPATH>")[1].split("</LOCALNAMESPACEPATH>")[0]
+
+        def method(name):
+            return (
+                f'<SIMPLEREQ><METHODCALL NAME="{name}"><LOCALINSTANCEPATH><LOCALNAMESPACEPATH>{path}</LOCALNAMESPACEPATH>'
+                f'{service}</LOCALINSTANCEPATH><PARAMVALUE NAME="request"><VALUE>{{}}</VALUE></PARAMVALUE></METHODCALL></SIMPLEREQ>'
+            )
+
+        codes, answers = self.codes(method("executeMethod"), method("none"), request("EnumerateInstanceNames", FCPORT))
+        self.assertEqual(codes, [0, 17, 0])
+        self.assertIn('<METHODRESPONSE NAME="executeMethod">', answers[0])
+
+    def test_long_answers(self):
+        everything = request("EnumerateClasses", value_parameter("DeepInheritance", "TRUE") + value_parameter("LocalOnly", "FALSE"))
+        codes, answers = self.codes(*[everything, request("GetClass", class_parameter("ClassName", "CIM_None"))] * 4)
+        self.assertEqual(codes, [0, 6] * 4)
+        self.assertEqual(len(set(answers)), 2)
+        self.assertGreater(len(answers[0]), 1 << 19)
+
+    def test_what_stood_before_a_bad_one_is_told(self):
+        bad = request("GetInstance", parameter("InstanceName", "<INSTANCENAME/>"))
+        self.assertEqual(self.codes(request("EnumerateInstanceNames", FCPORT), bad, request("GetClass", FCPORT))[0], [0, 4, 0])
+        status, fields, _ = self.ask(bad, request("GetClass", FCPORT))
+        self.assertEqual((status, fields["CIMError"]), (400, "request-not-valid"))
+
+    def test_headers(self):
+        both = [request("EnumerateInstanceNames", FCPORT)] * 2
+        self.assertEqual(self.ask(*both, CIMOperation="MethodCall", CIMBatch="")[0], 200)
+        for headers in ({"CIMMethod": "EnumerateInstanceNames"}, {"CIMObject": "root/kaldera"}):
+            status, fields, _ = self.ask(*both, **headers)
+            self.assertEqual((status, fields["CIMError"]), (400, "header-mismatch"))
+        status, fields, _ = self.served.post(NAMES, CIMBatch="")
+        self.assertEqual((status, fields["CIMError"]), (400, "header-mismatch"))
+
+    def test_what_is_refused(self):
+        one = request("EnumerateInstanceNames", FCPORT)
+        for content in ("<MULTIREQ/>", several(one, "<SIMPLEREQ/>"), several(several(one)), several(one) * 2, several(one) + one):
+            self.assertEqual(self.served.post(message(content))[0], 400, content)
+        self.assertEqual(self.served.post(message(several(*[one] * 1000)))[0], 200)
+        self.assertEqual(self.served.post(message(several(*[one] * 1001)))[0], 413)
 
 
 class Slowness(Serving_Case):
