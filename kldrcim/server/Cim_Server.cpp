@@ -10,8 +10,8 @@ namespace {
 
 const Operation_Row* find_row(std::string_view name)
 {
-    for (const auto rows :
-         {instance_operations(), association_operations(), class_operations(), pull_operations()})
+    for (const auto rows : {instance_operations(), association_operations(), class_operations(),
+                            pull_operations(), query_operations()})
         for (const Operation_Row& row : rows)
             if (same_name(row.name, name))
                 return &row;

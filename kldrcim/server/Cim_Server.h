@@ -81,6 +81,7 @@ std::span<const Operation_Row> instance_operations();
 std::span<const Operation_Row> association_operations();
 std::span<const Operation_Row> class_operations();
 std::span<const Operation_Row> pull_operations();
+std::span<const Operation_Row> query_operations();
 
 /// A method of a class.
 Result call_method(const Operation_Call& call);

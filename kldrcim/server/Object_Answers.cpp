@@ -17,6 +17,10 @@ void Object_Answers::place(Path_Value& path) const
 bool Object_Answers::instance(Instance_Value&& instance)
 {
     Xml_Writer& writer = call_.answer.object();
+    if (kind_ == BARE) {
+        write_instance(writer, instance, form_);
+        return call_.answer.object_done();
+    }
     const Tag tag = kind_ == NAMED    ? Tag::VALUE_NAMEDINSTANCE
                     : kind_ == PULLED ? Tag::VALUE_INSTANCEWITHPATH
                                       : Tag::VALUE_OBJECTWITHPATH;

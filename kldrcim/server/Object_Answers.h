@@ -16,6 +16,8 @@ public:
         OBJECTS,
         /// The same for operations that are pulled.
         PULLED,
+        /// Instances alone, as queries give them that are pulled.
+        BARE,
     };
 
     Object_Answers(const Operation_Call& call, Instance_Form form, Form kind)

@@ -19,6 +19,8 @@ struct Pull_Context
     {
         INSTANCES,
         PATHS,
+        /// Instances without paths: what a query selects.
+        ROWS,
     };
 
     Kind kind = INSTANCES;

@@ -1,6 +1,8 @@
 // Enumerations that a client opens and pulls. The provider is asked once, at the beginning: it may hold locks
 // while it hands objects over, and no client's pace may hold up the others.
 #include "kldrcim/server/Object_Answers.h"
+#include "kldrcim/server/Query_Results.h"
+#include "kldrcim/wire/Class_Xml.h"
 
 #include <algorithm>
 
@@ -18,9 +20,26 @@ constexpr auto limits_exceeded = static_cast<CMPIrc>(27);
 /// More are not given at once, whatever is asked for.
 constexpr std::uint64_t most_objects = 10000;
 
-void write_end(const Operation_Call& call, const std::string& name)
+/// What the instances of a query are: a class with the properties that it asks for.
+void write_row_class(Xml_Writer& writer, const Operation_Call& call, const Select_Query& query)
+{
+    Class_Info row = *call.space.classes().find(query.class_name());
+    row.methods.clear();
+    Class_Form form;
+    form.local_only = false;
+    if (!query.properties().empty())
+        form.properties = query.properties();
+    writer.open(Xml_Tag::PARAMVALUE).attribute(Xml_Attribute::NAME, "QueryResultClass");
+    write_class(writer, call.space.classes(), row, form);
+    writer.close(Xml_Tag::PARAMVALUE);
+}
+
+/// `query` is null behind what is no query, and behind each pull.
+void write_end(const Operation_Call& call, const std::string& name, const Select_Query* query = nullptr)
 {
     Xml_Writer& writer = call.answer.behind_values();
+    if (query && call.parameters.flag("ReturnQueryResultClass", false))
+        write_row_class(writer, call, *query);
     write_parameter(writer, {"EndOfSequence", Value::boolean(name.empty())});
     write_parameter(writer, {"EnumerationContext", Value::text(name)});
 }
@@ -32,7 +51,8 @@ void write_objects(const Operation_Call& call, Pull_Context& context, std::uint6
     form.properties = context.properties;
     form.seen_as = context.seen_as.empty() ? nullptr : call.space.classes().find(context.seen_as);
     form.origins = context.with_origins ? &call.space.classes() : nullptr;
-    Object_Answers receiver(call, form, Object_Answers::PULLED);
+    const bool is_row = context.kind == Pull_Context::ROWS;
+    Object_Answers receiver(call, form, is_row ? Object_Answers::BARE : Object_Answers::PULLED);
     call.answer.open_values();
     for (; count != 0 && !context.instances.empty(); --count) {
         receiver.instance(std::move(context.instances.front()));
@@ -59,15 +79,30 @@ void refuse_filters(const Parameters& parameters)
 {
     if (!parameters.text("FilterQuery").empty() || !parameters.text("FilterQueryLanguage").empty())
         throw Wire_Error::status(filter_unsupported, "no filters");
-    if (parameters.flag("ContinueOnError", false))
-        throw Wire_Error::status(continuing_unsupported, "no continuing on errors");
 }
 
-Result open_and_write(const Operation_Call& call, Request request, std::unique_ptr<Pull_Context> context)
+/// What each opened enumeration has: nobody asks for what there is not, and it lives for as long as it says.
+std::unique_ptr<Pull_Context> new_context(const Operation_Call& call, Pull_Context::Kind kind)
+{
+    if (call.parameters.flag("ContinueOnError", false))
+        throw Wire_Error::status(continuing_unsupported, "no continuing on errors");
+    auto context = std::make_unique<Pull_Context>();
+    context->kind = kind;
+    context->lifetime = lifetime_of(call.parameters);
+    return context;
+}
+
+/// `query` is null for what is no query.
+Result open_and_write(const Operation_Call& call, Request request, std::unique_ptr<Pull_Context> context,
+                      const Select_Query* query = nullptr)
 {
     const std::uint64_t count = std::min(call.parameters.number("MaxObjectCount").value_or(0), most_objects);
     Collector collector;
-    Result result = call.space.run(std::move(request), &collector);
+    std::optional<Query_Results> selected;
+    if (query)
+        selected.emplace(*query, call.space.classes(), collector);
+    Result result =
+        call.space.run(std::move(request), selected ? static_cast<Receiver*>(&*selected) : &collector);
     if (!result.ok())
         return result;
     std::ranges::move(collector.instances, std::back_inserter(context->instances));
@@ -75,7 +110,7 @@ Result open_and_write(const Operation_Call& call, Request request, std::unique_p
     context->name_space = call.space.name();
     if (context->size() <= count) {
         write_objects(call, *context, count);
-        write_end(call, {});
+        write_end(call, {}, query);
         return {};
     }
     // The place is taken before anything is given: what is refused must not be lost.
@@ -86,7 +121,7 @@ Result open_and_write(const Operation_Call& call, Request request, std::unique_p
         return failed(limits_exceeded, "too many open enumerations");
     write_objects(call, *context, count);
     contexts.put_back(name, std::move(context));
-    write_end(call, name);
+    write_end(call, name, query);
     return {};
 }
 
@@ -99,9 +134,7 @@ Result open(const Operation_Call& call)
     constexpr bool paths = Kind == Operation::ENUMERATE_INSTANCE_NAMES ||
                            Kind == Operation::ASSOCIATOR_NAMES || Kind == Operation::REFERENCE_NAMES;
     refuse_filters(call.parameters);
-    auto context = std::make_unique<Pull_Context>();
-    context->kind = paths ? Pull_Context::PATHS : Pull_Context::INSTANCES;
-    context->lifetime = lifetime_of(call.parameters);
+    auto context = new_context(call, paths ? Pull_Context::PATHS : Pull_Context::INSTANCES);
     context->properties = call.parameters.names("PropertyList");
     context->with_origins = call.parameters.flag("IncludeClassOrigin", false);
     Path_Value path;
@@ -121,6 +154,13 @@ Result open(const Operation_Call& call)
         request.filter.result_role = call.parameters.text("ResultRole");
     }
     return open_and_write(call, std::move(request), std::move(context));
+}
+
+Result open_query(const Operation_Call& call)
+{
+    const Select_Query query = read_query(call, "FilterQueryLanguage", "FilterQuery");
+    Request request = call.request(Operation::ENUMERATE_INSTANCES, {.class_name = query.class_name()});
+    return open_and_write(call, std::move(request), new_context(call, Pull_Context::ROWS), &query);
 }
 
 std::unique_ptr<Pull_Context> taken(const Operation_Call& call, const std::string& name)
@@ -169,8 +209,10 @@ constexpr Operation_Row pull_rows[] = {
     {"OpenAssociatorInstancePaths", "InstanceName AssocClass ResultClass Role ResultRole " COMMON,      true, open<Operation::ASSOCIATOR_NAMES>},
     {"OpenReferenceInstances",     "InstanceName ResultClass Role IncludeClassOrigin PropertyList " COMMON, true, open<Operation::REFERENCES>},
     {"OpenReferenceInstancePaths", "InstanceName ResultClass Role " COMMON,                             true, open<Operation::REFERENCE_NAMES>},
+    {"OpenQueryInstances",         "ReturnQueryResultClass " COMMON,                                    true, open_query},
     {"PullInstancesWithPath",      "EnumerationContext MaxObjectCount",                                 true, pull<Pull_Context::INSTANCES>},
     {"PullInstancePaths",          "EnumerationContext MaxObjectCount",                                 true, pull<Pull_Context::PATHS>},
+    {"PullInstances",              "EnumerationContext MaxObjectCount",                                 true, pull<Pull_Context::ROWS>},
     {"CloseEnumeration",           "EnumerationContext",                                                false, close},
 };
 // clang-format on

@@ -57,7 +57,7 @@ void default_value(Instance_Value& instance, const char* name, Value value)
 struct Subscriptions::Active
 {
     Path_Value path;
-    Indication_Query query;
+    Select_Query query;
     std::vector<std::string> provider_classes;
     std::shared_ptr<Indication_Exporter> exporter;
 };
@@ -157,7 +157,7 @@ Result Subscriptions::check_filter(const Instance_Value& filter) const
     if (query.size() > longest_query)
         return failed(CMPI_RC_ERR_INVALID_QUERY, "the query is too long");
     Query_Error error;
-    const auto parsed = Indication_Query::parse(query, text_of(filter, "QueryLanguage"), error);
+    const auto parsed = Select_Query::parse(query, text_of(filter, "QueryLanguage"), error);
     if (!parsed)
         return failed(error.rc, error.text);
     const Class_Info* info = classes_.find(parsed->class_name());
@@ -278,7 +278,7 @@ Result Subscriptions::activate(const Instance_Value& subscription)
         kind_of(handler->path.class_name) != Kind::LISTENER)
         return failed(CMPI_RC_ERR_INVALID_PARAMETER, "there is no such filter or listener");
     Query_Error error;
-    auto query = Indication_Query::parse(text_of(*filter, "Query"), text_of(*filter, "QueryLanguage"), error);
+    auto query = Select_Query::parse(text_of(*filter, "Query"), text_of(*filter, "QueryLanguage"), error);
     if (!query)
         return failed(error.rc, error.text);
     std::vector<std::string> used;

@@ -2,8 +2,8 @@
 
 #include "broker/Subscription.h"
 #include "kldrcim/server/Indication_Exporter.h"
-#include "kldrcim/server/Indication_Query.h"
 #include "kldrcim/server/Interop_Space.h"
+#include "kldrcim/server/Select_Query.h"
 
 namespace KPRV::kldrcim {
 

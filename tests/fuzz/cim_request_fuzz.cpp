@@ -1,6 +1,6 @@
 // Any body of a request: it is refused or answered, and the answer is a message that can be read.
 #include "kldrcim/server/Cim_Server.h"
-#include "kldrcim/server/Indication_Query.h"
+#include "kldrcim/server/Select_Query.h"
 #include "kldrcim/wire/Xml_Reader.h"
 #include "tests/fuzz/Fuzz_Target.h"
 #include "tests/kldrcim/wire/Toy_Classes.h"
@@ -70,7 +70,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         answer(server, reader.document());
     FUZZ_EXPECT(reader.fault() == Xml_Fault::TOO_LARGE || reader.document().size() <= 8 * size + 64);
     Query_Error error;
-    if (const auto query = Indication_Query::parse(text, "WQL", error))
+    if (const auto query = Select_Query::parse(text, "WQL", error))
         query->matches({{.class_name = query->class_name()}, {}}, space.classes());
     return 0;
 }

@@ -201,6 +201,47 @@ class Model(Serving_Case):
         self.failed(25, self.connection.OpenEnumerateInstances, "CIM_FCPort", FilterQueryLanguage="DMTF:FQL", FilterQuery="a=1")
         self.failed(26, self.connection.OpenEnumerateInstances, "CIM_FCPort", ContinueOnError=True)
 
+    def test_queries(self):
+        ports = self.connection.EnumerateInstances("KALDERA_FCPort")
+        one = ports[0]
+        query = f"SELECT * FROM CIM_FCPort WHERE DeviceID = '{one['DeviceID']}'"
+        (found,) = self.connection.ExecQuery("WQL", query)
+        self.assertEqual((found.path.keybindings, found.properties), (one.path.keybindings, one.properties))
+        condition = "SELECT DeviceID, Speed FROM CIM_FCPort WHERE Speed > 0 AND NOT DeviceID IS NULL"
+        found = self.connection.ExecQuery("DMTF:CQL", condition)
+        self.assertEqual([each["DeviceID"] for each in found], [each["DeviceID"] for each in ports if each["Speed"]])
+        self.assertEqual({name for each in found for name in each.keys()}, {"DeviceID", "Speed"})
+        self.assertEqual(self.connection.ExecQuery("WQL", "SELECT * FROM KALDERA_FCPort WHERE DeviceID = 'x'"), [])
+        profiles = self.client.interop.ExecQuery("WQL", "SELECT * FROM CIM_RegisteredProfile WHERE RegisteredName = 'SMI-S'")
+        self.assertEqual([each["RegisteredName"] for each in profiles], ["SMI-S"])
+
+    def test_pulled_queries(self):
+        ports = self.connection.EnumerateInstances("KALDERA_FCPort")
+        query = "SELECT DeviceID, Speed FROM CIM_FCPort"
+        opened = self.connection.OpenQueryInstances("DMTF:CQL", query, ReturnQueryResultClass=True, MaxObjectCount=1)
+        self.assertEqual((len(opened.instances), opened.eos), (1, False))
+        self.assertEqual(set(opened.query_result_class.properties), {"DeviceID", "Speed"})
+        self.assertEqual(len(opened.query_result_class.methods), 0)
+        self.failed(21, self.connection.PullInstancesWithPath, opened.context, 1)
+        rest = self.connection.PullInstances(opened.context, 1000)
+        self.assertTrue(rest.eos)
+        found = [each["DeviceID"] for each in opened.instances + rest.instances]
+        self.assertEqual(found, [each["DeviceID"] for each in ports])
+        every = self.connection.IterQueryInstances("WQL", query, MaxObjectCount=2)
+        self.assertEqual([each["DeviceID"] for each in every.generator], found)
+
+    def test_refused_queries(self):
+        for ask in (self.connection.ExecQuery, self.connection.OpenQueryInstances):
+            self.failed(14, ask, "SQL", "SELECT * FROM CIM_FCPort")
+            self.failed(15, ask, "WQL", "SELECT FROM CIM_FCPort")
+            self.failed(15, ask, "WQL", "SELECT * FROM CIM_FCPort, CIM_System")
+            self.failed(15, ask, "WQL", "SELECT * FROM CIM_FCPort WHERE Speed")
+            self.failed(15, ask, "WQL", "SELECT * FROM CIM_FCPort WHERE Nothing = 1")
+            self.failed(15, ask, "WQL", "SELECT Nothing FROM CIM_FCPort")
+            self.failed(15, ask, "WQL", "SELECT COUNT(*) FROM CIM_FCPort")
+            self.failed(5, ask, "WQL", "SELECT * FROM CIM_Nothing")
+            self.failed(3, ask, "WQL", "SELECT * FROM CIM_FCPort", namespace="root/nothing")
+
     def test_classes_as_mof(self):
         classes = self.connection.EnumerateClasses(DeepInheritance=True, LocalOnly=False)
         self.assertEqual(len(classes), 178)

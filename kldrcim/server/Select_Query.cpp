@@ -1,4 +1,4 @@
-#include "kldrcim/server/Indication_Query.h"
+#include "kldrcim/server/Select_Query.h"
 
 #include "broker/values/Type_Words.h"
 
@@ -99,7 +99,7 @@ std::optional<int> order(const Value& a, const Value& b)
 } // namespace
 
 /// A tree of AND, OR and NOT over comparisons.
-class Indication_Query::Condition
+class Select_Query::Condition
 {
 public:
     enum Kind
@@ -176,18 +176,20 @@ class Query_Parser
 public:
     explicit Query_Parser(const std::string& text) : text_(text) { advance(); }
 
-    std::optional<Indication_Query> query(Query_Error& error)
+    std::optional<Select_Query> query(Query_Error& error)
     {
-        Indication_Query result;
-        if (select(result) && end())
+        Select_Query result;
+        if (select(result) && end()) {
+            result.compared_ = std::move(compared_);
             return result;
+        }
         error = {CMPI_RC_ERR_INVALID_QUERY,
                  "at character " + std::to_string(failed_at_ + 1) + ": " + wanted_ + " is expected"};
         return std::nullopt;
     }
 
 private:
-    using Condition = Indication_Query::Condition;
+    using Condition = Select_Query::Condition;
     using Part = std::shared_ptr<const Condition>;
 
     enum class Kind
@@ -200,7 +202,7 @@ private:
         BROKEN,
     };
 
-    bool select(Indication_Query& result)
+    bool select(Select_Query& result)
     {
         if (!word("SELECT") || !properties(result.properties_) || !word("FROM") || !name(result.class_name_))
             return false;
@@ -326,6 +328,7 @@ private:
         }
         if (names.size() > 1 && same_name(names.front(), class_name))
             names.erase(names.begin());
+        compared_.push_back(names.front());
         return names.size() <= 2 || fail("one embedded instance at most");
     }
 
@@ -463,12 +466,13 @@ private:
     std::string token_;
     unsigned depth_ = 0;
     unsigned comparisons_ = 0;
+    std::vector<std::string> compared_;
     std::string wanted_;
     std::size_t failed_at_ = 0;
 };
 
-std::optional<Indication_Query> Indication_Query::parse(const std::string& text, const std::string& language,
-                                                        Query_Error& error)
+std::optional<Select_Query> Select_Query::parse(const std::string& text, const std::string& language,
+                                                Query_Error& error)
 {
     constexpr const char* languages[] = {"WQL", "DMTF:CQL", "CIM:CQL", "CQL"};
     if (std::ranges::none_of(languages, [&](const char* each) { return same_name(each, language); })) {
@@ -478,17 +482,26 @@ std::optional<Indication_Query> Indication_Query::parse(const std::string& text,
     return Query_Parser(text).query(error);
 }
 
-bool Indication_Query::matches(const Instance_Value& indication, const Class_Catalogue& classes) const
+std::string Select_Query::unknown_property(const Class_Info& info) const
 {
-    return classes.is_a(indication.path.class_name, class_name_) &&
-           (!condition_ || condition_->evaluate(indication, classes) == Truth::YES);
+    for (const auto* names : {&properties_, &compared_})
+        for (const std::string& name : *names)
+            if (!info.property(name))
+                return name;
+    return {};
 }
 
-void Indication_Query::project(Instance_Value& indication) const
+bool Select_Query::matches(const Instance_Value& instance, const Class_Catalogue& classes) const
+{
+    return classes.is_a(instance.path.class_name, class_name_) &&
+           (!condition_ || condition_->evaluate(instance, classes) == Truth::YES);
+}
+
+void Select_Query::project(Instance_Value& instance) const
 {
     if (properties_.empty())
         return;
-    std::erase_if(indication.properties, [&](const Named_Value& property) {
+    std::erase_if(instance.properties, [&](const Named_Value& property) {
         return !same_name(property.name, "SequenceContext") && !same_name(property.name, "SequenceNumber") &&
                std::ranges::none_of(properties_,
                                     [&](const std::string& name) { return same_name(name, property.name); });

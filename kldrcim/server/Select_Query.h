@@ -16,25 +16,30 @@ struct Query_Error
     std::string text;
 };
 
-/// A query of a subscription, in WQL or in the part of DMTF:CQL that looks the same:
+/// A query of a subscription, or for instances, in WQL or in the part of DMTF:CQL that looks the same:
 ///
 ///     SELECT *|NAME[, NAME...] FROM CLASS [WHERE CONDITION]
 ///
 /// A condition compares a property with a text, number, TRUE, FALSE or NULL (= <> != < <= > >= LIKE, IS [NOT]
 /// NULL), or asks what class an embedded instance is of (ISA); with AND, OR, NOT and parentheses. What is
 /// null compares to neither true nor false, as in SQL.
-class Indication_Query
+class Select_Query
 {
 public:
     /// Nothing with `error` for a query that cannot be understood.
-    static std::optional<Indication_Query> parse(const std::string& text, const std::string& language,
-                                                 Query_Error& error);
+    static std::optional<Select_Query> parse(const std::string& text, const std::string& language,
+                                             Query_Error& error);
 
     const std::string& class_name() const { return class_name_; }
+    /// What is asked for; nothing for all.
+    const std::vector<std::string>& properties() const { return properties_; }
+    /// The first name, of those that are asked for or compared, that is no property of the class; empty if
+    /// there is none.
+    std::string unknown_property(const Class_Info& info) const;
 
-    bool matches(const Instance_Value& indication, const Class_Catalogue& classes) const;
-    /// Drops the properties that are not asked for, but for those of its sequence.
-    void project(Instance_Value& indication) const;
+    bool matches(const Instance_Value& instance, const Class_Catalogue& classes) const;
+    /// Drops the properties that are not asked for, but for those of an indication's sequence.
+    void project(Instance_Value& instance) const;
 
     class Condition;
 
@@ -43,6 +48,7 @@ private:
 
     std::string class_name_;
     std::vector<std::string> properties_;
+    std::vector<std::string> compared_;
     std::shared_ptr<const Condition> condition_;
 };
 

@@ -1,10 +1,10 @@
-#include "kldrcim/server/Indication_Query.h"
+#include "kldrcim/server/Select_Query.h"
 
 #include <gtest/gtest.h>
 
 namespace KPRV::kldrcim {
 
-class Indication_Query_Test : public testing::Test
+class Select_Query_Test : public testing::Test
 {
 protected:
     static Instance_Value alert()
@@ -25,14 +25,14 @@ protected:
 
     bool matches(const std::string& condition)
     {
-        const auto query = Indication_Query::parse("SELECT * FROM Alert WHERE " + condition, "WQL", error_);
+        const auto query = Select_Query::parse("SELECT * FROM Alert WHERE " + condition, "WQL", error_);
         EXPECT_TRUE(query) << condition << ": " << error_.text;
         return query && query->matches(alert(), classes_);
     }
     std::string refusal(const std::string& text, const std::string& language = "WQL")
     {
         error_ = {};
-        EXPECT_FALSE(Indication_Query::parse(text, language, error_)) << text;
+        EXPECT_FALSE(Select_Query::parse(text, language, error_)) << text;
         return std::to_string(error_.rc) + " " + error_.text;
     }
 
@@ -40,7 +40,22 @@ protected:
     Query_Error error_;
 };
 
-TEST_F(Indication_Query_Test, ComparesPropertiesWithLiterals)
+TEST_F(Select_Query_Test, NamesWhatTheClassHasNot)
+{
+    Class_Info info;
+    for (const char* name : {"MessageID", "SourceInstance"})
+        info.properties.emplace_back().name = name;
+    const auto unknown = [&](const char* text) {
+        const auto query = Select_Query::parse(text, "WQL", error_);
+        return query ? query->unknown_property(info) : error_.text;
+    };
+    EXPECT_EQ("", unknown("SELECT * FROM Alert"));
+    EXPECT_EQ("", unknown("SELECT messageid FROM Alert WHERE Alert.MessageID = 'x' OR SourceInstance.Any = 1"));
+    EXPECT_EQ("Other", unknown("SELECT MessageID, Other FROM Alert"));
+    EXPECT_EQ("Other", unknown("SELECT * FROM Alert WHERE MessageID = 'x' AND NOT Other IS NULL"));
+}
+
+TEST_F(Select_Query_Test, ComparesPropertiesWithLiterals)
 {
     for (const char* condition : {"MessageID = 'FC''1'",
                                   "MessageID = 'FC\\'1'",
@@ -78,7 +93,7 @@ TEST_F(Indication_Query_Test, ComparesPropertiesWithLiterals)
         EXPECT_FALSE(matches(condition)) << condition;
 }
 
-TEST_F(Indication_Query_Test, KnowsWhatIsUnknown)
+TEST_F(Select_Query_Test, KnowsWhatIsUnknown)
 {
     EXPECT_FALSE(matches("Nothing = 'x'"));
     EXPECT_FALSE(matches("NOT Nothing = 'x'"));
@@ -89,7 +104,7 @@ TEST_F(Indication_Query_Test, KnowsWhatIsUnknown)
     EXPECT_FALSE(matches("Missing.Part = 1"));
 }
 
-TEST_F(Indication_Query_Test, BindsAsSqlDoes)
+TEST_F(Select_Query_Test, BindsAsSqlDoes)
 {
     EXPECT_TRUE(matches("Severity = 5 OR Severity = 4 AND Good = FALSE"));
     EXPECT_FALSE(matches("(Severity = 5 OR Severity = 4) AND Good = FALSE"));
@@ -97,7 +112,7 @@ TEST_F(Indication_Query_Test, BindsAsSqlDoes)
     EXPECT_TRUE(matches("not not Severity=5"));
 }
 
-TEST_F(Indication_Query_Test, SaysWhereAQueryGoesWrong)
+TEST_F(Select_Query_Test, SaysWhereAQueryGoesWrong)
 {
     EXPECT_EQ("15 at character 1: SELECT is expected", refusal(""));
     EXPECT_EQ("15 at character 10: a name is expected", refusal("SELECT a,"));
@@ -111,7 +126,7 @@ TEST_F(Indication_Query_Test, SaysWhereAQueryGoesWrong)
     EXPECT_EQ("14 WQL and DMTF:CQL are understood", refusal("SELECT * FROM A", "DMTF:FQL"));
 }
 
-TEST_F(Indication_Query_Test, IsBounded)
+TEST_F(Select_Query_Test, IsBounded)
 {
     std::string nested, chained = "a = 1";
     for (int i = 0; i < 100; ++i)
@@ -122,9 +137,9 @@ TEST_F(Indication_Query_Test, IsBounded)
     EXPECT_NE(std::string::npos, refusal("SELECT * FROM A WHERE " + chained).find("fewer comparisons"));
 }
 
-TEST_F(Indication_Query_Test, ProjectsButKeepsTheSequence)
+TEST_F(Select_Query_Test, ProjectsButKeepsTheSequence)
 {
-    const auto query = Indication_Query::parse("select messageid, Good from Alert", "CIM:CQL", error_);
+    const auto query = Select_Query::parse("select messageid, Good from Alert", "CIM:CQL", error_);
     ASSERT_TRUE(query);
     Instance_Value instance = alert();
     query->project(instance);

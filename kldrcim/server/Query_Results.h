@@ -1,0 +1,30 @@
+#pragma once
+
+#include "kldrcim/server/Cim_Server.h"
+#include "kldrcim/server/Select_Query.h"
+
+namespace KPRV::kldrcim {
+
+/// The query in two parameters of an operation. Throws `Wire_Error`: status 4 without one, 14 for its
+/// language, 15 for itself, 5 for a class that there is not.
+Select_Query read_query(const Operation_Call& call, const char* language, const char* query);
+
+/// Lets through what a query selects, with the properties that it asks for.
+class Query_Results final : public Receiver
+{
+public:
+    Query_Results(const Select_Query& query, const Class_Catalogue& classes, Receiver& next)
+        : query_(query), classes_(classes), next_(next)
+    {
+    }
+
+    bool instance(Instance_Value&& instance) override;
+    bool path(Path_Value&&) override { return true; }
+
+private:
+    const Select_Query& query_;
+    const Class_Catalogue& classes_;
+    Receiver& next_;
+};
+
+} // namespace KPRV::kldrcim
