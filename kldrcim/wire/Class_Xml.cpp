@@ -17,6 +17,27 @@ using At = Xml_Attribute;
 /// A class whose features know nobody else: the reader needs no types but those that stand there.
 const No_Catalogue no_catalogue;
 
+bool same_meanings(std::span<const Value_Meaning> a, std::span<const Value_Meaning> b)
+{
+    return std::ranges::equal(a, b, [](const Value_Meaning& one, const Value_Meaning& other) {
+        return one.least == other.least && one.most == other.most && std::string_view(one.word) == other.word;
+    });
+}
+
+bool same_declaration(const Feature_Info& a, const Feature_Info& b)
+{
+    return a.type == b.type && a.key == b.key && a.in == b.in && a.out == b.out &&
+           same_name(a.target_class, b.target_class) && a.default_value == b.default_value;
+}
+
+bool same_declaration(const Method_Info& a, const Method_Info& b)
+{
+    return a.is_static == b.is_static && a.return_type == b.return_type &&
+           std::ranges::equal(a.parameters, b.parameters, [](const auto& one, const auto& other) {
+               return same_name(one.name, other.name) && same_declaration(one, other);
+           });
+}
+
 class Class_Writer
 {
 public:
@@ -40,7 +61,7 @@ public:
             if (is_wanted(property))
                 write_property(property);
         for (const Method_Info& method : info_.methods)
-            if (!form_.local_only || !superclass_ || !superclass_->method(method.name))
+            if (!form_.local_only || is_own(method, superclass_ ? superclass_->method(method.name) : nullptr))
                 write_method(method);
         writer_.close(Tag::CLASS);
     }
@@ -48,18 +69,30 @@ public:
 private:
     bool is_wanted(const Feature_Info& property) const
     {
-        const bool inherited = superclass_ && superclass_->property(property.name);
-        return (!form_.local_only || !inherited) &&
+        return (!form_.local_only || is_own(property, inherited(property))) &&
                (!form_.properties || std::ranges::any_of(*form_.properties, [&](const std::string& name) {
                    return same_name(name, property.name);
                }));
     }
 
-    void write_origin(const std::string& origin)
+    const Feature_Info* inherited(const Feature_Info& property) const
+    {
+        return superclass_ ? superclass_->property(property.name) : nullptr;
+    }
+
+    /// True for what the class declares, or declares anew: what is known of it is not what was inherited.
+    template <class Info>
+    bool is_own(const Info& info, const Info* inherited) const
+    {
+        return !inherited || !same_declaration(info, *inherited) ||
+               !same_meanings(words_.of(info.name), inherited_words_.of(info.name));
+    }
+
+    void write_origin(const std::string& origin, bool is_own)
     {
         if (form_.origins)
             writer_.attribute(At::CLASSORIGIN, origin);
-        if (!same_name(origin, info_.name))
+        if (!is_own)
             writer_.attribute(At::PROPAGATED, "true");
     }
 
@@ -86,7 +119,7 @@ private:
     {
         const std::string origin = origin_of_property(catalogue_, info_.name, property.name);
         open(property, Tag::PROPERTY, Tag::PROPERTY_ARRAY, Tag::PROPERTY_REFERENCE, Tag::PROPERTY_ARRAY);
-        write_origin(origin);
+        write_origin(origin, is_own(property, inherited(property)));
         if (form_.qualifiers) {
             if (property.key)
                 write_qualifier(writer_, "Key");
@@ -124,7 +157,8 @@ private:
         writer_.open(Tag::METHOD).attribute(At::NAME, method.name);
         if (method.return_type != CMPI_null)
             writer_.attribute(At::TYPE, wire_type_name(method.return_type));
-        write_origin(origin_of_method(method.name));
+        write_origin(origin_of_method(method.name),
+                     is_own(method, superclass_ ? superclass_->method(method.name) : nullptr));
         if (form_.qualifiers && method.is_static)
             write_qualifier(writer_, "Static");
         if (form_.qualifiers)
@@ -153,6 +187,7 @@ private:
     const Class_Form& form_;
     const Class_Info* superclass_;
     const Class_Words words_{info_.name};
+    const Class_Words inherited_words_{info_.superclass};
     Tag latest_ = Tag::PROPERTY;
 };
 

@@ -72,6 +72,24 @@ TEST_F(Class_Xml, SaysWhatIsItsOwn)
         << all;
 }
 
+TEST_F(Class_Xml, SaysWhatIsDeclaredAnew)
+{
+    const std::string link = written("Toy_Ball_Link", {.qualifiers = false, .origins = true});
+    EXPECT_EQ(std::string::npos, link.find("\"From\"")) << link;
+    EXPECT_NE(std::string::npos,
+              link.find("NAME=\"To\" REFERENCECLASS=\"Toy_Ball\" CLASSORIGIN=\"Toy_Link\">"))
+        << link;
+    const std::string ball = written("Toy_Small_Ball", {.qualifiers = false});
+    for (const char* inherited : {"\"Name\"", "\"Size\"", "\"Parts\"", "PROPAGATED"})
+        EXPECT_EQ(std::string::npos, ball.find(inherited)) << ball;
+    EXPECT_NE(std::string::npos, ball.find("<VALUE>blue</VALUE>")) << ball;
+    EXPECT_NE(std::string::npos, ball.find("<METHOD NAME=\"Grow\"")) << ball;
+    const std::string all = written("Toy_Small_Ball", {.local_only = false, .qualifiers = false});
+    EXPECT_NE(std::string::npos, all.find("<PROPERTY NAME=\"Size\" TYPE=\"uint8\" PROPAGATED=\"true\">"))
+        << all;
+    EXPECT_NE(std::string::npos, all.find("<PROPERTY NAME=\"Color\" TYPE=\"string\"><VALUE>blue")) << all;
+}
+
 TEST_F(Class_Xml, TellsTheWordsOfOrganizations)
 {
     const std::string text = written("CIM_RegisteredSpecification", {});

@@ -41,6 +41,14 @@ public:
         add("Toy_Link", "",
             {feature("From", CMPI_ref, true, "Toy_Base"), feature("To", CMPI_ref, true, "Toy_Base")}, {});
         classes_.back().is_association = true;
+        // What a class declares anew is another thing than what it inherits.
+        add("Toy_Ball_Link", "Toy_Link",
+            {feature("From", CMPI_ref, true, "Toy_Base"), feature("To", CMPI_ref, true, "Toy_Ball")}, {});
+        classes_.back().is_association = true;
+        Method_Info shrink = grow;
+        shrink.parameters.pop_back();
+        color.default_value = Value::text("blue");
+        add("Toy_Small_Ball", "Toy_Ball", {name, size, color, parts}, {shrink});
         add("CIM_RegisteredSpecification", "", {feature("RegisteredOrganization", CMPI_uint16)}, {});
     }
 
