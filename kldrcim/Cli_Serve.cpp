@@ -22,8 +22,10 @@ int serve(const Cli_Options&, Host&)
 #include "kldrcim/server/Http_Server.h"
 #include "kldrcim/server/Subscriptions.h"
 #include "kldrcim/verbs/Interruption.h"
+#include "kldrcim/verbs/Running_Jobs.h"
 
 #include <cerrno>
+#include <cstdlib>
 #include <fstream>
 #include <iterator>
 #include <system_error>
@@ -92,17 +94,11 @@ Http_Page metrics_page(Host& host, const std::string& accept)
     return {media_type(notation), metrics_text(readings, notation)};
 }
 
-} // namespace
-
-int serve(const Cli_Options& options, Host& host)
+/// Until a signal comes; what clients have asked for is then answered.
+int serve_until(Interruption& interruption, const Cli_Options& options, const Http_Options& http_options,
+                Host& host)
 {
-    Http_Options http_options;
-    Users_File users;
     std::string error;
-    if (!read_options(options, http_options, users, error))
-        return complain(error, USAGE_ERROR);
-    http_options.metrics = [&host](const std::string& accept) { return metrics_page(host, accept); };
-    Interruption interruption;
     const std::string host_name = own_host_name();
     Broker_Space model(host);
     const Interop_Classes classes(host.catalogue());
@@ -129,6 +125,42 @@ int serve(const Cli_Options& options, Host& host)
     while (interruption.count() == 0)
         interruption.wait();
     return 0;
+}
+
+/// A hardware test may have taken a port out of service: this process ends when it has been brought back, or
+/// with the next signal.
+void wait_for_jobs(Interruption& interruption, Host& host)
+{
+    constexpr auto moment = std::chrono::milliseconds(100);
+    Local_Connection connection(host);
+    if (!connection.is_at_work())
+        return;
+    complain("waiting for the end of " + running_jobs(connection) + "; the next signal ends it as it is", 0);
+    const unsigned signals = interruption.count();
+    while (connection.is_at_work()) {
+        interruption.wait(moment);
+        if (interruption.count() == signals)
+            continue;
+        complain("left as it is: " + running_jobs(connection), 0);
+        // Not by the usual end, which would wait for the provider.
+        std::_Exit(status_of_signal(interruption.latest()));
+    }
+}
+
+} // namespace
+
+int serve(const Cli_Options& options, Host& host)
+{
+    Http_Options http_options;
+    Users_File users;
+    std::string error;
+    if (!read_options(options, http_options, users, error))
+        return complain(error, USAGE_ERROR);
+    http_options.metrics = [&host](const std::string& accept) { return metrics_page(host, accept); };
+    Interruption interruption;
+    const int status = serve_until(interruption, options, http_options, host);
+    wait_for_jobs(interruption, host);
+    return status;
 }
 
 } // namespace KPRV::kldrcim

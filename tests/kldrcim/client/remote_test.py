@@ -6,6 +6,7 @@ import re
 import signal
 import subprocess
 import tempfile
+import time
 import unittest
 
 from asking import in_process, run, start
@@ -138,6 +139,39 @@ class Jobs_Of_A_Server(Serving_Case):
         self.assertEqual(130, process.returncode)
         self.assertIn("kldrcim: interrupted: the server goes on with the test\n", errors)
         self.assertEqual(3, run("--url", self.served.url, "diag", "run", "MemoryTest", "2000024b4c100000")[0])
+
+
+class The_End_Of_A_Server(unittest.TestCase):
+    """A test that a client has started is told, and not cut off."""
+
+    def setUp(self):
+        self.served = Served()
+        status, out, errors = run("--url", self.served.url, "diag", "run", "SerdesLoopbackTest", "1000024b4c100000")
+        self.assertEqual(0, status, errors)
+        self.job = out.strip()
+        self.served.process.send_signal(signal.SIGTERM)
+        end = time.monotonic() + PATIENCE
+        while "waiting" not in self.told() and time.monotonic() < end:
+            time.sleep(0.05)
+        self.assertIsNone(self.served.process.poll(), self.told())
+        self.assertEqual(self.told(), f"kldrcim: waiting for the end of {self.job}; the next signal ends it as it is\n")
+
+    def told(self):
+        self.served.errors.seek(0)
+        return self.served.errors.read()
+
+    def test_it_is_waited_for(self):
+        # Nobody gets in any more.
+        self.assertEqual(2, run("--url", self.served.url, "ein", "KALDERA_FCPort")[0])
+        self.assertEqual(0, self.served.process.wait(PATIENCE))
+        self.assertEqual(0, self.served.stop())
+        self.assertEqual(1, self.served.said.count("\n"), self.served.said)
+
+    def test_the_next_signal_ends_it(self):
+        self.served.process.send_signal(signal.SIGINT)
+        self.assertEqual(128 + signal.SIGINT, self.served.process.wait(PATIENCE))
+        self.served.stop()
+        self.assertIn(f"kldrcim: left as it is: {self.job}\n", self.served.said)
 
 
 class Watching(Serving_Case):
