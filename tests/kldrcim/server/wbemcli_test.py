@@ -110,6 +110,11 @@ class Wbemcli(Serving_Case):
 
     def test_what_cannot_be_changed(self):
         path = self.first("KALDERA_ComputerSystem")
+        self.failed(7, "sp", path, "ElementName=x")
+        self.failed(7, "mi", path, "ElementName=x")
+        # It asks for the class first, and looks there.
+        self.assertIn("Unknown property", "".join(self.try_wbemcli("sp", path, "Nothing=x")[1:]))
+        self.failed(6, "mi", path[:-1] + '0"', "ElementName=x")
         self.failed(7, "di", path)
         self.failed(7, "dc", "CIM_FCPort")
 
