@@ -17,6 +17,24 @@ using At = Xml_Attribute;
 /// A class whose features know nobody else: the reader needs no types but those that stand there.
 const No_Catalogue no_catalogue;
 
+bool is_rest(const Value_Meaning& meaning)
+{
+    return value_map_text(meaning) == "..";
+}
+
+/// Clients take what has no end to go as far as its neighbours: numbers ascend, and what is left of them
+/// stands in front of the last range.
+std::vector<Value_Meaning> in_order_of_numbers(std::span<const Value_Meaning> meanings)
+{
+    std::vector<Value_Meaning> ordered(meanings.begin(), meanings.end());
+    std::ranges::sort(ordered, {},
+                      [](const Value_Meaning& each) { return std::pair(is_rest(each), each.least); });
+    const std::size_t count = ordered.size();
+    if (count > 1 && is_rest(ordered[count - 1]) && ordered[count - 2].least != ordered[count - 2].most)
+        std::swap(ordered[count - 1], ordered[count - 2]);
+    return ordered;
+}
+
 bool same_meanings(std::span<const Value_Meaning> a, std::span<const Value_Meaning> b)
 {
     return std::ranges::equal(a, b, [](const Value_Meaning& one, const Value_Meaning& other) {
@@ -133,7 +151,7 @@ private:
     void write_words(const std::string& feature)
     {
         std::vector<std::string> numbers, words;
-        for (const Value_Meaning& meaning : words_.of(feature)) {
+        for (const Value_Meaning& meaning : in_order_of_numbers(words_.of(feature))) {
             numbers.push_back(value_map_text(meaning));
             words.push_back(meaning.word);
         }

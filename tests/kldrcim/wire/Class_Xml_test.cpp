@@ -99,6 +99,18 @@ TEST_F(Class_Xml, TellsTheWordsOfOrganizations)
     EXPECT_NE(std::string::npos, text.find("<VALUE>11</VALUE>")) << text;
 }
 
+TEST_F(Class_Xml, PutsWhatIsLeftOfNumbersBeforeTheLastRange)
+{
+    const std::string text = written("CIM_EnabledLogicalElement", {});
+    EXPECT_NE(
+        std::string::npos,
+        text.find("<VALUE>9</VALUE><VALUE>10</VALUE><VALUE>11..32767</VALUE><VALUE>32768..65535</VALUE>"))
+        << text;
+    const std::string status = written("CIM_ManagedSystemElement", {});
+    EXPECT_NE(std::string::npos, status.find("<VALUE>19</VALUE><VALUE>..</VALUE><VALUE>32768..</VALUE>"))
+        << status;
+}
+
 TEST_F(Class_Xml, RefusesWhatIsNoClass)
 {
     EXPECT_THROW(read("<CLASS/>"), Wire_Error);

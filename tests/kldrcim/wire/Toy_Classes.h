@@ -49,6 +49,9 @@ public:
         shrink.parameters.pop_back();
         color.default_value = Value::text("blue");
         add("Toy_Small_Ball", "Toy_Ball", {name, size, color, parts}, {shrink});
+        // Those have words, which the catalogue knows by class and name.
+        add("CIM_EnabledLogicalElement", "", {feature("EnabledState", CMPI_uint16)}, {});
+        add("CIM_ManagedSystemElement", "", {feature("OperationalStatus", CMPI_uint16A)}, {});
         add("CIM_RegisteredSpecification", "", {feature("RegisteredOrganization", CMPI_uint16)}, {});
     }
 
