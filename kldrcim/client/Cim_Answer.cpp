@@ -153,6 +153,21 @@ Result Cim_Answer::result(const Http_Head& head, const Class_Catalogue& catalogu
 
 namespace {
 
+/// As the class has them; what it does not know comes last.
+void put_in_order(std::vector<Named_Value>& values, const Class_Info& info)
+{
+    const Feature_Info* const end = info.properties.data() + info.properties.size();
+    std::vector<std::pair<const Feature_Info*, Named_Value>> placed;
+    placed.reserve(values.size());
+    for (Named_Value& each : values) {
+        const Feature_Info* const place = info.property(each.name);
+        placed.emplace_back(place ? place : end, std::move(each));
+    }
+    std::ranges::stable_sort(placed, {}, [](const auto& each) { return each.first; });
+    for (std::size_t i = 0; i < values.size(); ++i)
+        values[i] = std::move(placed[i].second);
+}
+
 /// Makes of an element what the module would have handed over.
 class Object_Taker
 {
@@ -189,6 +204,8 @@ private:
             std::erase_if(instance.properties, [&](const Named_Value& property) {
                 return !contains_name(*request_.properties, property.name);
             });
+        if (const Class_Info* const info = catalogue_.find(instance.path.class_name))
+            put_in_order(instance.properties, *info);
         return receiver_.instance(std::move(instance));
     }
 
@@ -198,11 +215,8 @@ private:
         path.host.clear();
         if (path.name_space.empty())
             path.name_space = request_.path.name_space;
-        const Class_Info* const info = catalogue_.find(path.class_name);
-        if (!info)
-            return path;
-        const auto place = [&](const Named_Value& key) { return info->property(key.name); };
-        std::ranges::stable_sort(path.keys, {}, place);
+        if (const Class_Info* const info = catalogue_.find(path.class_name))
+            put_in_order(path.keys, *info);
         return path;
     }
 
@@ -211,6 +225,20 @@ private:
     const Request& request_;
     Receiver& receiver_;
 };
+
+/// Some servers take the keys that a list leaves out from the paths, too. What was not asked for goes no
+/// further.
+Request with_keys(Request request, const Class_Catalogue& catalogue)
+{
+    const Class_Info* const info = request.properties && request.operation == Operation::ENUMERATE_INSTANCES
+                                       ? catalogue.find(request.path.class_name)
+                                       : nullptr;
+    if (info)
+        for (const Feature_Info& each : info->properties)
+            if (each.key && !contains_name(*request.properties, each.name))
+                request.properties->push_back(each.name);
+    return request;
+}
 
 } // namespace
 
@@ -221,7 +249,8 @@ Result ask_for_objects(Http_Client& http, const Class_Catalogue& catalogue, cons
         request.operation == Operation::INVOKE_METHOD ? catalogue.find(request.path.class_name) : nullptr;
     Object_Taker taker(catalogue, request, receiver);
     Cim_Answer answer(http, [&](Xml_Node node) { return taker.take(node); });
-    return answer.ask(write_request(request), catalogue, info ? info->method(request.method) : nullptr);
+    return answer.ask(write_request(with_keys(request, catalogue)), catalogue,
+                      info ? info->method(request.method) : nullptr);
 }
 
 } // namespace KPRV::kldrcim

@@ -159,6 +159,22 @@ class Broken_Servers(unittest.TestCase):
         self.assertEqual((0, ""), (status, errors))
         self.assertEqual('instance of X {\n    T = "a<b!";\n    A = {31, NULL};\n    E = instance of Y {\n    };\n};\n', out.replace("    }", "    }"))
 
+    def test_keys_are_asked_for_too(self):
+        """Some servers give paths without the keys that a list of properties leaves out."""
+        declared = '<CLASS NAME="X"><PROPERTY NAME="K" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE>' \
+            '</QUALIFIER></PROPERTY><PROPERTY NAME="S" TYPE="string"/></CLASS>'
+        found = "<VALUE.NAMEDINSTANCE>" + NAMED.format("a") + '<INSTANCE CLASSNAME="X"><PROPERTY NAME="K" TYPE="string"><VALUE>a' \
+            '</VALUE></PROPERTY><PROPERTY NAME="S" TYPE="string"><VALUE>s</VALUE></PROPERTY></INSTANCE></VALUE.NAMEDINSTANCE>'
+
+        def send(at):
+            is_class = "GetClass" in at.server.asked[-1]
+            at.send(200, answer("X", ENUMERATED.format(declared if is_class else found)))
+
+        server, url = self.serve(send)
+        status, out, errors = run("--url", url, "ei", "X", "--properties", "S", "--format", "mof")
+        self.assertEqual((0, 'instance of X {\n    S = "s";\n};\n', ""), (status, out, errors))
+        self.assertIn("<VALUE.ARRAY><VALUE>S</VALUE><VALUE>K</VALUE></VALUE.ARRAY>", server.asked[-1])
+
     def test_void_operations_with_an_empty_value(self):
         def send(at):
             is_class = "GetClass" in at.server.asked[-1]
