@@ -50,7 +50,8 @@ TEST_F(Select_Query_Test, NamesWhatTheClassHasNot)
         return query ? query->unknown_property(info) : error_.text;
     };
     EXPECT_EQ("", unknown("SELECT * FROM Alert"));
-    EXPECT_EQ("", unknown("SELECT messageid FROM Alert WHERE Alert.MessageID = 'x' OR SourceInstance.Any = 1"));
+    EXPECT_EQ("",
+              unknown("SELECT messageid FROM Alert WHERE Alert.MessageID = 'x' OR SourceInstance.Any = 1"));
     EXPECT_EQ("Other", unknown("SELECT MessageID, Other FROM Alert"));
     EXPECT_EQ("Other", unknown("SELECT * FROM Alert WHERE MessageID = 'x' AND NOT Other IS NULL"));
 }
