@@ -25,6 +25,10 @@ class Found:
         return f"{self.kind} ({self.word_size} bits)"
 
 
+#: `kldrcim serve`, which comes with the package and needs no archive.
+SERVE = Found("serve", "serve", 64, Path(__file__).resolve().parent / "serve")
+
+
 def word_size(head):
     """Of an ELF file with these first bytes."""
     if head[:4] != b"\x7fELF":

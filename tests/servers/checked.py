@@ -17,15 +17,19 @@ INVENTORY = "/mnt/source/simulator/inventories/rich.json"
 def main(file, *options):
     server = Server()
     server.module_environment["KLDR_SIMULATOR_INVENTORY"] = INVENTORY
-    server.prepare()
-    package.install()
-    package.register("install")
+    if server.is_ours:
+        package.install()
+    else:
+        server.prepare()
+        package.install()
+        package.register("install")
     server.start()
+    remote = ["--remote-kldrcim", server.room["remote_kldrcim"]] if server.room["remote_kldrcim"] else []
     environment = [f"{name}={value}" for name, value in server.module_environment.items()]
     own = {"PATH": ADMINISTRATOR, "HOME": "/root", "LC_ALL": "C.UTF-8", "KLDR_CLIENTS": os.environ["KLDR_CLIENTS"]}
     done = subprocess.run(
         [sys.executable, "-B", file, "--url", server.url, "--server", server.kind, "--kldrcim", "/usr/bin/kldrcim",
-         "--module-environment", *environment, *options],
+         *remote, "--module-environment", *environment, *options],
         env=own, check=False,
     )  # fmt: skip
     server.kill()

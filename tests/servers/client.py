@@ -3,8 +3,9 @@
 A check runs beside a CIM server that has the module, and is given the command line over the same module and the same
 simulated host to compare with:
 
-    CHECK --url URL --server sfcb|pegasus --kldrcim PROGRAM --module-environment NAME=VALUE... [--long]
+    CHECK --url URL --server sfcb|pegasus|serve --kldrcim PROGRAM --module-environment NAME=VALUE... [--long]
 
+`--remote-kldrcim PROGRAM` is a command line that knows `--url`, where that of the module's word size was built without.
 It ends with 0, or with 1 and a line for each thing that is not as it should be.
 """
 
@@ -23,7 +24,7 @@ from pathlib import Path
 from server_traits import traits_of
 
 NAMESPACE = "root/kaldera"
-INTEROP = {"sfcb": "root/interop", "pegasus": "root/PG_InterOp"}
+INTEROP = {"sfcb": "root/interop", "pegasus": "root/PG_InterOp", "serve": "interop"}
 #: Seconds in which a server answers; its own limit for a provider is shorter.
 PATIENCE = 60
 #: What a check shows of a flood of differences.
@@ -59,6 +60,7 @@ class Check:
         parser.add_argument("--url", required=True)
         parser.add_argument("--server", required=True, choices=sorted(INTEROP))
         parser.add_argument("--kldrcim", required=True)
+        parser.add_argument("--remote-kldrcim", metavar="PROGRAM", help="for --url, where the other has it not")
         parser.add_argument("--module-environment", nargs="*", default=[], metavar="NAME=VALUE")
         parser.add_argument("--long", action="store_true")
         self.options = parser.parse_args(arguments)

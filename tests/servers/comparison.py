@@ -1,5 +1,7 @@
 """Objects of both sides in one form, and what they differ in."""
 
+import re
+
 from client import NAMESPACE, pywbem
 
 
@@ -24,6 +26,13 @@ def plain(value):
     if isinstance(value, int):
         return int(value)
     return str(value)
+
+
+def in_comparable_form(value):
+    """A value of JSON, a reference without what the server has added to it."""
+    if isinstance(value, str) and re.match(r"(?:[\w/]+:)?[A-Za-z]+_\w+\.\w+=", value):
+        return path_of_text(value)
+    return value
 
 
 def shown(path):
@@ -117,10 +126,42 @@ class Comparison:
         if not added:
             self.check.expect(what, plain(found.value), path_of_text(value) if reference and value else value)
 
+    def objects(self, what, found, expected):
+        """The same for two answers of the command line: objects with class, path and properties that are not null, or paths."""
+        texts = [[each if isinstance(each, str) else each["path"] for each in side] for side in (found, expected)]
+        self.names(what, [pywbem.CIMInstanceName.from_wbem_uri(text) for text in texts[0]], texts[1], repeated=True)
+        by_path = {}
+        for each in expected:
+            if not isinstance(each, str):
+                by_path.setdefault(path_of_text(each["path"]), []).append(each)
+        for each in found:
+            alike = [] if isinstance(each, str) else by_path.get(path_of_text(each["path"]), [])
+            if alike:
+                differences = [self.of_object(each, other) for other in alike]
+                self.check.expect(f"{what}: {each['path']}", min(differences, key=len), {})
+
+    def of_object(self, found, expected):
+        """Properties that are not alike: what is found, and what is expected."""
+        wanted, shown_ = expected["properties"], found["properties"]
+        return {
+            name: (shown_.get(name), wanted.get(name))
+            for name in {*wanted, *shown_}
+            if in_comparable_form(shown_.get(name)) != in_comparable_form(wanted.get(name))
+            and not (name not in wanted and self.is_added(found["class"], name, shown_[name]))
+        }
+
+    def is_added(self, class_name, name, value):
+        """A default by the server, of a property that a provider has left null or does not know."""
+        known = name.lower() in self.catalogue.cells(class_name)
+        return (name in self.traits.defaults or not known) and self.has_default(class_name, name, value)
+
     def is_default(self, class_name, found):
         """What a server puts where a provider leaves a property null."""
-        cell = self.server_cells(class_name).get(found.name.lower())
-        return cell is not None and plain(cell.value) == plain(found.value)
+        return self.has_default(class_name, found.name, plain(found.value))
+
+    def has_default(self, class_name, name, value):
+        cell = self.server_cells(class_name).get(name.lower())
+        return cell is not None and plain(cell.value) == value
 
     def namespace(self, what, names, expected=NAMESPACE):
         for name in names:

@@ -8,6 +8,7 @@ PATH is an archive, an unpacked server or a folder of them; FOLDER the build of 
 import argparse
 import json
 import os
+import shutil
 import subprocess
 import sys
 import time
@@ -22,6 +23,9 @@ HERE = Path(__file__).resolve().parent
 SOURCE = HERE.parent.parent
 #: In seconds, for one machine.
 QUICK, LONG = 300, 3600
+REMOTE = "remote_kldrcim"
+#: What runs the command line over the wire.
+OVER_THE_WIRE = "remote_check"
 
 
 @dataclass
@@ -60,7 +64,8 @@ def belongs(module, server):
 def jobs(servers, long):
     kinds = set()
     for server in servers:
-        for module, case, is_long, once_a_kind in cases():
+        # Cases are about what an administrator does with a server.
+        for module, case, is_long, once_a_kind in [] if server is archives.SERVE else cases():
             too_much = is_long or (once_a_kind and server.kind in kinds)
             if belongs(module, server) and (long or not too_much):
                 yield Job(server, case, ["python3", "-B", "-m", "unittest", case])
@@ -69,6 +74,27 @@ def jobs(servers, long):
                 options = ["--long"] if long else []
                 yield Job(server, file.stem, ["python3", "-B", "checked.py", f"/mnt/source/tests/servers/{file.name}", *options])
         kinds.add(server.kind)
+
+
+def knows_url(build):
+    """Whether the command line of a build was made with the libraries that `--url` needs."""
+    done = subprocess.run([build / "kldrcim", "--url", "http://127.0.0.1:1", "ein", "X"], capture_output=True, check=False)
+    return b"built without" not in done.stderr
+
+
+def lend_remote(builds):
+    """Puts a command line that knows `--url` beside the packages of the builds whose own does not; where there is none, these are
+    told. The word size of a client is of no concern to a server."""
+    lender = next((build for build in builds.values() if knows_url(build)), None)
+    told = []
+    for size, build in builds.items():
+        lent = build / "servers" / REMOTE
+        lent.unlink(missing_ok=True)
+        if not knows_url(build) and lender:
+            shutil.copy(lender / "kldrcim", lent)
+        elif not lender:
+            told.append(size)
+    return told
 
 
 def run(job, builds, long):
@@ -82,6 +108,7 @@ def run(job, builds, long):
         "long": long,
         "package": "/mnt/packages/kldrprovider.deb",
         "adapter_library": "/mnt/packages/libdzntj.so",
+        "remote_kldrcim": f"/mnt/packages/{REMOTE}" if (packages / REMOTE).exists() else "",
     }
     inside = "cd /mnt/source/tests/servers && exec \"$@\""
     begin = time.monotonic()
@@ -102,7 +129,7 @@ def main():
     parser.add_argument("--long", action="store_true", help="all that takes time too")
     parser.add_argument("--build", action="append", default=[], metavar="BITS=FOLDER")
     parser.add_argument("--needs", action="store_true", help="print the word sizes of the servers, and end")
-    parser.add_argument("--only", default="", metavar="TEXT", help="cases and checks with this in their name")
+    parser.add_argument("--only", default="", metavar="TEXT", help="cases and checks with this in their name, or in that of their server")
     parser.add_argument("paths", nargs="+", metavar="PATH")
     options = parser.parse_args()
     servers = [server for path in options.paths for server in archives.find(path)]
@@ -113,7 +140,13 @@ def main():
         print(f"no CIM server in {', '.join(options.paths)}", file=sys.stderr)
         return 1
     builds = {int(bits): Path(folder).resolve() for bits, folder in (each.split("=", 1) for each in options.build)}
-    planned = [job for job in jobs(servers, options.long) if options.only in job.title]
+    if archives.SERVE.word_size in builds:
+        servers.append(archives.SERVE)
+    planned = [job for job in jobs(servers, options.long) if options.only in str(job)]
+    without = lend_remote(builds)
+    for job in [job for job in planned if job.title == OVER_THE_WIRE and job.server.word_size in without]:
+        planned.remove(job)
+        print(f"not run: {job}: no command line was built with --url", flush=True)
     failed = 0
     with ThreadPoolExecutor(2) as pool:
         for job, (status, output, seconds) in zip(planned, pool.map(lambda job: run(job, builds, options.long), planned)):

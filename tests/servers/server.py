@@ -12,7 +12,7 @@ from pathlib import Path
 import cim_question
 
 #: What each kind's processes are called.
-PROCESSES = {"sfcb": ("sfcbd",), "pegasus": ("cimserver", "cimprovagt")}
+PROCESSES = {"sfcb": ("sfcbd",), "pegasus": ("cimserver", "cimprovagt"), "serve": ("kldrcim",)}
 NAMESPACE = "root/kaldera"
 INVENTORY = "/mnt/source/simulator/inventories/demo.json"
 #: The administrator's search path, and the one that package managers give to their scripts.
@@ -59,6 +59,8 @@ class Server:
         self.word_size = self.room["word_size"]
         self.home = Path("/opt/cim-servers") / self.room["name"]
         self.port = port
+        #: It is of the package, and knows the module without being told.
+        self.is_ours = self.kind == "serve"
         #: The module's own settings in the server's environment.
         self.module_environment = {"KLDR_SIMULATOR_INVENTORY": INVENTORY, "HOME": "/root"}
 

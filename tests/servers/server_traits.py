@@ -42,9 +42,10 @@ class Traits:
     list_takes_keys: bool = False
     #: Threads that the server may have taken on for a moment with many requests, and keeps for later ones.
     thread_pool: int = 0
-    #: The module is registered for alerts in the interop name space too. The server matches what is delivered in one name space
-    #: with the filters of all, so that filters in two of them bring each alert twice.
-    alerts_in_interop: bool = False
+    #: How often each alert comes where there is a filter for the interop name space, too; 0 for a server that takes none. sfcb has
+    #: the module registered there and matches what is delivered in one name space with the filters of all, so that filters in two
+    #: of them bring each alert twice.
+    alerts_in_interop: int = 0
     #: Each delivered alert is handed to a thread of the server, and on a busy machine one overtakes others, as many as this at the
     #: most. The module numbers them before, so that a client can tell.
     alerts_overtake: int = 0
@@ -67,12 +68,15 @@ TRAITS = {
         # In its schema, CIM_DiagnosticRecord is derived from CIM_RecordForLog directly.
         removed_superclasses={"CIM_LogEntry"},
         void_is_a_list=True,
-        alerts_in_interop=True,
+        alerts_in_interop=2,
         alerts_overtake=16,
         numbers_alerts=True,
         fills_in_alerts={"indicationfiltername", "sequencecontext"},
         own_in_interop={"KALDERA_ObjectManager", "KALDERA_Namespace", "KALDERA_CIMXMLCommunicationMechanism"},
     ),
+    # `kldrcim serve` adds nothing to what the module says, but for the sequence of what each listener gets. A filter for the
+    # name space where filters live is one for the module's.
+    "serve": Traits(defaults=set(), fills_in_alerts={"sequencecontext"}, alerts_in_interop=1),
     "pegasus": Traits(profile_gives_organization=True, own_prefix="PG_", thread_pool=80, alerts_overtake=16),
 }
 

@@ -208,7 +208,7 @@ def check_two_name_spaces(alerts, listener):
     with alerts.subscription(listener):
         if alerts.traits.alerts_in_interop:
             with alerts.subscription(other, namespace=second):
-                expected = alerts.switch(2) * 2
+                expected = alerts.switch(2) * alerts.traits.alerts_in_interop
                 for each in (listener, other):
                     # Those of one name space are in order, but not those of both.
                     found = [alert["MessageID"] for alert in each.take(len(expected))]
