@@ -1,6 +1,7 @@
 // The function table of `CMPIArray`: of fixed size and one type, as it was made.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
+#include "broker/values/Value_Bytes.h"
 
 namespace KPRV::broker {
 
@@ -16,6 +17,31 @@ Array_Object::Array_Object(Core& owner_core, const Value& value)
 {
     for (const Value& element : value.elements())
         elements.push_back({element, nullptr});
+}
+
+bool Array_Object::pack()
+{
+    Byte_Writer writer;
+    writer.number(elements.size());
+    for (const Element& element : elements) {
+        writer.number(reinterpret_cast<std::uintptr_t>(element.object));
+        writer.value(element.value);
+    }
+    hold(writer.bytes());
+    free_all(elements);
+    return true;
+}
+
+void Array_Object::unpack()
+{
+    Byte_Reader reader(held());
+    std::vector<Element> read(reader.number());
+    for (Element& element : read) {
+        element.object = reinterpret_cast<const void*>(static_cast<std::uintptr_t>(reader.number()));
+        element.value = reader.value();
+    }
+    elements = std::move(read);
+    let_go();
 }
 
 namespace {

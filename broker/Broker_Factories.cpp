@@ -48,7 +48,7 @@ CMPIString* new_string(const CMPIBroker* mb, const char* text, CMPIStatus* rc)
     Broker_Call call("CMNewString", mb, rc, text);
     if (!call || !call.need_text(call.core(), text, "text"))
         return nullptr;
-    return make_object<String_Object>(call.core(), call.name(), std::string(text))->cmpi();
+    return make_object<String_Object>(call.core(), call.name(), std::string_view(text))->cmpi();
 }
 
 CMPIArray* new_array(const CMPIBroker* mb, CMPICount count, CMPIType type, CMPIStatus* rc)
@@ -89,7 +89,7 @@ CMPIDateTime* new_date_time_from_chars(const CMPIBroker* mb, const char* text, C
         return nullptr;
     if (!is_datetime_text(text))
         return call.violation(call.core(), CMPI_RC_ERR_INVALID_PARAMETER, "not a datetime: " + quoted(text));
-    return make_object<Datetime_Object>(call.core(), call.name(), std::string(text))->cmpi();
+    return make_object<Datetime_Object>(call.core(), call.name(), std::string_view(text))->cmpi();
 }
 
 CMPISelectExp* new_select_exp(const CMPIBroker* mb, const char* query, const char* language,
@@ -130,9 +130,9 @@ std::string object_text(const Object& object)
 {
     switch (object.kind) {
     case Object_Kind::STRING:
-        return static_cast<const String_Object&>(object).text;
+        return static_cast<const String_Object&>(object).text();
     case Object_Kind::DATETIME:
-        return static_cast<const Datetime_Object&>(object).text;
+        return static_cast<const Datetime_Object&>(object).text();
     case Object_Kind::PATH:
         return path_text(static_cast<const Path_Object&>(object).content);
     case Object_Kind::INSTANCE:
@@ -163,7 +163,8 @@ CMPIString* get_type(const CMPIBroker* mb, const void* address, CMPIStatus* rc)
 {
     Broker_Call call("CDGetType", mb, rc);
     Object* object = call ? any_object(call, address) : nullptr;
-    return object ? make_object<String_Object>(call.core(), call.name(), std::string(kind_type(object->kind)))
+    return object ? make_object<String_Object>(call.core(), call.name(),
+                                               std::string_view(kind_type(object->kind)))
                         ->cmpi()
                   : nullptr;
 }
@@ -173,7 +174,8 @@ CMPIString* get_message(const CMPIBroker* mb, const char* id, const char* text, 
                         ...)
 {
     Broker_Call call("CMGetMessage", mb, rc, id);
-    return call ? make_object<String_Object>(call.core(), call.name(), std::string(text ? text : ""))->cmpi()
+    return call ? make_object<String_Object>(call.core(), call.name(), std::string_view(text ? text : ""))
+                      ->cmpi()
                 : nullptr;
 }
 

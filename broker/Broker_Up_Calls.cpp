@@ -250,6 +250,8 @@ CMPIStatus deliver_indication(const CMPIBroker* mb, const CMPIContext* ctx, cons
         return call.status();
     if (auto* indication = argument_object<Instance_Object>(call, call.core(), instance))
         call.fail(call->up_calls().deliver(name_space, indication->value()));
+    if (Call_Frame* const frame = Call_Frame::top())
+        frame->pack_old();
     return call.status();
 }
 

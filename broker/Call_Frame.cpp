@@ -6,6 +6,9 @@ namespace {
 
 thread_local Call_Frame* innermost = nullptr;
 
+/// More than what a provider has in hand at a time.
+constexpr std::size_t most_not_packed = 1024;
+
 std::string described(const Object& object)
 {
     return std::string(kind_name(object.kind)) + " made by " + object.maker;
@@ -21,9 +24,11 @@ Call_Frame::Call_Frame(std::shared_ptr<Core> core, const CMPIContext* context)
 
 Call_Frame::~Call_Frame()
 {
-    for (Object* object : objects_) {
+    for (Object* object = first_; object;) {
+        Object* const next = object->after;
         core_->ledger.freed_by_frame(object->kind, object->maker);
         core_->retire(*object);
+        object = next;
     }
     innermost = outer_;
 }
@@ -44,7 +49,34 @@ bool Call_Frame::is_on_this_thread(const Call_Frame* frame)
 void Call_Frame::record(Object& object)
 {
     object.frame = this;
-    objects_.insert(&object);
+    object.before = last_;
+    (last_ ? last_->after : first_) = &object;
+    last_ = &object;
+    if (!oldest_)
+        oldest_ = &object;
+    ++not_packed_;
+}
+
+void Call_Frame::forget(Object& object)
+{
+    if (oldest_ == &object)
+        oldest_ = object.after;
+    if (!object.is_old)
+        --not_packed_;
+    (object.before ? object.before->after : first_) = object.after;
+    (object.after ? object.after->before : last_) = object.before;
+    object.frame = nullptr;
+}
+
+void Call_Frame::pack_old()
+{
+    while (not_packed_ > most_not_packed) {
+        Object& object = *oldest_;
+        oldest_ = object.after;
+        object.is_old = true;
+        --not_packed_;
+        core_->pack(object);
+    }
 }
 
 void detail::settle_on_frame(Object& object)

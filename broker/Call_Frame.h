@@ -2,8 +2,6 @@
 
 #include "broker/Core.h"
 
-#include <unordered_set>
-
 namespace KPRV::broker {
 
 /// What a thread owes to one MI entry (or to one attachment): the objects made meanwhile, which end with it.
@@ -16,6 +14,10 @@ namespace KPRV::broker {
 /// release. `CMRelease` takes an object off its frame, if the frame is on the caller's thread. Retired is not
 /// freed: the object stays with a mark, so that a use after the call is a line in `Violations`. A thread that
 /// is attached has a frame from attachment to detachment.
+///
+/// A provider may use what it made until its call ends, and most never do: an enumeration leaves a dozen
+/// objects of each instance behind. With each delivery those that many others have followed are packed, until
+/// somebody asks for them.
 class Call_Frame
 {
 public:
@@ -33,12 +35,18 @@ public:
     const CMPIContext* context() const { return context_; }
 
     void record(Object& object);
-    void forget(Object& object) { objects_.erase(&object); }
+    void forget(Object& object);
+    /// Packs all but those made last. No object of this frame may be in hand meanwhile.
+    void pack_old();
 
 private:
     std::shared_ptr<Core> core_;
     const CMPIContext* context_;
-    std::unordered_set<Object*> objects_;
+    /// Recorded objects in the order in which they were made, and the first that may still be packed.
+    Object* first_ = nullptr;
+    Object* last_ = nullptr;
+    Object* oldest_ = nullptr;
+    std::size_t not_packed_ = 0;
     Call_Frame* outer_;
 };
 
@@ -62,14 +70,50 @@ namespace detail {
 
 void settle_on_frame(Object& object);
 
+/// Room for an object that is being made.
+class Fresh_Place
+{
+public:
+    Fresh_Place(Core& core, std::size_t size) : core_(core), place_(core.blocks.take_for_object(size)) {}
+    ~Fresh_Place()
+    {
+        if (object_)
+            object_->~Object();
+        if (place_)
+            core_.blocks.give_object(place_);
+    }
+    Fresh_Place(const Fresh_Place&) = delete;
+    Fresh_Place& operator=(const Fresh_Place&) = delete;
+
+    template <class T, class... Arguments>
+    T* make(Arguments&&... arguments)
+    {
+        T* const made = new (place_) T(core_, std::forward<Arguments>(arguments)...);
+        object_ = made;
+        return made;
+    }
+    /// From here on both are the core's.
+    void keep()
+    {
+        object_ = nullptr;
+        place_ = nullptr;
+    }
+
+private:
+    Core& core_;
+    void* place_;
+    Object* object_ = nullptr;
+};
+
 template <class T, class... Arguments>
 T* make(Core& core, const char* maker, Owner owner, Arguments&&... arguments)
 {
-    auto object = std::make_unique<T>(core, std::forward<Arguments>(arguments)...);
-    T* made = object.get();
+    Fresh_Place place(core, sizeof(T));
+    T* const made = place.template make<T>(std::forward<Arguments>(arguments)...);
     made->maker = maker;
     made->owner = owner;
-    core.adopt(std::move(object));
+    core.adopt(*made);
+    place.keep();
     if (owner == Owner::FRAME)
         settle_on_frame(*made);
     return made;

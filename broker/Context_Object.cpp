@@ -8,11 +8,8 @@ namespace {
 CMPIData entry_data(Call<Context_Object>& call, const char* name, const Value& value)
 {
     CMPIData data = make_data(call.core(), call.name(), value);
-    if (call->principal_without_text && same_name(name, CMPIPrincipal)) {
-        auto* text = make_object<String_Object>(call.core(), call.name(), std::string());
-        text->has_text = false;
-        data.value.string = text->cmpi();
-    }
+    if (call->principal_without_text && same_name(name, CMPIPrincipal))
+        data.value.string = make_object<String_Object>(call.core(), call.name(), nullptr)->cmpi();
     return data;
 }
 

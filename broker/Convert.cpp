@@ -101,11 +101,11 @@ CMPIrc read_object(Call_Base& call, Core& core, const CMPIValue& value, CMPIType
     switch (kind) {
     case Object_Kind::STRING: {
         auto* text = static_cast<String_Object*>(object);
-        result = text->has_text ? Value::text(text->text) : Value::null_of(CMPI_string);
+        result = text->has_text() ? Value::text(text->text()) : Value::null_of(CMPI_string);
         break;
     }
     case Object_Kind::DATETIME:
-        result = Value::datetime(static_cast<Datetime_Object*>(object)->text);
+        result = Value::datetime(static_cast<Datetime_Object*>(object)->text());
         break;
     case Object_Kind::PATH:
         result = Value::path(static_cast<Path_Object*>(object)->content);
@@ -167,11 +167,8 @@ CMPIData make_data(Core& core, const char* maker, const Value& value)
     data.type = value.type;
     if (value.null) {
         data.state = CMPI_nullValue;
-        if (value.type == CMPI_string && core.options.null_string_objects) {
-            auto* text = make_object<String_Object>(core, maker, std::string());
-            text->has_text = false;
-            data.value.string = text->cmpi();
-        }
+        if (value.type == CMPI_string && core.options.null_string_objects)
+            data.value.string = make_object<String_Object>(core, maker, nullptr)->cmpi();
         return data;
     }
     if (value.is_array())

@@ -1,100 +1,98 @@
 #include "broker/Core.h"
 
-#include "broker/Call_Frame.h"
-
-#include <array>
-#include <shared_mutex>
+#include <cstring>
 
 namespace KPRV::broker {
 
-namespace {
-
-/// All addresses that any host has handed out, in shards so that threads rarely wait for each other.
-class Address_Book
-{
-public:
-    void add(Object* object)
-    {
-        Shard& shard = at(object->address());
-        const Auto_Lock lock(shard.mutex);
-        shard.objects[object->address()] = object;
-    }
-
-    void remove(const Object* object)
-    {
-        Shard& shard = at(object->address());
-        const Auto_Lock lock(shard.mutex);
-        shard.objects.erase(object->address());
-    }
-
-    Object* find(const void* address)
-    {
-        Shard& shard = at(address);
-        const Auto_Shared_Lock lock(shard.mutex);
-        auto found = shard.objects.find(address);
-        return found == shard.objects.end() ? nullptr : found->second;
-    }
-
-private:
-    struct Shard
-    {
-        Standard_Mutex<std::shared_mutex> mutex;
-        std::unordered_map<const void*, Object*> objects GUARDED_BY(mutex);
-    };
-
-    Shard& at(const void* address)
-    {
-        return shards_[(reinterpret_cast<std::uintptr_t>(address) >> 6) % shards_.size()];
-    }
-
-    std::array<Shard, 16> shards_;
-};
-
-Address_Book& address_book()
-{
-    static Address_Book book;
-    return book;
-}
-
-} // namespace
-
 Object* find_object(const void* address)
 {
-    return address ? address_book().find(address) : nullptr;
+    Object* const object = address ? Object_Blocks::find(address) : nullptr;
+    if (object && object->packed)
+        object->core.unpack(*object);
+    return object;
+}
+
+void Object::hold(std::string_view bytes)
+{
+    let_go();
+    held_ = core.blocks.take_bytes(bytes.size() + 1);
+    std::memcpy(held_, bytes.data(), bytes.size());
+    held_[bytes.size()] = '\0';
+    held_size_ = static_cast<std::uint32_t>(bytes.size());
+}
+
+std::string_view Object::held() const
+{
+    if (held_)
+        core.blocks.touch_bytes(held_, std::size_t(held_size_) + 1);
+    return {held_, held_size_};
+}
+
+void Object::let_go()
+{
+    if (held_)
+        core.blocks.give_bytes(held_, std::size_t(held_size_) + 1);
+    held_ = nullptr;
+    held_size_ = 0;
 }
 
 Core::~Core()
 {
-    for (auto& [object, owner] : objects_)
-        address_book().remove(object);
-    for (auto& object : retired_)
-        address_book().remove(object.get());
+    while (Object* const object = blocks.any())
+        destroy(*object);
 }
 
-void Core::adopt(std::unique_ptr<Object> object)
+void Core::destroy(Object& object)
 {
-    Object* known = object.get();
-    address_book().add(known);
-    if (known->owner != Owner::HOST)
-        ledger.made(known->kind, known->maker);
-    const Auto_Lock lock(mutex_);
-    objects_[known] = std::move(object);
+    Object_Blocks::find(object.address());
+    object.~Object();
+    blocks.give_object(&object);
+}
+
+void Core::adopt(Object& object)
+{
+    if (object.owner != Owner::HOST)
+        ledger.made(object.kind, object.maker);
+    blocks.announce(&object);
 }
 
 void Core::retire(Object& object)
 {
-    object.live = false;
-    object.drop();
-    const Auto_Lock lock(mutex_);
-    auto at = objects_.find(&object);
-    if (at == objects_.end())
+    // Brings its block in, and makes another one leave: all that a call has left goes this way.
+    Object_Blocks::find(object.address());
+    if (!object.live.exchange(false))
         return;
-    retired_.push_back(std::move(at->second));
-    objects_.erase(at);
-    if (retired_.size() > options.most_shells) {
-        address_book().remove(retired_.front().get());
+    object.packed = false;
+    object.drop();
+    Object* last = nullptr;
+    {
+        const Auto_Lock lock(mutex_);
+        retired_.push_back(&object);
+        if (retired_.size() <= options.most_shells)
+            return;
+        last = retired_.front();
         retired_.pop_front();
     }
+    destroy(*last);
+}
+
+void Core::pack(Object& object)
+{
+    const Auto_Lock lock(mutex_);
+    try {
+        object.packed = object.pack();
+    } catch (const std::bad_alloc&) {
+        // It stays as it was.
+    }
+}
+
+void Core::unpack(Object& object)
+{
+    const Auto_Lock lock(mutex_);
+    if (!object.packed)
+        return;
+    object.unpack();
+    object.packed = false;
 }
 
 } // namespace KPRV::broker

@@ -4,6 +4,7 @@
 #include "broker/Host_Options.h"
 #include "broker/Ledger.h"
 #include "broker/Object.h"
+#include "broker/Object_Blocks.h"
 #include "broker/Violations.h"
 #include "broker/values/Class_Catalogue.h"
 #include "contracts/cmpi/cmpift.h"
@@ -18,7 +19,10 @@ namespace KPRV::broker {
 class Core
 {
 public:
-    explicit Core(Host_Options host_options) : options(std::move(host_options)) {}
+    explicit Core(Host_Options host_options)
+        : options(std::move(host_options)), blocks(options.most_object_memory)
+    {
+    }
     ~Core();
     Core(const Core&) = delete;
     Core& operator=(const Core&) = delete;
@@ -27,21 +31,26 @@ public:
     Violations violations;
     Ledger ledger;
     Call_Log calls;
+    Object_Blocks blocks;
     /// Set before the first call, never changed later.
     const Class_Catalogue* catalogue = nullptr;
 
-    /// Takes the object over: puts it on the list of known addresses and, if it belongs to the calling
-    /// thread's frame, on that frame's list.
-    void adopt(std::unique_ptr<Object> object);
+    /// Makes its address known, and counts it unless it is the host's own.
+    void adopt(Object& object);
 
     /// Ends the object's life: its content goes at once, its shell is kept for a while so that a later use is
     /// seen and not a crash.
     void retire(Object& object);
 
+    /// What the object holds takes less memory then, until it is found by its address.
+    void pack(Object& object);
+    void unpack(Object& object);
+
 private:
+    void destroy(Object& object);
+
     Standard_Mutex<> mutex_;
-    std::unordered_map<Object*, std::unique_ptr<Object>> objects_ GUARDED_BY(mutex_);
-    std::deque<std::unique_ptr<Object>> retired_ GUARDED_BY(mutex_);
+    std::deque<Object*> retired_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::broker

@@ -9,19 +9,19 @@ namespace {
 CMPIUint64 get_binary_format(const CMPIDateTime* self, CMPIStatus* rc)
 {
     Call<Datetime_Object> call("CMGetBinaryFormat", self, rc);
-    return call ? datetime_microseconds(call->text) : 0;
+    return call ? datetime_microseconds(call->text()) : 0;
 }
 
 CMPIString* get_string_format(const CMPIDateTime* self, CMPIStatus* rc)
 {
     Call<Datetime_Object> call("CMGetStringFormat", self, rc);
-    return call ? make_object<String_Object>(call.core(), call.name(), call->text)->cmpi() : nullptr;
+    return call ? make_object<String_Object>(call.core(), call.name(), call->held())->cmpi() : nullptr;
 }
 
 CMPIBoolean is_interval(const CMPIDateTime* self, CMPIStatus* rc)
 {
     Call<Datetime_Object> call("CMIsInterval", self, rc);
-    return call && is_interval_text(call->text);
+    return call && is_interval_text(call->text());
 }
 
 } // namespace

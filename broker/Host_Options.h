@@ -58,6 +58,9 @@ struct Host_Options
     /// How many released objects are remembered, so that a later use of one is seen. Enough for every object
     /// of one large operation.
     std::size_t most_shells = 1 << 18;
+    /// Bytes of objects that lie in memory; what a provider leaves behind beyond that lies in a file without
+    /// a name, see `Block_Memory`. 0 for all.
+    std::size_t most_object_memory = 0;
 
     /// The two public servers whose behaviour was measured.
     static Host_Options sfcb_like();

@@ -1,6 +1,7 @@
 // The function table of `CMPIInstance`, and how the class that it knows shapes what is set.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
+#include "broker/values/Value_Bytes.h"
 
 #include <algorithm>
 
@@ -9,9 +10,9 @@ namespace KPRV::broker {
 Path_Value Instance_Object::path() const
 {
     Path_Value path = content.path;
-    if (const Class_Info* info = core.catalogue->find(path.class_name))
+    if (const Class_Info* const known = info())
         for (const Named_Value& property : content.properties)
-            if (const Feature_Info* feature = info->property(property.name);
+            if (const Feature_Info* feature = known->property(property.name);
                 feature && feature->key && !property.value.null)
                 set_value(path.keys, feature->name, property.value);
     if (filter && core.options.filter_style == Host_Options::Filter_Style::EARLY)
@@ -27,6 +28,21 @@ Instance_Value Instance_Object::value() const
         std::erase_if(value.properties,
                       [&](const Named_Value& property) { return !contains_name(*filter, property.name); });
     return value;
+}
+
+bool Instance_Object::pack()
+{
+    Byte_Writer writer;
+    writer.instance(content);
+    hold(writer.bytes());
+    free_all(content);
+    return true;
+}
+
+void Instance_Object::unpack()
+{
+    content = Byte_Reader(held()).instance();
+    let_go();
 }
 
 namespace {
@@ -54,7 +70,7 @@ CMPICount get_property_count(const CMPIInstance* self, CMPIStatus* rc)
 /// What the class says about a property that is being set. Servers drop an unknown name without a word.
 bool fits_class(Call<Instance_Object>& call, const char* name, const Value& value)
 {
-    const Class_Info* info = call.core().catalogue->find(call->content.path.class_name);
+    const Class_Info* info = call->info();
     if (!info)
         return true;
     const Feature_Info* feature = info->property(name);
@@ -102,8 +118,10 @@ CMPIStatus set_object_path(const CMPIInstance* self, const CMPIObjectPath* path)
     Call<Instance_Object> call("CMSetObjectPath", self, nullptr);
     if (!call)
         return call.status();
-    if (auto* source = argument_object<Path_Object>(call, call.core(), path))
+    if (auto* source = argument_object<Path_Object>(call, call.core(), path)) {
         call->content.path = source->content;
+        call->known_class.forget();
+    }
     return call.status();
 }
 

@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <map>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace KPRV::broker {
@@ -29,6 +30,7 @@ public:
         std::size_t live() const { return made - released - freed_by_frame; }
     };
 
+    /// Names of calls are kept as they come, as constants.
     void made(Object_Kind kind, const char* maker);
     void released(Object_Kind kind, const char* maker);
     void freed_by_frame(Object_Kind kind, const char* maker);
@@ -50,7 +52,7 @@ private:
     Entry& at(Object_Kind kind, const char* maker) REQUIRES(mutex_);
 
     mutable Standard_Mutex<> mutex_;
-    std::map<std::pair<Object_Kind, std::string>, Entry> entries_ GUARDED_BY(mutex_);
+    std::map<std::pair<Object_Kind, std::string_view>, Entry> entries_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::broker

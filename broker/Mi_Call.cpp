@@ -18,7 +18,7 @@ void Mi_Frame::read_status(const CMPIStatus& status, Result& result)
         return;
     if (Object* object = find_object(status.msg);
         object && object->live && object->kind == Object_Kind::STRING)
-        result.message = static_cast<String_Object*>(object)->text;
+        result.message = static_cast<String_Object*>(object)->text();
     else
         core().violations.add("CMPIStatus", "the message is not a live string");
 }

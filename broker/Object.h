@@ -4,8 +4,9 @@
 #include "contracts/cmpi/cmpift.h"
 
 #include <atomic>
+#include <cstdint>
 #include <memory>
-#include <unordered_map>
+#include <string_view>
 
 namespace KPRV::broker {
 
@@ -13,7 +14,7 @@ class Call_Frame;
 class Core;
 
 /// Who has to end an object's life.
-enum class Owner
+enum class Owner : std::uint8_t
 {
     /// The call frame of the thread that made it, unless the provider releases it first.
     FRAME,
@@ -29,22 +30,46 @@ enum class Owner
 struct Object
 {
     Object(Core& object_core, Object_Kind object_kind) : core(object_core), kind(object_kind) {}
-    virtual ~Object() = default;
+    virtual ~Object() { let_go(); }
     Object(const Object&) = delete;
     Object& operator=(const Object&) = delete;
 
     /// Frees what the object holds; the shell stays.
-    virtual void drop() = 0;
+    virtual void drop() { let_go(); }
     /// The address that the provider sees.
     virtual const void* address() const = 0;
 
+    /// Holds what the object is about as bytes until `unpack`, which is called before anybody looks at it.
+    /// False for kinds that would gain nothing, and stay as they are.
+    virtual bool pack() { return false; }
+    virtual void unpack() {}
+
+    /// Keeps a copy of these bytes among the blocks, with a zero behind them, instead of those before.
+    void hold(std::string_view bytes);
+    void let_go();
+    bool holds() const { return held_ != nullptr; }
+    /// Its text is null if nothing is held.
+    std::string_view held() const;
+
     Core& core;
-    const Object_Kind kind;
     /// The call that made it.
     const char* maker = "";
-    Owner owner = Owner::FRAME;
     Call_Frame* frame = nullptr;
+    /// Those that the frame recorded before and after it.
+    Object* before = nullptr;
+    Object* after = nullptr;
+
+private:
+    char* held_ = nullptr;
+    std::uint32_t held_size_ = 0;
+
+public:
+    const Object_Kind kind;
+    Owner owner = Owner::FRAME;
     std::atomic<bool> live = true;
+    std::atomic<bool> packed = false;
+    /// The frame has had a look whether it should be packed.
+    bool is_old = false;
 };
 
 /// Joins a CMPI struct (the part that providers see) with the host side.
@@ -57,6 +82,7 @@ struct Object_Of : Cmpi_Type, Object
     template <class Table>
     Object_Of(Core& object_core, const Table& table) : Object(object_core, Kind)
     {
+        static_assert(alignof(Cmpi_Type) <= alignof(Object), "it stands right behind the host's part");
         this->hdl = static_cast<Object*>(this);
         this->ft = &table;
     }
@@ -65,7 +91,7 @@ struct Object_Of : Cmpi_Type, Object
 };
 
 /// The object of a host that stands at this address, released ones included; null for any other address,
-/// which is not read. Safe for any thread.
+/// which is not read. What it holds is unpacked. Safe for any thread.
 Object* find_object(const void* address);
 
 } // namespace KPRV::broker

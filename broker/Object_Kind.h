@@ -1,9 +1,11 @@
 #pragma once
 
+#include <cstdint>
+
 namespace KPRV::broker {
 
 /// What can be handed to a provider.
-enum class Object_Kind
+enum class Object_Kind : std::uint8_t
 {
     STRING,
     ARRAY,

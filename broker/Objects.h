@@ -3,6 +3,7 @@
 #include "broker/Core.h"
 #include "broker/values/Receiver.h"
 
+#include <cstddef>
 #include <optional>
 
 namespace KPRV::broker {
@@ -30,21 +31,29 @@ extern const CMPIContextFT context_table;
 extern const CMPIResultFT result_table;
 extern const CMPISelectExpFT select_table;
 
+/// To be assigned nothing leaves texts and lists the room that they had.
+template <class Content>
+void free_all(Content& content)
+{
+    const Content gone = std::move(content);
+}
+
 struct String_Object final : Object_Of<CMPIString, Object_Kind::STRING>
 {
-    String_Object(Core& owner_core, std::string text_value)
-        : Object_Of(owner_core, string_table), text(std::move(text_value))
+    String_Object(Core& owner_core, std::string_view text) : Object_Of(owner_core, string_table)
     {
+        hold(text);
     }
-    String_Object(Core& owner_core, const String_Object& other)
-        : Object_Of(owner_core, string_table), text(other.text), has_text(other.has_text)
+    /// A string whose text pointer is null, as some servers hand out.
+    String_Object(Core& owner_core, std::nullptr_t) : Object_Of(owner_core, string_table) {}
+    String_Object(Core& owner_core, const String_Object& other) : Object_Of(owner_core, string_table)
     {
+        if (other.has_text())
+            hold(other.held());
     }
-    void drop() override { text = {}; }
 
-    std::string text;
-    /// False for a string whose text pointer is null, as some servers hand out.
-    bool has_text = true;
+    bool has_text() const { return holds(); }
+    std::string text() const { return std::string(held()); }
 };
 
 struct Array_Object final : Object_Of<CMPIArray, Object_Kind::ARRAY>
@@ -63,7 +72,13 @@ struct Array_Object final : Object_Of<CMPIArray, Object_Kind::ARRAY>
         : Object_Of(owner_core, array_table), element_type(other.element_type), elements(other.elements)
     {
     }
-    void drop() override { elements.clear(); }
+    void drop() override
+    {
+        let_go();
+        free_all(elements);
+    }
+    bool pack() override;
+    void unpack() override;
 
     CMPIType element_type;
     std::vector<Element> elements;
@@ -86,6 +101,25 @@ struct Enumeration_Object final : Object_Of<CMPIEnumeration, Object_Kind::ENUMER
     std::size_t next = 0;
 };
 
+/// The class of an object, looked up when it is first asked for.
+class Known_Class
+{
+public:
+    const Class_Info* get(const Core& core, const std::string& class_name) const
+    {
+        if (!is_known_)
+            info_ = core.catalogue->find(class_name);
+        is_known_ = true;
+        return info_;
+    }
+    /// The object has another one.
+    void forget() { is_known_ = false; }
+
+private:
+    mutable const Class_Info* info_ = nullptr;
+    mutable bool is_known_ = false;
+};
+
 struct Instance_Object final : Object_Of<CMPIInstance, Object_Kind::INSTANCE>
 {
     Instance_Object(Core& owner_core, Instance_Value instance)
@@ -96,15 +130,24 @@ struct Instance_Object final : Object_Of<CMPIInstance, Object_Kind::INSTANCE>
         : Object_Of(owner_core, instance_table), content(other.content), filter(other.filter)
     {
     }
-    void drop() override { content = {}; }
+    void drop() override
+    {
+        let_go();
+        free_all(content);
+    }
+    bool pack() override;
+    void unpack() override;
 
     /// The instance as a server would read it: the keys of the path follow the key properties, and an early
     /// filter has taken its keys.
     Instance_Value value() const;
     Path_Value path() const;
 
+    const Class_Info* info() const { return known_class.get(core, content.path.class_name); }
+
     Instance_Value content;
     std::optional<std::vector<std::string>> filter;
+    Known_Class known_class;
 };
 
 struct Path_Object final : Object_Of<CMPIObjectPath, Object_Kind::PATH>
@@ -114,9 +157,18 @@ struct Path_Object final : Object_Of<CMPIObjectPath, Object_Kind::PATH>
         : Object_Of(owner_core, path_table), content(other.content), key_state(other.key_state)
     {
     }
-    void drop() override { content = {}; }
+    void drop() override
+    {
+        let_go();
+        free_all(content);
+    }
+    bool pack() override;
+    void unpack() override;
+
+    const Class_Info* info() const { return known_class.get(core, content.class_name); }
 
     Path_Value content;
+    Known_Class known_class;
     /// State bits that all keys carry.
     CMPIValueState key_state = CMPI_goodValue;
 };
@@ -138,18 +190,17 @@ struct Args_Object final : Object_Of<CMPIArgs, Object_Kind::ARGS>
 
 struct Datetime_Object final : Object_Of<CMPIDateTime, Object_Kind::DATETIME>
 {
-    Datetime_Object(Core& owner_core, std::string text_value)
-        : Object_Of(owner_core, datetime_table), text(std::move(text_value))
+    Datetime_Object(Core& owner_core, std::string_view text) : Object_Of(owner_core, datetime_table)
     {
+        hold(text);
     }
     Datetime_Object(Core& owner_core, const Datetime_Object& other)
-        : Object_Of(owner_core, datetime_table), text(other.text)
+        : Datetime_Object(owner_core, other.held())
     {
     }
-    void drop() override { text = {}; }
 
     /// 25 characters.
-    std::string text;
+    std::string text() const { return std::string(held()); }
 };
 
 struct Context_Object final : Object_Of<CMPIContext, Object_Kind::CONTEXT>

@@ -1,6 +1,7 @@
 // The function table of `CMPIObjectPath`, and what servers make of the keys that are added.
 #include "broker/Convert.h"
 #include "broker/values/Type_Words.h"
+#include "broker/values/Value_Bytes.h"
 #include "broker/values/Value_Text.h"
 
 namespace KPRV::broker {
@@ -32,6 +33,21 @@ Path_Object::Path_Object(Core& owner_core, Path_Value path, bool from_client)
     widen_keys(content.keys, core.options.key_style);
     if (core.options.key_style == Host_Options::Key_Style::SINT64)
         key_state = CMPI_keyValue;
+}
+
+bool Path_Object::pack()
+{
+    Byte_Writer writer;
+    writer.path(content);
+    hold(writer.bytes());
+    free_all(content);
+    return true;
+}
+
+void Path_Object::unpack()
+{
+    content = Byte_Reader(held()).path();
+    let_go();
 }
 
 namespace {
@@ -75,7 +91,10 @@ CMPIString* get_host_name(const CMPIObjectPath* self, CMPIStatus* rc)
 
 CMPIStatus set_class_name(const CMPIObjectPath* self, const char* text)
 {
-    return set_text<&Path_Value::class_name>("CMSetClassName", self, text);
+    const CMPIStatus status = set_text<&Path_Value::class_name>("CMSetClassName", self, text);
+    if (status.rc == CMPI_RC_OK)
+        static_cast<Path_Object*>(find_object(self))->known_class.forget();
+    return status;
 }
 
 CMPIString* get_class_name(const CMPIObjectPath* self, CMPIStatus* rc)
@@ -86,7 +105,7 @@ CMPIString* get_class_name(const CMPIObjectPath* self, CMPIStatus* rc)
 /// Servers convert 64-bit numbers to a narrower class type of the same sign, and refuse all else.
 bool fits_class(Call<Path_Object>& call, const char* name, Value& value)
 {
-    const Class_Info* info = call.core().catalogue->find(call->content.class_name);
+    const Class_Info* info = call->info();
     if (!info)
         return true;
     const Feature_Info* feature = info->property(name);

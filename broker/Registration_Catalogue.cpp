@@ -3,7 +3,9 @@
 #include "broker/values/Type_Words.h"
 #include "module/runtime/Meta_Value.h"
 
+#include <algorithm>
 #include <cstring>
+#include <strings.h>
 
 namespace KPRV::broker {
 
@@ -136,6 +138,12 @@ std::unique_ptr<Class_Info> class_info(const Meta_Class* meta_class, bool has_pr
 
 } // namespace
 
+bool Registration_Catalogue::Name_Order::operator()(std::string_view a, std::string_view b) const
+{
+    const int order = strncasecmp(a.data(), b.data(), std::min(a.size(), b.size()));
+    return order != 0 ? order < 0 : a.size() < b.size();
+}
+
 Registration_Catalogue::Registration_Catalogue(const Registration* head)
 {
     const Auto_Lock lock(mutex_);
@@ -143,7 +151,7 @@ Registration_Catalogue::Registration_Catalogue(const Registration* head)
         module_name_ = head->module_name;
     for (const Registration* entry = head; entry; entry = entry->next) {
         add(entry->meta_class);
-        slots_[lower_name(entry->meta_class->name)].has_provider = true;
+        slots_[entry->meta_class->name].has_provider = true;
         if (const Meta_Repository* repository = entry->meta_class->meta_repository)
             for (uint32 i = 0; i < repository->num_meta_classes; ++i)
                 add(repository->meta_classes[i]);
@@ -154,7 +162,7 @@ Registration_Catalogue::~Registration_Catalogue() = default;
 
 void Registration_Catalogue::add(const Meta_Class* meta_class)
 {
-    Slot& slot = slots_[lower_name(meta_class->name)];
+    Slot& slot = slots_[meta_class->name];
     if (slot.meta_class)
         return;
     slot.meta_class = meta_class;
@@ -164,7 +172,7 @@ void Registration_Catalogue::add(const Meta_Class* meta_class)
 const Class_Info* Registration_Catalogue::find(std::string_view name) const
 {
     const Auto_Lock lock(mutex_);
-    auto at = slots_.find(lower_name(name));
+    auto at = slots_.find(name);
     if (at == slots_.end())
         return nullptr;
     Slot& slot = at->second;

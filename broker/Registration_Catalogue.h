@@ -29,12 +29,19 @@ private:
         std::unique_ptr<Class_Info> info;
     };
 
+    /// Whatever the letters' case.
+    struct Name_Order
+    {
+        using is_transparent = void;
+        bool operator()(std::string_view a, std::string_view b) const;
+    };
+
     void add(const Meta_Class* meta_class) REQUIRES(mutex_);
 
     std::string module_name_;
     std::vector<std::string> names_;
     mutable Standard_Mutex<> mutex_;
-    mutable std::map<std::string, Slot, std::less<>> slots_ GUARDED_BY(mutex_);
+    mutable std::map<std::string, Slot, Name_Order> slots_ GUARDED_BY(mutex_);
 };
 
 } // namespace KPRV::broker

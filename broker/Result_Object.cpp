@@ -5,6 +5,14 @@ namespace KPRV::broker {
 
 namespace {
 
+/// Nothing of the call is in hand here.
+CMPIStatus delivered(const Call<Result_Object>& call)
+{
+    if (Call_Frame* const frame = Call_Frame::top())
+        frame->pack_old();
+    return call.status();
+}
+
 /// True if the operation may return this kind of thing now.
 bool may_return(Call<Result_Object>& call, Result_Object::Accepts what, const char* name)
 {
@@ -38,7 +46,7 @@ CMPIStatus return_instance(const CMPIResult* self, const CMPIInstance* instance)
     auto* object = argument_object<Instance_Object>(call, call.core(), instance);
     if (object && !call->stopped)
         call->stopped = !call->receiver.instance(object->value());
-    return call.status();
+    return delivered(call);
 }
 
 CMPIStatus return_object_path(const CMPIResult* self, const CMPIObjectPath* path)
@@ -49,7 +57,7 @@ CMPIStatus return_object_path(const CMPIResult* self, const CMPIObjectPath* path
     auto* object = argument_object<Path_Object>(call, call.core(), path);
     if (object && !call->stopped)
         call->stopped = !call->receiver.path(Path_Value(object->content));
-    return call.status();
+    return delivered(call);
 }
 
 CMPIStatus return_done(const CMPIResult* self)

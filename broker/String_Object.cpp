@@ -8,7 +8,7 @@ namespace {
 const char* get_char_ptr(const CMPIString* self, CMPIStatus* rc)
 {
     Call<String_Object> call("CMGetCharsPtr", self, rc);
-    return call && call->has_text ? call->text.c_str() : nullptr;
+    return call ? call->held().data() : nullptr;
 }
 
 } // namespace

@@ -27,6 +27,7 @@ std::unique_ptr<Local_Connection> open_module(const Cli_Options& options, std::s
     host_options.name_space = options.name_space;
     // A large answer should not be outweighed by what remembers its objects, nor should what runs for months.
     host_options.most_shells = options.verb == "serve" ? 1 << 10 : 1 << 14;
+    host_options.most_object_memory = std::size_t(4) << 20;
     std::unique_ptr<Host> host =
         Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
     if (!host) {

@@ -44,6 +44,7 @@ protected:
     {
         unsetenv("TOY_MANY");
         unsetenv("TOY_MANY_FAILS");
+        unsetenv("TOY_MANY_LEAVES");
         Toy_Test::TearDown();
     }
 
@@ -73,6 +74,33 @@ TEST_F(Receiver_Test, OneObjectAtATimeIsAliveOfAProviderThatReleasesThem)
     host->run(enumerate, &notes);
     // The instance and its path; the request's own arguments do not count.
     EXPECT_EQ(2u, notes.most_live);
+}
+
+TEST_F(Receiver_Test, WhatAProviderLeavesStaysGoodUntilItsCallEnds)
+{
+    setenv("TOY_MANY", "30000", 1);
+    setenv("TOY_MANY_LEAVES", "1", 1);
+    // All in memory; the most of it in a file; where no file can be made.
+    for (const auto& [bound, folder] :
+         {std::pair(0, "."), std::pair(1 << 20, "."), std::pair(1 << 20, "./none")}) {
+        SCOPED_TRACE(std::to_string(bound) + " " + folder);
+        setenv("TMPDIR", folder, 1);
+        Host_Options options;
+        options.most_object_memory = static_cast<std::size_t>(bound);
+        options.most_shells = 100;
+        host = open_toy(TOY_DESCRIBED, options);
+        Notes kept(*host);
+        const Result result = host->run(enumerate, &kept);
+        EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
+        EXPECT_EQ(30000u, kept.paths.size());
+        EXPECT_EQ("a text that stands for 30000", kept.last.property("Text")->as_text());
+        // Path, instance, text, moment and numbers of each.
+        EXPECT_LE(150000u, kept.most_live);
+        EXPECT_EQ(0u, host->ledger().live());
+        for (const Ledger::Entry& entry : host->ledger().entries())
+            EXPECT_EQ(0u, entry.released) << entry.maker;
+    }
+    unsetenv("TMPDIR");
 }
 
 TEST_F(Receiver_Test, SeesTheListedPropertiesAlone)

@@ -1,11 +1,12 @@
 // TOY_Many: as many instances as the environment variable TOY_MANY says, none of which exists before it is
 // returned. With TOY_MANY_FAILS the enumeration fails behind the last; in the middle it waits for a writer of
 // the FIFO that TOY_MANY_WAITS names. The 2000th is wider than others, and of the 3000th on there is more to
-// tell.
+// tell. With TOY_MANY_LEAVES nothing is released, and some of what is left is looked at before the end.
 #include "tests/broker/toy.h"
 
 #include <cstdio>
 #include <cstdlib>
+#include <vector>
 
 namespace toy {
 
@@ -33,6 +34,49 @@ void wait_in_the_middle(CMPIUint32 id)
         std::fclose(file);
 }
 
+/// What an instance is made of, if it is left to the server.
+struct Left
+{
+    CMPIUint32 id;
+    CMPIObjectPath* path;
+    CMPIInstance* instance;
+    CMPIString* text;
+    CMPIDateTime* moment;
+    CMPIArray* numbers;
+};
+
+std::string text_of(CMPIUint32 id)
+{
+    return "a text that stands for " + std::to_string(id);
+}
+
+Left leave(CMPIUint32 id, CMPIObjectPath* path, CMPIInstance* instance)
+{
+    Left left = {id,
+                 path,
+                 instance,
+                 CMNewString(broker, text_of(id).c_str(), nullptr),
+                 broker->eft->newDateTimeFromBinary(broker, id, 0, nullptr),
+                 CMNewArray(broker, 2, CMPI_uint32, nullptr)};
+    CMSetArrayElementAt(left.numbers, 1, &id, CMPI_uint32);
+    CMSetProperty(instance, "Text", &left.text, CMPI_string);
+    return left;
+}
+
+/// True if all reads as it did when it was made.
+bool is_whole(const Left& left)
+{
+    const CMPIData key = left.path->ft->getKey(left.path, "Id", nullptr);
+    const CMPIData id = left.instance->ft->getProperty(left.instance, "Id", nullptr);
+    const CMPIData text = left.instance->ft->getProperty(left.instance, "Text", nullptr);
+    return key.value.uint32 == left.id && id.value.uint32 == left.id &&
+           text_of(left.id) == CMGetCharPtr(text.value.string) &&
+           text_of(left.id) == CMGetCharPtr(left.text) &&
+           left.moment->ft->getBinaryFormat(left.moment, nullptr) == left.id &&
+           CMGetArrayElementAt(left.numbers, 0, nullptr).state == CMPI_nullValue &&
+           CMGetArrayElementAt(left.numbers, 1, nullptr).value.uint32 == left.id;
+}
+
 CMPIStatus finish(const CMPIResult* result)
 {
     return std::getenv("TOY_MANY_FAILS")
@@ -46,7 +90,8 @@ CMPIStatus return_paths(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* r
         CMPIObjectPath* path = many_path(id);
         CMReturnObjectPath(result, path);
         wait_in_the_middle(id);
-        CMRelease(path);
+        if (!std::getenv("TOY_MANY_LEAVES"))
+            CMRelease(path);
     }
     return finish(result);
 }
@@ -54,6 +99,8 @@ CMPIStatus return_paths(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* r
 CMPIStatus return_instances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                             const CMPIObjectPath*, const char**)
 {
+    const bool leaves = std::getenv("TOY_MANY_LEAVES");
+    std::vector<Left> seldom;
     for (CMPIUint32 id = 1; id <= wanted(); ++id) {
         CMPIObjectPath* path = many_path(id);
         CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
@@ -61,13 +108,21 @@ CMPIStatus return_instances(CMPIInstanceMI*, const CMPIContext*, const CMPIResul
         CMSetProperty(instance, "Text", id == 2000 ? "wider than all before" : "as all", CMPI_chars);
         if (id >= 3000)
             CMSetProperty(instance, "Late", "now", CMPI_chars);
+        if (leaves)
+            if (const Left left = leave(id, path, instance); id % 1000 == 1)
+                seldom.push_back(left);
         const CMPIStatus status = CMReturnInstance(result, instance);
-        CMRelease(instance);
-        CMRelease(path);
+        if (!leaves) {
+            CMRelease(instance);
+            CMRelease(path);
+        }
         wait_in_the_middle(id);
         if (status.rc != CMPI_RC_OK)
             return status;
     }
+    for (const Left& left : seldom)
+        if (!is_whole(left))
+            return {CMPI_RC_ERR_FAILED, CMNewString(broker, "what was left is not what it was", nullptr)};
     return finish(result);
 }
 

@@ -1,0 +1,42 @@
+#pragma once
+
+#include "broker/values/Value.h"
+
+namespace KPRV::broker {
+
+/// Writes values as bytes, a tenth of what they take as objects: for what is kept and rarely looked at. Only
+/// the process that wrote them can read them.
+class Byte_Writer
+{
+public:
+    void number(std::uint64_t number);
+    void text(std::string_view text);
+    void value(const Value& value);
+    void values(const std::vector<Named_Value>& values);
+    void path(const Path_Value& path);
+    void instance(const Instance_Value& instance);
+
+    const std::string& bytes() const { return bytes_; }
+
+private:
+    std::string bytes_;
+};
+
+/// Reads them back, in the order in which they were written.
+class Byte_Reader
+{
+public:
+    explicit Byte_Reader(std::string_view bytes) : rest_(bytes) {}
+
+    std::uint64_t number();
+    std::string text();
+    Value value();
+    std::vector<Named_Value> values();
+    Path_Value path();
+    Instance_Value instance();
+
+private:
+    std::string_view rest_;
+};
+
+} // namespace KPRV::broker
