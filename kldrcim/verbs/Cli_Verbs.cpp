@@ -77,7 +77,7 @@ constexpr Cli_Verb verbs[] = {
      "the registered profiles and what conforms to each, as a tree", nullptr},
     {"conform",  0, 0,   "",                                        run_conform,     Op{},                        all_formats,  "",
      "what a client of the Storage HBA profile expects, beside what it finds", "1 something mandatory is missing."},
-    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        many_formats,  "--filter --count= --raw",
+    {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        many_formats,  "--filter --where --count= --raw",
      "subscribe to indications (default: KALDERA_AlertIndication) and write each as it comes, until interrupted", nullptr},
     {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        all_formats,  "--wait",
      "the hardware tests, and the ports and adapters that they can be run on\n"

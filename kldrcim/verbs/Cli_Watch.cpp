@@ -4,6 +4,7 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
 #include "kldrcim/verbs/Interruption.h"
+#include "kldrcim/verbs/Result_Filter.h"
 #include "module/runtime/Standard_Mutex.h"
 
 #include <deque>
@@ -71,9 +72,11 @@ int watch(const Cli_Options& options, Connection& connection)
     const std::vector<std::string> name_spaces =
         options.filters.empty() ? std::vector{options.name_space} : options.filters;
 
+    std::string error;
+    if (!check_filter(options, connection.classes(), indication_class, false, error))
+        return complain(error, USAGE_ERROR);
     Interruption interruption;
     Inbox inbox(interruption);
-    std::string error;
     const auto subscription = connection.subscribe(
         indication_class, name_spaces,
         [&](const std::string& name_space, const Instance_Value& indication) {
@@ -83,10 +86,13 @@ int watch(const Cli_Options& options, Connection& connection)
     if (!subscription)
         return complain(error, FAILURE);
     Instance_Value indication;
-    for (unsigned written = 0; options.count == 0 || written < options.count; ++written) {
+    for (unsigned written = 0; options.count == 0 || written < options.count;) {
         if (!inbox.take(indication))
             break;
+        if (!meets_conditions(options, indication.path.class_name, indication.properties))
+            continue;
         write(options, indication);
+        ++written;
     }
     return 0;
 }

@@ -91,10 +91,8 @@ bool Result_Filter::take(std::vector<Thing>& kept, const std::string& class_name
                          const std::vector<Named_Value>& values, Thing&& thing)
 {
     look_for_names(class_name, values);
-    const Class_Words words(class_name);
-    for (const Where_Clause& condition : options_.conditions)
-        if (!holds(condition, words.of(condition.name), find_value(values, condition.name)))
-            return true;
+    if (!meets_conditions(options_, class_name, values))
+        return true;
     ++count_;
     if (options_.total)
         return true;
@@ -138,6 +136,15 @@ bool Result_Filter::give(Instance_Value&& instance)
 bool Result_Filter::give(Path_Value&& path)
 {
     return writer_->path(std::move(path));
+}
+
+bool meets_conditions(const Cli_Options& options, const std::string& class_name,
+                      const std::vector<Named_Value>& values)
+{
+    const Class_Words words(class_name);
+    return std::ranges::all_of(options.conditions, [&](const Where_Clause& condition) {
+        return holds(condition, words.of(condition.name), find_value(values, condition.name));
+    });
 }
 
 Property_List properties_for(const Cli_Options& options)

@@ -46,6 +46,10 @@ private:
     std::size_t count_ = 0;
 };
 
+/// Whether what has these values is as each --where wants it.
+bool meets_conditions(const Cli_Options& options, const std::string& class_name,
+                      const std::vector<Named_Value>& values);
+
 /// The properties to ask for, so that they can be looked at.
 Property_List properties_for(const Cli_Options& options);
 

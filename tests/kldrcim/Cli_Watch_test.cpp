@@ -37,6 +37,15 @@ TEST(Cli_Watch, WritesTheFormatsOfTheOtherVerbs)
     EXPECT_EQ("root/toy:TOY_Alert\n\n", none.out);
 }
 
+TEST(Cli_Watch, WritesWhatMeetsTheConditions)
+{
+    EXPECT_EQ(block, kldrcim("watch TOY_Alert --count 1 --where Text=smoke").out);
+    EXPECT_EQ(block, kldrcim("watch TOY_Alert --count 1 --where Text~SM* --where Other=").out);
+    // What is looked at need not be shown.
+    EXPECT_EQ("root/toy:TOY_Alert\n\n",
+              kldrcim("watch TOY_Alert --count 1 --where Text=smoke --properties Other").out);
+}
+
 TEST(Cli_Watch, TakesFiltersInSeveralNamespaces)
 {
     EXPECT_EQ(block, kldrcim("watch TOY_Alert --count 1 --filter root/toy --filter root/other").out);

@@ -158,7 +158,8 @@ TEST(Filtered_Results, NameTheCulpritOfBadInput)
         {"ei TOY_Item --count 1", "usage: kldrcim [options] ei CLASS"},
         {"ei TOY_Item --count=1", "--count takes no value"},
         {"cm TOY_Item Echo --format jsonl", "--format jsonl makes no sense for cm"},
-        {"watch --where A=1", "--where makes no sense for watch; it is for ei ein ai ain ri rin"},
+        {"gi TOY_Item.Id=1 --where A=1",
+         "--where makes no sense for gi; it is for ei ein ai ain ri rin watch"},
         {"gi TOY_Item.Id=1 --count", "--count makes no sense for gi; it is for ei ein ai ain ri rin watch"},
     };
     for (const auto& [arguments, error] : mistakes) {

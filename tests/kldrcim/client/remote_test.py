@@ -64,6 +64,23 @@ class Same_Answers(Serving_Case):
         self.same("ain", system, *filters, "--result", "CIM_PortController", "--result-role", "PartComponent")
         self.same("rin", system, *filters)
 
+    def test_part_of_the_results(self):
+        for form in ("table", "json", "jsonl", "mof"):
+            self.same("ei", "KALDERA_FCPort", "--where", "OperationalStatus=no contact", "--properties", "DeviceID", "--format", form)
+            self.same("ei", "CIM_NetworkPort", "--where", "Speed!=0", "--sort", "-Speed", "--properties", "DeviceID,Speed", "--format", form)
+            self.same("ein", "KALDERA_FCPort", "--where", "DeviceID~*4C10*", "--where", "DeviceID!=1000024b4c100000", "--format", form)
+            self.same("ai", self.port, "--where", "ElementName~*", "--format", form)
+        # What is looked at and not shown is asked for, too; what only a subclass has is found.
+        self.assertEqual("1\n", run("--url", self.served.url, "ei", "KALDERA_FCPort", "--where", "PortNumber=1", "--where", "Speed=0", "--count")[1])
+        self.same("ei", "CIM_LogicalDevice", "--where", "PermanentAddress~1000*", "--sort", "DeviceID", "--properties", "DeviceID")
+        for verb in ("ain", "rin", "ri"):
+            self.same(verb, self.port, "--count")
+        self.same("ain", self.port, "--sort", "-Name", "--assoc", "KALDERA_DeviceSAPImplementation")
+        for refused in (("--where", "PortType=Q"), ("--where", "NoSuch=1"), ("--sort", "NoSuch"), ("--where", "Speed")):
+            self.same("ei", "KALDERA_FCPort", *refused)
+        self.same("ein", "KALDERA_FCPort", "--where", "Speed=0")
+        self.same("ai", self.port, "--where", "NoSuch=1")
+
     def test_walks(self):
         for form in ("table", "json"):
             self.same("tree", "--format", form, "--software", "--connectors")
@@ -188,6 +205,19 @@ class Watching(Serving_Case):
         alerts = json.loads("[" + out.replace("}\n{", "},\n{") + "]")
         self.assertEqual(["root/kaldera:KALDERA_AlertIndication"] * 2, [alert["path"] for alert in alerts])
         self.assertRegex(alerts[0]["properties"]["MessageID"], r"KLDR\d+$")
+        self.assertEqual(["", "", ""], self.left())
+
+    def test_a_condition_is_met_by_what_is_written_and_counted(self):
+        # The first is critical, the next is not.
+        status, out, errors = run(
+            "--url", self.served.url, "watch", "--where", "PerceivedSeverity!=Critical", "--where", "MessageID~*83", "--count", "2",
+            "--format", "jsonl", "--properties", "MessageID",
+        )
+        self.assertEqual((0, ""), (status, errors))
+        self.assertEqual(
+            ["PROPKLDR131083", "PROPKLDR327683"], [json.loads(line)["properties"]["MessageID"] for line in out.splitlines()])
+        status, out, errors = run("--url", self.served.url, "watch", "--where", "NoSuch=1")
+        self.assertEqual((2, "", 'kldrcim: KALDERA_AlertIndication has no property "NoSuch"\n'), (status, out, errors))
         self.assertEqual(["", "", ""], self.left())
 
     def test_each_filter_has_its_name_space(self):
