@@ -8,7 +8,7 @@ namespace {
 CMPIStatus add_arg(const CMPIArgs* self, const char* name, const CMPIValue* value, CMPIType type)
 {
     Call<Args_Object> call("CMAddArg", self, nullptr, name);
-    Value read;
+    Plain_Value read;
     if (call && call.need_text(call.core(), name, "argument name") &&
         !read_value(call, call.core(), value, type, read))
         KPRV::broker::set_value(call->content, name, std::move(read));

@@ -9,13 +9,13 @@ Array_Object::Array_Object(Core& owner_core, CMPIType type, std::size_t size)
     : Object_Of(owner_core, array_table), element_type(type), elements(size)
 {
     for (Element& element : elements)
-        element.value = Value::null_of(type);
+        element.value = Plain_Value::null_of(type);
 }
 
-Array_Object::Array_Object(Core& owner_core, const Value& value)
+Array_Object::Array_Object(Core& owner_core, const Plain_Value& value)
     : Object_Of(owner_core, array_table), element_type(value.element_type())
 {
-    for (const Value& element : value.elements())
+    for (const Plain_Value& element : value.elements())
         elements.push_back({element, nullptr});
 }
 

@@ -37,48 +37,48 @@ std::vector<std::string> association_classes(const Class_Catalogue& catalogue, c
 
 void Association_Merge::add(const std::string& provider_class, Result one)
 {
-    sum_.done_count += one.done_count;
-    sum_.stopped = one.stopped;
+    _sum.done_count += one.done_count;
+    _sum.stopped = one.stopped;
     if (!one.ok()) {
-        sum_.failures.push_back({provider_class, one.rc, one.message});
-        if (!first_failure_)
-            first_failure_ = std::move(one);
+        _sum.failures.push_back({provider_class, one.rc, one.message});
+        if (!_first_failure)
+            _first_failure = std::move(one);
         return;
     }
-    succeeded_ = true;
+    _succeeded = true;
     for (Instance_Value& instance : one.instances)
         if (is_new(instance.path))
-            sum_.instances.push_back(std::move(instance));
+            _sum.instances.push_back(std::move(instance));
     for (Path_Value& path : one.paths)
         if (is_new(path))
-            sum_.paths.push_back(std::move(path));
+            _sum.paths.push_back(std::move(path));
 }
 
 bool Association_Merge::instance(Instance_Value&& instance)
 {
-    return !is_new(instance.path) || receiver_->instance(std::move(instance));
+    return !is_new(instance.path) || _receiver->instance(std::move(instance));
 }
 
 bool Association_Merge::path(Path_Value&& path)
 {
-    return !is_new(path) || receiver_->path(std::move(path));
+    return !is_new(path) || _receiver->path(std::move(path));
 }
 
 /// An instance whose path has no keys (some providers return such) cannot be told from its like: it stays.
 bool Association_Merge::is_new(const Path_Value& path)
 {
-    return path.keys.empty() || seen_.insert(lower_name(path.name_space) + ":" + path_identity(path)).second;
+    return path.keys.empty() || _seen.insert(lower_name(path.name_space) + ":" + path_identity(path)).second;
 }
 
 Result Association_Merge::settle()
 {
-    if (first_failure_ && !succeeded_) {
-        sum_.rc = first_failure_->rc;
-        sum_.message = first_failure_->message;
-        sum_.exception = first_failure_->exception;
+    if (_first_failure && !_succeeded) {
+        _sum.rc = _first_failure->rc;
+        _sum.message = _first_failure->message;
+        _sum.exception = _first_failure->exception;
     }
-    sum_.done = sum_.done_count > 0;
-    return std::move(sum_);
+    _sum.done = _sum.done_count > 0;
+    return std::move(_sum);
 }
 
 } // namespace KPRV::broker

@@ -20,12 +20,12 @@ class Association_Merge final : private Receiver
 public:
     /// With a receiver, objects are not kept: those that nobody has reported before go to it as they come,
     /// also those of a provider that fails later.
-    explicit Association_Merge(Receiver* receiver = nullptr) : receiver_(receiver) {}
+    explicit Association_Merge(Receiver* receiver = nullptr) : _receiver(receiver) {}
 
     /// Where the provider that is asked next hands its objects to; null where they come in its answer.
-    Receiver* taker() { return receiver_ ? this : nullptr; }
+    Receiver* taker() { return _receiver ? this : nullptr; }
     void add(const std::string& provider_class, Result one);
-    bool is_stopped() const { return sum_.stopped; }
+    bool is_stopped() const { return _sum.stopped; }
     /// The sum. If all providers failed, with the status of the first.
     Result settle();
 
@@ -34,11 +34,11 @@ private:
     bool path(Path_Value&& path) override;
     bool is_new(const Path_Value& path);
 
-    Receiver* const receiver_;
-    Result sum_;
-    std::optional<Result> first_failure_;
-    bool succeeded_ = false;
-    std::unordered_set<std::string> seen_;
+    Receiver* const _receiver;
+    Result _sum;
+    std::optional<Result> _first_failure;
+    bool _succeeded = false;
+    std::unordered_set<std::string> _seen;
 };
 
 } // namespace KPRV::broker

@@ -20,7 +20,7 @@ namespace KPRV::broker {
 class Block_Memory
 {
 public:
-    static constexpr std::size_t block_size = std::size_t(1) << 18;
+    static constexpr std::size_t BLOCK_SIZE = std::size_t(1) << 18;
 
     struct Block
     {
@@ -32,9 +32,9 @@ public:
     };
 
     /// So many bytes lie in memory before there is a file, and so many of the file at a time; 0 for no bound.
-    explicit Block_Memory(std::size_t most_in_memory) : most_blocks_(most_in_memory / block_size)
+    explicit Block_Memory(std::size_t most_in_memory) : _most_blocks(most_in_memory / BLOCK_SIZE)
     {
-        here_.reserve(most_blocks_ + 1);
+        _here.reserve(_most_blocks + 1);
     }
     ~Block_Memory();
     Block_Memory(const Block_Memory&) = delete;
@@ -56,19 +56,19 @@ public:
 
 private:
     void come_in(Block& block);
-    void note_here(Block& block) REQUIRES(mutex_);
+    void note_here(Block& block) REQUIRES(_mutex);
     /// A reserved place in the file; negative if there is none.
-    off_t place_in_file() REQUIRES(mutex_);
+    off_t place_in_file() REQUIRES(_mutex);
 
-    const std::size_t most_blocks_;
-    mutable Standard_Mutex<> mutex_;
-    std::size_t in_memory_ GUARDED_BY(mutex_) = 0;
-    int file_ GUARDED_BY(mutex_) = -1;
-    bool has_no_file_ GUARDED_BY(mutex_) = false;
-    off_t file_end_ GUARDED_BY(mutex_) = 0;
-    std::vector<off_t> free_places_ GUARDED_BY(mutex_);
+    const std::size_t _most_blocks;
+    mutable Standard_Mutex<> _mutex;
+    std::size_t _in_memory GUARDED_BY(_mutex) = 0;
+    int _file GUARDED_BY(_mutex) = -1;
+    bool _has_no_file GUARDED_BY(_mutex) = false;
+    off_t _file_end GUARDED_BY(_mutex) = 0;
+    std::vector<off_t> _free_places GUARDED_BY(_mutex);
     /// Blocks of the file that are here, the oldest first.
-    std::vector<Block*> here_ GUARDED_BY(mutex_);
+    std::vector<Block*> _here GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

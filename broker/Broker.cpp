@@ -18,9 +18,9 @@ std::set<const Broker*>& brokers() REQUIRES(brokers_mutex)
 
 } // namespace
 
-Broker::Broker(std::shared_ptr<Core> core, Up_Calls& up_calls) : core_(std::move(core)), up_calls_(up_calls)
+Broker::Broker(std::shared_ptr<Core> core, Up_Calls& up_calls) : _core(std::move(core)), _up_calls(up_calls)
 {
-    level_100_ = {this, broker_table, broker_enc_table, broker_ext_table};
+    _level_100 = {this, broker_table, broker_enc_table, broker_ext_table};
     const Auto_Lock lock(brokers_mutex);
     brokers().insert(this);
 }
@@ -35,15 +35,15 @@ Broker* Broker::find(const CMPIBroker* address)
 {
     const Auto_Lock lock(brokers_mutex);
     for (const Broker* broker : brokers())
-        if (&broker->level_100_ == address)
+        if (&broker->_level_100 == address)
             return const_cast<Broker*>(broker);
     return nullptr;
 }
 
 Broker_Call::Broker_Call(const char* name, const CMPIBroker* self, CMPIStatus* rc, const char* argument)
-    : Call_Base(name, rc), broker_(Broker::find(self))
+    : Call_Base(name, rc), _broker(Broker::find(self))
 {
-    if (!broker_) {
+    if (!_broker) {
         if (Call_Frame* frame = Call_Frame::top())
             frame->core().violations.add(name, "this is not a broker of this server");
         set(CMPI_RC_ERR_INVALID_HANDLE);

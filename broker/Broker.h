@@ -17,19 +17,19 @@ public:
     Broker(const Broker&) = delete;
     Broker& operator=(const Broker&) = delete;
 
-    const CMPIBroker* cmpi() const { return &level_100_; }
-    const std::shared_ptr<Core>& core() const { return core_; }
-    Up_Calls& up_calls() const { return up_calls_; }
+    const CMPIBroker* cmpi() const { return &_level_100; }
+    const std::shared_ptr<Core>& core() const { return _core; }
+    Up_Calls& up_calls() const { return _up_calls; }
 
     /// The broker at this address, null for any other.
     static Broker* find(const CMPIBroker* address);
 
 private:
-    std::shared_ptr<Core> core_;
-    Up_Calls& up_calls_;
-    CMPIBroker level_100_ = {};
+    std::shared_ptr<Core> _core;
+    Up_Calls& _up_calls;
+    CMPIBroker _level_100 = {};
     /// Where a provider of level 2.0 looks for the memory table.
-    [[maybe_unused]] const void* no_memory_table_ = nullptr;
+    [[maybe_unused]] const void* _no_memory_table = nullptr;
 };
 
 /// One call through a broker table: like `Call`, but the object is the broker. Up-calls ask for a context
@@ -39,13 +39,13 @@ class Broker_Call : public Call_Base
 public:
     Broker_Call(const char* name, const CMPIBroker* self, CMPIStatus* rc, const char* argument = nullptr);
 
-    Broker* operator->() const { return broker_; }
-    Core& core() const { return *broker_->core(); }
+    Broker* operator->() const { return _broker; }
+    Core& core() const { return *_broker->core(); }
     /// Null after a violation.
     Context_Object* context(const CMPIContext* context);
 
 private:
-    Broker* broker_;
+    Broker* _broker;
 };
 
 extern const CMPIBrokerFT* const broker_table;

@@ -64,11 +64,11 @@ CMPIEnumeration* answer(Up_Call& call)
 {
     if (!call.send())
         return nullptr;
-    std::vector<Value> elements;
+    std::vector<Plain_Value> elements;
     for (Instance_Value& instance : call.result.instances)
-        elements.push_back(Value::instance(std::move(instance)));
+        elements.push_back(Plain_Value::instance(std::move(instance)));
     for (Path_Value& path : call.result.paths)
-        elements.push_back(Value::path(std::move(path)));
+        elements.push_back(Plain_Value::path(std::move(path)));
     return make_object<Enumeration_Object>(call.core(), call.name(), std::move(elements))->cmpi();
 }
 

@@ -40,13 +40,13 @@ Object* Call_Base::check(const void* address, Object_Kind kind, std::string_view
     std::string fault = fault_of(object, kind);
     if (!fault.empty()) {
         if (object)
-            object->core.violations.add(name_, fault);
+            object->core.violations.add(_name, fault);
         else
-            blame_current(name_, fault);
+            blame_current(_name, fault);
         set(CMPI_RC_ERR_INVALID_HANDLE);
         return nullptr;
     }
-    if (CMPIrc rc = object->core.calls.enter(name_, argument))
+    if (CMPIrc rc = object->core.calls.enter(_name, argument))
         set(rc);
     return object;
 }

@@ -10,12 +10,12 @@ namespace KPRV::broker {
 class Call_Base
 {
 public:
-    Call_Base(const char* name, CMPIStatus* rc) : name_(name), rc_(rc) { set(CMPI_RC_OK); }
+    Call_Base(const char* name, CMPIStatus* rc) : _name(name), _rc(rc) { set(CMPI_RC_OK); }
 
-    explicit operator bool() const { return code_ == CMPI_RC_OK; }
-    const char* name() const { return name_; }
-    CMPIrc code() const { return code_; }
-    CMPIStatus status() const { return {code_, nullptr}; }
+    explicit operator bool() const { return _code == CMPI_RC_OK; }
+    const char* name() const { return _name; }
+    CMPIrc code() const { return _code; }
+    CMPIStatus status() const { return {_code, nullptr}; }
 
     /// Ends the call with this code; null, so that `return call.fail(...)` serves functions that answer a
     /// pointer.
@@ -27,7 +27,7 @@ public:
     /// The same, and the provider is to blame.
     std::nullptr_t violation(Core& core, CMPIrc code, const std::string& what)
     {
-        core.violations.add(name_, what);
+        core.violations.add(_name, what);
         return fail(code);
     }
     /// A text that must not be null: a violation and code 4 otherwise.
@@ -41,17 +41,17 @@ public:
 protected:
     void set(CMPIrc code)
     {
-        code_ = code;
-        if (rc_)
-            *rc_ = {code, nullptr};
+        _code = code;
+        if (_rc)
+            *_rc = {code, nullptr};
     }
     /// The good object of that kind at the address; null after a violation.
     Object* check(const void* address, Object_Kind kind, std::string_view argument);
 
 private:
-    const char* name_;
-    CMPIStatus* rc_;
-    CMPIrc code_ = CMPI_RC_OK;
+    const char* _name;
+    CMPIStatus* _rc;
+    CMPIrc _code = CMPI_RC_OK;
 };
 
 template <class T>
@@ -59,15 +59,15 @@ class Call : public Call_Base
 {
 public:
     Call(const char* name, const typename T::Cmpi* self, CMPIStatus* rc, const char* argument = nullptr)
-        : Call_Base(name, rc), object_(static_cast<T*>(check(self, T::KIND, argument ? argument : "")))
+        : Call_Base(name, rc), _object(static_cast<T*>(check(self, T::KIND, argument ? argument : "")))
     {
     }
-    T* operator->() const { return object_; }
-    T& operator*() const { return *object_; }
-    Core& core() const { return object_->core; }
+    T* operator->() const { return _object; }
+    T& operator*() const { return *_object; }
+    Core& core() const { return _object->core; }
 
 private:
-    T* object_;
+    T* _object;
 };
 
 /// An object that came as a further argument of a call; null after a violation.

@@ -7,7 +7,7 @@ namespace {
 thread_local Call_Frame* innermost = nullptr;
 
 /// More than what a provider has in hand at a time.
-constexpr std::size_t most_not_packed = 1024;
+constexpr std::size_t MOST_NOT_PACKED = 1024;
 
 std::string described(const Object& object)
 {
@@ -17,20 +17,20 @@ std::string described(const Object& object)
 } // namespace
 
 Call_Frame::Call_Frame(std::shared_ptr<Core> core, const CMPIContext* context)
-    : core_(std::move(core)), context_(context), outer_(innermost)
+    : _core(std::move(core)), _context(context), _outer(innermost)
 {
     innermost = this;
 }
 
 Call_Frame::~Call_Frame()
 {
-    for (Object* object = first_; object;) {
+    for (Object* object = _first; object;) {
         Object* const next = object->after;
-        core_->ledger.freed_by_frame(object->kind, object->maker);
-        core_->retire(*object);
+        _core->ledger.freed_by_frame(object->kind, object->maker);
+        _core->retire(*object);
         object = next;
     }
-    innermost = outer_;
+    innermost = _outer;
 }
 
 Call_Frame* Call_Frame::top()
@@ -40,7 +40,7 @@ Call_Frame* Call_Frame::top()
 
 bool Call_Frame::is_on_this_thread(const Call_Frame* frame)
 {
-    for (const Call_Frame* at = innermost; at; at = at->outer_)
+    for (const Call_Frame* at = innermost; at; at = at->_outer)
         if (at == frame)
             return true;
     return false;
@@ -49,33 +49,33 @@ bool Call_Frame::is_on_this_thread(const Call_Frame* frame)
 void Call_Frame::record(Object& object)
 {
     object.frame = this;
-    object.before = last_;
-    (last_ ? last_->after : first_) = &object;
-    last_ = &object;
-    if (!oldest_)
-        oldest_ = &object;
-    ++not_packed_;
+    object.before = _last;
+    (_last ? _last->after : _first) = &object;
+    _last = &object;
+    if (!_oldest)
+        _oldest = &object;
+    ++_not_packed;
 }
 
 void Call_Frame::forget(Object& object)
 {
-    if (oldest_ == &object)
-        oldest_ = object.after;
+    if (_oldest == &object)
+        _oldest = object.after;
     if (!object.is_old)
-        --not_packed_;
-    (object.before ? object.before->after : first_) = object.after;
-    (object.after ? object.after->before : last_) = object.before;
+        --_not_packed;
+    (object.before ? object.before->after : _first) = object.after;
+    (object.after ? object.after->before : _last) = object.before;
     object.frame = nullptr;
 }
 
 void Call_Frame::pack_old()
 {
-    while (not_packed_ > most_not_packed) {
-        Object& object = *oldest_;
-        oldest_ = object.after;
+    while (_not_packed > MOST_NOT_PACKED) {
+        Object& object = *_oldest;
+        _oldest = object.after;
         object.is_old = true;
-        --not_packed_;
-        core_->pack(object);
+        --_not_packed;
+        _core->pack(object);
     }
 }
 
@@ -92,7 +92,7 @@ void detail::settle_on_frame(Object& object)
 CMPIrc release_by_provider(Object& object)
 {
     Core& core = object.core;
-    if (object.owner == Owner::HOST || object.owner == Owner::THREAD) {
+    if (object.owner == Owner::SERVER || object.owner == Owner::THREAD) {
         core.violations.add("CMRelease", "the provider does not own this " + described(object));
         return CMPI_RC_ERR_FAILED;
     }

@@ -31,8 +31,8 @@ public:
     /// True if the frame is one of the calling thread's.
     static bool is_on_this_thread(const Call_Frame* frame);
 
-    Core& core() const { return *core_; }
-    const CMPIContext* context() const { return context_; }
+    Core& core() const { return *_core; }
+    const CMPIContext* context() const { return _context; }
 
     void record(Object& object);
     void forget(Object& object);
@@ -40,14 +40,14 @@ public:
     void pack_old();
 
 private:
-    std::shared_ptr<Core> core_;
-    const CMPIContext* context_;
+    std::shared_ptr<Core> _core;
+    const CMPIContext* _context;
     /// Recorded objects in the order in which they were made, and the first that may still be packed.
-    Object* first_ = nullptr;
-    Object* last_ = nullptr;
-    Object* oldest_ = nullptr;
-    std::size_t not_packed_ = 0;
-    Call_Frame* outer_;
+    Object* _first = nullptr;
+    Object* _last = nullptr;
+    Object* _oldest = nullptr;
+    std::size_t _not_packed = 0;
+    Call_Frame* _outer;
 };
 
 /// Makes an object for the provider under the name of the call that makes it, and records it on the thread's
@@ -59,7 +59,7 @@ T* make_object(Core& core, const char* maker, Arguments&&... arguments);
 template <class T, class... Arguments>
 T* make_clone(Core& core, Arguments&&... arguments);
 
-/// Makes an argument of a call: the host's own, ended by the host.
+/// Makes an argument of a call: the server's own, ended by the server.
 template <class T, class... Arguments>
 T* make_argument(Core& core, Arguments&&... arguments);
 
@@ -74,13 +74,13 @@ void settle_on_frame(Object& object);
 class Fresh_Place
 {
 public:
-    Fresh_Place(Core& core, std::size_t size) : core_(core), place_(core.blocks.take_for_object(size)) {}
+    Fresh_Place(Core& core, std::size_t size) : _core(core), _place(core.blocks.take_for_object(size)) {}
     ~Fresh_Place()
     {
-        if (object_)
-            object_->~Object();
-        if (place_)
-            core_.blocks.give_object(place_);
+        if (_object)
+            _object->~Object();
+        if (_place)
+            _core.blocks.give_object(_place);
     }
     Fresh_Place(const Fresh_Place&) = delete;
     Fresh_Place& operator=(const Fresh_Place&) = delete;
@@ -88,21 +88,21 @@ public:
     template <class T, class... Arguments>
     T* make(Arguments&&... arguments)
     {
-        T* const made = new (place_) T(core_, std::forward<Arguments>(arguments)...);
-        object_ = made;
+        T* const made = new (_place) T(_core, std::forward<Arguments>(arguments)...);
+        _object = made;
         return made;
     }
     /// From here on both are the core's.
     void keep()
     {
-        object_ = nullptr;
-        place_ = nullptr;
+        _object = nullptr;
+        _place = nullptr;
     }
 
 private:
-    Core& core_;
-    void* place_;
-    Object* object_ = nullptr;
+    Core& _core;
+    void* _place;
+    Object* _object = nullptr;
 };
 
 template <class T, class... Arguments>
@@ -136,7 +136,7 @@ T* make_clone(Core& core, Arguments&&... arguments)
 template <class T, class... Arguments>
 T* make_argument(Core& core, Arguments&&... arguments)
 {
-    return detail::make<T>(core, "the call", Owner::HOST, std::forward<Arguments>(arguments)...);
+    return detail::make<T>(core, "the call", Owner::SERVER, std::forward<Arguments>(arguments)...);
 }
 
 /// Keeps an argument alive for the length of a call.
@@ -146,19 +146,19 @@ class Argument
 public:
     template <class... Arguments>
     explicit Argument(Core& core, Arguments&&... arguments)
-        : object_(make_argument<T>(core, std::forward<Arguments>(arguments)...))
+        : _object(make_argument<T>(core, std::forward<Arguments>(arguments)...))
     {
     }
-    ~Argument() { object_->core.retire(*object_); }
+    ~Argument() { _object->core.retire(*_object); }
     Argument(const Argument&) = delete;
     Argument& operator=(const Argument&) = delete;
 
-    T* operator->() const { return object_; }
-    T& operator*() const { return *object_; }
-    typename T::Cmpi* cmpi() const { return object_->cmpi(); }
+    T* operator->() const { return _object; }
+    T& operator*() const { return *_object; }
+    typename T::Cmpi* cmpi() const { return _object->cmpi(); }
 
 private:
-    T* object_;
+    T* _object;
 };
 
 } // namespace KPRV::broker

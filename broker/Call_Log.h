@@ -17,7 +17,7 @@ class Call_Log
 {
 public:
     /// Recording is off at first: it costs time.
-    void record(bool on) { recording_ = on; }
+    void record(bool on) { _recording = on; }
 
     /// "CMSetProperty Name": the call and its key argument (class, property, key, argument, method, text or
     /// kind).
@@ -44,11 +44,11 @@ private:
         bool throws;
     };
 
-    std::atomic<bool> recording_ = false;
-    std::atomic<bool> faulty_ = false;
-    mutable Standard_Mutex<> mutex_;
-    std::vector<std::string> calls_ GUARDED_BY(mutex_);
-    std::multimap<std::string, Fault, std::less<>> faults_ GUARDED_BY(mutex_);
+    std::atomic<bool> _recording = false;
+    std::atomic<bool> _faulty = false;
+    mutable Standard_Mutex<> _mutex;
+    std::vector<std::string> _calls GUARDED_BY(_mutex);
+    std::multimap<std::string, Fault, std::less<>> _faults GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

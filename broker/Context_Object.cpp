@@ -5,7 +5,7 @@ namespace KPRV::broker {
 
 namespace {
 
-CMPIData entry_data(Call<Context_Object>& call, const char* name, const Value& value)
+CMPIData entry_data(Call<Context_Object>& call, const char* name, const Plain_Value& value)
 {
     CMPIData data = make_data(call.core(), call.name(), value);
     if (call->principal_without_text && same_name(name, CMPIPrincipal))
@@ -18,7 +18,7 @@ CMPIData get_entry(const CMPIContext* self, const char* name, CMPIStatus* rc)
     Call<Context_Object> call("CMGetContextEntry", self, rc, name);
     if (!call || !call.need_text(call.core(), name, "entry name"))
         return no_data();
-    if (const Value* value = find_value(call->entries, name))
+    if (const Plain_Value* value = find_value(call->entries, name))
         return entry_data(call, name, *value);
     call.fail(CMPI_RC_ERR_NO_SUCH_PROPERTY);
     return no_data();
@@ -39,7 +39,7 @@ CMPICount get_entry_count(const CMPIContext* self, CMPIStatus* rc)
 CMPIStatus add_entry(const CMPIContext* self, const char* name, const CMPIValue* value, CMPIType type)
 {
     Call<Context_Object> call("CMAddContextEntry", self, nullptr, name);
-    Value read;
+    Plain_Value read;
     if (call && call.need_text(call.core(), name, "entry name") &&
         !read_value(call, call.core(), value, type, read))
         set_value(call->entries, name, std::move(read));

@@ -8,37 +8,37 @@ namespace KPRV::broker {
 
 namespace {
 
-Value read_number(const CMPIValue& value, CMPIType type)
+Plain_Value read_number(const CMPIValue& value, CMPIType type)
 {
     switch (type) {
     case CMPI_boolean:
-        return Value::boolean(value.boolean != 0);
+        return Plain_Value::boolean(value.boolean != 0);
     case CMPI_char16:
-        return Value::unsigned_number(type, value.char16);
+        return Plain_Value::unsigned_number(type, value.char16);
     case CMPI_uint8:
-        return Value::unsigned_number(type, value.uint8);
+        return Plain_Value::unsigned_number(type, value.uint8);
     case CMPI_uint16:
-        return Value::unsigned_number(type, value.uint16);
+        return Plain_Value::unsigned_number(type, value.uint16);
     case CMPI_uint32:
-        return Value::unsigned_number(type, value.uint32);
+        return Plain_Value::unsigned_number(type, value.uint32);
     case CMPI_uint64:
-        return Value::unsigned_number(type, value.uint64);
+        return Plain_Value::unsigned_number(type, value.uint64);
     case CMPI_sint8:
-        return Value::signed_number(type, value.sint8);
+        return Plain_Value::signed_number(type, value.sint8);
     case CMPI_sint16:
-        return Value::signed_number(type, value.sint16);
+        return Plain_Value::signed_number(type, value.sint16);
     case CMPI_sint32:
-        return Value::signed_number(type, value.sint32);
+        return Plain_Value::signed_number(type, value.sint32);
     case CMPI_sint64:
-        return Value::signed_number(type, value.sint64);
+        return Plain_Value::signed_number(type, value.sint64);
     case CMPI_real32:
-        return Value::real(type, value.real32);
+        return Plain_Value::real(type, value.real32);
     default:
-        return Value::real(type, value.real64);
+        return Plain_Value::real(type, value.real64);
     }
 }
 
-CMPIValue number_of(const Value& value)
+CMPIValue number_of(const Plain_Value& value)
 {
     CMPIValue result = {};
     switch (value.type) {
@@ -76,7 +76,7 @@ const void* object_of(const CMPIValue& value)
     return value.string;
 }
 
-CMPIrc read_object(Call_Base& call, Core& core, const CMPIValue& value, CMPIType type, Value& result)
+CMPIrc read_object(Call_Base& call, Core& core, const CMPIValue& value, CMPIType type, Plain_Value& result)
 {
     const void* address = object_of(value);
     if (type & CMPI_ARRAY) {
@@ -101,24 +101,24 @@ CMPIrc read_object(Call_Base& call, Core& core, const CMPIValue& value, CMPIType
     switch (kind) {
     case Object_Kind::STRING: {
         auto* text = static_cast<String_Object*>(object);
-        result = text->has_text() ? Value::text(text->text()) : Value::null_of(CMPI_string);
+        result = text->has_text() ? Plain_Value::text(text->text()) : Plain_Value::null_of(CMPI_string);
         break;
     }
     case Object_Kind::DATETIME:
-        result = Value::datetime(static_cast<Datetime_Object*>(object)->text());
+        result = Plain_Value::datetime(static_cast<Datetime_Object*>(object)->text());
         break;
     case Object_Kind::PATH:
-        result = Value::path(static_cast<Path_Object*>(object)->content);
+        result = Plain_Value::path(static_cast<Path_Object*>(object)->content);
         break;
     default:
-        result = Value::instance(static_cast<Instance_Object*>(object)->value());
+        result = Plain_Value::instance(static_cast<Instance_Object*>(object)->value());
     }
     return CMPI_RC_OK;
 }
 
 } // namespace
 
-CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType type, Value& result)
+CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType type, Plain_Value& result)
 {
     // The two words for plain characters become strings.
     CMPIType element = static_cast<CMPIType>(type & ~CMPI_ARRAY);
@@ -129,13 +129,13 @@ CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType 
         call.violation(core, CMPI_RC_ERR_INVALID_DATA_TYPE, "unknown type word " + std::to_string(type));
         return call.code();
     }
-    result = Value::null_of(meant);
+    result = Plain_Value::null_of(meant);
     if (!value)
         return CMPI_RC_OK;
     if (type == CMPI_chars || type == CMPI_charsptr) {
         const char* text = type == CMPI_chars ? reinterpret_cast<const char*>(value) : value->chars;
         if (text)
-            result = Value::text(text);
+            result = Plain_Value::text(text);
         return CMPI_RC_OK;
     }
     if (meant & (CMPI_ENC | CMPI_ARRAY))
@@ -144,9 +144,9 @@ CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType 
     return CMPI_RC_OK;
 }
 
-CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Value& result)
+CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Plain_Value& result)
 {
-    std::vector<Value> elements;
+    std::vector<Plain_Value> elements;
     for (const Array_Object::Element& element : array.elements) {
         Object* object = find_object(element.object);
         if (element.object && (!object || !object->live)) {
@@ -157,11 +157,11 @@ CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Value&
         }
         elements.push_back(element.value);
     }
-    result = Value::array(array.element_type, std::move(elements));
+    result = Plain_Value::array(array.element_type, std::move(elements));
     return CMPI_RC_OK;
 }
 
-CMPIData make_data(Core& core, const char* maker, const Value& value)
+CMPIData make_data(Core& core, const char* maker, const Plain_Value& value)
 {
     CMPIData data = {};
     data.type = value.type;
@@ -191,7 +191,7 @@ CMPIData make_entry(Call_Base& call, Core& core, const std::vector<Named_Value>&
 {
     if (!call.need_text(core, name, what))
         return no_data();
-    if (const Value* value = find_value(entries, name))
+    if (const Plain_Value* value = find_value(entries, name))
         return make_data(core, call.name(), *value);
     call.fail(missing);
     return no_data();

@@ -7,13 +7,13 @@ namespace KPRV::broker {
 
 /// Copies what a provider passes as value pointer and type word (see cmpimacs.h) into a host value. Wrong
 /// type words and objects are violations; the code is that of the call.
-CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType type, Value& result);
+CMPIrc read_value(Call_Base& call, Core& core, const CMPIValue* value, CMPIType type, Plain_Value& result);
 
 /// Presents a host value to the provider; objects that it needs are made under the name of the call.
-CMPIData make_data(Core& core, const char* maker, const Value& value);
+CMPIData make_data(Core& core, const char* maker, const Plain_Value& value);
 
 /// The array's elements as a host value.
-CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Value& result);
+CMPIrc read_array(Call_Base& call, Core& core, const Array_Object& array, Plain_Value& result);
 
 /// The entry of that name for the getters by name, whose code for a name that is not there differs. A null
 /// name is a violation; `what` calls it by its role.

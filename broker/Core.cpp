@@ -15,25 +15,25 @@ Object* find_object(const void* address)
 void Object::hold(std::string_view bytes)
 {
     let_go();
-    held_ = core.blocks.take_bytes(bytes.size() + 1);
-    std::memcpy(held_, bytes.data(), bytes.size());
-    held_[bytes.size()] = '\0';
-    held_size_ = static_cast<std::uint32_t>(bytes.size());
+    _held = core.blocks.take_bytes(bytes.size() + 1);
+    std::memcpy(_held, bytes.data(), bytes.size());
+    _held[bytes.size()] = '\0';
+    _held_size = static_cast<std::uint32_t>(bytes.size());
 }
 
 std::string_view Object::held() const
 {
-    if (held_)
-        core.blocks.touch_bytes(held_, std::size_t(held_size_) + 1);
-    return {held_, held_size_};
+    if (_held)
+        core.blocks.touch_bytes(_held, std::size_t(_held_size) + 1);
+    return {_held, _held_size};
 }
 
 void Object::let_go()
 {
-    if (held_)
-        core.blocks.give_bytes(held_, std::size_t(held_size_) + 1);
-    held_ = nullptr;
-    held_size_ = 0;
+    if (_held)
+        core.blocks.give_bytes(_held, std::size_t(_held_size) + 1);
+    _held = nullptr;
+    _held_size = 0;
 }
 
 Core::~Core()
@@ -51,7 +51,7 @@ void Core::destroy(Object& object)
 
 void Core::adopt(Object& object)
 {
-    if (object.owner != Owner::HOST)
+    if (object.owner != Owner::SERVER)
         ledger.made(object.kind, object.maker);
     blocks.announce(&object);
 }
@@ -66,19 +66,19 @@ void Core::retire(Object& object)
     object.drop();
     Object* last = nullptr;
     {
-        const Auto_Lock lock(mutex_);
-        retired_.push_back(&object);
-        if (retired_.size() <= options.most_shells)
+        const Auto_Lock lock(_mutex);
+        _retired.push_back(&object);
+        if (_retired.size() <= options.most_shells)
             return;
-        last = retired_.front();
-        retired_.pop_front();
+        last = _retired.front();
+        _retired.pop_front();
     }
     destroy(*last);
 }
 
 void Core::pack(Object& object)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     try {
         object.packed = object.pack();
     } catch (const std::bad_alloc&) {
@@ -88,7 +88,7 @@ void Core::pack(Object& object)
 
 void Core::unpack(Object& object)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     if (!object.packed)
         return;
     object.unpack();

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "broker/Call_Log.h"
-#include "broker/Host_Options.h"
 #include "broker/Ledger.h"
 #include "broker/Object.h"
 #include "broker/Object_Blocks.h"
+#include "broker/Server_Options.h"
 #include "broker/Violations.h"
 #include "broker/values/Class_Catalogue.h"
 #include "contracts/cmpi/cmpift.h"
@@ -15,19 +15,20 @@
 
 namespace KPRV::broker {
 
-/// What the objects and the broker of one host share. Lives as long as the last thread that is inside a call.
+/// What the objects and the broker of one server share. Lives as long as the last thread that is inside a
+/// call.
 class Core
 {
 public:
-    explicit Core(Host_Options host_options)
-        : options(std::move(host_options)), blocks(options.most_object_memory)
+    explicit Core(Server_Options server_options)
+        : options(std::move(server_options)), blocks(options.most_object_memory)
     {
     }
     ~Core();
     Core(const Core&) = delete;
     Core& operator=(const Core&) = delete;
 
-    const Host_Options options;
+    const Server_Options options;
     Violations violations;
     Ledger ledger;
     Call_Log calls;
@@ -35,7 +36,7 @@ public:
     /// Set before the first call, never changed later.
     const Class_Catalogue* catalogue = nullptr;
 
-    /// Makes its address known, and counts it unless it is the host's own.
+    /// Makes its address known, and counts it unless it is the server's own.
     void adopt(Object& object);
 
     /// Ends the object's life: its content goes at once, its shell is kept for a while so that a later use is
@@ -49,8 +50,8 @@ public:
 private:
     void destroy(Object& object);
 
-    Standard_Mutex<> mutex_;
-    std::deque<Object*> retired_ GUARDED_BY(mutex_);
+    Standard_Mutex<> _mutex;
+    std::deque<Object*> _retired GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

@@ -32,7 +32,8 @@ CMPIArray* to_array(const CMPIEnumeration* self, CMPIStatus* rc)
     if (!call)
         return nullptr;
     CMPIType type = call->elements.empty() ? CMPIType(CMPI_instance) : call->elements.front().type;
-    return make_object<Array_Object>(call.core(), call.name(), Value::array(type, call->elements))->cmpi();
+    return make_object<Array_Object>(call.core(), call.name(), Plain_Value::array(type, call->elements))
+        ->cmpi();
 }
 
 } // namespace

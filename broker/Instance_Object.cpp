@@ -15,7 +15,7 @@ Path_Value Instance_Object::path() const
             if (const Feature_Info* feature = known->property(property.name);
                 feature && feature->key && !property.value.null)
                 set_value(path.keys, feature->name, property.value);
-    if (filter && core.options.filter_style == Host_Options::Filter_Style::EARLY)
+    if (filter && core.options.filter_style == Server_Options::Filter_Style::EARLY)
         std::erase_if(path.keys, [&](const Named_Value& key) { return !contains_name(*filter, key.name); });
     return path;
 }
@@ -68,7 +68,7 @@ CMPICount get_property_count(const CMPIInstance* self, CMPIStatus* rc)
 }
 
 /// What the class says about a property that is being set. Servers drop an unknown name without a word.
-bool fits_class(Call<Instance_Object>& call, const char* name, const Value& value)
+bool fits_class(Call<Instance_Object>& call, const char* name, const Plain_Value& value)
 {
     const Class_Info* info = call->info();
     if (!info)
@@ -84,11 +84,11 @@ bool fits_class(Call<Instance_Object>& call, const char* name, const Value& valu
 CMPIStatus set_property(const CMPIInstance* self, const char* name, const CMPIValue* value, CMPIType type)
 {
     Call<Instance_Object> call("CMSetProperty", self, nullptr, name);
-    Value read;
+    Plain_Value read;
     if (!call || !call.need_text(call.core(), name, "property name") ||
         read_value(call, call.core(), value, type, read) || !fits_class(call, name, read))
         return call.status();
-    bool early = call.core().options.filter_style == Host_Options::Filter_Style::EARLY;
+    bool early = call.core().options.filter_style == Server_Options::Filter_Style::EARLY;
     if (!early || !call->filter || contains_name(*call->filter, name))
         KPRV::broker::set_value(call->content.properties, name, std::move(read));
     return call.status();
@@ -106,7 +106,7 @@ CMPIStatus set_property_filter(const CMPIInstance* self, const char** names, con
     if (!call || !names)
         return call.status();
     call->filter = read_list(names);
-    if (call.core().options.filter_style == Host_Options::Filter_Style::EARLY)
+    if (call.core().options.filter_style == Server_Options::Filter_Style::EARLY)
         std::erase_if(call->content.properties, [&](const Named_Value& property) {
             return !contains_name(*call->filter, property.name);
         });

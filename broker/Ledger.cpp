@@ -4,7 +4,7 @@ namespace KPRV::broker {
 
 Ledger::Entry& Ledger::at(Object_Kind kind, const char* maker)
 {
-    Entry& entry = entries_[{kind, maker}];
+    Entry& entry = _entries[{kind, maker}];
     if (entry.maker.empty()) {
         entry.kind = kind;
         entry.maker = maker;
@@ -14,19 +14,19 @@ Ledger::Entry& Ledger::at(Object_Kind kind, const char* maker)
 
 void Ledger::made(Object_Kind kind, const char* maker)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     ++at(kind, maker).made;
 }
 
 void Ledger::released(Object_Kind kind, const char* maker)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     ++at(kind, maker).released;
 }
 
 void Ledger::freed_by_frame(Object_Kind kind, const char* maker)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     ++at(kind, maker).freed_by_frame;
 }
 
@@ -48,9 +48,9 @@ std::size_t Ledger::live(Object_Kind kind) const
 
 std::vector<Ledger::Entry> Ledger::entries() const
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     std::vector<Entry> list;
-    for (const auto& [key, entry] : entries_)
+    for (const auto& [key, entry] : _entries)
         list.push_back(entry);
     return list;
 }
@@ -73,8 +73,8 @@ void Ledger::report(std::FILE* out) const
 
 void Ledger::clear()
 {
-    const Auto_Lock lock(mutex_);
-    entries_.clear();
+    const Auto_Lock lock(_mutex);
+    _entries.clear();
 }
 
 } // namespace KPRV::broker

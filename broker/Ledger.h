@@ -49,10 +49,10 @@ public:
     void clear();
 
 private:
-    Entry& at(Object_Kind kind, const char* maker) REQUIRES(mutex_);
+    Entry& at(Object_Kind kind, const char* maker) REQUIRES(_mutex);
 
-    mutable Standard_Mutex<> mutex_;
-    std::map<std::pair<Object_Kind, std::string_view>, Entry> entries_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::map<std::pair<Object_Kind, std::string_view>, Entry> _entries GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

@@ -6,8 +6,8 @@
 namespace KPRV::broker {
 
 Mi_Frame::Mi_Frame(Broker& broker, const std::vector<Named_Value>& entries)
-    : broker_(broker), context_(*broker.core(), entries, broker.core()->options.user_without_text),
-      frame_(broker.core(), context_.cmpi())
+    : _broker(broker), _context(*broker.core(), entries, broker.core()->options.user_without_text),
+      _frame(broker.core(), _context.cmpi())
 {
 }
 
@@ -41,13 +41,13 @@ public:
         if (!list)
             return;
         for (const std::string& name : *list)
-            names_.push_back(name.c_str());
-        names_.push_back(nullptr);
+            _names.push_back(name.c_str());
+        _names.push_back(nullptr);
     }
-    const char** get() { return names_.empty() ? nullptr : names_.data(); }
+    const char** get() { return _names.empty() ? nullptr : _names.data(); }
 
 private:
-    std::vector<const char*> names_;
+    std::vector<const char*> _names;
 };
 
 /// Empty filters are passed as null.
@@ -80,17 +80,17 @@ class Provider_Call final : private Receiver
 public:
     Provider_Call(Broker& broker, Provider_Set& providers, const std::string& class_name,
                   const Request& request, Receiver* receiver)
-        : providers_(providers), class_name_(class_name), request_(request),
-          receiver_(receiver ? *receiver : kept_), frame_(broker, request.context),
-          path_(frame_.core(), path_of(class_name, request), request.from_client),
-          results_(frame_.core(), accepted_by(request.operation), static_cast<Receiver&>(*this)),
-          list_(request.properties)
+        : _providers(providers), _class_name(class_name), _request(request),
+          _receiver(receiver ? *receiver : _kept), _frame(broker, request.context),
+          _path(_frame.core(), path_of(class_name, request), request.from_client),
+          _results(_frame.core(), accepted_by(request.operation), static_cast<Receiver&>(*this)),
+          _list(request.properties)
     {
     }
 
     Result run()
     {
-        switch (request_.operation) {
+        switch (_request.operation) {
         case Operation::INVOKE_METHOD:
             invoke();
             break;
@@ -104,12 +104,12 @@ public:
             operate();
         }
         collect();
-        return std::move(result_);
+        return std::move(_result);
     }
 
 private:
-    Core& core() { return frame_.core(); }
-    void violation(const std::string& what) { core().violations.add(class_name_.c_str(), what); }
+    Core& core() { return _frame.core(); }
+    void violation(const std::string& what) { core().violations.add(_class_name.c_str(), what); }
 
     /// An enumeration of a superclass reaches each provider under its own class.
     static Path_Value path_of(const std::string& class_name, const Request& request)
@@ -125,36 +125,36 @@ private:
     void call(Mi* mi, Entry entry, Arguments... arguments)
     {
         if (!mi || !(mi->ft->*entry)) {
-            if (result_.ok())
-                result_.rc = CMPI_RC_ERR_NOT_SUPPORTED;
+            if (_result.ok())
+                _result.rc = CMPI_RC_ERR_NOT_SUPPORTED;
             return;
         }
-        frame_.run(result_, [&] {
-            return (mi->ft->*entry)(mi, frame_.context(), results_.cmpi(), path_.cmpi(), arguments...);
+        _frame.run(_result, [&] {
+            return (mi->ft->*entry)(mi, _frame.context(), _results.cmpi(), _path.cmpi(), arguments...);
         });
     }
 
     void operate()
     {
         using Table = CMPIInstanceMIFT;
-        CMPIInstanceMI* mi = providers_.instance(class_name_, result_);
-        switch (request_.operation) {
+        CMPIInstanceMI* mi = _providers.instance(_class_name, _result);
+        switch (_request.operation) {
         case Operation::ENUMERATE_INSTANCE_NAMES:
             return call(mi, &Table::enumerateInstanceNames);
         case Operation::ENUMERATE_INSTANCES:
-            return call(mi, &Table::enumerateInstances, list_.get());
+            return call(mi, &Table::enumerateInstances, _list.get());
         case Operation::GET_INSTANCE:
-            return call(mi, &Table::getInstance, list_.get());
+            return call(mi, &Table::getInstance, _list.get());
         case Operation::DELETE_INSTANCE:
             return call(mi, &Table::deleteInstance);
         default:
             break;
         }
-        Argument<Instance_Object> instance(core(), complete(request_.instance));
-        if (request_.operation == Operation::CREATE_INSTANCE)
+        Argument<Instance_Object> instance(core(), complete(_request.instance));
+        if (_request.operation == Operation::CREATE_INSTANCE)
             call(mi, &Table::createInstance, static_cast<const CMPIInstance*>(instance.cmpi()));
         else
-            call(mi, &Table::modifyInstance, static_cast<const CMPIInstance*>(instance.cmpi()), list_.get());
+            call(mi, &Table::modifyInstance, static_cast<const CMPIInstance*>(instance.cmpi()), _list.get());
     }
 
     /// Servers add the keys of the path, and the class's other properties with default or null.
@@ -166,7 +166,7 @@ private:
         for (const Feature_Info& feature : info->properties) {
             if (instance.property(feature.name))
                 continue;
-            const Value* key = feature.key ? instance.path.key(feature.name) : nullptr;
+            const Plain_Value* key = feature.key ? instance.path.key(feature.name) : nullptr;
             if (!key)
                 instance.properties.push_back({feature.name, feature.default_value});
             else if (is_integer(key->type) && is_integer(feature.type))
@@ -180,19 +180,19 @@ private:
     void traverse()
     {
         using Table = CMPIAssociationMIFT;
-        CMPIAssociationMI* mi = providers_.association(class_name_, result_);
-        const Association_Filter& filter = request_.filter;
+        CMPIAssociationMI* mi = _providers.association(_class_name, _result);
+        const Association_Filter& filter = _request.filter;
         const char *association_class = or_null(filter.association_class),
                    *result_class = or_null(filter.result_class), *role = or_null(filter.role),
                    *result_role = or_null(filter.result_role);
-        switch (request_.operation) {
+        switch (_request.operation) {
         case Operation::ASSOCIATORS:
             return call(mi, &Table::associators, association_class, result_class, role, result_role,
-                        list_.get());
+                        _list.get());
         case Operation::ASSOCIATOR_NAMES:
             return call(mi, &Table::associatorNames, association_class, result_class, role, result_role);
         case Operation::REFERENCES:
-            return call(mi, &Table::references, result_class, role, list_.get());
+            return call(mi, &Table::references, result_class, role, _list.get());
         default:
             return call(mi, &Table::referenceNames, result_class, role);
         }
@@ -202,67 +202,67 @@ private:
     {
         Argument<Args_Object> in(core(), arguments());
         Argument<Args_Object> out(core());
-        call(providers_.method(class_name_, result_), &CMPIMethodMIFT::invokeMethod, request_.method.c_str(),
+        call(_providers.method(_class_name, _result), &CMPIMethodMIFT::invokeMethod, _request.method.c_str(),
              static_cast<const CMPIArgs*>(in.cmpi()), out.cmpi());
-        result_.out = out->content;
-        if (!result_.ok())
+        _result.out = out->content;
+        if (!_result.ok())
             return;
-        if (results_->data.size() == 1)
-            result_.return_value = results_->data.front();
+        if (_results->data.size() == 1)
+            _result.return_value = _results->data.front();
         else
-            violation("a method returns one value, not " + std::to_string(results_->data.size()));
+            violation("a method returns one value, not " + std::to_string(_results->data.size()));
         check_out();
     }
 
     std::vector<Named_Value> arguments()
     {
-        std::vector<Named_Value> given = request_.in;
-        if (core().options.argument_style == Host_Options::Argument_Style::LEFT_OUT)
+        std::vector<Named_Value> given = _request.in;
+        if (core().options.argument_style == Server_Options::Argument_Style::LEFT_OUT)
             std::erase_if(given, [](const Named_Value& argument) { return argument.value.null; });
         for (Named_Value& argument : given)
             if (argument.value.null)
-                argument.value = Value::null_of(CMPI_boolean);
+                argument.value = Plain_Value::null_of(CMPI_boolean);
         return given;
     }
 
     void check_out()
     {
-        const Class_Info* info = core().catalogue->find(request_.path.class_name);
-        const Method_Info* method = info ? info->method(request_.method) : nullptr;
+        const Class_Info* info = core().catalogue->find(_request.path.class_name);
+        const Method_Info* method = info ? info->method(_request.method) : nullptr;
         if (!method)
             return;
-        for (const Named_Value& argument : result_.out) {
+        for (const Named_Value& argument : _result.out) {
             const Feature_Info* parameter = method->parameter(argument.name);
             if (!parameter || !parameter->out)
-                violation(request_.method + " has no out parameter " + argument.name);
+                violation(_request.method + " has no out parameter " + argument.name);
             else if (parameter->type != argument.value.type)
-                violation(request_.method + "." + argument.name + " is " + type_word_name(parameter->type) +
+                violation(_request.method + "." + argument.name + " is " + type_word_name(parameter->type) +
                           ", not " + type_word_name(argument.value.type));
         }
     }
 
     void collect()
     {
-        if (failure_)
-            std::rethrow_exception(failure_);
-        result_.instances = std::move(kept_.instances);
-        result_.paths = std::move(kept_.paths);
-        result_.done_count = results_->done_count;
-        result_.done = result_.done_count > 0;
-        result_.stopped = results_->stopped;
-        if (result_.ok() && request_.operation == Operation::GET_INSTANCE && returned_ != 1)
-            violation("getInstance answers one instance, not " + std::to_string(returned_));
-        if (result_.ok() && request_.operation == Operation::CREATE_INSTANCE && returned_ != 1)
-            violation("createInstance answers one path, not " + std::to_string(returned_));
+        if (_failure)
+            std::rethrow_exception(_failure);
+        _result.instances = std::move(_kept.instances);
+        _result.paths = std::move(_kept.paths);
+        _result.done_count = _results->done_count;
+        _result.done = _result.done_count > 0;
+        _result.stopped = _results->stopped;
+        if (_result.ok() && _request.operation == Operation::GET_INSTANCE && _returned != 1)
+            violation("getInstance answers one instance, not " + std::to_string(_returned));
+        if (_result.ok() && _request.operation == Operation::CREATE_INSTANCE && _returned != 1)
+            violation("createInstance answers one path, not " + std::to_string(_returned));
     }
 
     bool instance(Instance_Value&& instance) override
     {
         // Properties outside the list are the server's to filter, should the provider have set them all the
         // same.
-        if (request_.properties)
+        if (_request.properties)
             std::erase_if(instance.properties, [&](const Named_Value& property) {
-                return !contains_name(*request_.properties, property.name);
+                return !contains_name(*_request.properties, property.name);
             });
         return take(std::move(instance), &Receiver::instance);
     }
@@ -273,27 +273,27 @@ private:
     template <class Object>
     bool take(Object&& object, bool (Receiver::*receive)(Object&&))
     {
-        ++returned_;
+        ++_returned;
         try {
-            return (receiver_.*receive)(std::forward<Object>(object));
+            return (_receiver.*receive)(std::forward<Object>(object));
         } catch (...) {
-            failure_ = std::current_exception();
+            _failure = std::current_exception();
             return false;
         }
     }
 
-    Provider_Set& providers_;
-    const std::string& class_name_;
-    const Request& request_;
-    Collected kept_;
-    Receiver& receiver_;
-    std::exception_ptr failure_;
-    std::size_t returned_ = 0;
-    Mi_Frame frame_;
-    Argument<Path_Object> path_;
-    Argument<Result_Object> results_;
-    C_List list_;
-    Result result_;
+    Provider_Set& _providers;
+    const std::string& _class_name;
+    const Request& _request;
+    Collected _kept;
+    Receiver& _receiver;
+    std::exception_ptr _failure;
+    std::size_t _returned = 0;
+    Mi_Frame _frame;
+    Argument<Path_Object> _path;
+    Argument<Result_Object> _results;
+    C_List _list;
+    Result _result;
 };
 
 } // namespace

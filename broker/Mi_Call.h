@@ -17,8 +17,8 @@ class Mi_Frame
 public:
     Mi_Frame(Broker& broker, const std::vector<Named_Value>& entries);
 
-    const CMPIContext* context() const { return context_.cmpi(); }
-    Core& core() const { return *broker_.core(); }
+    const CMPIContext* context() const { return _context.cmpi(); }
+    Core& core() const { return *_broker.core(); }
 
     /// Calls the function and turns its status, or the exception that left it, into the result's.
     template <class Function>
@@ -37,9 +37,9 @@ private:
     void read_status(const CMPIStatus& status, Result& result);
     void caught(Result& result, const char* what);
 
-    Broker& broker_;
-    Argument<Context_Object> context_;
-    Call_Frame frame_;
+    Broker& _broker;
+    Argument<Context_Object> _context;
+    Call_Frame _frame;
 };
 
 } // namespace KPRV::broker

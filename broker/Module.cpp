@@ -23,12 +23,12 @@ std::unique_ptr<Module> Module::open(const std::string& path, std::string& error
 
 Module::~Module()
 {
-    dlclose(handle_);
+    dlclose(_handle);
 }
 
 void* Module::symbol(const std::string& name) const
 {
-    return dlsym(handle_, name.c_str());
+    return dlsym(_handle, name.c_str());
 }
 
 void* Module::factory(const std::string& class_name, Mi_Kind kind) const

@@ -46,13 +46,13 @@ public:
     /// What `cimple_module()` answers, null if the library does not export it.
     const Registration* registrations() const;
 
-    const std::string& path() const { return path_; }
+    const std::string& path() const { return _path; }
 
 private:
-    Module(void* handle, std::string path) : handle_(handle), path_(std::move(path)) {}
+    Module(void* handle, std::string path) : _handle(handle), _path(std::move(path)) {}
 
-    void* handle_;
-    std::string path_;
+    void* _handle;
+    std::string _path;
 };
 
 } // namespace KPRV::broker

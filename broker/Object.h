@@ -21,12 +21,12 @@ enum class Owner : std::uint8_t
     /// The provider: clones.
     PROVIDER,
     /// The host: arguments of a call. A provider must not release them.
-    HOST,
+    SERVER,
     /// The attachment of a thread: contexts from `CBPrepareAttachThread`, which `CBDetachThread` ends.
     THREAD,
 };
 
-/// Host side of a CMPI object.
+/// The server's side of a CMPI object.
 struct Object
 {
     Object(Core& object_core, Object_Kind object_kind) : core(object_core), kind(object_kind) {}
@@ -47,7 +47,7 @@ struct Object
     /// Keeps a copy of these bytes among the blocks, with a zero behind them, instead of those before.
     void hold(std::string_view bytes);
     void let_go();
-    bool holds() const { return held_ != nullptr; }
+    bool holds() const { return _held != nullptr; }
     /// Its text is null if nothing is held.
     std::string_view held() const;
 
@@ -60,8 +60,8 @@ struct Object
     Object* after = nullptr;
 
 private:
-    char* held_ = nullptr;
-    std::uint32_t held_size_ = 0;
+    char* _held = nullptr;
+    std::uint32_t _held_size = 0;
 
 public:
     const Object_Kind kind;
@@ -72,7 +72,7 @@ public:
     bool is_old = false;
 };
 
-/// Joins a CMPI struct (the part that providers see) with the host side.
+/// Joins a CMPI struct (the part that providers see) with the server side.
 template <class Cmpi_Type, Object_Kind Kind>
 struct Object_Of : Cmpi_Type, Object
 {
@@ -90,7 +90,7 @@ struct Object_Of : Cmpi_Type, Object
     Cmpi_Type* cmpi() { return this; }
 };
 
-/// The object of a host that stands at this address, released ones included; null for any other address,
+/// The object of a server that stands at this address, released ones included; null for any other address,
 /// which is not read. What it holds is unpacked. Safe for any thread.
 Object* find_object(const void* address);
 

@@ -12,9 +12,9 @@ namespace KPRV::broker {
 
 namespace {
 
-constexpr std::size_t block_size = Block_Memory::block_size;
+constexpr std::size_t BLOCK_SIZE = Block_Memory::BLOCK_SIZE;
 /// Bytes beyond that lie in the heap, so that a block holds many places.
-constexpr std::size_t largest = 8192;
+constexpr std::size_t LARGEST = 8192;
 
 /// Small places differ by 16 bytes, larger ones by 256.
 constexpr std::size_t row_of(std::size_t size)
@@ -25,14 +25,14 @@ constexpr std::size_t place_size(std::size_t row)
 {
     return row <= 32 ? row * 16 : (row - 32) * 256;
 }
-static_assert(row_of(largest) == 64 && place_size(row_of(513)) == 768);
+static_assert(row_of(LARGEST) == 64 && place_size(row_of(513)) == 768);
 
 /// The part that providers see stands behind the host's.
-constexpr std::size_t seen_from = sizeof(Object);
+constexpr std::size_t SEEN_FROM = sizeof(Object);
 
 std::size_t begin_of_block(const void* address)
 {
-    return reinterpret_cast<std::uintptr_t>(address) / block_size * block_size;
+    return reinterpret_cast<std::uintptr_t>(address) / BLOCK_SIZE * BLOCK_SIZE;
 }
 
 /// Where a sanitizer looks, each text lies for itself.
@@ -48,23 +48,23 @@ constexpr bool bytes_in_blocks = true;
 struct Object_Blocks::Places
 {
     Places(Object_Blocks& blocks, std::size_t row_number)
-        : owner(blocks), row(row_number), size(place_size(row_number)), free(block_size / size),
+        : owner(blocks), row(row_number), size(place_size(row_number)), free(BLOCK_SIZE / size),
           taken((free + 63) / 64), known(taken.size())
     {
         // No place begins behind the last whole one.
         for (std::size_t i = free; i < taken.size() * 64; ++i)
             taken[i / 64] |= std::uint64_t(1) << i % 64;
-        owner.memory_.take(block);
+        owner._memory.take(block);
     }
     ~Places()
     {
-        ASAN_UNPOISON_MEMORY_REGION(block.begin, block_size);
-        owner.memory_.give(block);
+        ASAN_UNPOISON_MEMORY_REGION(block.begin, BLOCK_SIZE);
+        owner._memory.give(block);
     }
     Places(const Places&) = delete;
     Places& operator=(const Places&) = delete;
 
-    std::size_t count() const { return block_size / size; }
+    std::size_t count() const { return BLOCK_SIZE / size; }
     std::size_t number_of(const void* place) const
     {
         return static_cast<std::size_t>(static_cast<const char*>(place) - block.begin) / size;
@@ -78,7 +78,7 @@ struct Object_Blocks::Places
         --free;
         void* const place = block.begin + (first * 64 + bit) * size;
         ASAN_UNPOISON_MEMORY_REGION(place, size);
-        owner.memory_.touch(block);
+        owner._memory.touch(block);
         return place;
     }
     void give(void* place)
@@ -105,10 +105,10 @@ struct Object_Blocks::Places
     Object* find(const void* address)
     {
         const std::size_t number = number_of(address);
-        if (number >= count() || address != block.begin + number * size + seen_from ||
+        if (number >= count() || address != block.begin + number * size + SEEN_FROM ||
             !(known[number / 64].load(std::memory_order_acquire) >> number % 64 & 1))
             return nullptr;
-        owner.memory_.touch(block);
+        owner._memory.touch(block);
         return object(number);
     }
 
@@ -163,9 +163,9 @@ private:
         std::unordered_map<std::size_t, Places*> blocks GUARDED_BY(mutex);
     };
 
-    Shard& at(const void* address) { return shards_[begin_of_block(address) / block_size % shards_.size()]; }
+    Shard& at(const void* address) { return _shards[begin_of_block(address) / BLOCK_SIZE % _shards.size()]; }
 
-    std::array<Shard, 16> shards_;
+    std::array<Shard, 16> _shards;
 };
 
 template <class Places>
@@ -177,11 +177,11 @@ Address_Book<Places>& address_book()
 
 } // namespace
 
-Object_Blocks::Object_Blocks(std::size_t most_in_memory) : memory_(most_in_memory) {}
+Object_Blocks::Object_Blocks(std::size_t most_in_memory) : _memory(most_in_memory) {}
 
 Object_Blocks::~Object_Blocks()
 {
-    for (Rows* const rows : {&objects_, &bytes_})
+    for (Rows* const rows : {&_objects, &_bytes})
         for (Row& row : *rows)
             for (std::list<Places>* const list : {&row.full, &row.free})
                 for (const Places& places : *list)
@@ -224,8 +224,8 @@ void Object_Blocks::give(Rows& rows, void* place)
 
 void* Object_Blocks::take_for_object(std::size_t size)
 {
-    const Auto_Lock lock(mutex_);
-    return take(objects_, size);
+    const Auto_Lock lock(_mutex);
+    return take(_objects, size);
 }
 
 void Object_Blocks::announce(const void* place)
@@ -242,39 +242,39 @@ void Object_Blocks::give_object(void* place)
         places.know(place, false);
         return &places;
     });
-    const Auto_Lock lock(mutex_);
-    give(objects_, place);
+    const Auto_Lock lock(_mutex);
+    give(_objects, place);
 }
 
 char* Object_Blocks::take_bytes(std::size_t size)
 {
-    if (!bytes_in_blocks || size > largest)
+    if (!bytes_in_blocks || size > LARGEST)
         return static_cast<char*>(::operator new(size));
-    const Auto_Lock lock(mutex_);
-    return static_cast<char*>(take(bytes_, size));
+    const Auto_Lock lock(_mutex);
+    return static_cast<char*>(take(_bytes, size));
 }
 
 void Object_Blocks::give_bytes(char* place, std::size_t size)
 {
-    if (!bytes_in_blocks || size > largest)
+    if (!bytes_in_blocks || size > LARGEST)
         return ::operator delete(place);
-    const Auto_Lock lock(mutex_);
-    give(bytes_, place);
+    const Auto_Lock lock(_mutex);
+    give(_bytes, place);
 }
 
 void Object_Blocks::touch_bytes(const char* place, std::size_t size)
 {
-    if (bytes_in_blocks && size <= largest)
+    if (bytes_in_blocks && size <= LARGEST)
         address_book<Places>().with(place, [&](Places& places) {
-            memory_.touch(places.block);
+            _memory.touch(places.block);
             return &places;
         });
 }
 
 Object* Object_Blocks::any()
 {
-    const Auto_Lock lock(mutex_);
-    for (Row& row : objects_)
+    const Auto_Lock lock(_mutex);
+    for (Row& row : _objects)
         for (std::list<Places>* const list : {&row.full, &row.free})
             for (const Places& places : *list)
                 for (std::size_t i = 0; i < places.known.size(); ++i)

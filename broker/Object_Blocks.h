@@ -40,7 +40,7 @@ public:
     /// read.
     static Object* find(const void* address);
 
-    const Block_Memory& memory() const { return memory_; }
+    const Block_Memory& memory() const { return _memory; }
 
 private:
     struct Places;
@@ -52,13 +52,13 @@ private:
     };
     using Rows = std::array<Row, 65>;
 
-    void* take(Rows& rows, std::size_t size) REQUIRES(mutex_);
-    void give(Rows& rows, void* place) REQUIRES(mutex_);
+    void* take(Rows& rows, std::size_t size) REQUIRES(_mutex);
+    void give(Rows& rows, void* place) REQUIRES(_mutex);
 
-    Block_Memory memory_;
-    Standard_Mutex<> mutex_;
-    Rows objects_ GUARDED_BY(mutex_);
-    Rows bytes_ GUARDED_BY(mutex_);
+    Block_Memory _memory;
+    Standard_Mutex<> _mutex;
+    Rows _objects GUARDED_BY(_mutex);
+    Rows _bytes GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

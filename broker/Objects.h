@@ -60,14 +60,14 @@ struct Array_Object final : Object_Of<CMPIArray, Object_Kind::ARRAY>
 {
     struct Element
     {
-        Value value;
+        Plain_Value value;
         /// The provider's object that was set, null for plain values: servers keep only this pointer.
         const void* object = nullptr;
     };
 
     Array_Object(Core& owner_core, CMPIType type, std::size_t size);
     /// Elements of an array value.
-    Array_Object(Core& owner_core, const Value& value);
+    Array_Object(Core& owner_core, const Plain_Value& value);
     Array_Object(Core& owner_core, const Array_Object& other)
         : Object_Of(owner_core, array_table), element_type(other.element_type), elements(other.elements)
     {
@@ -86,7 +86,7 @@ struct Array_Object final : Object_Of<CMPIArray, Object_Kind::ARRAY>
 
 struct Enumeration_Object final : Object_Of<CMPIEnumeration, Object_Kind::ENUMERATION>
 {
-    Enumeration_Object(Core& owner_core, std::vector<Value> values)
+    Enumeration_Object(Core& owner_core, std::vector<Plain_Value> values)
         : Object_Of(owner_core, enumeration_table), elements(std::move(values))
     {
     }
@@ -97,7 +97,7 @@ struct Enumeration_Object final : Object_Of<CMPIEnumeration, Object_Kind::ENUMER
     void drop() override { elements.clear(); }
 
     /// All instances or all references.
-    std::vector<Value> elements;
+    std::vector<Plain_Value> elements;
     std::size_t next = 0;
 };
 
@@ -107,17 +107,17 @@ class Known_Class
 public:
     const Class_Info* get(const Core& core, const std::string& class_name) const
     {
-        if (!is_known_)
-            info_ = core.catalogue->find(class_name);
-        is_known_ = true;
-        return info_;
+        if (!_is_known)
+            _info = core.catalogue->find(class_name);
+        _is_known = true;
+        return _info;
     }
     /// The object has another one.
-    void forget() { is_known_ = false; }
+    void forget() { _is_known = false; }
 
 private:
-    mutable const Class_Info* info_ = nullptr;
-    mutable bool is_known_ = false;
+    mutable const Class_Info* _info = nullptr;
+    mutable bool _is_known = false;
 };
 
 struct Instance_Object final : Object_Of<CMPIInstance, Object_Kind::INSTANCE>
@@ -249,7 +249,7 @@ struct Result_Object final : Object_Of<CMPIResult, Object_Kind::RESULT>
     Receiver& receiver;
     /// It has had enough.
     bool stopped = false;
-    std::vector<Value> data;
+    std::vector<Plain_Value> data;
     unsigned done_count = 0;
 };
 

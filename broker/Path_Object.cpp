@@ -9,17 +9,17 @@ namespace KPRV::broker {
 namespace {
 
 /// A client's integer keys travel as text, so their width is lost on the way.
-void widen_keys(std::vector<Named_Value>& keys, Host_Options::Key_Style style)
+void widen_keys(std::vector<Named_Value>& keys, Server_Options::Key_Style style)
 {
     for (Named_Value& key : keys) {
         if (!is_integer(key.value.type) || key.value.null)
             continue;
         std::int64_t number = key.value.as_sint();
         bool below_zero = is_signed(key.value.type) && number < 0;
-        if (style == Host_Options::Key_Style::SINT64 || below_zero)
-            key.value = Value::signed_number(CMPI_sint64, number);
+        if (style == Server_Options::Key_Style::SINT64 || below_zero)
+            key.value = Plain_Value::signed_number(CMPI_sint64, number);
         else
-            key.value = Value::unsigned_number(CMPI_uint64, key.value.as_uint());
+            key.value = Plain_Value::unsigned_number(CMPI_uint64, key.value.as_uint());
     }
 }
 
@@ -31,7 +31,7 @@ Path_Object::Path_Object(Core& owner_core, Path_Value path, bool from_client)
     if (!from_client)
         return;
     widen_keys(content.keys, core.options.key_style);
-    if (core.options.key_style == Host_Options::Key_Style::SINT64)
+    if (core.options.key_style == Server_Options::Key_Style::SINT64)
         key_state = CMPI_keyValue;
 }
 
@@ -103,7 +103,7 @@ CMPIString* get_class_name(const CMPIObjectPath* self, CMPIStatus* rc)
 }
 
 /// Servers convert 64-bit numbers to a narrower class type of the same sign, and refuse all else.
-bool fits_class(Call<Path_Object>& call, const char* name, Value& value)
+bool fits_class(Call<Path_Object>& call, const char* name, Plain_Value& value)
 {
     const Class_Info* info = call->info();
     if (!info)
@@ -123,7 +123,7 @@ bool fits_class(Call<Path_Object>& call, const char* name, Value& value)
 CMPIStatus add_key(const CMPIObjectPath* self, const char* name, const CMPIValue* value, CMPIType type)
 {
     Call<Path_Object> call("CMAddKey", self, nullptr, name);
-    Value read;
+    Plain_Value read;
     if (!call || !call.need_text(call.core(), name, "key name") ||
         read_value(call, call.core(), value, type, read))
         return call.status();

@@ -55,38 +55,38 @@ CMPIIndicationMI* Provider_Set::indication(const std::string& class_name, Result
 
 void* Provider_Set::get(const std::string& class_name, Mi_Kind kind, Result& answer)
 {
-    const Auto_Lock lock(mutex_);
-    auto at = made_.find({class_name, kind});
-    if (at != made_.end())
+    const Auto_Lock lock(_mutex);
+    auto at = _made.find({class_name, kind});
+    if (at != _made.end())
         return at->second;
     void* mi = make(class_name, kind, answer);
     if (mi)
-        made_[{class_name, kind}] = mi;
+        _made[{class_name, kind}] = mi;
     return mi;
 }
 
 void* Provider_Set::make(const std::string& class_name, Mi_Kind kind, Result& answer)
 {
-    void* factory = module_.factory(class_name, kind);
+    void* factory = _module.factory(class_name, kind);
     if (!factory)
         return nullptr;
-    Mi_Frame frame(broker_, {});
+    Mi_Frame frame(_broker, {});
     switch (kind) {
     case Mi_Kind::INSTANCE:
-        return call_factory<CMPIInstanceMI>(frame, factory, broker_.cmpi(), answer);
+        return call_factory<CMPIInstanceMI>(frame, factory, _broker.cmpi(), answer);
     case Mi_Kind::ASSOCIATION:
-        return call_factory<CMPIAssociationMI>(frame, factory, broker_.cmpi(), answer);
+        return call_factory<CMPIAssociationMI>(frame, factory, _broker.cmpi(), answer);
     case Mi_Kind::METHOD:
-        return call_factory<CMPIMethodMI>(frame, factory, broker_.cmpi(), answer);
+        return call_factory<CMPIMethodMI>(frame, factory, _broker.cmpi(), answer);
     default:
-        return call_factory<CMPIIndicationMI>(frame, factory, broker_.cmpi(), answer);
+        return call_factory<CMPIIndicationMI>(frame, factory, _broker.cmpi(), answer);
     }
 }
 
 CMPIrc Provider_Set::cleanup_one(void* mi, Mi_Kind kind, bool terminating)
 {
-    Argument<Context_Object> context(*broker_.core());
-    Call_Frame frame(broker_.core(), context.cmpi());
+    Argument<Context_Object> context(*_broker.core());
+    Call_Frame frame(_broker.core(), context.cmpi());
     switch (kind) {
     case Mi_Kind::INSTANCE:
         return call_cleanup<CMPIInstanceMI>(mi, context.cmpi(), terminating);
@@ -102,10 +102,10 @@ CMPIrc Provider_Set::cleanup_one(void* mi, Mi_Kind kind, bool terminating)
 template <class Wanted>
 CMPIrc Provider_Set::cleanup_if(Wanted wanted, bool terminating)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     CMPIrc highest = CMPI_RC_OK;
     for (Mi_Kind kind : mi_kinds) {
-        for (auto at = made_.begin(); at != made_.end();) {
+        for (auto at = _made.begin(); at != _made.end();) {
             if (at->first.second != kind || !wanted(at->first.first)) {
                 ++at;
                 continue;
@@ -113,7 +113,7 @@ CMPIrc Provider_Set::cleanup_if(Wanted wanted, bool terminating)
             CMPIrc rc = cleanup_one(at->second, kind, terminating);
             highest = std::max(highest, rc);
             bool kept = rc == CMPI_RC_DO_NOT_UNLOAD || rc == CMPI_RC_NEVER_UNLOAD;
-            at = kept ? std::next(at) : made_.erase(at);
+            at = kept ? std::next(at) : _made.erase(at);
         }
     }
     return highest;
@@ -131,8 +131,8 @@ CMPIrc Provider_Set::cleanup(const std::string& class_name, bool terminating)
 
 std::size_t Provider_Set::count() const
 {
-    const Auto_Lock lock(mutex_);
-    return made_.size();
+    const Auto_Lock lock(_mutex);
+    return _made.size();
 }
 
 } // namespace KPRV::broker

@@ -13,7 +13,7 @@ namespace KPRV::broker {
 class Provider_Set
 {
 public:
-    Provider_Set(const Module& module, Broker& broker) : module_(module), broker_(broker) {}
+    Provider_Set(const Module& module, Broker& broker) : _module(module), _broker(broker) {}
 
     /// The interface of that class and kind. Null if the module has no such factory, or if the factory
     /// failed: `answer` then has its status.
@@ -24,7 +24,7 @@ public:
 
     bool serves(const std::string& class_name, Mi_Kind kind) const
     {
-        return module_.factory(class_name, kind);
+        return _module.factory(class_name, kind);
     }
 
     /// Calls `cleanup` of all interfaces (or of one class's), kind by kind in the order instance,
@@ -45,10 +45,10 @@ private:
     template <class Wanted>
     CMPIrc cleanup_if(Wanted wanted, bool terminating);
 
-    const Module& module_;
-    Broker& broker_;
-    mutable Standard_Mutex<std::recursive_mutex> mutex_;
-    std::map<Key, void*> made_ GUARDED_BY(mutex_);
+    const Module& _module;
+    Broker& _broker;
+    mutable Standard_Mutex<std::recursive_mutex> _mutex;
+    std::map<Key, void*> _made GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

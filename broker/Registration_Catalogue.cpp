@@ -31,52 +31,52 @@ Number number_at(const void* base, std::size_t index)
     return number;
 }
 
-Value literal(uint16 type, const void* base, std::size_t index)
+Plain_Value literal(uint16 type, const void* base, std::size_t index)
 {
     CMPIType word = word_of(type, 0);
     switch (type) {
     case BOOLEAN:
-        return Value::boolean(number_at<uint8>(base, index) != 0);
+        return Plain_Value::boolean(number_at<uint8>(base, index) != 0);
     case UINT8:
-        return Value::unsigned_number(word, number_at<uint8>(base, index));
+        return Plain_Value::unsigned_number(word, number_at<uint8>(base, index));
     case SINT8:
-        return Value::signed_number(word, number_at<sint8>(base, index));
+        return Plain_Value::signed_number(word, number_at<sint8>(base, index));
     case UINT16:
     case CHAR16:
-        return Value::unsigned_number(word, number_at<uint16>(base, index));
+        return Plain_Value::unsigned_number(word, number_at<uint16>(base, index));
     case SINT16:
-        return Value::signed_number(word, number_at<sint16>(base, index));
+        return Plain_Value::signed_number(word, number_at<sint16>(base, index));
     case UINT32:
-        return Value::unsigned_number(word, number_at<uint32>(base, index));
+        return Plain_Value::unsigned_number(word, number_at<uint32>(base, index));
     case SINT32:
-        return Value::signed_number(word, number_at<sint32>(base, index));
+        return Plain_Value::signed_number(word, number_at<sint32>(base, index));
     case UINT64:
-        return Value::unsigned_number(word, number_at<uint64>(base, index));
+        return Plain_Value::unsigned_number(word, number_at<uint64>(base, index));
     case SINT64:
-        return Value::signed_number(word, number_at<sint64>(base, index));
+        return Plain_Value::signed_number(word, number_at<sint64>(base, index));
     case REAL32:
-        return Value::real(word, number_at<real32>(base, index));
+        return Plain_Value::real(word, number_at<real32>(base, index));
     case REAL64:
-        return Value::real(word, number_at<real64>(base, index));
+        return Plain_Value::real(word, number_at<real64>(base, index));
     default: {
-        Value text = Value::text(number_at<const char*>(base, index));
+        Plain_Value text = Plain_Value::text(number_at<const char*>(base, index));
         text.type = word;
         return text;
     }
     }
 }
 
-Value default_of(const Meta_Property* property)
+Plain_Value default_of(const Meta_Property* property)
 {
     CMPIType word = word_of(property->type, property->subscript);
     if (!property->value)
-        return Value::null_of(word);
+        return Plain_Value::null_of(word);
     if (!property->subscript)
         return literal(property->type, property->value, 0);
-    std::vector<Value> elements;
+    std::vector<Plain_Value> elements;
     for (uint32 i = 0; i < property->value->array_value.num_elements; ++i)
         elements.push_back(literal(property->type, property->value->array_value.elements, i));
-    return Value::array(word_of(property->type, 0), std::move(elements));
+    return Plain_Value::array(word_of(property->type, 0), std::move(elements));
 }
 
 Feature_Info feature_info(const Meta_Feature* feature)
@@ -93,7 +93,7 @@ Feature_Info feature_info(const Meta_Feature* feature)
             info.type |= CMPI_ARRAY;
         if (reference->meta_class)
             info.target_class = reference->meta_class->name;
-        info.default_value = Value::null_of(info.type);
+        info.default_value = Plain_Value::null_of(info.type);
     } else {
         auto* property = static_cast<const Meta_Property*>(feature);
         info.type = word_of(property->type, property->subscript);
@@ -146,12 +146,12 @@ bool Registration_Catalogue::Name_Order::operator()(std::string_view a, std::str
 
 Registration_Catalogue::Registration_Catalogue(const Registration* head)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     if (head && head->module_name)
-        module_name_ = head->module_name;
+        _module_name = head->module_name;
     for (const Registration* entry = head; entry; entry = entry->next) {
         add(entry->meta_class);
-        slots_[entry->meta_class->name].has_provider = true;
+        _slots[entry->meta_class->name].has_provider = true;
         if (const Meta_Repository* repository = entry->meta_class->meta_repository)
             for (uint32 i = 0; i < repository->num_meta_classes; ++i)
                 add(repository->meta_classes[i]);
@@ -162,18 +162,18 @@ Registration_Catalogue::~Registration_Catalogue() = default;
 
 void Registration_Catalogue::add(const Meta_Class* meta_class)
 {
-    Slot& slot = slots_[meta_class->name];
+    Slot& slot = _slots[meta_class->name];
     if (slot.meta_class)
         return;
     slot.meta_class = meta_class;
-    names_.emplace_back(meta_class->name);
+    _names.emplace_back(meta_class->name);
 }
 
 const Class_Info* Registration_Catalogue::find(std::string_view name) const
 {
-    const Auto_Lock lock(mutex_);
-    auto at = slots_.find(name);
-    if (at == slots_.end())
+    const Auto_Lock lock(_mutex);
+    auto at = _slots.find(name);
+    if (at == _slots.end())
         return nullptr;
     Slot& slot = at->second;
     if (!slot.info)

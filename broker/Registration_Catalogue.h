@@ -17,9 +17,9 @@ public:
     explicit Registration_Catalogue(const Registration* head);
     ~Registration_Catalogue() override;
 
-    std::vector<std::string> class_names() const override { return names_; }
+    std::vector<std::string> class_names() const override { return _names; }
     const Class_Info* find(std::string_view name) const override;
-    std::string module_name() const override { return module_name_; }
+    std::string module_name() const override { return _module_name; }
 
 private:
     struct Slot
@@ -36,12 +36,12 @@ private:
         bool operator()(std::string_view a, std::string_view b) const;
     };
 
-    void add(const Meta_Class* meta_class) REQUIRES(mutex_);
+    void add(const Meta_Class* meta_class) REQUIRES(_mutex);
 
-    std::string module_name_;
-    std::vector<std::string> names_;
-    mutable Standard_Mutex<> mutex_;
-    mutable std::map<std::string, Slot, Name_Order> slots_ GUARDED_BY(mutex_);
+    std::string _module_name;
+    std::vector<std::string> _names;
+    mutable Standard_Mutex<> _mutex;
+    mutable std::map<std::string, Slot, Name_Order> _slots GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

@@ -29,7 +29,7 @@ CMPIStatus return_data(const CMPIResult* self, const CMPIValue* value, CMPIType 
     Call<Result_Object> call("CMReturnData", self, nullptr);
     if (!call || !may_return(call, Result_Object::DATA, "data"))
         return call.status();
-    Value read;
+    Plain_Value read;
     // A method without a return value passes type 0, which is a null value of no type.
     if (type == CMPI_null || !read_value(call, call.core(), value, type, read))
         call->data.push_back(std::move(read));

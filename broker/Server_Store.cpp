@@ -25,30 +25,30 @@ Result failed(CMPIrc rc)
 
 void Server_Store::add_name_space(const std::string& name_space)
 {
-    const Auto_Lock lock(mutex_);
-    spaces_[lower_name(name_space)];
+    const Auto_Lock lock(_mutex);
+    _spaces[lower_name(name_space)];
 }
 
 void Server_Store::add(const std::string& name_space, Instance_Value instance)
 {
     instance.path.name_space = name_space;
-    const Auto_Lock lock(mutex_);
-    spaces_[lower_name(name_space)].instances.push_back(std::move(instance));
+    const Auto_Lock lock(_mutex);
+    _spaces[lower_name(name_space)].instances.push_back(std::move(instance));
 }
 
 void Server_Store::add_class(const std::string& name_space, const std::string& class_name,
                              const std::string& superclass)
 {
-    const Auto_Lock lock(mutex_);
-    std::string& known = spaces_[lower_name(name_space)].classes[lower_name(class_name)];
+    const Auto_Lock lock(_mutex);
+    std::string& known = _spaces[lower_name(name_space)].classes[lower_name(class_name)];
     if (!superclass.empty())
         known = lower_name(superclass);
 }
 
 void Server_Store::refuse(const std::string& name_space, CMPIrc rc)
 {
-    const Auto_Lock lock(mutex_);
-    spaces_[lower_name(name_space)].refusal = rc;
+    const Auto_Lock lock(_mutex);
+    _spaces[lower_name(name_space)].refusal = rc;
 }
 
 bool Server_Store::Name_Space::is_a(const Class_Catalogue& catalogue, const std::string& class_name,
@@ -68,21 +68,21 @@ bool Server_Store::Name_Space::is_a(const Class_Catalogue& catalogue, const std:
 void Server_Store::on_method(const std::string& name_space, const std::string& class_name,
                              const std::string& method, Method answer)
 {
-    const Auto_Lock lock(mutex_);
-    spaces_[lower_name(name_space)].methods[method_key(class_name, method)] = std::move(answer);
+    const Auto_Lock lock(_mutex);
+    _spaces[lower_name(name_space)].methods[method_key(class_name, method)] = std::move(answer);
 }
 
 bool Server_Store::has_name_space(const std::string& name_space) const
 {
-    const Auto_Lock lock(mutex_);
-    return spaces_.count(lower_name(name_space)) != 0;
+    const Auto_Lock lock(_mutex);
+    return _spaces.count(lower_name(name_space)) != 0;
 }
 
 bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& path) const
 {
-    const Auto_Lock lock(mutex_);
-    auto found = spaces_.find(lower_name(path.name_space));
-    if (found == spaces_.end())
+    const Auto_Lock lock(_mutex);
+    auto found = _spaces.find(lower_name(path.name_space));
+    if (found == _spaces.end())
         return false;
     const Name_Space& space = found->second;
     if (space.refusal)
@@ -102,9 +102,9 @@ bool Server_Store::serves(const Class_Catalogue& catalogue, const Path_Value& pa
 
 std::vector<Instance_Value> Server_Store::instances(const std::string& name_space) const
 {
-    const Auto_Lock lock(mutex_);
-    auto space = spaces_.find(lower_name(name_space));
-    return space == spaces_.end() ? std::vector<Instance_Value>() : space->second.instances;
+    const Auto_Lock lock(_mutex);
+    auto space = _spaces.find(lower_name(name_space));
+    return space == _spaces.end() ? std::vector<Instance_Value>() : space->second.instances;
 }
 
 std::vector<Instance_Value>::iterator Server_Store::find(Name_Space& space, const Path_Value& path)
@@ -123,8 +123,8 @@ Result Server_Store::run(const Class_Catalogue& catalogue, const Request& reques
 Result Server_Store::look_up(const Class_Catalogue& catalogue, const Request& request,
                              std::optional<Method>& method)
 {
-    const Auto_Lock lock(mutex_);
-    Name_Space& space = spaces_[lower_name(request.path.name_space)];
+    const Auto_Lock lock(_mutex);
+    Name_Space& space = _spaces[lower_name(request.path.name_space)];
     if (space.refusal)
         return failed(*space.refusal);
     switch (request.operation) {

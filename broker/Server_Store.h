@@ -59,8 +59,8 @@ private:
     Result change(Name_Space& space, const Request& request);
     Result enumerate(const Class_Catalogue& catalogue, const Name_Space& space, const Request& request) const;
 
-    mutable Standard_Mutex<> mutex_;
-    std::map<std::string, Name_Space, std::less<>> spaces_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::map<std::string, Name_Space, std::less<>> _spaces GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

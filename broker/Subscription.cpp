@@ -2,28 +2,29 @@
 
 namespace KPRV::broker {
 
-Subscription::Subscription(Host& host, std::string provider_class)
-    : host_(host), class_(std::move(provider_class))
+Subscription::Subscription(Local_Server& server, std::string provider_class)
+    : _server(server), _class(std::move(provider_class))
 {
 }
 
 Subscription::~Subscription()
 {
-    while (!filters_.empty())
-        remove(std::string(filters_.begin()->first));
+    while (!_filters.empty())
+        remove(std::string(_filters.begin()->first));
 }
 
 CMPIrc Subscription::add(const std::string& name_space)
 {
-    if (const CMPIrc rc = host_.authorize_filter(class_, name_space); rc != CMPI_RC_OK)
+    if (const CMPIrc rc = _server.authorize_filter(_class, name_space); rc != CMPI_RC_OK)
         return rc;
     // The answer would only tell a server to poll by itself, which none does.
-    host_.must_poll(class_, name_space);
-    const bool is_first_of_all = filters_.empty();
-    if (const CMPIrc rc = host_.activate_filter(class_, name_space, count(name_space) == 0); rc != CMPI_RC_OK)
+    _server.must_poll(_class, name_space);
+    const bool is_first_of_all = _filters.empty();
+    if (const CMPIrc rc = _server.activate_filter(_class, name_space, count(name_space) == 0);
+        rc != CMPI_RC_OK)
         return rc;
-    ++filters_[name_space];
-    const CMPIrc rc = is_first_of_all ? host_.enable_indications(class_) : CMPI_RC_OK;
+    ++_filters[name_space];
+    const CMPIrc rc = is_first_of_all ? _server.enable_indications(_class) : CMPI_RC_OK;
     if (rc != CMPI_RC_OK)
         remove(name_space);
     return rc;
@@ -33,25 +34,25 @@ CMPIrc Subscription::remove(const std::string& name_space)
 {
     if (count(name_space) == 0)
         return CMPI_RC_ERR_NOT_FOUND;
-    const bool is_last_of_all = filters_.size() == 1 && count(name_space) == 1;
-    const CMPIrc disabled = is_last_of_all ? host_.disable_indications(class_) : CMPI_RC_OK;
+    const bool is_last_of_all = _filters.size() == 1 && count(name_space) == 1;
+    const CMPIrc disabled = is_last_of_all ? _server.disable_indications(_class) : CMPI_RC_OK;
     const CMPIrc deactivated = deactivate(name_space);
     return disabled != CMPI_RC_OK ? disabled : deactivated;
 }
 
 CMPIrc Subscription::deactivate(const std::string& name_space)
 {
-    const auto filter = filters_.find(name_space);
+    const auto filter = _filters.find(name_space);
     const bool is_last = --filter->second == 0;
     if (is_last)
-        filters_.erase(filter);
-    return host_.deactivate_filter(class_, name_space, is_last);
+        _filters.erase(filter);
+    return _server.deactivate_filter(_class, name_space, is_last);
 }
 
 unsigned Subscription::count(const std::string& name_space) const
 {
-    const auto filter = filters_.find(name_space);
-    return filter == filters_.end() ? 0 : filter->second;
+    const auto filter = _filters.find(name_space);
+    return filter == _filters.end() ? 0 : filter->second;
 }
 
 } // namespace KPRV::broker

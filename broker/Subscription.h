@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 
 #include <map>
 
@@ -11,7 +11,7 @@ namespace KPRV::broker {
 class Subscription
 {
 public:
-    Subscription(Host& host, std::string provider_class);
+    Subscription(Local_Server& server, std::string provider_class);
     ~Subscription();
     Subscription(const Subscription&) = delete;
     Subscription& operator=(const Subscription&) = delete;
@@ -28,9 +28,9 @@ public:
 private:
     CMPIrc deactivate(const std::string& name_space);
 
-    Host& host_;
-    const std::string class_;
-    std::map<std::string, unsigned> filters_;
+    Local_Server& _server;
+    const std::string _class;
+    std::map<std::string, unsigned> _filters;
 };
 
 } // namespace KPRV::broker

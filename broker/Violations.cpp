@@ -4,26 +4,26 @@ namespace KPRV::broker {
 
 void Violations::add(const char* call, const std::string& what)
 {
-    const Auto_Lock lock(mutex_);
-    list_.push_back(std::string(call) + ": " + what);
+    const Auto_Lock lock(_mutex);
+    _list.push_back(std::string(call) + ": " + what);
 }
 
 std::vector<std::string> Violations::list() const
 {
-    const Auto_Lock lock(mutex_);
-    return list_;
+    const Auto_Lock lock(_mutex);
+    return _list;
 }
 
 std::size_t Violations::count() const
 {
-    const Auto_Lock lock(mutex_);
-    return list_.size();
+    const Auto_Lock lock(_mutex);
+    return _list.size();
 }
 
 void Violations::clear()
 {
-    const Auto_Lock lock(mutex_);
-    list_.clear();
+    const Auto_Lock lock(_mutex);
+    _list.clear();
 }
 
 std::string Violations::text() const

@@ -25,8 +25,8 @@ public:
     std::string text() const;
 
 private:
-    mutable Standard_Mutex<> mutex_;
-    std::vector<std::string> list_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::vector<std::string> _list GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

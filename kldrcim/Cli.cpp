@@ -43,10 +43,10 @@ bool choose(Cli_Options& options, std::string& error)
     return error.empty();
 }
 
-int run_body(const Cli_Verb& verb, const Cli_Options& options, Connection& connection, Host* host)
+int run_body(const Cli_Verb& verb, const Cli_Options& options, Connection& connection, Local_Server* server)
 {
     try {
-        return verb.body ? verb.body(options, connection) : serve(options, *host);
+        return verb.body ? verb.body(options, connection) : serve(options, *server);
     } catch (const Connection_Error& error) {
         flush_output();
         return complain(error.what(), verb.without_module);
@@ -62,18 +62,18 @@ int run_verb(Cli_Options options)
     if (!choose(options, error))
         return complain(error, USAGE_ERROR);
     std::unique_ptr<Connection> connection;
-    Host* host = nullptr;
+    Local_Server* server = nullptr;
     if (!options.url.empty()) {
         connection = open_server(options, error, warning);
     } else if (auto local = open_module(options, error, warning)) {
-        host = &local->host();
+        server = &local->server();
         connection = std::move(local);
     }
     if (!connection)
         return complain(error, verb.without_module);
     if (!warning.empty())
         complain("warning: " + warning, 0);
-    const int status = run_body(verb, options, *connection, host);
+    const int status = run_body(verb, options, *connection, server);
     for (const std::string& breach : connection->breaches())
         complain("warning: the provider broke the CMPI contract: " + breach, 0);
     if (options.leaks)

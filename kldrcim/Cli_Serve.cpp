@@ -6,7 +6,7 @@
 
 namespace KPRV::kldrcim {
 
-int serve(const Cli_Options&, Host&)
+int serve(const Cli_Options&, Local_Server&)
 {
     return complain("this kldrcim was built without serve: libmicrohttpd, expat or libcurl was missing",
                     USAGE_ERROR);
@@ -72,18 +72,18 @@ bool read_options(const Cli_Options& options, Http_Options& http, Users_File& us
 const std::vector<std::string> interop_names = {"interop", "root/interop"};
 
 /// What the module finds when it asks its server who it is.
-void tell_module(Host& host, Instance_Value manager)
+void tell_module(Local_Server& local, Instance_Value manager)
 {
     for (const char* name_space : {"root/PG_InterOp", "root/interop"}) {
         manager.path.name_space = name_space;
-        host.store().add(name_space, manager);
+        local.store().add(name_space, manager);
     }
 }
 
 /// The host in numbers, for a collector.
-Http_Page metrics_page(Host& host, const std::string& accept)
+Http_Page metrics_page(Local_Server& local, const std::string& accept)
 {
-    Local_Connection connection(host);
+    Local_Connection connection(local);
     const Host_Readings readings = read_host(connection);
     if (readings.host.system.properties.empty())
         throw Http_Refusal{503, nullptr, "the module does not answer"};
@@ -96,15 +96,15 @@ Http_Page metrics_page(Host& host, const std::string& accept)
 
 /// Until a signal comes; what clients have asked for is then answered.
 int serve_until(Interruption& interruption, const Cli_Options& options, const Http_Options& http_options,
-                Host& host)
+                Local_Server& local)
 {
     std::string error;
     const std::string host_name = own_host_name();
-    Broker_Space model(host);
-    const Interop_Classes classes(host.catalogue());
+    Broker_Space model(local);
+    const Interop_Classes classes(local.catalogue());
     Server_Objects objects(host_name, KLDR_VERSION, {interop_names[0], interop_names[1], model.name()});
-    tell_module(host, objects.object_manager());
-    Subscriptions subscriptions(host, classes,
+    tell_module(local, objects.object_manager());
+    Subscriptions subscriptions(local, classes,
                                 {.system_name = host_name,
                                  .interop_names = interop_names,
                                  .state_file = options.state,
@@ -129,16 +129,16 @@ int serve_until(Interruption& interruption, const Cli_Options& options, const Ht
 
 /// A hardware test may have taken a port out of service: this process ends when it has been brought back, or
 /// with the next signal.
-void wait_for_jobs(Interruption& interruption, Host& host)
+void wait_for_jobs(Interruption& interruption, Local_Server& local)
 {
-    constexpr auto moment = std::chrono::milliseconds(100);
-    Local_Connection connection(host);
+    constexpr auto MOMENT = std::chrono::milliseconds(100);
+    Local_Connection connection(local);
     if (!connection.is_at_work())
         return;
     complain("waiting for the end of " + running_jobs(connection) + "; the next signal ends it as it is", 0);
     const unsigned signals = interruption.count();
     while (connection.is_at_work()) {
-        interruption.wait(moment);
+        interruption.wait(MOMENT);
         if (interruption.count() == signals)
             continue;
         complain("left as it is: " + running_jobs(connection), 0);
@@ -149,17 +149,17 @@ void wait_for_jobs(Interruption& interruption, Host& host)
 
 } // namespace
 
-int serve(const Cli_Options& options, Host& host)
+int serve(const Cli_Options& options, Local_Server& local)
 {
     Http_Options http_options;
     Users_File users;
     std::string error;
     if (!read_options(options, http_options, users, error))
         return complain(error, USAGE_ERROR);
-    http_options.metrics = [&host](const std::string& accept) { return metrics_page(host, accept); };
+    http_options.metrics = [&local](const std::string& accept) { return metrics_page(local, accept); };
     Interruption interruption;
-    const int status = serve_until(interruption, options, http_options, host);
-    wait_for_jobs(interruption, host);
+    const int status = serve_until(interruption, options, http_options, local);
+    wait_for_jobs(interruption, local);
     return status;
 }
 

@@ -20,7 +20,7 @@ bool is_counter(const Json::Value& each)
 Counters::Counters(std::span<const unsigned> ids)
 {
     for (const unsigned id : ids)
-        counters_.push_back({id, 0U, 0});
+        _counters.push_back({id, 0U, 0});
 }
 
 Counters::Counters(const Json_Text& source, const Json::Value& written)
@@ -29,16 +29,16 @@ Counters::Counters(const Json_Text& source, const Json::Value& written)
         if (!is_counter(each))
             source.refuse(each, "a counter must be [id, value] or [id, value, growth per second], not " +
                                     compact_text(each));
-        counters_.push_back({each[0].asUInt(), each[1], each.size() == 3 ? each[2].asUInt() : 0});
+        _counters.push_back({each[0].asUInt(), each[1], each.size() == 3 ? each[2].asUInt() : 0});
     }
 }
 
 Json::Value Counters::answer(Clock::time_point now) const
 {
     using std::chrono::milliseconds;
-    const auto age = std::chrono::duration_cast<milliseconds>(now - since_).count();
+    const auto age = std::chrono::duration_cast<milliseconds>(now - _since).count();
     Json::Value list(Json::arrayValue);
-    for (const Counter& counter : counters_) {
+    for (const Counter& counter : _counters) {
         Json::Value& entry = list.append(Json::Value());
         entry["id"] = counter.id;
         if (counter.growth == 0) {
@@ -53,9 +53,9 @@ Json::Value Counters::answer(Clock::time_point now) const
 
 void Counters::reset(Clock::time_point now)
 {
-    for (Counter& counter : counters_)
+    for (Counter& counter : _counters)
         counter.start = 0U;
-    since_ = now;
+    _since = now;
 }
 
 } // namespace KPRV::simulator

@@ -35,8 +35,8 @@ private:
         Json::Value start; // a number, or any text in its place
         std::uint32_t growth;
     };
-    std::vector<Counter> counters_;
-    Clock::time_point since_ = Clock::now();
+    std::vector<Counter> _counters;
+    Clock::time_point _since = Clock::now();
 };
 
 } // namespace KPRV::simulator

@@ -15,7 +15,7 @@ namespace KPRV::simulator {
 
 namespace {
 
-constexpr std::size_t entry_count = 0
+constexpr std::size_t ENTRY_COUNT = 0
 #define ENTRY_POINT(symbol, variable, signature) +1
 #include "contracts/adapter/Entry_Points.def"
 #undef ENTRY_POINT
@@ -23,7 +23,7 @@ constexpr std::size_t entry_count = 0
 
 // A row of another name, two of one, or one too few: none of it compiles.
 constexpr auto rows = [] {
-    std::array<Entry_Row, entry_count> filled = {};
+    std::array<Entry_Row, ENTRY_COUNT> filled = {};
     const auto fill = [&](Entry entry, const Entry_Row& row) {
         Entry_Row& place = filled[static_cast<std::size_t>(entry)];
         if (place.symbol)

@@ -60,28 +60,28 @@ private:
         unsigned told;
     };
 
-    bool is_told() const REQUIRES(mutex_) { return wanted_ && callback_; }
-    void start_thread() REQUIRES(mutex_);
+    bool is_told() const REQUIRES(_mutex) { return _wanted && _callback; }
+    void start_thread() REQUIRES(_mutex);
     void end_thread();
     void run();
-    bool take_event(std::string& text) REQUIRES(mutex_);
-    bool take_scripted(std::string& text) REQUIRES(mutex_);
-    void schedule(std::size_t line, Clock::time_point from) REQUIRES(mutex_);
-    void call(const char* text) REQUIRES(mutex_);
+    bool take_event(std::string& text) REQUIRES(_mutex);
+    bool take_scripted(std::string& text) REQUIRES(_mutex);
+    void schedule(std::size_t line, Clock::time_point from) REQUIRES(_mutex);
+    void call(const char* text) REQUIRES(_mutex);
 
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any changed_;
-    evtProcessCB callback_ GUARDED_BY(mutex_) = nullptr;
-    bool wanted_ GUARDED_BY(mutex_) = false;
-    bool is_script_due_ GUARDED_BY(mutex_) = false;
-    unsigned calls_ GUARDED_BY(mutex_) = 0;
-    bool has_thread_ GUARDED_BY(mutex_) = false;
-    bool ends_ GUARDED_BY(mutex_) = false;
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _changed;
+    evtProcessCB _callback GUARDED_BY(_mutex) = nullptr;
+    bool _wanted GUARDED_BY(_mutex) = false;
+    bool _is_script_due GUARDED_BY(_mutex) = false;
+    unsigned _calls GUARDED_BY(_mutex) = 0;
+    bool _has_thread GUARDED_BY(_mutex) = false;
+    bool _ends GUARDED_BY(_mutex) = false;
     /// Set before the process can ask for its end.
-    std::thread thread_;
-    std::deque<std::string> events_ GUARDED_BY(mutex_);
-    std::vector<Scripted_Event> script_ GUARDED_BY(mutex_);
-    Due due_ GUARDED_BY(mutex_) = {};
+    std::thread _thread;
+    std::deque<std::string> _events GUARDED_BY(_mutex);
+    std::vector<Scripted_Event> _script GUARDED_BY(_mutex);
+    Due _due GUARDED_BY(_mutex) = {};
 };
 
 } // namespace KPRV::simulator

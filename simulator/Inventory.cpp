@@ -67,7 +67,7 @@ void Inventory::index_adapter(const Json_Text& source, const Json::Value& writte
             return;
         const std::string key = lower_case(address.asString());
         bool taken = !index.try_emplace(key, position).second && !may_stand;
-        for (const Index* each : {&adapter_index_, &port_index_}) {
+        for (const Index* each : {&_adapter_index, &_port_index}) {
             const auto found = each->find(key);
             taken = taken || (found != each->end() && found->second.adapter != number);
         }
@@ -76,35 +76,35 @@ void Inventory::index_adapter(const Json_Text& source, const Json::Value& writte
     };
     const Json::Value& hba = written["hbaData"];
     const Position self{number, 0, false};
-    put(adapter_index_, hba["wwn"], self);
-    put(adapter_index_, hba["hbaMAC"], self);
-    put(adapter_index_, written["address"], self, true);
+    put(_adapter_index, hba["wwn"], self);
+    put(_adapter_index, hba["hbaMAC"], self);
+    put(_adapter_index, written["address"], self, true);
 
     std::size_t place = 0;
     for (const Json::Value& port : written["ethPorts"])
-        put(port_index_, port["mac"], {number, place++, true});
+        put(_port_index, port["mac"], {number, place++, true});
     place = 0;
     for (const Json::Value& port : written["fcPorts"]) {
-        put(port_index_, port["wwn"], {number, place, false});
+        put(_port_index, port["wwn"], {number, place, false});
         // FCoE traffic leaves by an Ethernet port, whose MAC it may use.
-        const auto found = port_index_.find(lower_case(port["fcoeMac"].asString()));
-        put(port_index_, port["fcoeMac"], {number, place++, false},
-            found != port_index_.end() && found->second.ethernet);
+        const auto found = _port_index.find(lower_case(port["fcoeMac"].asString()));
+        put(_port_index, port["fcoeMac"], {number, place++, false},
+            found != _port_index.end() && found->second.ethernet);
     }
 }
 
 Inventory::Place Inventory::adapter_at(const std::string& address)
 {
-    const auto found = adapter_index_.find(lower_case(address));
-    if (found == adapter_index_.end())
+    const auto found = _adapter_index.find(lower_case(address));
+    if (found == _adapter_index.end())
         return {};
     return {&adapters[found->second.adapter], nullptr};
 }
 
 Inventory::Place Inventory::port_at(const std::string& address)
 {
-    const auto found = port_index_.find(lower_case(address));
-    if (found == port_index_.end())
+    const auto found = _port_index.find(lower_case(address));
+    if (found == _port_index.end())
         return {};
     const Position& position = found->second;
     Adapter& adapter = adapters[position.adapter];

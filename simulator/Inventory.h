@@ -115,7 +115,7 @@ private:
 
     void index_adapter(const Json_Text& source, const Json::Value& written, std::size_t number);
 
-    Index adapter_index_;
-    Index port_index_;
+    Index _adapter_index;
+    Index _port_index;
 };
 } // namespace KPRV::simulator

@@ -13,7 +13,7 @@ namespace KPRV::simulator {
 namespace {
 
 // The reader recurses, and the threads that come in through a CIM server have small stacks.
-constexpr std::size_t max_nesting = 64;
+constexpr std::size_t MAX_NESTING = 64;
 
 // The reader tells its first error as "* Line 3, Column 5\n  Missing ...\n".
 struct Reader_Error
@@ -49,7 +49,7 @@ std::size_t skip_opaque(const std::string& text, std::size_t start)
 
 } // namespace
 
-Json_Text::Json_Text(std::string name, std::string text) : name_(std::move(name)), text_(std::move(text)) {}
+Json_Text::Json_Text(std::string name, std::string text) : _name(std::move(name)), _text(std::move(text)) {}
 
 Json_Text Json_Text::of_file(const std::string& path)
 {
@@ -71,8 +71,8 @@ Json::Value Json_Text::parse() const
     const std::unique_ptr<Json::CharReader> reader(builder.newCharReader());
     Json::Value value;
     std::string errors;
-    const char* start = text_.data();
-    if (!reader->parse(start, start + text_.size(), &value, &errors)) {
+    const char* start = _text.data();
+    if (!reader->parse(start, start + _text.size(), &value, &errors)) {
         const Reader_Error error = first_error(errors);
         refuse_line(error.line, error.reason);
     }
@@ -86,27 +86,27 @@ void Json_Text::refuse(const Json::Value& value, const std::string& reason) cons
 
 void Json_Text::refuse_line(std::size_t line, const std::string& reason) const
 {
-    throw Refused(name_ + ":" + std::to_string(line) + ": " + reason);
+    throw Refused(_name + ":" + std::to_string(line) + ": " + reason);
 }
 
 std::size_t Json_Text::line_at(std::size_t offset) const
 {
-    const char* start = text_.data();
-    const char* end = start + std::min(offset, text_.size());
+    const char* start = _text.data();
+    const char* end = start + std::min(offset, _text.size());
     return 1 + static_cast<std::size_t>(std::count(start, end, '\n'));
 }
 
 void Json_Text::check_nesting() const
 {
     std::size_t depth = 0;
-    for (std::size_t at = 0; at < text_.size(); ++at) {
-        at = skip_opaque(text_, at);
-        const char letter = at < text_.size() ? text_[at] : ' ';
+    for (std::size_t at = 0; at < _text.size(); ++at) {
+        at = skip_opaque(_text, at);
+        const char letter = at < _text.size() ? _text[at] : ' ';
         if (letter == '{' || letter == '[')
             ++depth;
         else if ((letter == '}' || letter == ']') && depth > 0)
             --depth;
-        if (depth > max_nesting)
+        if (depth > MAX_NESTING)
             refuse_line(line_at(at), "nested deeper than 64 levels");
     }
 }

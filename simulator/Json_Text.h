@@ -35,8 +35,8 @@ private:
     std::size_t line_at(std::size_t offset) const;
     void check_nesting() const;
 
-    std::string name_;
-    std::string text_;
+    std::string _name;
+    std::string _text;
 };
 
 /// `value` as JSON text in one line.

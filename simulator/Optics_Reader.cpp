@@ -7,8 +7,8 @@ namespace KPRV::simulator {
 namespace {
 
 // Lengths of the text fields in the memory of an SFP.
-constexpr std::size_t name_length = 16;
-constexpr std::size_t revision_length = 4;
+constexpr std::size_t NAME_LENGTH = 16;
+constexpr std::size_t REVISION_LENGTH = 4;
 
 // Alike for the two functions of one physical port, which see the same SFP.
 std::string serial_number(const Port_Place& place)
@@ -29,8 +29,8 @@ std::optional<Optics> take_optics(const Json_Text& source, Json::Value& port, co
     set_default(written, "serialNo", serial_number(place));
     fill_defaults(written, optics_members);
     for (const char* name : {"vendorName", "vendorPart", "serialNo"})
-        pad_text(written, name, name_length);
-    pad_text(written, "revision", revision_length);
+        pad_text(written, name, NAME_LENGTH);
+    pad_text(written, "revision", REVISION_LENGTH);
     Optics optics;
     const Json::Value readings = take_part(written, "readings");
     if (!readings.isNull()) {

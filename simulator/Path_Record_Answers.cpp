@@ -26,16 +26,16 @@ Target record_target(State& state, const Port& port, Json::Value record)
 class Change
 {
 public:
-    Change(State& state, Port& port, Records records) : state_(state), port_(port), next_(port.*records) {}
+    Change(State& state, Port& port, Records records) : _state(state), _port(port), _next(port.*records) {}
 
-    void clear() { next_.clear(); }
+    void clear() { _next.clear(); }
 
     void remove(const Json::Value& list)
     {
         each_path(list, [&](const std::string& path, const Json::Value& record) {
-            if (!next_.contains(path))
+            if (!_next.contains(path))
                 refuse(Error_Code::NOT_FOUND, "no such record: " + compact_text(record));
-            next_.remove(path);
+            _next.remove(path);
         });
     }
 
@@ -45,17 +45,17 @@ public:
         each_path(list, [&](const std::string& path, const Json::Value& record) {
             if (of_luns && !record.isMember("lunId"))
                 refuse(Error_Code::REQUEST, "a record must have lunId: " + compact_text(record));
-            else if (!replaces && next_.contains(path))
+            else if (!replaces && _next.contains(path))
                 refuse(Error_Code::DUPLICATE, "there is such a record: " + compact_text(record));
-            next_.put(path, record);
+            _next.put(path, record);
         });
     }
 
     Json::Value finish(Records records)
     {
-        if (!refusal_.isNull())
-            return refusal_;
-        port_.*records = std::move(next_);
+        if (!_refusal.isNull())
+            return _refusal;
+        _port.*records = std::move(_next);
         return done_answer();
     }
 
@@ -70,24 +70,24 @@ private:
                 refuse(Error_Code::REQUEST, "a record must be an object: " + compact_text(record));
                 continue;
             }
-            const Target target = record_target(state_, port_, record);
+            const Target target = record_target(_state, _port, record);
             if (target)
                 action(target.path, record);
-            else if (refusal_.isNull())
-                refusal_ = target.refusal;
+            else if (_refusal.isNull())
+                _refusal = target.refusal;
         }
     }
 
     void refuse(Error_Code code, const std::string& reason)
     {
-        if (refusal_.isNull())
-            refusal_ = error_answer(code, reason);
+        if (_refusal.isNull())
+            _refusal = error_answer(code, reason);
     }
 
-    State& state_;
-    Port& port_;
-    Path_Records next_;
-    Json::Value refusal_;
+    State& _state;
+    Port& _port;
+    Path_Records _next;
+    Json::Value _refusal;
 };
 
 Json::Value records_answer(State& state, const Json::Value& request, const char* name, Records records)

@@ -38,13 +38,13 @@ public:
     /// Also removes those of all that lies behind the path.
     void remove_below(const std::string& path);
 
-    void clear() { records_.clear(); }
+    void clear() { _records.clear(); }
 
     /// An array of the records.
     Json::Value list() const;
 
 private:
-    std::vector<std::pair<std::string, Json::Value>> records_;
+    std::vector<std::pair<std::string, Json::Value>> _records;
 };
 
 } // namespace KPRV::simulator

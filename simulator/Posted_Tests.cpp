@@ -8,7 +8,7 @@ namespace KPRV::simulator {
 namespace {
 
 // A server may run for days on the simulator: of very many requests the oldest are forgotten.
-constexpr std::size_t most_requests = 1024;
+constexpr std::size_t MOST_REQUESTS = 1024;
 
 constexpr const char* state_words[] = {"Unknown", "Posted", "Running", "Completed", "Cancelled"};
 
@@ -21,9 +21,9 @@ unsigned percent(Posted_Tests::Clock::duration part, Posted_Tests::Clock::durati
 
 const Posted_Tests::Request* Posted_Tests::find(const std::string& id) const
 {
-    const auto found = std::find_if(requests_.begin(), requests_.end(),
+    const auto found = std::find_if(_requests.begin(), _requests.end(),
                                     [&](const Request& request) { return request.id == id; });
-    return found == requests_.end() ? nullptr : &*found;
+    return found == _requests.end() ? nullptr : &*found;
 }
 
 Posted_Tests::Request* Posted_Tests::find(const std::string& id)
@@ -47,9 +47,9 @@ void Posted_Tests::post(const std::string& id, const Json::Value& query, const s
                         std::chrono::milliseconds duration)
 {
     if (!find(id)) {
-        if (requests_.size() == most_requests)
-            requests_.pop_front();
-        requests_.emplace_back().id = id;
+        if (_requests.size() == MOST_REQUESTS)
+            _requests.pop_front();
+        _requests.emplace_back().id = id;
     }
     find(id)->tests.push_back({query, failure, duration});
 }

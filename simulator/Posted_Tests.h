@@ -60,7 +60,7 @@ private:
     const Request* find(const std::string& id) const;
     Request* find(const std::string& id);
 
-    std::deque<Request> requests_;
+    std::deque<Request> _requests;
 };
 
 } // namespace KPRV::simulator

@@ -17,7 +17,7 @@ public:
     /// How many calls are remembered from now on, at least one.
     void keep(std::size_t most);
     void add(const char* symbol, const Json::Value& request);
-    void clear() { calls_.clear(); }
+    void clear() { _calls.clear(); }
 
     /// An array of {"call", "request"}, oldest first.
     Json::Value calls() const;
@@ -31,8 +31,8 @@ private:
         const char* symbol;
         Json::Value request;
     };
-    std::size_t most_ = MOST_CALLS;
-    std::deque<Call> calls_;
+    std::size_t _most = MOST_CALLS;
+    std::deque<Call> _calls;
 };
 
 } // namespace KPRV::simulator

@@ -6,22 +6,22 @@ namespace KPRV::simulator {
 
 bool Remote_Port_List::add(Shared port)
 {
-    if (!index_.try_emplace(lower_case(port->address), ports_.size()).second)
+    if (!_index.try_emplace(lower_case(port->address), _ports.size()).second)
         return false;
-    ports_.push_back(std::move(port));
+    _ports.push_back(std::move(port));
     return true;
 }
 
 Remote_Port_List::Shared Remote_Port_List::find(const std::string& address) const
 {
-    const auto found = index_.find(lower_case(address));
-    return found == index_.end() ? nullptr : ports_[found->second];
+    const auto found = _index.find(lower_case(address));
+    return found == _index.end() ? nullptr : _ports[found->second];
 }
 
 Json::Value Remote_Port_List::list() const
 {
     Json::Value answer(Json::arrayValue);
-    for (const Shared& port : ports_)
+    for (const Shared& port : _ports)
         answer.append(port->listed);
     return answer;
 }

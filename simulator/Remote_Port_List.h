@@ -34,8 +34,8 @@ public:
     Json::Value list() const;
 
 private:
-    std::vector<Shared> ports_;
-    std::unordered_map<std::string, std::size_t> index_;
+    std::vector<Shared> _ports;
+    std::unordered_map<std::string, std::size_t> _index;
 };
 
 } // namespace KPRV::simulator

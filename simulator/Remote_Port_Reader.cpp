@@ -10,8 +10,8 @@ namespace KPRV::simulator {
 namespace {
 
 // Lengths of the fields in a logical unit's standard inquiry data.
-constexpr std::size_t vendor_length = 8;
-constexpr std::size_t product_length = 16;
+constexpr std::size_t VENDOR_LENGTH = 8;
+constexpr std::size_t PRODUCT_LENGTH = 16;
 
 Json::Value device_data(const Json_Text& source, Json::Value data)
 {
@@ -32,8 +32,8 @@ Json::Value lun(const Json_Text& source, Json::Value data, Json::ArrayIndex plac
         source.refuse(data, "duplicate LUN number " + compact_text(number));
     set_default(data, "lunDescIdType", data["lunDescription"].isString() ? 3U : 0U);
     fill_defaults(data, lun_members);
-    pad_text(data, "vendor", vendor_length);
-    pad_text(data, "productID", product_length);
+    pad_text(data, "vendor", VENDOR_LENGTH);
+    pad_text(data, "productID", PRODUCT_LENGTH);
     return answered_members(std::move(data), lun_members);
 }
 

@@ -13,14 +13,14 @@ std::string mark(const std::string& group, const std::string& path)
 
 void Reset_Marks::reset(const std::string& group, const std::string& path)
 {
-    marks_.insert(mark(group, path));
+    _marks.insert(mark(group, path));
 }
 
 bool Reset_Marks::is_reset(const std::string& group, const std::string& path) const
 {
     for (std::size_t end = path.find('/');; end = path.find('/', end + 1)) {
         const std::string above = path.substr(0, end);
-        if (marks_.contains(mark(group, above)) || marks_.contains(mark("", above)))
+        if (_marks.contains(mark(group, above)) || _marks.contains(mark("", above)))
             return true;
         if (end == std::string::npos)
             return false;

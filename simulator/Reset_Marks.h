@@ -18,7 +18,7 @@ public:
     bool is_reset(const std::string& group, const std::string& path) const;
 
 private:
-    std::set<std::string> marks_;
+    std::set<std::string> _marks;
 };
 
 } // namespace KPRV::simulator

@@ -34,8 +34,8 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
     run_hardware_test(row, request);
     Json::Value answer;
     {
-        const Auto_Lock lock(mutex_);
-        answer = answer_by_row(state_, row, request);
+        const Auto_Lock lock(_mutex);
+        answer = answer_by_row(_state, row, request);
     }
     for (const Fault& fault : strike.faults)
         if (fault.kind == Fault_Kind::REMOVE || fault.kind == Fault_Kind::SET)
@@ -45,12 +45,12 @@ Json::Value Simulator::answer(Entry entry, const Json::Value& request)
 
 Simulator::Strike Simulator::record(const Entry_Row& row, const Json::Value& request)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     load_from_environment();
-    recorder_.add(row.symbol, request);
-    called_.notify_all();
-    Strike strike{{}, releases_};
-    for (Fault& fault : faults_)
+    _recorder.add(row.symbol, request);
+    _called.notify_all();
+    Strike strike{{}, _releases};
+    for (Fault& fault : _faults)
         if (strikes(fault, row.symbol, request))
             strike.faults.push_back(fault);
     return strike;
@@ -63,9 +63,9 @@ void Simulator::wait_out(const Strike& strike)
             std::this_thread::sleep_for(std::chrono::milliseconds(fault.words["milliseconds"].asUInt()));
         if (fault.kind != Fault_Kind::HOLD)
             continue;
-        const Auto_Lock lock(mutex_);
-        while (releases_ == strike.releases)
-            released_.wait(mutex_);
+        const Auto_Lock lock(_mutex);
+        while (_releases == strike.releases)
+            _released.wait(_mutex);
     }
 }
 
@@ -73,20 +73,20 @@ void Simulator::run_hardware_test(const Entry_Row& row, const Json::Value& reque
 {
     std::chrono::milliseconds duration;
     {
-        const Auto_Lock lock(mutex_);
-        duration = hardware_test_duration(state_, row, request);
+        const Auto_Lock lock(_mutex);
+        duration = hardware_test_duration(_state, row, request);
     }
     std::this_thread::sleep_for(duration);
 }
 
 void Simulator::load_from_environment()
 {
-    if (state_.loaded)
+    if (_state.loaded)
         return;
-    state_.loaded = true;
-    state_.problem.clear();
-    state_.inventory = {};
-    faults_.clear();
+    _state.loaded = true;
+    _state.problem.clear();
+    _state.inventory = {};
+    _faults.clear();
     events().set_script({});
     try {
         if (const char* path = std::getenv(inventory_variable))
@@ -96,7 +96,7 @@ void Simulator::load_from_environment()
             events().set_script(read_events(source, source.parse()));
         }
     } catch (const Refused& refused) {
-        state_.problem = refused.what();
+        _state.problem = refused.what();
         std::fprintf(stderr, "simulator: %s\n", refused.what());
     }
 }
@@ -104,39 +104,39 @@ void Simulator::load_from_environment()
 void Simulator::put_in_place(const Json_Text& source)
 {
     Inventory inventory(source);
-    faults_ = read_faults(source, inventory.faults);
+    _faults = read_faults(source, inventory.faults);
     events().set_script(std::move(inventory.events));
-    state_.inventory = std::move(inventory);
+    _state.inventory = std::move(inventory);
 }
 
 void Simulator::load(const Json_Text& source)
 {
-    const Auto_Lock lock(mutex_);
-    state_.loaded = true;
-    state_.from_environment = false;
-    state_.problem.clear();
+    const Auto_Lock lock(_mutex);
+    _state.loaded = true;
+    _state.from_environment = false;
+    _state.problem.clear();
     try {
         put_in_place(source);
     } catch (const Refused& refused) {
-        state_.problem = refused.what();
-        state_.inventory = {};
+        _state.problem = refused.what();
+        _state.inventory = {};
         events().set_script({});
-        faults_.clear();
+        _faults.clear();
         throw;
     }
 }
 
 void Simulator::unload()
 {
-    const Auto_Lock lock(mutex_);
-    state_.loaded = false;
-    state_.from_environment = true;
+    const Auto_Lock lock(_mutex);
+    _state.loaded = false;
+    _state.from_environment = true;
 }
 
 void Simulator::set_log_callback(log4cxxMsgCB callback)
 {
-    const Auto_Lock lock(mutex_);
-    state_.session.log_callback = callback;
+    const Auto_Lock lock(_mutex);
+    _state.session.log_callback = callback;
 }
 
 void Simulator::set_event_callback(evtProcessCB callback)
@@ -148,65 +148,65 @@ void Simulator::set_event_callback(evtProcessCB callback)
 void Simulator::add_fault(const Json_Text& source)
 {
     Fault fault = read_fault(source, source.parse());
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     load_from_environment();
-    faults_.push_back(std::move(fault));
+    _faults.push_back(std::move(fault));
 }
 
 void Simulator::clear_faults()
 {
     {
-        const Auto_Lock lock(mutex_);
-        faults_.clear();
+        const Auto_Lock lock(_mutex);
+        _faults.clear();
     }
     release();
 }
 
 void Simulator::release()
 {
-    const Auto_Lock lock(mutex_);
-    ++releases_;
-    released_.notify_all();
+    const Auto_Lock lock(_mutex);
+    ++_releases;
+    _released.notify_all();
 }
 
 bool Simulator::wait_for_calls(const std::string& symbol, std::size_t count, std::chrono::milliseconds limit)
 {
     const auto end = std::chrono::steady_clock::now() + limit;
-    const Auto_Lock lock(mutex_);
-    while (recorder_.count(symbol) < count)
-        if (called_.wait_until(mutex_, end) == std::cv_status::timeout)
-            return recorder_.count(symbol) >= count;
+    const Auto_Lock lock(_mutex);
+    while (_recorder.count(symbol) < count)
+        if (_called.wait_until(_mutex, end) == std::cv_status::timeout)
+            return _recorder.count(symbol) >= count;
     return true;
 }
 
 Json::Value Simulator::calls()
 {
-    const Auto_Lock lock(mutex_);
-    return recorder_.calls();
+    const Auto_Lock lock(_mutex);
+    return _recorder.calls();
 }
 
 void Simulator::clear_calls()
 {
-    const Auto_Lock lock(mutex_);
-    recorder_.clear();
+    const Auto_Lock lock(_mutex);
+    _recorder.clear();
 }
 
 void Simulator::keep_calls(std::size_t most)
 {
-    const Auto_Lock lock(mutex_);
-    recorder_.keep(most);
+    const Auto_Lock lock(_mutex);
+    _recorder.keep(most);
 }
 
 Json::Value Simulator::status()
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     load_from_environment();
     Json::Value status;
-    status["initialised"] = state_.session.initialised;
+    status["initialised"] = _state.session.initialised;
     status["wantsEvents"] = events().is_wanted();
-    status["logCallback"] = state_.session.log_callback != nullptr;
+    status["logCallback"] = _state.session.log_callback != nullptr;
     status["eventCallback"] = events().has_callback();
-    status["problem"] = state_.problem;
+    status["problem"] = _state.problem;
     return status;
 }
 
@@ -214,8 +214,8 @@ bool Simulator::log(int level, const char* file, int line, const char* text)
 {
     log4cxxMsgCB callback = nullptr;
     {
-        const Auto_Lock lock(mutex_);
-        callback = state_.session.log_callback;
+        const Auto_Lock lock(_mutex);
+        callback = _state.session.log_callback;
     }
     if (callback)
         callback(level, file, line, text);

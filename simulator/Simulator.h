@@ -62,10 +62,10 @@ public:
     void queue_event(const char* text);
 
 private:
-    void load_from_environment() REQUIRES(mutex_);
-    void put_in_place(const Json_Text& source) REQUIRES(mutex_);
+    void load_from_environment() REQUIRES(_mutex);
+    void put_in_place(const Json_Text& source) REQUIRES(_mutex);
     /// They have a lock of their own.
-    Event_Feed& events() UNCHECKED { return state_.events; }
+    Event_Feed& events() UNCHECKED { return _state.events; }
 
     // The faults that strike a call, and the count of releases when it came in: the next one is its.
     struct Strike
@@ -79,13 +79,13 @@ private:
     /// Takes the time of a hardware test; other calls go on.
     void run_hardware_test(const Entry_Row& row, const Json::Value& request);
 
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any called_;
-    std::condition_variable_any released_;
-    unsigned releases_ GUARDED_BY(mutex_) = 0;
-    State state_ GUARDED_BY(mutex_);
-    std::vector<Fault> faults_ GUARDED_BY(mutex_);
-    Recorder recorder_ GUARDED_BY(mutex_);
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _called;
+    std::condition_variable_any _released;
+    unsigned _releases GUARDED_BY(_mutex) = 0;
+    State _state GUARDED_BY(_mutex);
+    std::vector<Fault> _faults GUARDED_BY(_mutex);
+    Recorder _recorder GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::simulator

@@ -31,15 +31,15 @@ Json::Value parsed(const std::string& text)
 
 } // namespace
 
-Simulator_Control::Simulator_Control(const std::string& library) : library_(dlopen(library.c_str(), RTLD_NOW))
+Simulator_Control::Simulator_Control(const std::string& library) : _library(dlopen(library.c_str(), RTLD_NOW))
 {
-    if (!library_)
+    if (!_library)
         throw std::runtime_error(dlerror());
 }
 
 void* Simulator_Control::address(const std::string& name)
 {
-    void* found = dlsym(library_, name.c_str());
+    void* found = dlsym(_library, name.c_str());
     if (!found)
         throw std::runtime_error("the adapter library has no " + name);
     return found;

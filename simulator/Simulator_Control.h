@@ -75,7 +75,7 @@ public:
 private:
     void* address(const std::string& name);
 
-    void* library_;
+    void* _library;
 };
 
 } // namespace KPRV::simulator

@@ -12,8 +12,8 @@ namespace KPRV::simulator {
 
 namespace {
 
-constexpr std::size_t most_vnics = 4;
-constexpr unsigned link_bandwidth = 10000;
+constexpr std::size_t MOST_VNICS = 4;
+constexpr unsigned LINK_BANDWIDTH = 10000;
 
 // The port's MAC with the function in the first byte, as a locally administered address.
 std::string vnic_mac(const std::string& port, unsigned function)
@@ -33,15 +33,15 @@ std::vector<Virtual_Nic>::iterator find_vnic(std::vector<Virtual_Nic>& nics, con
 // Why the port cannot have these functions beside its own, in words; empty if it can.
 std::string objection(const std::vector<Virtual_Nic>& nics)
 {
-    if (nics.size() > most_vnics)
+    if (nics.size() > MOST_VNICS)
         return "the port has all the virtual NICs that it can have";
     unsigned long long promised = 0;
     for (const Virtual_Nic& nic : nics) {
-        if (nic.min_bandwidth > nic.max_bandwidth || nic.max_bandwidth > link_bandwidth)
-            return "bandwidths must be minBandwidth <= maxBandwidth <= " + std::to_string(link_bandwidth);
+        if (nic.min_bandwidth > nic.max_bandwidth || nic.max_bandwidth > LINK_BANDWIDTH)
+            return "bandwidths must be minBandwidth <= maxBandwidth <= " + std::to_string(LINK_BANDWIDTH);
         promised += nic.min_bandwidth;
     }
-    if (promised > link_bandwidth)
+    if (promised > LINK_BANDWIDTH)
         return "more bandwidth is promised than the link has";
     return "";
 }

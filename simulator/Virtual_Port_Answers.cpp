@@ -13,7 +13,7 @@ namespace KPRV::simulator {
 
 namespace {
 
-constexpr std::size_t most_virtual_ports = 255;
+constexpr std::size_t MOST_VIRTUAL_PORTS = 255;
 
 bool is_taken(Inventory& inventory, const std::string& address)
 {
@@ -50,7 +50,7 @@ Json::Value objection(State& state, const Json::Value& request, const Target& ta
         return error_answer(Error_Code::REQUEST, "symbolicName must be a text");
     if (is_taken(state.inventory, request["vwwn"].asString()))
         return error_answer(Error_Code::DUPLICATE, "address in use: " + compact_text(request["vwwn"]));
-    if (target.port->virtual_ports.size() >= most_virtual_ports)
+    if (target.port->virtual_ports.size() >= MOST_VIRTUAL_PORTS)
         return error_answer(Error_Code::CONFLICT, "the port has all the virtual ports that it can have");
     return {};
 }

@@ -141,6 +141,16 @@ def check_head(path, lines, complain):
         complain(path, 1, "has no header: which sentence says what of whom stands here?")
 
 
+def check_names(path, lines, complain):
+    """Tests say what is so in one style, and members have their underscore in front."""
+    for number, line in enumerate(lines, 1):
+        if re.match(r"(TYPED_)?TEST(_[FP])?\(\w+, *[a-z]", line):
+            complain(path, number, "a test's name is ThatOfASentence")
+        member = re.match(r" +(?:mutable )?(?:const )?[A-Za-z_][\w:<>, *&]* [*&]*([a-z]\w*_)(?: = [^;]*|\{[^;]*)?;", line)
+        if member and path.parts[0] != "module":
+            complain(path, number, f"{member[1]} is a member: _{member[1][:-1]}")
+
+
 def main():
     failures = []
 
@@ -160,6 +170,7 @@ def main():
             check_traps(path, lines, complain)
             check_mutexes(path, lines, complain)
             check_head(path, lines, complain)
+            check_names(path, lines, complain)
 
     for failure in failures:
         print(failure)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 namespace KPRV::broker {
 
@@ -15,7 +15,7 @@ struct Feature_Info
     /// Class of a reference or embedded instance; empty if the schema does not say.
     std::string target_class;
     /// Default value; null of `type` without one.
-    Value default_value;
+    Plain_Value default_value;
 };
 
 struct Method_Info

@@ -45,21 +45,21 @@ bool is_interval_text(std::string_view text)
 
 std::uint64_t datetime_microseconds(std::string_view text)
 {
-    constexpr std::int64_t day = 86400000000;
+    constexpr std::int64_t DAY = 86400000000;
     if (is_interval_text(text))
-        return static_cast<std::uint64_t>(number(text, 0, 8) * day + time_of_day(text));
+        return static_cast<std::uint64_t>(number(text, 0, 8) * DAY + time_of_day(text));
     year_month_day date(year(static_cast<int>(number(text, 0, 4))),
                         month(static_cast<unsigned>(number(text, 4, 2))),
                         std::chrono::day(static_cast<unsigned>(number(text, 6, 2))));
     std::int64_t days = sys_days(date).time_since_epoch().count();
     std::int64_t offset = number(text, 22, 3) * 60000000;
-    return static_cast<std::uint64_t>(days * day + time_of_day(text) + (text[21] == '+' ? -offset : offset));
+    return static_cast<std::uint64_t>(days * DAY + time_of_day(text) + (text[21] == '+' ? -offset : offset));
 }
 
 std::string datetime_text(std::uint64_t microseconds, bool interval)
 {
-    constexpr std::uint64_t day = 86400000000;
-    unsigned long long days = microseconds / day, rest = microseconds % day;
+    constexpr std::uint64_t DAY = 86400000000;
+    unsigned long long days = microseconds / DAY, rest = microseconds % DAY;
     unsigned long long second = rest / 1000000, micro = rest % 1000000;
     char date[16], text[40];
     if (interval) {

@@ -10,7 +10,7 @@ namespace KPRV::broker {
 namespace {
 
 /// Each kind of value has a letter of its own, so that the text "1" and the number 1 stay apart.
-std::string value_identity(const Value& value)
+std::string value_identity(const Plain_Value& value)
 {
     if (const Path_Value* path = value.as_path())
         return "p" + quoted(path_identity(*path));

@@ -19,39 +19,39 @@ bool is_digit(char c)
 class Path_Parser
 {
 public:
-    Path_Parser(std::string_view text, Path_Error& error) : text_(text), error_(error) {}
+    Path_Parser(std::string_view text, Path_Error& error) : _text(text), _error(error) {}
 
     std::optional<Path_Value> parse()
     {
         Path_Value path;
         std::size_t colon = find_outside_keys(':');
         if (colon != std::string_view::npos) {
-            path.name_space = text_.substr(0, colon);
+            path.name_space = _text.substr(0, colon);
             if (path.name_space.empty())
                 return fail("a namespace before the colon");
-            at_ = colon + 1;
+            _at = colon + 1;
         }
         if (!name(path.class_name))
             return fail("a class name");
-        if (at_ == text_.size())
+        if (_at == _text.size())
             return path;
-        if (text_[at_] != '.')
+        if (_text[_at] != '.')
             return fail("'.' and a key, or the end");
         do {
-            ++at_;
+            ++_at;
             Named_Value key;
             if (!name(key.name))
                 return fail("a key name");
             if (path.key(key.name))
                 return fail("a key that has not been given before");
-            if (at_ == text_.size() || text_[at_] != '=')
+            if (_at == _text.size() || _text[_at] != '=')
                 return fail("'='");
-            ++at_;
+            ++_at;
             if (!value(key.value))
                 return std::nullopt;
             path.keys.push_back(std::move(key));
-        } while (at_ < text_.size() && text_[at_] == ',');
-        if (at_ != text_.size())
+        } while (_at < _text.size() && _text[_at] == ',');
+        if (_at != _text.size())
             return fail("',' or the end");
         return path;
     }
@@ -59,42 +59,42 @@ public:
 private:
     std::nullopt_t fail(const char* expected)
     {
-        error_ = {at_ + 1, expected};
+        _error = {_at + 1, expected};
         return std::nullopt;
     }
 
     /// A colon or the like that stands before the first key.
     std::size_t find_outside_keys(char c) const
     {
-        std::size_t at = text_.find_first_of(std::string("=\"") + c);
-        return at != std::string_view::npos && text_[at] == c ? at : std::string_view::npos;
+        std::size_t at = _text.find_first_of(std::string("=\"") + c);
+        return at != std::string_view::npos && _text[at] == c ? at : std::string_view::npos;
     }
 
     bool name(std::string& result)
     {
-        std::size_t start = at_;
-        while (at_ < text_.size() && (is_name_start(text_[at_]) || (at_ > start && is_digit(text_[at_]))))
-            ++at_;
-        result = text_.substr(start, at_ - start);
+        std::size_t start = _at;
+        while (_at < _text.size() && (is_name_start(_text[_at]) || (_at > start && is_digit(_text[_at]))))
+            ++_at;
+        result = _text.substr(start, _at - start);
         return !result.empty();
     }
 
-    bool value(Value& result)
+    bool value(Plain_Value& result)
     {
-        if (at_ == text_.size())
+        if (_at == _text.size())
             return fail_value();
-        if (text_[at_] == '"')
+        if (_text[_at] == '"')
             return quoted_text(result);
-        if (text_[at_] == '-' || is_digit(text_[at_]))
+        if (_text[_at] == '-' || is_digit(_text[_at]))
             return number(result);
-        std::size_t start = at_;
+        std::size_t start = _at;
         std::string word;
         name(word);
         if (same_name(word, "true") || same_name(word, "false")) {
-            result = Value::boolean(same_name(word, "true"));
+            result = Plain_Value::boolean(same_name(word, "true"));
             return true;
         }
-        at_ = start;
+        _at = start;
         return fail_value();
     }
 
@@ -104,42 +104,42 @@ private:
         return false;
     }
 
-    bool number(Value& result)
+    bool number(Plain_Value& result)
     {
-        const char *from = text_.data() + at_, *end = text_.data() + text_.size();
+        const char *from = _text.data() + _at, *end = _text.data() + _text.size();
         std::from_chars_result read;
         if (*from == '-') {
             std::int64_t number = 0;
             read = std::from_chars(from, end, number);
-            result = Value::signed_number(CMPI_sint64, number);
+            result = Plain_Value::signed_number(CMPI_sint64, number);
         } else {
             std::uint64_t number = 0;
             read = std::from_chars(from, end, number);
-            result = Value::unsigned_number(CMPI_uint64, number);
+            result = Plain_Value::unsigned_number(CMPI_uint64, number);
         }
         if (read.ec != std::errc()) {
             fail("a number of at most 64 bits");
             return false;
         }
-        at_ = static_cast<std::size_t>(read.ptr - text_.data());
+        _at = static_cast<std::size_t>(read.ptr - _text.data());
         return true;
     }
 
-    bool quoted_text(Value& result)
+    bool quoted_text(Plain_Value& result)
     {
         std::string text;
-        for (++at_; at_ < text_.size() && text_[at_] != '"'; ++at_) {
-            if (text_[at_] != '\\')
-                text += text_[at_];
+        for (++_at; _at < _text.size() && _text[_at] != '"'; ++_at) {
+            if (_text[_at] != '\\')
+                text += _text[_at];
             else if (!escape(text))
                 return false;
         }
-        if (at_ == text_.size()) {
+        if (_at == _text.size()) {
             fail("'\"' at the end of the text");
             return false;
         }
-        ++at_;
-        result = Value::text(std::move(text));
+        ++_at;
+        result = Plain_Value::text(std::move(text));
         return true;
     }
 
@@ -147,18 +147,18 @@ private:
     bool escape(std::string& text)
     {
         static constexpr std::string_view letters = "\"\\ntrbf'", meanings = "\"\\\n\t\r\b\f'";
-        ++at_;
-        if (at_ < text_.size()) {
-            if (std::size_t which = letters.find(text_[at_]); which != std::string_view::npos) {
+        ++_at;
+        if (_at < _text.size()) {
+            if (std::size_t which = letters.find(_text[_at]); which != std::string_view::npos) {
                 text += meanings[which];
                 return true;
             }
             unsigned code = 0;
-            const char* from = text_.data() + at_ + 1;
-            if (text_[at_] == 'x' && text_.size() - at_ > 4 &&
+            const char* from = _text.data() + _at + 1;
+            if (_text[_at] == 'x' && _text.size() - _at > 4 &&
                 std::from_chars(from, from + 4, code, 16).ptr == from + 4 && code > 0 && code < 0x80) {
                 text += static_cast<char>(code);
-                at_ += 4;
+                _at += 4;
                 return true;
             }
         }
@@ -166,9 +166,9 @@ private:
         return false;
     }
 
-    std::string_view text_;
-    Path_Error& error_;
-    std::size_t at_ = 0;
+    std::string_view _text;
+    Path_Error& _error;
+    std::size_t _at = 0;
 };
 
 } // namespace

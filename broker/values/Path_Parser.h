@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include <optional>
 

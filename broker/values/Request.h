@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include <optional>
 
@@ -75,7 +75,7 @@ struct Result
     std::vector<Instance_Value> instances = {};
     std::vector<Path_Value> paths = {};
     /// Of a method; type 0 and null if the provider returned none.
-    Value return_value = {};
+    Plain_Value return_value = {};
     /// Out parameters of a method.
     std::vector<Named_Value> out = {};
     /// How often the provider called `CMReturnDone`, summed over all providers that were asked.

@@ -19,7 +19,7 @@ enum Held : std::uint64_t
     INSTANCE,
     ELEMENTS,
 };
-static_assert(std::variant_size_v<Value::Data> == ELEMENTS + 1);
+static_assert(std::variant_size_v<Plain_Value::Data> == ELEMENTS + 1);
 
 } // namespace
 
@@ -27,17 +27,17 @@ static_assert(std::variant_size_v<Value::Data> == ELEMENTS + 1);
 void Byte_Writer::number(std::uint64_t number)
 {
     for (; number > 0x7F; number >>= 7)
-        bytes_ += static_cast<char>(number | 0x80);
-    bytes_ += static_cast<char>(number);
+        _bytes += static_cast<char>(number | 0x80);
+    _bytes += static_cast<char>(number);
 }
 
 void Byte_Writer::text(std::string_view text)
 {
     number(text.size());
-    bytes_ += text;
+    _bytes += text;
 }
 
-void Byte_Writer::value(const Value& value)
+void Byte_Writer::value(const Plain_Value& value)
 {
     number(value.type);
     number(value.data.index() * 2 + value.null);
@@ -56,7 +56,7 @@ void Byte_Writer::value(const Value& value)
         return instance(*value.as_instance());
     case ELEMENTS:
         number(value.elements().size());
-        for (const Value& element : value.elements())
+        for (const Plain_Value& element : value.elements())
             this->value(element);
         return;
     default:
@@ -90,9 +90,9 @@ void Byte_Writer::instance(const Instance_Value& instance)
 std::uint64_t Byte_Reader::number()
 {
     std::uint64_t number = 0;
-    for (unsigned shift = 0; !rest_.empty(); shift += 7) {
-        const auto byte = static_cast<unsigned char>(rest_.front());
-        rest_.remove_prefix(1);
+    for (unsigned shift = 0; !_rest.empty(); shift += 7) {
+        const auto byte = static_cast<unsigned char>(_rest.front());
+        _rest.remove_prefix(1);
         number |= static_cast<std::uint64_t>(byte & 0x7F) << shift;
         if (byte < 0x80)
             break;
@@ -103,14 +103,14 @@ std::uint64_t Byte_Reader::number()
 std::string Byte_Reader::text()
 {
     const std::size_t size = number();
-    std::string text(rest_.substr(0, size));
-    rest_.remove_prefix(text.size());
+    std::string text(_rest.substr(0, size));
+    _rest.remove_prefix(text.size());
     return text;
 }
 
-Value Byte_Reader::value()
+Plain_Value Byte_Reader::value()
 {
-    Value value;
+    Plain_Value value;
     value.type = static_cast<CMPIType>(number());
     const std::uint64_t held = number();
     value.null = held & 1;
@@ -137,8 +137,8 @@ Value Byte_Reader::value()
         value.data = std::make_shared<const Instance_Value>(instance());
         break;
     case ELEMENTS: {
-        std::vector<Value> elements(number());
-        for (Value& element : elements)
+        std::vector<Plain_Value> elements(number());
+        for (Plain_Value& element : elements)
             element = this->value();
         value.data = std::move(elements);
         break;

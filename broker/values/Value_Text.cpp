@@ -19,10 +19,10 @@ std::string number_text(double value)
     return text;
 }
 
-std::string list_text(const Value& value, std::string (*one)(const Value&))
+std::string list_text(const Plain_Value& value, std::string (*one)(const Plain_Value&))
 {
     std::string text = "{";
-    for (const Value& element : value.elements())
+    for (const Plain_Value& element : value.elements())
         text += (text.size() > 1 ? ", " : "") + one(element);
     return text + "}";
 }
@@ -38,7 +38,7 @@ std::string indented(const std::string& text)
     return result;
 }
 
-std::string scalar_text(const Value& value)
+std::string scalar_text(const Plain_Value& value)
 {
     if (value.type == CMPI_boolean)
         return value.as_bool() ? "true" : "false";
@@ -96,7 +96,7 @@ std::string quoted(std::string_view text)
     return result + '"';
 }
 
-std::string plain_text(const Value& value)
+std::string plain_text(const Plain_Value& value)
 {
     if (value.null)
         return "null";
@@ -111,7 +111,7 @@ std::string plain_text(const Value& value)
     return scalar_text(value);
 }
 
-std::string mof_text(const Value& value)
+std::string mof_text(const Plain_Value& value)
 {
     if (value.null)
         return "NULL";

@@ -1,14 +1,14 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 namespace KPRV::broker {
 
 /// A value as people read it: a text as it is, an array as `{"a", "b"}`, "null" for null.
-std::string plain_text(const Value& value);
+std::string plain_text(const Plain_Value& value);
 
 /// A value as MOF writes it: texts quoted and escaped, "NULL" for null, references as quoted object paths.
-std::string mof_text(const Value& value);
+std::string mof_text(const Plain_Value& value);
 
 /// `instance of X { ... };` of MOF, one property a line; null properties are left out. Ends with a line
 /// break.

@@ -18,7 +18,7 @@ using Tag = Xml_Tag;
 using At = Xml_Attribute;
 
 /// Of what is kept: an object, or all that a method gives back. Objects are not, however many there are.
-constexpr std::size_t most_kept = std::size_t(64) << 20;
+constexpr std::size_t MOST_KEPT = std::size_t(64) << 20;
 
 std::string visible(std::string_view text)
 {
@@ -56,7 +56,7 @@ Result failure(int code, std::string text)
     return result;
 }
 
-Value return_value(const Instance_Reader& reader, Xml_Node node, const Method_Info* method)
+Plain_Value return_value(const Instance_Reader& reader, Xml_Node node, const Method_Info* method)
 {
     const bool is_typed =
         node.has(At::PARAMTYPE) || node.has(At::EmbeddedObject) || node.has(At::EMBEDDEDOBJECT);
@@ -66,27 +66,27 @@ Value return_value(const Instance_Reader& reader, Xml_Node node, const Method_In
 } // namespace
 
 Cim_Answer::Cim_Answer(Http_Client& http, Take take)
-    : http_(http), take_(std::move(take)),
-      reader_({.bytes = most_kept}, [this](Xml_Node node) { has_enough_ = has_enough_ || !take_(node); })
+    : _http(http), _take(std::move(take)),
+      _reader({.bytes = MOST_KEPT}, [this](Xml_Node node) { _has_enough = _has_enough || !_take(node); })
 {
 }
 
 bool Cim_Answer::read(const Http_Head& head, std::string_view piece)
 {
-    if (head.status == 200 && !reader_.feed(piece))
-        refuse(reader_.fault_text());
-    return !has_enough_;
+    if (head.status == 200 && !_reader.feed(piece))
+        refuse(_reader.fault_text());
+    return !_has_enough;
 }
 
 void Cim_Answer::refuse(const std::string& why) const
 {
-    throw Connection_Error(http_.settings().url.text() +
+    throw Connection_Error(_http.settings().url.text() +
                            " is no CIM server, or a broken one: " + visible(why));
 }
 
 void Cim_Answer::check(const Http_Head& head) const
 {
-    const Server_Url& url = http_.settings().url;
+    const Server_Url& url = _http.settings().url;
     const std::string status = "HTTP status " + std::to_string(head.status);
     if (head.status == 200)
         return;
@@ -108,11 +108,11 @@ void Cim_Answer::check(const Http_Head& head) const
 Result Cim_Answer::ask(const Http_Message& message, const Class_Catalogue& catalogue,
                        const Method_Info* method)
 {
-    const auto patience = http_.settings().patience;
+    const auto patience = _http.settings().patience;
     // What a method does may take ten times as long: a test, or an adapter's firmware.
     const bool is_method = message.body.find("<METHODCALL") != std::string::npos;
     try {
-        const Http_Head head = http_.post(
+        const Http_Head head = _http.post(
             message,
             [this](const Http_Head& answered, std::string_view piece) { return read(answered, piece); },
             is_method ? 10 * patience : patience);
@@ -127,12 +127,12 @@ Result Cim_Answer::result(const Http_Head& head, const Class_Catalogue& catalogu
 {
     check(head);
     Result result;
-    result.stopped = has_enough_;
-    if (has_enough_)
+    result.stopped = _has_enough;
+    if (_has_enough)
         return result;
     if (const std::string trailer = head.field("cimstatuscode"); !trailer.empty() && trailer != "0")
         return failure(std::atoi(trailer.c_str()), decoded(head.field("cimstatuscodedescription")));
-    auto& reader = const_cast<Xml_Reader&>(reader_);
+    auto& reader = const_cast<Xml_Reader&>(_reader);
     if (!reader.finish())
         refuse(reader.fault_text());
     const Xml_Node answer = reader.document().root().child(Tag::MESSAGE).child(Tag::SIMPLERSP).first();
@@ -173,7 +173,7 @@ class Object_Taker
 {
 public:
     Object_Taker(const Class_Catalogue& catalogue, const Request& request, Receiver& receiver)
-        : reader_(catalogue), catalogue_(catalogue), request_(request), receiver_(receiver)
+        : _reader(catalogue), _catalogue(catalogue), _request(request), _receiver(receiver)
     {
     }
 
@@ -183,16 +183,16 @@ public:
         case Tag::INSTANCENAME:
         case Tag::OBJECTPATH:
         case Tag::INSTANCEPATH:
-            return receiver_.path(settled(reader_.path(node)));
+            return _receiver.path(settled(_reader.path(node)));
         case Tag::INSTANCE: {
-            Instance_Value instance = reader_.instance(node);
+            Instance_Value instance = _reader.instance(node);
             const std::string class_name = instance.path.class_name;
-            instance.path = request_.path;
+            instance.path = _request.path;
             instance.path.class_name = class_name;
             return hand_over(std::move(instance));
         }
         default:
-            return hand_over(reader_.instance_with_path(node));
+            return hand_over(_reader.instance_with_path(node));
         }
     }
 
@@ -200,13 +200,13 @@ private:
     bool hand_over(Instance_Value instance)
     {
         instance.path = settled(std::move(instance.path));
-        if (request_.properties)
+        if (_request.properties)
             std::erase_if(instance.properties, [&](const Named_Value& property) {
-                return !contains_name(*request_.properties, property.name);
+                return !contains_name(*_request.properties, property.name);
             });
-        if (const Class_Info* const info = catalogue_.find(instance.path.class_name))
+        if (const Class_Info* const info = _catalogue.find(instance.path.class_name))
             put_in_order(instance.properties, *info);
-        return receiver_.instance(std::move(instance));
+        return _receiver.instance(std::move(instance));
     }
 
     /// Without the server's host, in its name space, with the keys in the order of the class.
@@ -214,16 +214,16 @@ private:
     {
         path.host.clear();
         if (path.name_space.empty())
-            path.name_space = request_.path.name_space;
-        if (const Class_Info* const info = catalogue_.find(path.class_name))
+            path.name_space = _request.path.name_space;
+        if (const Class_Info* const info = _catalogue.find(path.class_name))
             put_in_order(path.keys, *info);
         return path;
     }
 
-    const Instance_Reader reader_;
-    const Class_Catalogue& catalogue_;
-    const Request& request_;
-    Receiver& receiver_;
+    const Instance_Reader _reader;
+    const Class_Catalogue& _catalogue;
+    const Request& _request;
+    Receiver& _receiver;
 };
 
 /// Some servers take the keys that a list leaves out from the paths, too. What was not asked for goes no

@@ -31,10 +31,10 @@ private:
     [[noreturn]] void refuse(const std::string& why) const;
     Result result(const Http_Head& head, const Class_Catalogue& catalogue, const Method_Info* method) const;
 
-    Http_Client& http_;
-    Take take_;
-    bool has_enough_ = false;
-    Xml_Reader reader_;
+    Http_Client& _http;
+    Take _take;
+    bool _has_enough = false;
+    Xml_Reader _reader;
 };
 
 /// Asks for a request's objects; they go to the receiver as the module would hand them over.

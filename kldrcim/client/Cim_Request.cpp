@@ -33,57 +33,57 @@ std::string header_text(std::string_view text)
 class Call_Writer
 {
 public:
-    explicit Call_Writer(Tag call, const std::string& name) : call_(call), writer_(message_.body)
+    explicit Call_Writer(Tag call, const std::string& name) : _call(call), _writer(_message.body)
     {
-        message_.body = xml_declaration;
-        writer_.open(Tag::CIM).attribute(At::CIMVERSION, "2.0").attribute(At::DTDVERSION, "2.0");
-        writer_.open(Tag::MESSAGE).attribute(At::ID, "1").attribute(At::PROTOCOLVERSION, "1.0");
-        writer_.open(Tag::SIMPLEREQ).open(call_).attribute(At::NAME, name);
-        message_.fields = {"CIMOperation: MethodCall", "CIMMethod: " + header_text(name)};
+        _message.body = xml_declaration;
+        _writer.open(Tag::CIM).attribute(At::CIMVERSION, "2.0").attribute(At::DTDVERSION, "2.0");
+        _writer.open(Tag::MESSAGE).attribute(At::ID, "1").attribute(At::PROTOCOLVERSION, "1.0");
+        _writer.open(Tag::SIMPLEREQ).open(_call).attribute(At::NAME, name);
+        _message.fields = {"CIMOperation: MethodCall", "CIMMethod: " + header_text(name)};
     }
 
-    Xml_Writer& writer() { return writer_; }
+    Xml_Writer& writer() { return _writer; }
 
     /// Writes a parameter with what `write` puts into it.
     template <class Write>
     void parameter(const char* name, Write write)
     {
-        writer_.open(Tag::IPARAMVALUE).attribute(At::NAME, name);
+        _writer.open(Tag::IPARAMVALUE).attribute(At::NAME, name);
         write();
-        writer_.close(Tag::IPARAMVALUE);
+        _writer.close(Tag::IPARAMVALUE);
     }
     void flag(const char* name, bool value)
     {
-        parameter(name, [&] { write_text_value(writer_, value ? "TRUE" : "FALSE"); });
+        parameter(name, [&] { write_text_value(_writer, value ? "TRUE" : "FALSE"); });
     }
     void class_name(const char* name, const std::string& value)
     {
         if (!value.empty())
-            parameter(name, [&] { write_class_name(writer_, value); });
+            parameter(name, [&] { write_class_name(_writer, value); });
     }
     void text(const char* name, const std::string& value)
     {
         if (!value.empty())
-            parameter(name, [&] { write_text_value(writer_, value); });
+            parameter(name, [&] { write_text_value(_writer, value); });
     }
     void properties(const Property_List& list)
     {
         if (list)
-            parameter("PropertyList", [&] { write_text_array(writer_, *list); });
+            parameter("PropertyList", [&] { write_text_array(_writer, *list); });
     }
 
     Http_Message end(const std::string& object)
     {
-        writer_.close(call_).close(Tag::SIMPLEREQ).close(Tag::MESSAGE).close(Tag::CIM);
-        message_.body += '\n';
-        message_.fields.push_back("CIMObject: " + header_text(object));
-        return std::move(message_);
+        _writer.close(_call).close(Tag::SIMPLEREQ).close(Tag::MESSAGE).close(Tag::CIM);
+        _message.body += '\n';
+        _message.fields.push_back("CIMObject: " + header_text(object));
+        return std::move(_message);
     }
 
 private:
-    const Tag call_;
-    Http_Message message_;
-    Xml_Writer writer_;
+    const Tag _call;
+    Http_Message _message;
+    Xml_Writer _writer;
 };
 
 const char* name_of(Operation operation)

@@ -86,22 +86,22 @@ std::string Http_Head::field(std::string_view name) const
     return at == fields.end() ? "" : at->second;
 }
 
-Http_Client::Http_Client(Http_Settings settings) : settings_(std::move(settings)), handle_(curl_easy_init())
+Http_Client::Http_Client(Http_Settings settings) : _settings(std::move(settings)), _handle(curl_easy_init())
 {
-    if (!handle_)
+    if (!_handle)
         throw std::bad_alloc();
     set_up();
 }
 
 Http_Client::~Http_Client()
 {
-    curl_easy_cleanup(handle_);
+    curl_easy_cleanup(_handle);
 }
 
 void Http_Client::set_up()
 {
-    const Server_Url& url = settings_.url;
-    const auto set = [&](auto option, auto value) { curl_easy_setopt(handle_, option, value); };
+    const Server_Url& url = _settings.url;
+    const auto set = [&](auto option, auto value) { curl_easy_setopt(_handle, option, value); };
     set(CURLOPT_URL, (url.text() + "/cimom").c_str());
     set(CURLOPT_PROTOCOLS_STR, "http,https");
     set(CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
@@ -115,11 +115,11 @@ void Http_Client::set_up()
     if (url.user) {
         set(CURLOPT_HTTPAUTH, static_cast<long>(CURLAUTH_BASIC));
         set(CURLOPT_USERNAME, url.user->c_str());
-        set(CURLOPT_PASSWORD, settings_.password.c_str());
+        set(CURLOPT_PASSWORD, _settings.password.c_str());
     }
-    if (!settings_.ca_file.empty())
-        set(CURLOPT_CAINFO, settings_.ca_file.c_str());
-    if (settings_.is_insecure) {
+    if (!_settings.ca_file.empty())
+        set(CURLOPT_CAINFO, _settings.ca_file.c_str());
+    if (_settings.is_insecure) {
         set(CURLOPT_SSL_VERIFYPEER, 0L);
         set(CURLOPT_SSL_VERIFYHOST, 0L);
     }
@@ -130,14 +130,14 @@ void Http_Client::set_up()
 
 Http_Head Http_Client::post(const Http_Message& message, const Body& body, std::chrono::seconds patience)
 {
-    Exchange exchange = {body, handle_};
+    Exchange exchange = {body, _handle};
     // Some servers refuse to be asked first, and some wait for it.
     std::vector<std::string> fields = {"Content-Type: application/xml; charset=\"utf-8\"",
                                        "Accept:", "Expect:", "User-Agent: kldrcim"};
     fields.insert(fields.end(), message.fields.begin(), message.fields.end());
     const auto list = list_of(fields);
     char details[CURL_ERROR_SIZE] = {};
-    const auto set = [&](auto option, auto value) { curl_easy_setopt(handle_, option, value); };
+    const auto set = [&](auto option, auto value) { curl_easy_setopt(_handle, option, value); };
     set(CURLOPT_HTTPHEADER, list.get());
     set(CURLOPT_POSTFIELDSIZE_LARGE, static_cast<curl_off_t>(message.body.size()));
     set(CURLOPT_POSTFIELDS, message.body.data());
@@ -146,13 +146,13 @@ Http_Head Http_Client::post(const Http_Message& message, const Body& body, std::
     set(CURLOPT_HEADERDATA, &exchange);
     set(CURLOPT_WRITEDATA, &exchange);
     set(CURLOPT_ERRORBUFFER, details);
-    const CURLcode code = curl_easy_perform(handle_);
+    const CURLcode code = curl_easy_perform(_handle);
     if (exchange.thrown)
         std::rethrow_exception(exchange.thrown);
     if (code != CURLE_OK && !exchange.has_enough)
         fail(code, details, patience);
     long status = 0;
-    curl_easy_getinfo(handle_, CURLINFO_RESPONSE_CODE, &status);
+    curl_easy_getinfo(_handle, CURLINFO_RESPONSE_CODE, &status);
     exchange.head.status = static_cast<int>(status);
     return std::move(exchange.head);
 }
@@ -160,15 +160,15 @@ Http_Head Http_Client::post(const Http_Message& message, const Body& body, std::
 std::string Http_Client::own_address() const
 {
     const char* address = nullptr;
-    curl_easy_getinfo(handle_, CURLINFO_LOCAL_IP, &address);
+    curl_easy_getinfo(_handle, CURLINFO_LOCAL_IP, &address);
     return address ? address : "";
 }
 
 void Http_Client::fail(int code, const char* details, std::chrono::seconds patience) const
 {
-    const std::string where = settings_.url.text();
+    const std::string where = _settings.url.text();
     long number = 0;
-    curl_easy_getinfo(handle_, CURLINFO_OS_ERRNO, &number);
+    curl_easy_getinfo(_handle, CURLINFO_OS_ERRNO, &number);
     const std::string why = code == CURLE_COULDNT_CONNECT && number != 0
                                 ? std::strerror(static_cast<int>(number))
                             : *details ? details
@@ -177,7 +177,7 @@ void Http_Client::fail(int code, const char* details, std::chrono::seconds patie
     case CURLE_OUT_OF_MEMORY:
         throw std::bad_alloc();
     case CURLE_COULDNT_RESOLVE_HOST:
-        throw Connection_Error("there is no host " + settings_.url.host);
+        throw Connection_Error("there is no host " + _settings.url.host);
     case CURLE_COULDNT_CONNECT:
         throw Connection_Error("nobody listens at " + where + ": " + why);
     case CURLE_OPERATION_TIMEDOUT:
@@ -187,7 +187,7 @@ void Http_Client::fail(int code, const char* details, std::chrono::seconds patie
         throw Connection_Error("the certificate of " + where + " is not to be trusted: " + why +
                                "; --cacert FILE names who may have signed it");
     case CURLE_SSL_CACERT_BADFILE:
-        throw Connection_Error("--cacert: no certificates in " + settings_.ca_file);
+        throw Connection_Error("--cacert: no certificates in " + _settings.ca_file);
     case CURLE_SSL_CONNECT_ERROR:
         throw Connection_Error("no TLS with " + where + ": " + why);
     case CURLE_WEIRD_SERVER_REPLY:

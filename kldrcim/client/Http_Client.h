@@ -59,7 +59,7 @@ public:
     /// The answer's head, whatever its status. Throws `Connection_Error` if there is no whole answer.
     Http_Head post(const Http_Message& message, const Body& body, std::chrono::seconds patience);
 
-    const Http_Settings& settings() const { return settings_; }
+    const Http_Settings& settings() const { return _settings; }
     /// The address by which this machine speaks to the server; empty before the first message.
     std::string own_address() const;
 
@@ -69,8 +69,8 @@ private:
     void set_up();
     [[noreturn]] void fail(int code, const char* details, std::chrono::seconds patience) const;
 
-    const Http_Settings settings_;
-    void* const handle_;
+    const Http_Settings _settings;
+    void* const _handle;
 };
 
 } // namespace KPRV::kldrcim

@@ -16,8 +16,8 @@ namespace {
 
 using Tag = Xml_Tag;
 
-constexpr std::size_t largest_body = std::size_t(4) << 20;
-constexpr unsigned connections = 16, seconds_of_silence = 30;
+constexpr std::size_t LARGEST_BODY = std::size_t(4) << 20;
+constexpr unsigned CONNECTIONS = 16, seconds_of_silence = 30;
 
 constexpr const char* taken =
     "<?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
@@ -62,7 +62,7 @@ struct Indication_Listener::Callbacks
             auto& body = *static_cast<std::string*>(*context);
             if (*size != 0) {
                 // What is too long is read to its end and refused.
-                if (body.size() <= largest_body)
+                if (body.size() <= LARGEST_BODY)
                     body.append(data, *size);
                 *size = 0;
                 return MHD_YES;
@@ -94,7 +94,7 @@ struct Indication_Listener::Callbacks
 };
 
 Indication_Listener::Indication_Listener(std::string address, Indication_Sink sink)
-    : address_(std::move(address)), sink_(std::move(sink)), secret_(random_word())
+    : _address(std::move(address)), _sink(std::move(sink)), _secret(random_word())
 {
 }
 
@@ -109,43 +109,43 @@ std::unique_ptr<Indication_Listener> Indication_Listener::start(const std::strin
     }
     const unsigned flags =
         MHD_USE_INTERNAL_POLLING_THREAD | (where.ss_family == AF_INET6 ? unsigned(MHD_USE_IPv6) : 0U);
-    listener->daemon_ = MHD_start_daemon(
+    listener->_daemon = MHD_start_daemon(
         flags, 0, nullptr, nullptr, &Callbacks::request, listener.get(), MHD_OPTION_SOCK_ADDR,
-        reinterpret_cast<sockaddr*>(&where), MHD_OPTION_CONNECTION_LIMIT, connections,
+        reinterpret_cast<sockaddr*>(&where), MHD_OPTION_CONNECTION_LIMIT, CONNECTIONS,
         MHD_OPTION_CONNECTION_TIMEOUT, seconds_of_silence, MHD_OPTION_NOTIFY_COMPLETED, &Callbacks::end,
         nullptr, MHD_OPTION_END);
     const MHD_DaemonInfo* const info =
-        listener->daemon_ ? MHD_get_daemon_info(listener->daemon_, MHD_DAEMON_INFO_BIND_PORT) : nullptr;
+        listener->_daemon ? MHD_get_daemon_info(listener->_daemon, MHD_DAEMON_INFO_BIND_PORT) : nullptr;
     if (!info) {
         error = "cannot listen for indications at " + address + ": " + std::strerror(errno);
         return nullptr;
     }
-    listener->port_ = info->port;
+    listener->_port = info->port;
     return listener;
 }
 
 Indication_Listener::~Indication_Listener()
 {
-    if (daemon_)
-        MHD_stop_daemon(daemon_);
+    if (_daemon)
+        MHD_stop_daemon(_daemon);
 }
 
 std::string Indication_Listener::add(const std::string& name_space)
 {
-    const Auto_Lock lock(mutex_);
-    name_spaces_.push_back(name_space);
-    const bool is_v6 = address_.find(':') != std::string::npos;
-    return "http://" + (is_v6 ? "[" + address_ + "]" : address_) + ":" + std::to_string(port_) + "/" +
-           secret_ + "/" + std::to_string(name_spaces_.size() - 1);
+    const Auto_Lock lock(_mutex);
+    _name_spaces.push_back(name_space);
+    const bool is_v6 = _address.find(':') != std::string::npos;
+    return "http://" + (is_v6 ? "[" + _address + "]" : _address) + ":" + std::to_string(_port) + "/" +
+           _secret + "/" + std::to_string(_name_spaces.size() - 1);
 }
 
 std::optional<std::string> Indication_Listener::name_space_of(const std::string& path) const
 {
-    const std::string head = "/" + secret_ + "/";
-    const Auto_Lock lock(mutex_);
-    for (std::size_t i = 0; i < name_spaces_.size(); ++i)
+    const std::string head = "/" + _secret + "/";
+    const Auto_Lock lock(_mutex);
+    for (std::size_t i = 0; i < _name_spaces.size(); ++i)
         if (path == head + std::to_string(i))
-            return name_spaces_[i];
+            return _name_spaces[i];
     return std::nullopt;
 }
 
@@ -154,7 +154,7 @@ unsigned Indication_Listener::take(const std::string& path, const std::string& b
     const auto name_space = name_space_of(path);
     if (!name_space)
         return MHD_HTTP_NOT_FOUND;
-    if (body.size() > largest_body)
+    if (body.size() > LARGEST_BODY)
         return MHD_HTTP_CONTENT_TOO_LARGE;
     Xml_Reader reader;
     if (!reader.feed(body) || !reader.finish())
@@ -172,7 +172,7 @@ unsigned Indication_Listener::take(const std::string& path, const std::string& b
         const No_Catalogue no_classes;
         Instance_Value indication = Instance_Reader(no_classes).instance(instance);
         indication.path.name_space = *name_space;
-        sink_(*name_space, indication);
+        _sink(*name_space, indication);
     } catch (const Wire_Error&) {
         return MHD_HTTP_BAD_REQUEST;
     }

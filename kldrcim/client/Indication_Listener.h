@@ -32,13 +32,13 @@ private:
     /// The status of HTTP for a body that came to that path.
     unsigned take(const std::string& path, const std::string& body) const;
 
-    const std::string address_;
-    const Indication_Sink sink_;
-    const std::string secret_;
-    mutable Standard_Mutex<> mutex_;
-    std::vector<std::string> name_spaces_ GUARDED_BY(mutex_);
-    std::uint16_t port_ = 0;
-    MHD_Daemon* daemon_ = nullptr;
+    const std::string _address;
+    const Indication_Sink _sink;
+    const std::string _secret;
+    mutable Standard_Mutex<> _mutex;
+    std::vector<std::string> _name_spaces GUARDED_BY(_mutex);
+    std::uint16_t _port = 0;
+    MHD_Daemon* _daemon = nullptr;
 };
 
 } // namespace KPRV::kldrcim

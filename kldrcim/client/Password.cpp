@@ -18,25 +18,25 @@ namespace {
 class Silence
 {
 public:
-    explicit Silence(int terminal) : terminal_(terminal), is_set_(tcgetattr(terminal, &before_) == 0)
+    explicit Silence(int terminal) : _terminal(terminal), _is_set(tcgetattr(terminal, &_before) == 0)
     {
-        termios silent = before_;
+        termios silent = _before;
         silent.c_lflag &= ~static_cast<tcflag_t>(ECHO);
-        if (is_set_)
-            tcsetattr(terminal_, TCSAFLUSH, &silent);
+        if (_is_set)
+            tcsetattr(_terminal, TCSAFLUSH, &silent);
     }
     ~Silence()
     {
-        if (is_set_)
-            tcsetattr(terminal_, TCSAFLUSH, &before_);
+        if (_is_set)
+            tcsetattr(_terminal, TCSAFLUSH, &_before);
     }
     Silence(const Silence&) = delete;
     Silence& operator=(const Silence&) = delete;
 
 private:
-    const int terminal_;
-    termios before_ = {};
-    const bool is_set_;
+    const int _terminal;
+    termios _before = {};
+    const bool _is_set;
 };
 
 } // namespace

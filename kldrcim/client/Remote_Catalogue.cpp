@@ -8,29 +8,29 @@
 namespace KPRV::kldrcim {
 
 Remote_Catalogue::Remote_Catalogue(const Http_Settings& settings, std::string name_space)
-    : name_space_(std::move(name_space)), http_(settings)
+    : _name_space(std::move(name_space)), _http(settings)
 {
 }
 
 std::vector<std::string> Remote_Catalogue::class_names() const
 {
-    const Auto_Lock lock(mutex_);
-    if (!names_) {
-        names_.emplace();
-        Cim_Answer answer(http_, [&](Xml_Node node) {
-            names_->emplace_back(node.attribute(Xml_Attribute::NAME));
+    const Auto_Lock lock(_mutex);
+    if (!_names) {
+        _names.emplace();
+        Cim_Answer answer(_http, [&](Xml_Node node) {
+            _names->emplace_back(node.attribute(Xml_Attribute::NAME));
             return true;
         });
         // A server that does not tell has none that could be listed.
-        answer.ask(write_class_names_request(name_space_), No_Catalogue());
+        answer.ask(write_class_names_request(_name_space), No_Catalogue());
     }
-    return *names_;
+    return *_names;
 }
 
 const Class_Info* Remote_Catalogue::find(std::string_view name) const
 {
-    const Auto_Lock lock(mutex_);
-    auto [at, is_new] = classes_.try_emplace(lower_name(name));
+    const Auto_Lock lock(_mutex);
+    auto [at, is_new] = _classes.try_emplace(lower_name(name));
     if (is_new)
         at->second = ask(std::string(name));
     return at->second.get();
@@ -41,11 +41,11 @@ std::unique_ptr<Class_Info> Remote_Catalogue::ask(const std::string& name) const
     std::unique_ptr<Class_Info> info;
     if (name.empty())
         return info;
-    Cim_Answer answer(http_, [&](Xml_Node node) {
+    Cim_Answer answer(_http, [&](Xml_Node node) {
         info = std::make_unique<Class_Info>(read_class(node));
         return true;
     });
-    const Result result = answer.ask(write_class_request(name_space_, name), No_Catalogue());
+    const Result result = answer.ask(write_class_request(_name_space, name), No_Catalogue());
     return result.ok() ? std::move(info) : nullptr;
 }
 

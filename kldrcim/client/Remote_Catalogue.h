@@ -22,14 +22,14 @@ public:
     std::string module_name() const override { return {}; }
 
 private:
-    std::unique_ptr<Class_Info> ask(const std::string& name) const REQUIRES(mutex_);
+    std::unique_ptr<Class_Info> ask(const std::string& name) const REQUIRES(_mutex);
 
-    const std::string name_space_;
-    mutable Standard_Mutex<> mutex_;
-    mutable Http_Client http_ GUARDED_BY(mutex_);
+    const std::string _name_space;
+    mutable Standard_Mutex<> _mutex;
+    mutable Http_Client _http GUARDED_BY(_mutex);
     /// By lower-case name; null for one that there is not.
-    mutable std::map<std::string, std::unique_ptr<Class_Info>, std::less<>> classes_ GUARDED_BY(mutex_);
-    mutable std::optional<std::vector<std::string>> names_ GUARDED_BY(mutex_);
+    mutable std::map<std::string, std::unique_ptr<Class_Info>, std::less<>> _classes GUARDED_BY(_mutex);
+    mutable std::optional<std::vector<std::string>> _names GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::kldrcim

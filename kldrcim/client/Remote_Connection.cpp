@@ -7,17 +7,17 @@
 namespace KPRV::kldrcim {
 
 Remote_Connection::Remote_Connection(const Http_Settings& settings, std::string name_space)
-    : settings_(settings), name_space_(std::move(name_space)), http_(settings_),
-      classes_(settings_, name_space_)
+    : _settings(settings), _name_space(std::move(name_space)), _http(_settings),
+      _classes(_settings, _name_space)
 {
 }
 
 Result Remote_Connection::run(Request request, Receiver* receiver)
 {
     if (request.path.name_space.empty())
-        request.path.name_space = name_space_;
+        request.path.name_space = _name_space;
     Collected kept;
-    Result result = ask_for_objects(http_, classes_, request, receiver ? *receiver : kept);
+    Result result = ask_for_objects(_http, _classes, request, receiver ? *receiver : kept);
     result.instances = std::move(kept.instances);
     result.paths = std::move(kept.paths);
     return result;
@@ -27,7 +27,7 @@ std::unique_ptr<Open_Subscription> Remote_Connection::subscribe(const std::strin
                                                                 const std::vector<std::string>& name_spaces,
                                                                 Indication_Sink sink, std::string& error)
 {
-    auto subscription = std::make_unique<Remote_Subscription>(settings_, std::move(sink));
+    auto subscription = std::make_unique<Remote_Subscription>(_settings, std::move(sink));
     if (!subscription->begin(error))
         return nullptr;
     for (const std::string& name_space : name_spaces)

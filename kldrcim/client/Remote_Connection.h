@@ -13,7 +13,7 @@ public:
     Remote_Connection(const Http_Settings& settings, std::string name_space);
 
     Result run(Request request, Receiver* receiver = nullptr) override;
-    const Class_Catalogue& classes() override { return classes_; }
+    const Class_Catalogue& classes() override { return _classes; }
     /// A server does not tell.
     std::vector<std::string> provider_kinds(const std::string&) override { return {}; }
     /// The server itself says no.
@@ -22,14 +22,14 @@ public:
                                                  const std::vector<std::string>& name_spaces,
                                                  Indication_Sink sink, std::string& error) override;
     std::string subject() const override { return "the server"; }
-    std::string location() const override { return settings_.url.text(); }
+    std::string location() const override { return _settings.url.text(); }
     bool is_in_process() const override { return false; }
 
 private:
-    const Http_Settings settings_;
-    const std::string name_space_;
-    Http_Client http_;
-    Remote_Catalogue classes_;
+    const Http_Settings _settings;
+    const std::string _name_space;
+    Http_Client _http;
+    Remote_Catalogue _classes;
 };
 
 } // namespace KPRV::kldrcim

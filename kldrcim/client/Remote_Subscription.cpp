@@ -18,7 +18,7 @@ constexpr const char* destination_class = "CIM_ListenerDestinationCIMXML";
 constexpr const char* subscription_class = "CIM_IndicationSubscription";
 
 /// Gone with the server's end.
-constexpr std::uint64_t transient = 3;
+constexpr std::uint64_t TRANSIENT = 3;
 
 std::string this_host()
 {
@@ -49,15 +49,15 @@ std::string failure_of(const Result& result)
 } // namespace
 
 Remote_Subscription::Remote_Subscription(const Http_Settings& settings, Indication_Sink sink)
-    : http_(settings), sink_(std::move(sink)), name_(name_prefix() + std::to_string(getpid()))
+    : _http(settings), _sink(std::move(sink)), _name(name_prefix() + std::to_string(getpid()))
 {
 }
 
 Remote_Subscription::~Remote_Subscription()
 {
-    while (!made_.empty()) {
-        remove(made_.back());
-        made_.pop_back();
+    while (!_made.empty()) {
+        remove(_made.back());
+        _made.pop_back();
     }
 }
 
@@ -65,16 +65,16 @@ bool Remote_Subscription::begin(std::string& error)
 {
     if (!find_interop(error))
         return false;
-    system_name_ = system_name();
+    _system_name = system_name();
     take_back_orphans();
-    listener_ = Indication_Listener::start(http_.own_address(), sink_, error);
-    return listener_ != nullptr;
+    _listener = Indication_Listener::start(_http.own_address(), _sink, error);
+    return _listener != nullptr;
 }
 
 Result Remote_Subscription::run(const Request& request, Receiver& receiver)
 {
     static const No_Catalogue no_classes;
-    return ask_for_objects(http_, no_classes, request, receiver);
+    return ask_for_objects(_http, no_classes, request, receiver);
 }
 
 bool Remote_Subscription::find_interop(std::string& error)
@@ -88,10 +88,10 @@ bool Remote_Subscription::find_interop(std::string& error)
         // wrong.
         if (result.rc == CMPI_RC_ERR_INVALID_NAMESPACE)
             continue;
-        interop_ = name;
+        _interop = name;
         return true;
     }
-    error = http_.settings().url.text() + " has no interop namespace to subscribe in";
+    error = _http.settings().url.text() + " has no interop namespace to subscribe in";
     return false;
 }
 
@@ -99,26 +99,26 @@ std::string Remote_Subscription::system_name()
 {
     Collected managers;
     run({.operation = Operation::ENUMERATE_INSTANCES,
-         .path = {.name_space = interop_, .class_name = "CIM_ObjectManager"}},
+         .path = {.name_space = _interop, .class_name = "CIM_ObjectManager"}},
         managers);
-    const Value* const name =
+    const Plain_Value* const name =
         managers.instances.empty() ? nullptr : managers.instances.front().property("SystemName");
-    return name && !name->as_text().empty() ? name->as_text() : http_.settings().url.host;
+    return name && !name->as_text().empty() ? name->as_text() : _http.settings().url.host;
 }
 
 void Remote_Subscription::take_back_orphans()
 {
     const auto name_of = [](const Path_Value* path) {
-        const Value* const name = path ? path->key("Name") : nullptr;
+        const Plain_Value* const name = path ? path->key("Name") : nullptr;
         return name ? name->as_text() : std::string();
     };
     for (const char* class_name : {subscription_class, filter_class, destination_class}) {
         Collected found;
         run({.operation = Operation::ENUMERATE_INSTANCE_NAMES,
-             .path = {.name_space = interop_, .class_name = class_name}},
+             .path = {.name_space = _interop, .class_name = class_name}},
             found);
         for (const Path_Value& path : found.paths) {
-            const Value* const filter = path.key("Filter");
+            const Plain_Value* const filter = path.key("Filter");
             if (is_orphan(name_of(filter ? filter->as_path() : &path)))
                 remove(path);
         }
@@ -129,45 +129,47 @@ std::optional<Path_Value> Remote_Subscription::create(const std::string& class_n
                                                       std::vector<Named_Value> properties, std::string& error)
 {
     Instance_Value instance;
-    instance.path = {.name_space = interop_, .class_name = class_name};
+    instance.path = {.name_space = _interop, .class_name = class_name};
     instance.properties = std::move(properties);
     Collected made;
     const Result result =
         run({.operation = Operation::CREATE_INSTANCE, .path = instance.path, .instance = instance}, made);
     if (!result.ok() || made.paths.empty()) {
-        error = failure_of(result) + " (" + class_name + " in " + interop_ + ")";
+        error = failure_of(result) + " (" + class_name + " in " + _interop + ")";
         return std::nullopt;
     }
-    made_.push_back(made.paths.front());
+    _made.push_back(made.paths.front());
     return made.paths.front();
 }
 
 std::vector<Named_Value> Remote_Subscription::named(const char* class_name) const
 {
-    return {{"SystemCreationClassName", Value::text("CIM_ComputerSystem")},
-            {"SystemName", Value::text(system_name_)},
-            {"CreationClassName", Value::text(class_name)},
-            {"Name", Value::text(name_ + ":" + std::to_string(made_.size()))}};
+    return {{"SystemCreationClassName", Plain_Value::text("CIM_ComputerSystem")},
+            {"SystemName", Plain_Value::text(_system_name)},
+            {"CreationClassName", Plain_Value::text(class_name)},
+            {"Name", Plain_Value::text(_name + ":" + std::to_string(_made.size()))}};
 }
 
 bool Remote_Subscription::add(const std::string& indication_class, const std::string& name_space,
                               std::string& error)
 {
     std::vector<Named_Value> filter = named(filter_class);
-    filter.push_back({"Query", Value::text("SELECT * FROM " + indication_class)});
-    filter.push_back({"QueryLanguage", Value::text("WQL")});
-    filter.push_back({"SourceNamespace", Value::text(name_space)});
+    filter.push_back({"Query", Plain_Value::text("SELECT * FROM " + indication_class)});
+    filter.push_back({"QueryLanguage", Plain_Value::text("WQL")});
+    filter.push_back({"SourceNamespace", Plain_Value::text(name_space)});
     const auto filter_path = create(filter_class, std::move(filter), error);
     if (!filter_path)
         return false;
     std::vector<Named_Value> destination = named(destination_class);
-    destination.push_back({"Destination", Value::text(listener_->add(name_space))});
-    destination.push_back({"PersistenceType", Value::unsigned_number(CMPI_uint16, transient)});
+    destination.push_back({"Destination", Plain_Value::text(_listener->add(name_space))});
+    destination.push_back({"PersistenceType", Plain_Value::unsigned_number(CMPI_uint16, TRANSIENT)});
     const auto destination_path = create(destination_class, std::move(destination), error);
     if (!destination_path)
         return false;
     return create(subscription_class,
-                  {{"Filter", Value::path(*filter_path)}, {"Handler", Value::path(*destination_path)}}, error)
+                  {{"Filter", Plain_Value::path(*filter_path)},
+                   {"Handler", Plain_Value::path(*destination_path)}},
+                  error)
         .has_value();
 }
 

@@ -30,14 +30,14 @@ private:
     std::vector<Named_Value> named(const char* class_name) const;
     bool remove(const Path_Value& path);
 
-    Http_Client http_;
-    Indication_Sink sink_;
-    std::string interop_;
-    std::string system_name_;
-    std::string name_;
-    std::unique_ptr<Indication_Listener> listener_;
+    Http_Client _http;
+    Indication_Sink _sink;
+    std::string _interop;
+    std::string _system_name;
+    std::string _name;
+    std::unique_ptr<Indication_Listener> _listener;
     /// In the order in which they were made.
-    std::vector<Path_Value> made_;
+    std::vector<Path_Value> _made;
 };
 
 } // namespace KPRV::kldrcim

@@ -8,7 +8,7 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-constexpr std::uint16_t plain_port = 5988, tls_port = 5989;
+constexpr std::uint16_t PLAIN_PORT = 5988, tls_port = 5989;
 
 int hex_digit(char c)
 {
@@ -81,7 +81,7 @@ bool parse_server_url(const std::string& text, Server_Url& url, std::string& err
         url.user = decoded(user);
         rest.remove_prefix(at + 1);
     }
-    url.port = url.is_tls ? tls_port : plain_port;
+    url.port = url.is_tls ? tls_port : PLAIN_PORT;
     const auto colon = rest.rfind(':');
     if (colon != rest.npos && rest.find(']', colon) == rest.npos) {
         if (!read_port(rest.substr(colon + 1), url.port))

@@ -44,30 +44,30 @@ const char* media_type(Metrics_Notation notation)
 
 void Exposition::begin(const Metric_Family& family)
 {
-    name_ = family.name;
-    added_.clear();
-    std::string announced = name_;
-    if (notation_ == Metrics_Notation::OPENMETRICS)
+    _name = family.name;
+    _added.clear();
+    std::string announced = _name;
+    if (_notation == Metrics_Notation::OPENMETRICS)
         announced.resize(announced.size() - suffix_of(family.type).size());
-    text_ += "# HELP " + announced + " " + family.help + "\n# TYPE " + announced + " " +
-             type_word(family.type, notation_) + "\n";
+    _text += "# HELP " + announced + " " + family.help + "\n# TYPE " + announced + " " +
+             type_word(family.type, _notation) + "\n";
 }
 
 void Exposition::add(const Labels& labels, std::variant<std::uint64_t, double> value)
 {
-    std::string sample = name_;
+    std::string sample = _name;
     const char* before = "{";
     for (const auto& [name, text] : labels) {
         sample += before + std::string(name) + "=\"" + label_value(text) + "\"";
         before = ",";
     }
     sample += labels.empty() ? " " : "} ";
-    if (!added_.insert(sample).second)
+    if (!_added.insert(sample).second)
         return;
     char number[64];
     char* const end =
         std::visit([&](auto each) { return std::to_chars(number, std::end(number), each).ptr; }, value);
-    text_ += sample + std::string(number, end) + "\n";
+    _text += sample + std::string(number, end) + "\n";
 }
 
 } // namespace KPRV::kldrcim

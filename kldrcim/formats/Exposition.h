@@ -45,7 +45,7 @@ using Labels = std::vector<std::pair<const char*, std::string>>;
 class Exposition
 {
 public:
-    explicit Exposition(Metrics_Notation notation) : notation_(notation) {}
+    explicit Exposition(Metrics_Notation notation) : _notation(notation) {}
 
     void begin(const Metric_Family& family);
     /// Of the family that was begun last. Labels that it has already are left out: collectors refuse a text
@@ -53,14 +53,14 @@ public:
     void add(const Labels& labels, std::variant<std::uint64_t, double> value);
 
     /// The text with its end.
-    std::string text() const { return text_ + "# EOF\n"; }
+    std::string text() const { return _text + "# EOF\n"; }
 
 private:
-    Metrics_Notation notation_;
-    std::string name_;
+    Metrics_Notation _notation;
+    std::string _name;
     /// Labels of the samples of this family.
-    std::unordered_set<std::string> added_;
-    std::string text_;
+    std::unordered_set<std::string> _added;
+    std::string _text;
 };
 
 } // namespace KPRV::kldrcim

@@ -79,14 +79,14 @@ std::string json_values(const std::vector<Named_Value>& values, unsigned indent)
     return json_object(members, indent);
 }
 
-std::string json_words(std::span<const Value_Meaning> meanings, const Value& value, unsigned indent)
+std::string json_words(std::span<const Value_Meaning> meanings, const Plain_Value& value, unsigned indent)
 {
     if (!value.is_array()) {
         const char* const word = word_of(meanings, value);
         return word ? json_string(word) : "null";
     }
     std::vector<std::string> elements;
-    for (const Value& element : value.elements())
+    for (const Plain_Value& element : value.elements())
         elements.push_back(json_words(meanings, element, indent + 2));
     return json_array(elements, indent);
 }
@@ -108,13 +108,13 @@ std::string json_instance(const Instance_Value& instance, unsigned indent, Words
     return json_object(members, indent);
 }
 
-std::string json_text(const Value& value, unsigned indent)
+std::string json_text(const Plain_Value& value, unsigned indent)
 {
     if (value.null || (is_real(value.type) && !std::isfinite(value.as_real())))
         return "null";
     if (value.is_array()) {
         std::vector<std::string> elements;
-        for (const Value& element : value.elements())
+        for (const Plain_Value& element : value.elements())
             elements.push_back(json_text(element, indent + 2));
         return json_array(elements, indent);
     }

@@ -8,7 +8,7 @@ using namespace broker;
 
 /// JSON with the members in the order of the class, which jsoncpp's sorted objects cannot keep; its quoting
 /// of texts is used. References are object paths as text; a NaN or infinity is null.
-std::string json_text(const Value& value, unsigned indent = 0);
+std::string json_text(const Plain_Value& value, unsigned indent = 0);
 
 /// `{"class": ..., "path": ..., "properties": {...}, "words": {...}}`, nulls included. "words" says what
 /// those numbers mean that have a meaning, under the names of the properties; it is left out where there are
@@ -16,7 +16,8 @@ std::string json_text(const Value& value, unsigned indent = 0);
 std::string json_instance(const Instance_Value& instance, unsigned indent = 0, Words words = Words::LEFT_OUT);
 
 /// What the number, or each number of the array, means: a text, or null.
-std::string json_words(std::span<const Value_Meaning> meanings, const Value& value, unsigned indent = 0);
+std::string json_words(std::span<const Value_Meaning> meanings, const Plain_Value& value,
+                       unsigned indent = 0);
 
 std::string json_string(const std::string& text);
 

@@ -11,7 +11,7 @@ namespace KPRV::kldrcim {
 namespace {
 
 /// More columns than this read better as blocks.
-constexpr std::size_t most_columns = 8;
+constexpr std::size_t MOST_COLUMNS = 8;
 
 /// Columns on a terminal: the bytes of a UTF-8 sequence behind its first do not count.
 std::size_t display_width(const std::string& text)
@@ -91,28 +91,28 @@ std::string values_as_block(const std::vector<Named_Value>& values, const Class_
 
 Instances_Table::Instances_Table(const std::vector<Instance_Value>& first,
                                  const std::vector<std::string>* columns, std::size_t width, Words words)
-    : are_fixed_(columns), words_(words), headings_(columns ? *columns : columns_of(first))
+    : _are_fixed(columns), _words(words), _headings(columns ? *columns : columns_of(first))
 {
-    if (headings_.empty() || headings_.size() > most_columns)
+    if (_headings.empty() || _headings.size() > MOST_COLUMNS)
         return;
     std::vector<std::vector<std::string>> rows;
     rows.reserve(first.size());
     for (const Instance_Value& instance : first)
         rows.push_back(cells(instance));
-    widths_ = widths_of(headings_, rows);
-    std::size_t total = 2 * (headings_.size() - 1);
-    for (const std::size_t column : widths_)
+    _widths = widths_of(_headings, rows);
+    std::size_t total = 2 * (_headings.size() - 1);
+    for (const std::size_t column : _widths)
         total += column;
     if (width && total > width)
-        widths_.clear();
+        _widths.clear();
 }
 
 std::vector<std::string> Instances_Table::cells(const Instance_Value& instance) const
 {
-    const Class_Words class_words(instance.path.class_name, words_);
+    const Class_Words class_words(instance.path.class_name, _words);
     std::vector<std::string> row;
-    for (const std::string& heading : headings_) {
-        const Value* value = instance.property(heading);
+    for (const std::string& heading : _headings) {
+        const Plain_Value* value = instance.property(heading);
         row.push_back(value && !value->null ? visible_text(worded_text(class_words.of(heading), *value))
                                             : "");
     }
@@ -121,22 +121,22 @@ std::vector<std::string> Instances_Table::cells(const Instance_Value& instance) 
 
 std::string Instances_Table::head() const
 {
-    return is_of_blocks() ? "" : head_of(headings_, widths_);
+    return is_of_blocks() ? "" : head_of(_headings, _widths);
 }
 
 std::string Instances_Table::row(const Instance_Value& instance) const
 {
     return is_of_blocks()
                ? path_text(instance.path) + "\n" +
-                     values_as_block(instance.properties, Class_Words(instance.path.class_name, words_))
-               : row_of(cells(instance), widths_);
+                     values_as_block(instance.properties, Class_Words(instance.path.class_name, _words))
+               : row_of(cells(instance), _widths);
 }
 
 bool Instances_Table::has_columns_for(const Instance_Value& instance) const
 {
-    return are_fixed_ || is_of_blocks() ||
+    return _are_fixed || is_of_blocks() ||
            std::ranges::all_of(instance.properties, [&](const Named_Value& property) {
-               return property.value.null || contains_name(headings_, property.name);
+               return property.value.null || contains_name(_headings, property.name);
            });
 }
 

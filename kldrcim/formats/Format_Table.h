@@ -26,13 +26,13 @@ public:
     bool has_columns_for(const Instance_Value& instance) const;
 
 private:
-    bool is_of_blocks() const { return widths_.empty(); }
+    bool is_of_blocks() const { return _widths.empty(); }
     std::vector<std::string> cells(const Instance_Value& instance) const;
 
-    const bool are_fixed_;
-    const Words words_;
-    const std::vector<std::string> headings_;
-    std::vector<std::size_t> widths_;
+    const bool _are_fixed;
+    const Words _words;
+    const std::vector<std::string> _headings;
+    std::vector<std::size_t> _widths;
 };
 
 /// All of them.

@@ -77,17 +77,17 @@ std::string label_lines(const Node_Label& label)
 class Graph_Writer
 {
 public:
-    explicit Graph_Writer(const Topology& topology) : topology_(topology), order_(topology.nodes.size(), 0) {}
+    explicit Graph_Writer(const Topology& topology) : _topology(topology), _order(topology.nodes.size(), 0) {}
 
     void write()
     {
-        for (const Number root : topology_.roots)
+        for (const Number root : _topology.roots)
             walk(root, 0);
-        for (const Number node : met_)
-            put("  " + name_of(node) + " [" + topology_.nodes[node].text + "];\n");
-        for (const Edge& edge : edges_)
+        for (const Number node : _met)
+            put("  " + name_of(node) + " [" + _topology.nodes[node].text + "];\n");
+        for (const Edge& edge : _edges)
             put_edge(edge);
-        for (const Topology::Step_Links& each : topology_.steps)
+        for (const Topology::Step_Links& each : _topology.steps)
             if (each.step->taken == Topology_Step::CROSS_LINK)
                 for (const Topology::Link& link : in_order(each.links))
                     put_edge({link.from, link.to, each.step, false});
@@ -105,7 +105,7 @@ private:
         bool in_tree;
     };
 
-    std::string name_of(Number node) const { return "n" + std::to_string(order_[node]); }
+    std::string name_of(Number node) const { return "n" + std::to_string(_order[node]); }
 
     void put_edge(const Edge& edge) const
     {
@@ -117,15 +117,15 @@ private:
     /// A node that the walk meets again has been gone through, but for what it shows below another one.
     void walk(Number node, Number above)
     {
-        if (order_[node] == 0) {
-            met_.push_back(node);
-            order_[node] = met_.size();
+        if (_order[node] == 0) {
+            _met.push_back(node);
+            _order[node] = _met.size();
         }
-        for (const Topology::Step_Links& each : topology_.steps)
-            for (const Number child : topology_.below(each, node, above)) {
-                const bool is_new = order_[child] == 0;
-                if (known_.insert(std::uint64_t(node) << 32 | child).second)
-                    edges_.push_back({node, child, each.step, is_new});
+        for (const Topology::Step_Links& each : _topology.steps)
+            for (const Number child : _topology.below(each, node, above)) {
+                const bool is_new = _order[child] == 0;
+                if (_known.insert(std::uint64_t(node) << 32 | child).second)
+                    _edges.push_back({node, child, each.step, is_new});
                 walk(child, node);
             }
     }
@@ -135,18 +135,18 @@ private:
     {
         std::vector<Topology::Link> drawn;
         for (const Topology::Link& link : links)
-            if (order_[link.from] != 0 && order_[link.to] != 0)
+            if (_order[link.from] != 0 && _order[link.to] != 0)
                 drawn.push_back(link);
-        std::ranges::stable_sort(drawn, {}, [&](const Topology::Link& link) { return order_[link.from]; });
+        std::ranges::stable_sort(drawn, {}, [&](const Topology::Link& link) { return _order[link.from]; });
         return drawn;
     }
 
-    const Topology& topology_;
+    const Topology& _topology;
     /// From 1 on; 0 for what was not met.
-    std::vector<std::size_t> order_;
-    std::vector<Number> met_;
-    std::vector<Edge> edges_;
-    std::unordered_set<std::uint64_t> known_;
+    std::vector<std::size_t> _order;
+    std::vector<Number> _met;
+    std::vector<Edge> _edges;
+    std::unordered_set<std::uint64_t> _known;
 };
 
 } // namespace

@@ -210,7 +210,7 @@ Node_Label label_of(const Node_Facts& node)
 
 std::string line_of(const Instance_Value& instance, const char* property)
 {
-    const Value* value = instance.property(property);
+    const Plain_Value* value = instance.property(property);
     return value && !value->null ? visible_text(plain_text(*value)) : "";
 }
 

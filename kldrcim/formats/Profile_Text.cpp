@@ -18,7 +18,7 @@ constexpr const char* kind_names[] = {"profile", "subprofile", "element", "softw
 /// The two that register what is implemented here; others by their number.
 std::string organization(const Instance_Value& instance)
 {
-    const Value* value = instance.property("RegisteredOrganization");
+    const Plain_Value* value = instance.property("RegisteredOrganization");
     if (!value || value->null)
         return "";
     const std::uint64_t number = value->as_uint();

@@ -14,14 +14,14 @@ namespace {
 class Json_Writer final : public Result_Writer
 {
 public:
-    explicit Json_Writer(Words words) : words_(words) {}
+    explicit Json_Writer(Words words) : _words(words) {}
 
-    bool instance(Instance_Value&& instance) override { return element(json_instance(instance, 2, words_)); }
+    bool instance(Instance_Value&& instance) override { return element(json_instance(instance, 2, _words)); }
     bool path(Path_Value&& path) override { return element(json_string(path_text(path))); }
 
     void end(bool complete) override
     {
-        if (is_begun_)
+        if (_is_begun)
             put("\n]\n");
         else if (complete)
             put("[]\n");
@@ -30,14 +30,14 @@ public:
 private:
     bool element(const std::string& text)
     {
-        put(is_begun_ ? ",\n  " : "[\n  ");
+        put(_is_begun ? ",\n  " : "[\n  ");
         put(text);
-        is_begun_ = true;
+        _is_begun = true;
         return true;
     }
 
-    const Words words_;
-    bool is_begun_ = false;
+    const Words _words;
+    bool _is_begun = false;
 };
 
 /// What has a line for each path.
@@ -54,11 +54,11 @@ public:
 class Json_Lines_Writer final : public Result_Writer
 {
 public:
-    explicit Json_Lines_Writer(Words words) : words_(words) {}
+    explicit Json_Lines_Writer(Words words) : _words(words) {}
 
     bool instance(Instance_Value&& instance) override
     {
-        put(json_line(json_instance(instance, 0, words_)));
+        put(json_line(json_instance(instance, 0, _words)));
         return true;
     }
     bool path(Path_Value&& path) override
@@ -69,7 +69,7 @@ public:
     void end(bool) override {}
 
 private:
-    const Words words_;
+    const Words _words;
 };
 
 class Mof_Writer final : public Line_Writer
@@ -87,49 +87,49 @@ class Table_Writer final : public Line_Writer
 {
 public:
     Table_Writer(const std::vector<std::string>* columns, std::size_t width, Words words)
-        : columns_(columns), width_(width), words_(words)
+        : _columns(columns), _width(width), _words(words)
     {
     }
 
     bool instance(Instance_Value&& instance) override
     {
-        if (table_ && !table_->has_columns_for(instance))
-            table_.reset();
-        if (table_) {
-            put(table_->between() + table_->row(instance));
+        if (_table && !_table->has_columns_for(instance))
+            _table.reset();
+        if (_table) {
+            put(_table->between() + _table->row(instance));
             return true;
         }
-        first_.push_back(std::move(instance));
-        if (first_.size() == rows_that_size)
+        _first.push_back(std::move(instance));
+        if (_first.size() == ROWS_THAT_SIZE)
             begin();
         return true;
     }
 
     void end(bool) override
     {
-        if (!first_.empty())
+        if (!_first.empty())
             begin();
     }
 
 private:
     void begin()
     {
-        put(is_begun_ ? "\n" : "");
-        table_.emplace(first_, columns_, width_, words_);
-        put(table_->head());
-        for (std::size_t i = 0; i < first_.size(); ++i)
-            put((i == 0 ? "" : table_->between()) + table_->row(first_[i]));
-        first_.clear();
-        is_begun_ = true;
+        put(_is_begun ? "\n" : "");
+        _table.emplace(_first, _columns, _width, _words);
+        put(_table->head());
+        for (std::size_t i = 0; i < _first.size(); ++i)
+            put((i == 0 ? "" : _table->between()) + _table->row(_first[i]));
+        _first.clear();
+        _is_begun = true;
     }
 
-    const std::vector<std::string>* const columns_;
-    const std::size_t width_;
-    const Words words_;
+    const std::vector<std::string>* const _columns;
+    const std::size_t _width;
+    const Words _words;
     /// Of a table that is not sized yet.
-    std::vector<Instance_Value> first_;
-    std::optional<Instances_Table> table_;
-    bool is_begun_ = false;
+    std::vector<Instance_Value> _first;
+    std::optional<Instances_Table> _table;
+    bool _is_begun = false;
 };
 
 } // namespace

@@ -31,6 +31,6 @@ std::unique_ptr<Result_Writer> mof_writer();
 std::unique_ptr<Result_Writer> table_writer(const std::vector<std::string>* columns, std::size_t width,
                                             Words words);
 
-inline constexpr std::size_t rows_that_size = 1000;
+inline constexpr std::size_t ROWS_THAT_SIZE = 1000;
 
 } // namespace KPRV::kldrcim

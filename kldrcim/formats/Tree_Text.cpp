@@ -38,29 +38,29 @@ std::vector<Occurrence> shown_below(const Topology& topology, const Occurrence& 
 class Tree_Writer
 {
 public:
-    Tree_Writer(const Topology& topology, const Twigs& twigs) : topology_(topology), twigs_(twigs) {}
+    Tree_Writer(const Topology& topology, const Twigs& twigs) : _topology(topology), _twigs(twigs) {}
 
-    /// `before_` is what stands before the lines below.
+    /// `_before` is what stands before the lines below.
     void write(const Occurrence& occurrence)
     {
-        put(topology_.nodes[occurrence.node].text);
+        put(_topology.nodes[occurrence.node].text);
         put("\n");
-        const std::vector<Occurrence> below = shown_below(topology_, occurrence);
+        const std::vector<Occurrence> below = shown_below(_topology, occurrence);
         for (std::size_t i = 0; i < below.size(); ++i) {
             const bool is_last = i + 1 == below.size();
-            const std::size_t size = before_.size();
-            put(before_);
-            put(is_last ? twigs_.last_child : twigs_.child);
-            before_ += is_last ? twigs_.nothing : twigs_.passing;
+            const std::size_t size = _before.size();
+            put(_before);
+            put(is_last ? _twigs.last_child : _twigs.child);
+            _before += is_last ? _twigs.nothing : _twigs.passing;
             write(below[i]);
-            before_.resize(size);
+            _before.resize(size);
         }
     }
 
 private:
-    const Topology& topology_;
-    const Twigs& twigs_;
-    std::string before_;
+    const Topology& _topology;
+    const Twigs& _twigs;
+    std::string _before;
 };
 
 /// The lines behind the first moved to the right.

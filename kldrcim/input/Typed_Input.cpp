@@ -87,36 +87,36 @@ std::string path_error_text(const std::string& text, const Path_Error& error)
            error.expected + ": " + text;
 }
 
-bool typed_scalar(const Class_Catalogue& catalogue, CMPIType type, const std::string& text, Value& value,
-                  std::string& error)
+bool typed_scalar(const Class_Catalogue& catalogue, CMPIType type, const std::string& text,
+                  Plain_Value& value, std::string& error)
 {
     bool fits = true;
     if (type == CMPI_string) {
-        value = Value::text(unquoted(text));
+        value = Plain_Value::text(unquoted(text));
     } else if (type == CMPI_dateTime) {
-        value = Value::datetime(unquoted(text));
+        value = Plain_Value::datetime(unquoted(text));
         fits = is_datetime_text(value.as_text());
     } else if (type == CMPI_boolean) {
-        value = Value::boolean(same_name(text, "true"));
+        value = Plain_Value::boolean(same_name(text, "true"));
         fits = value.as_bool() || same_name(text, "false");
     } else if (type == CMPI_ref) {
         Path_Value path;
         if (!typed_path(catalogue, unquoted(text), path, error))
             return false;
-        value = Value::path(std::move(path));
+        value = Plain_Value::path(std::move(path));
     } else if (is_real(type)) {
         double number = 0;
         fits = read_real(text, number);
-        value = Value::real(type, number);
+        value = Plain_Value::real(type, number);
     } else if (is_signed(type)) {
         std::int64_t number = 0;
         fits = read_integer(text, number) && number >= smallest(type) &&
                number <= static_cast<std::int64_t>(largest(type));
-        value = Value::signed_number(type, number);
+        value = Plain_Value::signed_number(type, number);
     } else if (is_unsigned(type) || type == CMPI_char16) {
         std::uint64_t number = 0;
         fits = read_integer(text, number) && number <= largest(type);
-        value = Value::unsigned_number(type, number);
+        value = Plain_Value::unsigned_number(type, number);
     } else {
         error = "values of type " + type_word_name(type) + " cannot be given on the command line";
         return false;
@@ -171,19 +171,19 @@ bool typed_path(const Class_Catalogue& catalogue, const std::string& text, Path_
 }
 
 bool typed_value(const Class_Catalogue& catalogue, CMPIType type, const std::string& text,
-                 const std::string& what, Value& value, std::string& error)
+                 const std::string& what, Plain_Value& value, std::string& error)
 {
     bool fits = true;
     if (text == "NULL") {
-        value = Value::null_of(type);
+        value = Plain_Value::null_of(type);
     } else if (type & CMPI_ARRAY) {
         CMPIType element_type = static_cast<CMPIType>(type & ~CMPI_ARRAY);
-        std::vector<Value> elements;
+        std::vector<Plain_Value> elements;
         for (const std::string& element : is_list(text) ? list_elements(text) : std::vector{text}) {
             elements.emplace_back();
             fits = fits && typed_scalar(catalogue, element_type, element, elements.back(), error);
         }
-        value = Value::array(element_type, std::move(elements));
+        value = Plain_Value::array(element_type, std::move(elements));
     } else {
         fits = typed_scalar(catalogue, type, text, value, error);
     }
@@ -192,36 +192,36 @@ bool typed_value(const Class_Catalogue& catalogue, CMPIType type, const std::str
     return fits;
 }
 
-Value guessed_value(const std::string& text)
+Plain_Value guessed_value(const std::string& text)
 {
     std::uint64_t number = 0;
     std::int64_t negative = 0;
     double real = 0;
     if (text == "NULL")
-        return Value::null_of(CMPI_string);
+        return Plain_Value::null_of(CMPI_string);
     if (is_list(text)) {
-        std::vector<Value> elements, texts;
+        std::vector<Plain_Value> elements, texts;
         bool alike = true;
         for (const std::string& element : list_elements(text)) {
             elements.push_back(guessed_value(element));
-            texts.push_back(Value::text(unquoted(element)));
+            texts.push_back(Plain_Value::text(unquoted(element)));
             alike = alike && elements.back().type == elements.front().type;
         }
         CMPIType type = elements.empty() || !alike ? CMPIType(CMPI_string) : elements.front().type;
-        return Value::array(type, alike ? std::move(elements) : std::move(texts));
+        return Plain_Value::array(type, alike ? std::move(elements) : std::move(texts));
     }
     if (same_name(text, "true") || same_name(text, "false"))
-        return Value::boolean(same_name(text, "true"));
+        return Plain_Value::boolean(same_name(text, "true"));
     if (read_integer(text, number))
-        return Value::unsigned_number(CMPI_uint64, number);
+        return Plain_Value::unsigned_number(CMPI_uint64, number);
     if (read_integer(text, negative))
-        return Value::signed_number(CMPI_sint64, negative);
+        return Plain_Value::signed_number(CMPI_sint64, negative);
     if (!text.empty() && std::string_view("+-.0123456789").find(text[0]) != std::string_view::npos &&
         read_real(text, real))
-        return Value::real(CMPI_real64, real);
+        return Plain_Value::real(CMPI_real64, real);
     if (is_datetime_text(text))
-        return Value::datetime(text);
-    return Value::text(unquoted(text));
+        return Plain_Value::datetime(text);
+    return Plain_Value::text(unquoted(text));
 }
 
 bool typed_assignment(const Class_Catalogue& catalogue, const std::string& class_name,

@@ -16,10 +16,10 @@ bool typed_path(const Class_Catalogue& catalogue, const std::string& text, Path_
 
 /// A value for a property or parameter of that type; `what` names it in the error.
 bool typed_value(const Class_Catalogue& catalogue, CMPIType type, const std::string& text,
-                 const std::string& what, Value& value, std::string& error);
+                 const std::string& what, Plain_Value& value, std::string& error);
 
 /// The value that the text looks like.
-Value guessed_value(const std::string& text);
+Plain_Value guessed_value(const std::string& text);
 
 /// "NAME=VALUE" for a property of the class, or for an in parameter if a method is given.
 bool typed_assignment(const Class_Catalogue& catalogue, const std::string& class_name,

@@ -11,46 +11,46 @@ namespace {
 class Local_Subscription final : public Open_Subscription
 {
 public:
-    Local_Subscription(Host& host, const std::string& indication_class, Indication_Sink sink)
-        : host_(host), subscription_(std::in_place, host, indication_class)
+    Local_Subscription(Local_Server& server, const std::string& indication_class, Indication_Sink sink)
+        : _server(server), _subscription(std::in_place, server, indication_class)
     {
-        host_.set_sink([sink = std::move(sink)](const auto& name_space, const Instance_Value& indication) {
+        _server.set_sink([sink = std::move(sink)](const auto& name_space, const Instance_Value& indication) {
             sink(name_space, indication);
             return CMPI_RC_OK;
         });
     }
     ~Local_Subscription() override
     {
-        subscription_.reset();
-        host_.set_sink({});
+        _subscription.reset();
+        _server.set_sink({});
     }
 
-    CMPIrc add(const std::string& name_space) { return subscription_->add(name_space); }
+    CMPIrc add(const std::string& name_space) { return _subscription->add(name_space); }
 
 private:
-    Host& host_;
-    std::optional<Subscription> subscription_;
+    Local_Server& _server;
+    std::optional<Subscription> _subscription;
 };
 
 } // namespace
 
 Result Local_Connection::run(Request request, Receiver* receiver)
 {
-    return host_.run(std::move(request), receiver);
+    return _server.run(std::move(request), receiver);
 }
 
 std::vector<std::string> Local_Connection::provider_kinds(const std::string& class_name)
 {
     std::vector<std::string> kinds;
     for (const Mi_Kind kind : mi_kinds)
-        if (host_.module().factory(class_name, kind))
+        if (_server.module().factory(class_name, kind))
             kinds.push_back(lower_name(mi_kind_name(kind)));
     return kinds;
 }
 
 bool Local_Connection::is_own_module() const
 {
-    return host_.catalogue().module_name() == "kldrprovider_Module";
+    return _server.catalogue().module_name() == "kldrprovider_Module";
 }
 
 bool Local_Connection::serves(const std::string& name_space, std::string& error)
@@ -70,7 +70,7 @@ std::unique_ptr<Open_Subscription> Local_Connection::subscribe(const std::string
                                                                const std::vector<std::string>& name_spaces,
                                                                Indication_Sink sink, std::string& error)
 {
-    auto subscription = std::make_unique<Local_Subscription>(host_, indication_class, std::move(sink));
+    auto subscription = std::make_unique<Local_Subscription>(_server, indication_class, std::move(sink));
     for (const std::string& name_space : name_spaces)
         if (const CMPIrc rc = subscription->add(name_space); rc != CMPI_RC_OK) {
             error = code_text(rc) + ": " + indication_class + " takes no subscription for " + name_space;
@@ -82,7 +82,7 @@ std::unique_ptr<Open_Subscription> Local_Connection::subscribe(const std::string
 bool Local_Connection::is_at_work()
 {
     // The thread of a test stays attached to its server until it ends.
-    return host_.ledger().live(Object_Kind::CONTEXT) != 0;
+    return _server.ledger().live(Object_Kind::CONTEXT) != 0;
 }
 
 } // namespace KPRV::kldrcim

@@ -22,22 +22,22 @@ bool is_loaded(const char* library)
 std::unique_ptr<Local_Connection> open_module(const Cli_Options& options, std::string& error,
                                               std::string& warning)
 {
-    Host_Options host_options;
-    host_options.user = options.user;
-    host_options.name_space = options.name_space;
+    Server_Options server_options;
+    server_options.user = options.user;
+    server_options.name_space = options.name_space;
     // A large answer should not be outweighed by what remembers its objects, nor should what runs for months.
-    host_options.most_shells = options.verb == "serve" ? 1 << 10 : 1 << 14;
-    host_options.most_object_memory = std::size_t(4) << 20;
-    std::unique_ptr<Host> host =
-        Host::open(options.module.empty() ? default_module() : options.module, host_options, error);
-    if (!host) {
+    server_options.most_shells = options.verb == "serve" ? 1 << 10 : 1 << 14;
+    server_options.most_object_memory = std::size_t(4) << 20;
+    std::unique_ptr<Local_Server> server =
+        Local_Server::open(options.module.empty() ? default_module() : options.module, server_options, error);
+    if (!server) {
         error = "cannot load the provider module: " + error;
         return nullptr;
     }
     if (!options.server_instances.empty() &&
-        !read_server_instances(options.server_instances, host->catalogue(), host->store(), error))
+        !read_server_instances(options.server_instances, server->catalogue(), server->store(), error))
         return nullptr;
-    auto connection = std::make_unique<Local_Connection>(std::move(host));
+    auto connection = std::make_unique<Local_Connection>(std::move(server));
     if (!connection->serves(options.name_space, error))
         return nullptr;
     // Without its adapter library the module loads and finds nothing, which should not look like "no

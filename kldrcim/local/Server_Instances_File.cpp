@@ -32,7 +32,7 @@ class Reader
 {
 public:
     Reader(std::string text, const Class_Catalogue& catalogue, Server_Store& store)
-        : text_(std::move(text)), catalogue_(catalogue), store_(store)
+        : _text(std::move(text)), _catalogue(catalogue), _store(store)
     {
     }
 
@@ -57,7 +57,7 @@ private:
         Json::Value value;
         std::string errors;
         try {
-            if (reader->parse(text_.data(), text_.data() + text_.size(), &value, &errors))
+            if (reader->parse(_text.data(), _text.data() + _text.size(), &value, &errors))
                 return value;
         } catch (const std::exception&) {
             throw Refused(1, "nested too deeply");
@@ -73,9 +73,9 @@ private:
 
     [[noreturn]] void refuse(const Json::Value& value, const std::string& reason) const
     {
-        auto end = text_.begin() + std::min<std::ptrdiff_t>(value.getOffsetStart(),
-                                                            static_cast<std::ptrdiff_t>(text_.size()));
-        throw Refused(1 + static_cast<std::size_t>(std::count(text_.begin(), end, '\n')), reason);
+        auto end = _text.begin() + std::min<std::ptrdiff_t>(value.getOffsetStart(),
+                                                            static_cast<std::ptrdiff_t>(_text.size()));
+        throw Refused(1 + static_cast<std::size_t>(std::count(_text.begin(), end, '\n')), reason);
     }
 
     void check_members(const Json::Value& entry) const
@@ -105,21 +105,21 @@ private:
         check_members(entry);
         const std::string name_space = text_member(entry, "namespace", true);
         if (entry.isMember("refuses")) {
-            store_.refuse(name_space, read_refusal(entry));
+            _store.refuse(name_space, read_refusal(entry));
             return;
         }
         const std::string class_name = text_member(entry, "class", true);
         const std::string superclass = text_member(entry, "superclass", false);
-        if (!superclass.empty() && catalogue_.is_known() && !catalogue_.find(superclass))
+        if (!superclass.empty() && _catalogue.is_known() && !_catalogue.find(superclass))
             refuse(entry["superclass"], "the module has no class " + superclass);
         if (!entry.isMember("properties")) {
-            store_.add_class(name_space, class_name, superclass);
+            _store.add_class(name_space, class_name, superclass);
             return;
         }
         // Only an entry that is good to its end is put in.
         Instance_Value instance = read_instance(entry["properties"], class_name, superclass);
-        store_.add_class(name_space, class_name, superclass);
-        store_.add(name_space, std::move(instance));
+        _store.add_class(name_space, class_name, superclass);
+        _store.add(name_space, std::move(instance));
     }
 
     CMPIrc read_refusal(const Json::Value& entry) const
@@ -139,48 +139,49 @@ private:
         if (!properties.isObject())
             refuse(properties, "expected the properties: an object");
         Instance_Value instance = {{.class_name = class_name}, {}};
-        const Class_Info* own = catalogue_.find(class_name);
-        const Class_Info* info = own || superclass.empty() ? own : catalogue_.find(superclass);
+        const Class_Info* own = _catalogue.find(class_name);
+        const Class_Info* info = own || superclass.empty() ? own : _catalogue.find(superclass);
         for (const std::string& name : properties.getMemberNames()) {
             const Json::Value& written = properties[name];
             const Feature_Info* feature = info ? info->property(name) : nullptr;
             // A subclass of its own may have properties of its own.
             if (own && !feature)
                 refuse(written, class_name + " has no property \"" + name + "\"");
-            Value value = feature ? typed(written, feature->type, class_name + "." + name)
-                                  : guessed(written, class_name + "." + name);
+            Plain_Value value = feature ? typed(written, feature->type, class_name + "." + name)
+                                        : guessed(written, class_name + "." + name);
             const std::string& spelled = feature ? feature->name : name;
             set_value(instance.properties, spelled, std::move(value));
         }
         // In the order of the class: members of JSON have none.
         for (const Feature_Info& feature : info ? info->properties : std::vector<Feature_Info>())
-            if (const Value* value = instance.property(feature.name); feature.key && value && !value->null)
+            if (const Plain_Value* value = instance.property(feature.name);
+                feature.key && value && !value->null)
                 set_value(instance.path.keys, feature.name, *value);
         return instance;
     }
 
-    Value typed(const Json::Value& written, CMPIType type, const std::string& what) const
+    Plain_Value typed(const Json::Value& written, CMPIType type, const std::string& what) const
     {
         if (written.isNull())
-            return Value::null_of(type);
+            return Plain_Value::null_of(type);
         if (type & CMPI_ARRAY) {
             const auto element_type = static_cast<CMPIType>(type & ~CMPI_ARRAY);
-            std::vector<Value> elements;
+            std::vector<Plain_Value> elements;
             if (!written.isArray())
                 refuse_type(written, type, what);
             for (const Json::Value& element : written)
                 elements.push_back(typed(element, element_type, what));
-            return Value::array(element_type, std::move(elements));
+            return Plain_Value::array(element_type, std::move(elements));
         }
         const bool is_text = type == CMPI_string || type == CMPI_dateTime || type == CMPI_ref;
         const bool is_truth = type == CMPI_boolean;
         if (is_text ? !written.isString() : is_truth ? !written.isBool() : !is_number(written))
             refuse_type(written, type, what);
         if (type == CMPI_string)
-            return Value::text(written.asString());
-        Value value;
+            return Plain_Value::text(written.asString());
+        Plain_Value value;
         std::string error;
-        if (!typed_value(catalogue_, type, written.asString(), what, value, error))
+        if (!typed_value(_catalogue, type, written.asString(), what, value, error))
             refuse(written, error);
         return value;
     }
@@ -193,36 +194,36 @@ private:
     }
 
     /// A value of a property that no class declares: by how it is written.
-    Value guessed(const Json::Value& written, const std::string& what) const
+    Plain_Value guessed(const Json::Value& written, const std::string& what) const
     {
         if (written.isNull())
-            return Value::null_of(CMPI_string);
+            return Plain_Value::null_of(CMPI_string);
         if (written.isArray()) {
-            std::vector<Value> elements;
+            std::vector<Plain_Value> elements;
             for (const Json::Value& element : written) {
                 elements.push_back(guessed(element, what));
                 if (element.isArray() || elements.back().type != elements.front().type)
                     refuse(element, what + ": the elements of an array are values of one type");
             }
             const CMPIType type = elements.empty() ? CMPIType(CMPI_string) : elements.front().type;
-            return Value::array(type, std::move(elements));
+            return Plain_Value::array(type, std::move(elements));
         }
         if (written.isString())
-            return Value::text(written.asString());
+            return Plain_Value::text(written.asString());
         if (written.isBool())
-            return Value::boolean(written.asBool());
+            return Plain_Value::boolean(written.asBool());
         if (written.isUInt64())
-            return Value::unsigned_number(CMPI_uint64, written.asUInt64());
+            return Plain_Value::unsigned_number(CMPI_uint64, written.asUInt64());
         if (written.isInt64())
-            return Value::signed_number(CMPI_sint64, written.asInt64());
+            return Plain_Value::signed_number(CMPI_sint64, written.asInt64());
         if (written.isDouble())
-            return Value::real(CMPI_real64, written.asDouble());
+            return Plain_Value::real(CMPI_real64, written.asDouble());
         refuse(written, what + ": an object is no value of a property");
     }
 
-    std::string text_;
-    const Class_Catalogue& catalogue_;
-    Server_Store& store_;
+    std::string _text;
+    const Class_Catalogue& _catalogue;
+    Server_Store& _store;
 };
 
 } // namespace

@@ -10,104 +10,104 @@ using Tag = Xml_Tag;
 using At = Xml_Attribute;
 
 /// What is sent at a time.
-constexpr std::size_t piece_size = std::size_t(64) << 10;
-constexpr int last_status = 29;
+constexpr std::size_t PIECE_SIZE = std::size_t(64) << 10;
+constexpr int LAST_STATUS = 29;
 
 } // namespace
 
 CMPIrc wire_status(CMPIrc rc)
 {
-    constexpr int no_more_elements = 18, no_response = 19;
-    const bool known = rc > 0 && rc <= last_status && rc != no_more_elements && rc != no_response;
+    constexpr int NO_MORE_ELEMENTS = 18, no_response = 19;
+    const bool known = rc > 0 && rc <= LAST_STATUS && rc != NO_MORE_ELEMENTS && rc != no_response;
     return known ? rc : CMPIrc(CMPI_RC_ERR_FAILED);
 }
 
-Answer::Answer(const Cim_Message& message, Body_Sink& sink) : message_(message), sink_(sink), writer_(text_)
+Answer::Answer(const Cim_Message& message, Body_Sink& sink) : _message(message), _sink(sink), _writer(_text)
 {
-    text_ += xml_declaration;
-    writer_.open(Tag::CIM).attribute(At::CIMVERSION, "2.0").attribute(At::DTDVERSION, "2.0");
-    writer_.open(Tag::MESSAGE).attribute(At::ID, message_.id).attribute(At::PROTOCOLVERSION, "1.0");
-    if (message_.is_multiple)
-        writer_.open(Tag::MULTIRSP);
+    _text += xml_declaration;
+    _writer.open(Tag::CIM).attribute(At::CIMVERSION, "2.0").attribute(At::DTDVERSION, "2.0");
+    _writer.open(Tag::MESSAGE).attribute(At::ID, _message.id).attribute(At::PROTOCOLVERSION, "1.0");
+    if (_message.is_multiple)
+        _writer.open(Tag::MULTIRSP);
     // The end of the tag belongs to what stands before a call.
-    writer_.text({});
+    _writer.text({});
 }
 
 void Answer::begin(const Cim_Call& call)
 {
-    call_ = &call;
-    from_ = text_.size();
-    in_values_ = sent_ = false;
+    _call = &call;
+    _from = _text.size();
+    _in_values = _sent = false;
     open_response();
 }
 
 void Answer::open_response()
 {
-    writer_.open(Tag::SIMPLERSP);
-    writer_.open(call_->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
-        .attribute(At::NAME, call_->name);
+    _writer.open(Tag::SIMPLERSP);
+    _writer.open(_call->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
+        .attribute(At::NAME, _call->name);
 }
 
 void Answer::open_values()
 {
-    if (!in_values_)
-        writer_.open(Tag::IRETURNVALUE);
-    in_values_ = true;
+    if (!_in_values)
+        _writer.open(Tag::IRETURNVALUE);
+    _in_values = true;
 }
 
 Xml_Writer& Answer::object()
 {
     open_values();
-    return writer_;
+    return _writer;
 }
 
 bool Answer::object_done()
 {
-    writer_.text("\n");
-    sent_ = sent_ || text_.size() >= piece_size;
+    _writer.text("\n");
+    _sent = _sent || _text.size() >= PIECE_SIZE;
     return send_if_long();
 }
 
 bool Answer::send_if_long()
 {
-    if (text_.size() < piece_size)
+    if (_text.size() < PIECE_SIZE)
         return true;
-    unread_ = !sink_.send(std::move(text_));
-    text_.clear();
-    return !unread_;
+    _unread = !_sink.send(std::move(_text));
+    _text.clear();
+    return !_unread;
 }
 
 Xml_Writer& Answer::behind_values()
 {
-    if (in_values_)
-        writer_.close(Tag::IRETURNVALUE);
-    in_values_ = false;
-    return writer_;
+    if (_in_values)
+        _writer.close(Tag::IRETURNVALUE);
+    _in_values = false;
+    return _writer;
 }
 
 void Answer::succeed()
 {
     behind_values()
-        .close(call_->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
+        .close(_call->is_extrinsic ? Tag::METHODRESPONSE : Tag::IMETHODRESPONSE)
         .close(Tag::SIMPLERSP);
-    if (message_.is_multiple)
+    if (_message.is_multiple)
         send_if_long();
 }
 
 bool Answer::fail(CMPIrc rc, const std::string& text)
 {
-    if (sent_)
+    if (_sent)
         return true;
     // A tag that is not at its end would go on in the new text.
-    writer_.text({});
-    text_.erase(from_);
-    in_values_ = false;
+    _writer.text({});
+    _text.erase(_from);
+    _in_values = false;
     open_response();
     const CMPIrc status = wire_status(rc);
     std::string description = text.empty() ? status_name(rc) : text;
     if (status != rc && !text.empty())
         description = std::string(status_name(rc)) + ": " + text;
-    writer_.open(Tag::ERROR)
+    _writer.open(Tag::ERROR)
         .attribute(At::CODE, std::to_string(status))
         .attribute(At::DESCRIPTION, description)
         .close(Tag::ERROR);
@@ -117,10 +117,10 @@ bool Answer::fail(CMPIrc rc, const std::string& text)
 
 void Answer::end()
 {
-    if (message_.is_multiple)
-        writer_.close(Tag::MULTIRSP);
-    writer_.close(Tag::MESSAGE).close(Tag::CIM);
-    text_ += '\n';
+    if (_message.is_multiple)
+        _writer.close(Tag::MULTIRSP);
+    _writer.close(Tag::MESSAGE).close(Tag::CIM);
+    _text += '\n';
 }
 
 } // namespace KPRV::kldrcim

@@ -44,26 +44,26 @@ public:
     void end();
 
     /// True once a piece has been sent that nobody took.
-    bool is_unread() const { return unread_; }
+    bool is_unread() const { return _unread; }
 
     /// What has not been sent.
-    std::string take_rest() { return std::move(text_); }
+    std::string take_rest() { return std::move(_text); }
 
 private:
     void open_response();
     /// False if nobody reads any more.
     bool send_if_long();
 
-    const Cim_Message& message_;
-    const Cim_Call* call_ = nullptr;
-    Body_Sink& sink_;
-    std::string text_;
-    Xml_Writer writer_;
+    const Cim_Message& _message;
+    const Cim_Call* _call = nullptr;
+    Body_Sink& _sink;
+    std::string _text;
+    Xml_Writer _writer;
     /// Where in the text the answer to the call begins, unless a part of it has been sent.
-    std::size_t from_ = 0;
-    bool in_values_ = false;
-    bool sent_ = false;
-    bool unread_ = false;
+    std::size_t _from = 0;
+    bool _in_values = false;
+    bool _sent = false;
+    bool _unread = false;
 };
 
 /// "CIM_ERR_NOT_FOUND" of what a client is told: the codes beyond those of clients become 1.

@@ -7,68 +7,68 @@ namespace KPRV::kldrcim {
 
 bool Body_Pipe::send(std::string&& text)
 {
-    const Auto_Lock lock(mutex_);
-    while (bytes_ >= most_bytes && !closed_)
-        changed_.wait(mutex_);
-    if (closed_)
+    const Auto_Lock lock(_mutex);
+    while (_bytes >= MOST_BYTES && !_closed)
+        _changed.wait(_mutex);
+    if (_closed)
         return false;
-    bytes_ += text.size();
-    pieces_.push_back(std::move(text));
-    changed_.notify_all();
+    _bytes += text.size();
+    _pieces.push_back(std::move(text));
+    _changed.notify_all();
     return true;
 }
 
 void Body_Pipe::finish(bool broken)
 {
-    const Auto_Lock lock(mutex_);
-    finished_ = true;
-    broken_ = broken;
-    changed_.notify_all();
+    const Auto_Lock lock(_mutex);
+    _finished = true;
+    _broken = broken;
+    _changed.notify_all();
 }
 
 void Body_Pipe::close()
 {
-    const Auto_Lock lock(mutex_);
-    closed_ = true;
-    changed_.notify_all();
+    const Auto_Lock lock(_mutex);
+    _closed = true;
+    _changed.notify_all();
 }
 
 void Body_Pipe::wait_for_piece()
 {
-    while (pieces_.empty() && !finished_ && !closed_)
-        changed_.wait(mutex_);
+    while (_pieces.empty() && !_finished && !_closed)
+        _changed.wait(_mutex);
 }
 
 bool Body_Pipe::wait()
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     wait_for_piece();
-    return !pieces_.empty();
+    return !_pieces.empty();
 }
 
 std::size_t Body_Pipe::read(char* to, std::size_t size)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     wait_for_piece();
-    if (pieces_.empty())
+    if (_pieces.empty())
         return 0;
-    const std::string& piece = pieces_.front();
-    const std::size_t count = std::min(size, piece.size() - taken_);
-    std::memcpy(to, piece.data() + taken_, count);
-    taken_ += count;
-    bytes_ -= count;
-    if (taken_ == piece.size()) {
-        pieces_.pop_front();
-        taken_ = 0;
+    const std::string& piece = _pieces.front();
+    const std::size_t count = std::min(size, piece.size() - _taken);
+    std::memcpy(to, piece.data() + _taken, count);
+    _taken += count;
+    _bytes -= count;
+    if (_taken == piece.size()) {
+        _pieces.pop_front();
+        _taken = 0;
     }
-    changed_.notify_all();
+    _changed.notify_all();
     return count;
 }
 
 bool Body_Pipe::is_broken() const
 {
-    const Auto_Lock lock(mutex_);
-    return broken_ || closed_;
+    const Auto_Lock lock(_mutex);
+    return _broken || _closed;
 }
 
 } // namespace KPRV::kldrcim

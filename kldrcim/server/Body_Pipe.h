@@ -13,7 +13,7 @@ namespace KPRV::kldrcim {
 class Body_Pipe final : public Body_Sink
 {
 public:
-    static constexpr std::size_t most_bytes = std::size_t(4) << 20;
+    static constexpr std::size_t MOST_BYTES = std::size_t(4) << 20;
 
     bool send(std::string&& text) override;
     /// Nothing more comes. A broken answer has no end.
@@ -29,17 +29,17 @@ public:
     bool is_broken() const;
 
 private:
-    void wait_for_piece() REQUIRES(mutex_);
+    void wait_for_piece() REQUIRES(_mutex);
 
-    mutable Standard_Mutex<> mutex_;
-    std::condition_variable_any changed_;
-    std::deque<std::string> pieces_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::condition_variable_any _changed;
+    std::deque<std::string> _pieces GUARDED_BY(_mutex);
     /// What has been read of the first piece.
-    std::size_t taken_ GUARDED_BY(mutex_) = 0;
-    std::size_t bytes_ GUARDED_BY(mutex_) = 0;
-    bool finished_ GUARDED_BY(mutex_) = false;
-    bool broken_ GUARDED_BY(mutex_) = false;
-    bool closed_ GUARDED_BY(mutex_) = false;
+    std::size_t _taken GUARDED_BY(_mutex) = 0;
+    std::size_t _bytes GUARDED_BY(_mutex) = 0;
+    bool _finished GUARDED_BY(_mutex) = false;
+    bool _broken GUARDED_BY(_mutex) = false;
+    bool _closed GUARDED_BY(_mutex) = false;
 };
 
 } // namespace KPRV::kldrcim

@@ -13,9 +13,9 @@ using Tag = Xml_Tag;
 using At = Xml_Attribute;
 
 /// No class has so many properties.
-constexpr std::size_t most_names = 1000;
+constexpr std::size_t MOST_NAMES = 1000;
 /// Of one message.
-constexpr std::size_t most_calls = 1000;
+constexpr std::size_t MOST_CALLS = 1000;
 
 [[noreturn]] void refuse_message(const std::string& text)
 {
@@ -144,8 +144,8 @@ Cim_Message read_message(const Xml_Document& document)
         return message;
     }
     for (const Xml_Node each : request.children()) {
-        if (message.calls.size() == most_calls)
-            throw Http_Refusal{413, nullptr, "more than " + std::to_string(most_calls) + " requests"};
+        if (message.calls.size() == MOST_CALLS)
+            throw Http_Refusal{413, nullptr, "more than " + std::to_string(MOST_CALLS) + " requests"};
         message.calls.push_back(read_call(each));
     }
     // Some clients send one as they would send many.
@@ -187,15 +187,15 @@ Parameters::Parameters(const Cim_Call& call, std::string_view known)
         if (!is_known)
             throw Wire_Error::status(CMPI_RC_ERR_NOT_SUPPORTED,
                                      call.name + " has no parameter " + std::string(name.substr(0, 64)));
-        if (std::ranges::any_of(values_, [&](const auto& value) { return same_name(value.first, name); }))
+        if (std::ranges::any_of(_values, [&](const auto& value) { return same_name(value.first, name); }))
             throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER, std::string(name) + " is there twice");
-        values_.emplace_back(name, each.first());
+        _values.emplace_back(name, each.first());
     }
 }
 
 Xml_Node Parameters::find(std::string_view name) const
 {
-    for (const auto& [each, node] : values_)
+    for (const auto& [each, node] : _values)
         if (same_name(each, name))
             return node;
     return {};
@@ -212,7 +212,7 @@ Xml_Node Parameters::required(std::string_view name) const
 namespace {
 
 /// A value that is none of its type is a wrong parameter here.
-Value parameter_value(Xml_Node node, std::string_view name, CMPIType type)
+Plain_Value parameter_value(Xml_Node node, std::string_view name, CMPIType type)
 {
     try {
         if (node.is(Tag::VALUE))
@@ -274,7 +274,7 @@ Property_List Parameters::names(std::string_view name) const
         if (std::ranges::any_of(result,
                                 [&](const std::string& have) { return same_name(have, each.text()); }))
             continue;
-        if (result.size() == most_names)
+        if (result.size() == MOST_NAMES)
             throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER, std::string(name) + " is too long");
         result.emplace_back(each.text());
     }

@@ -76,7 +76,7 @@ public:
     Property_List names(std::string_view name) const;
 
 private:
-    std::vector<std::pair<std::string, Xml_Node>> values_;
+    std::vector<std::pair<std::string, Xml_Node>> _values;
 };
 
 } // namespace KPRV::kldrcim

@@ -34,7 +34,7 @@ Request Operation_Call::request(Operation operation, Path_Value path) const
     request.path.host.clear();
     request.path.name_space = space.name();
     if (user)
-        request.context.push_back({CMPIPrincipal, Value::text(*user)});
+        request.context.push_back({CMPIPrincipal, Plain_Value::text(*user)});
     return request;
 }
 
@@ -49,11 +49,11 @@ Path_Value Operation_Call::path(std::string_view parameter) const
     return path;
 }
 
-Cim_Server::Cim_Server(std::string host_name) : host_name_(std::move(host_name)) {}
+Cim_Server::Cim_Server(std::string host_name) : _host_name(std::move(host_name)) {}
 
 Cim_Space* Cim_Server::find_space(const std::string& name) const
 {
-    for (const auto& [each, space] : spaces_)
+    for (const auto& [each, space] : _spaces)
         if (same_name(each, name))
             return space;
     return nullptr;

@@ -18,7 +18,7 @@ public:
     explicit Cim_Server(std::string host_name);
 
     /// The first space of a name answers. Before the first message.
-    void add(std::string name, Cim_Space& space) { spaces_.emplace_back(std::move(name), &space); }
+    void add(std::string name, Cim_Space& space) { _spaces.emplace_back(std::move(name), &space); }
 
     struct Reply
     {
@@ -35,17 +35,17 @@ public:
     /// True if the answer may be long.
     static bool may_be_long(const Cim_Message& message);
 
-    const std::string& host_name() const { return host_name_; }
-    Pull_Contexts& pull_contexts() { return pull_contexts_; }
+    const std::string& host_name() const { return _host_name; }
+    Pull_Contexts& pull_contexts() { return _pull_contexts; }
 
 private:
     Cim_Space* find_space(const std::string& name) const;
     /// True if the answer is broken.
     bool answer_call(const Cim_Call& call, const std::optional<std::string>& user, Answer& answer);
 
-    std::string host_name_;
-    std::vector<std::pair<std::string, Cim_Space*>> spaces_;
-    Pull_Contexts pull_contexts_;
+    std::string _host_name;
+    std::vector<std::pair<std::string, Cim_Space*>> _spaces;
+    Pull_Contexts _pull_contexts;
 };
 
 /// What the bodies of operations work with.

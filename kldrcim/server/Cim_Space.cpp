@@ -50,7 +50,7 @@ Result Broker_Space::run(Request request, Receiver* receiver)
     if (enumerates && classes().is_known() &&
         (classes().find(class_name)->is_indication || !is_served_below(classes(), class_name)))
         return {};
-    return host_.run(std::move(request), receiver);
+    return _server.run(std::move(request), receiver);
 }
 
 } // namespace KPRV::kldrcim

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 
 namespace KPRV::kldrcim {
 
@@ -23,14 +23,14 @@ public:
 class Broker_Space final : public Cim_Space
 {
 public:
-    explicit Broker_Space(Host& host) : host_(host) {}
+    explicit Broker_Space(Local_Server& server) : _server(server) {}
 
-    const std::string& name() const override { return host_.options().name_space; }
-    const Class_Catalogue& classes() const override { return host_.catalogue(); }
+    const std::string& name() const override { return _server.options().name_space; }
+    const Class_Catalogue& classes() const override { return _server.catalogue(); }
     Result run(Request request, Receiver* receiver) override;
 
 private:
-    Host& host_;
+    Local_Server& _server;
 };
 
 /// A status with its text.

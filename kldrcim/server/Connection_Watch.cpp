@@ -4,38 +4,38 @@
 
 namespace KPRV::kldrcim {
 
-Connection_Watch::Connection_Watch() : thread_([this] { run(); }) {}
+Connection_Watch::Connection_Watch() : _thread([this] { run(); }) {}
 
 Connection_Watch::~Connection_Watch()
 {
     {
-        const Auto_Lock lock(mutex_);
-        stop_ = true;
+        const Auto_Lock lock(_mutex);
+        _stop = true;
     }
-    changed_.notify_all();
-    thread_.join();
+    _changed.notify_all();
+    _thread.join();
 }
 
 void Connection_Watch::limit(int socket, std::chrono::seconds time)
 {
-    const Auto_Lock lock(mutex_);
-    ends_[socket] = Clock::now() + time;
+    const Auto_Lock lock(_mutex);
+    _ends[socket] = Clock::now() + time;
 }
 
 void Connection_Watch::release(int socket)
 {
-    const Auto_Lock lock(mutex_);
-    ends_.erase(socket);
+    const Auto_Lock lock(_mutex);
+    _ends.erase(socket);
 }
 
 void Connection_Watch::run()
 {
-    const Auto_Lock lock(mutex_);
-    while (!stop_) {
-        changed_.wait_for(mutex_, std::chrono::milliseconds(500));
+    const Auto_Lock lock(_mutex);
+    while (!_stop) {
+        _changed.wait_for(_mutex, std::chrono::milliseconds(500));
         const auto now = Clock::now();
         // Shut down, not closed: the connection's own thread sees its end and gives the socket back.
-        std::erase_if(ends_, [&](const auto& entry) {
+        std::erase_if(_ends, [&](const auto& entry) {
             if (entry.second > now)
                 return false;
             shutdown(entry.first, SHUT_RDWR);

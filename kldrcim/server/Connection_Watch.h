@@ -34,11 +34,11 @@ public:
 private:
     void run();
 
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any changed_;
-    std::map<int, Clock::time_point> ends_ GUARDED_BY(mutex_);
-    bool stop_ GUARDED_BY(mutex_) = false;
-    std::thread thread_;
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _changed;
+    std::map<int, Clock::time_point> _ends GUARDED_BY(_mutex);
+    bool _stop GUARDED_BY(_mutex) = false;
+    std::thread _thread;
 };
 
 } // namespace KPRV::kldrcim

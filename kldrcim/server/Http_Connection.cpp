@@ -10,13 +10,13 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-constexpr std::size_t streamed_piece = std::size_t(64) << 10;
-constexpr std::size_t most_header_bytes = std::size_t(16) << 10;
-constexpr unsigned most_headers = 100;
+constexpr std::size_t STREAMED_PIECE = std::size_t(64) << 10;
+constexpr std::size_t MOST_HEADER_BYTES = std::size_t(16) << 10;
+constexpr unsigned MOST_HEADERS = 100;
 /// Of a client that sends on after it has been refused.
-constexpr std::size_t most_ignored = std::size_t(1) << 20;
+constexpr std::size_t MOST_IGNORED = std::size_t(1) << 20;
 constexpr std::chrono::seconds failed_login_pause{1};
-constexpr unsigned idle_seconds = 30;
+constexpr unsigned IDLE_SECONDS = 30;
 constexpr const char* metrics_path = "/metrics";
 
 std::string percent_encoded(const std::string& text)
@@ -71,49 +71,49 @@ struct Http_Connection::Callbacks
     static ssize_t read(void* data, std::uint64_t, char* buffer, std::size_t size)
     {
         auto& self = *static_cast<Http_Connection*>(data);
-        const std::size_t count = self.pipe_.read(buffer, size);
+        const std::size_t count = self._pipe.read(buffer, size);
         if (count != 0)
             return static_cast<ssize_t>(count);
-        if (self.pipe_.is_broken())
+        if (self._pipe.is_broken())
             return MHD_CONTENT_READER_END_WITH_ERROR;
-        const std::size_t rest = std::min(size, self.rest_.size());
-        std::memcpy(buffer, self.rest_.data(), rest);
-        self.rest_.erase(0, rest);
+        const std::size_t rest = std::min(size, self._rest.size());
+        std::memcpy(buffer, self._rest.data(), rest);
+        self._rest.erase(0, rest);
         return rest == 0 ? MHD_CONTENT_READER_END_OF_STREAM : static_cast<ssize_t>(rest);
     }
 };
 
 Http_Connection::~Http_Connection()
 {
-    pipe_.close();
-    if (maker_.joinable())
-        maker_.join();
-    server_.watch_->limit(peer_.socket, Connection_Watch::idle);
+    _pipe.close();
+    if (_maker.joinable())
+        _maker.join();
+    _server._watch->limit(_peer.socket, Connection_Watch::idle);
 }
 
 const char* Http_Connection::header(const char* name) const
 {
-    return MHD_lookup_connection_value(connection_, MHD_HEADER_KIND, name);
+    return MHD_lookup_connection_value(_connection, MHD_HEADER_KIND, name);
 }
 
 void Http_Connection::check_client() const
 {
     Header_Size size;
-    MHD_get_connection_values(connection_, MHD_HEADER_KIND, add_size, &size);
-    if (size.bytes > most_header_bytes || size.count > most_headers)
+    MHD_get_connection_values(_connection, MHD_HEADER_KIND, add_size, &size);
+    if (size.bytes > MOST_HEADER_BYTES || size.count > MOST_HEADERS)
         throw Http_Refusal{431, nullptr, "too many header fields"};
     // A page in a browser, which can reach what is on its own host.
     if (header("Origin"))
         throw Http_Refusal{403, nullptr, "not for web pages"};
     const std::string host = host_of(header("Host") ? header("Host") : "localhost");
-    if (is_loopback(server_.options_.address) && !is_loopback(host) && !same_name(host, "localhost") &&
-        !same_name(host, server_.server_.host_name()))
+    if (is_loopback(_server._options.address) && !is_loopback(host) && !same_name(host, "localhost") &&
+        !same_name(host, _server._server.host_name()))
         throw Http_Refusal{403, nullptr, "the header Host names another host"};
 }
 
 bool Http_Connection::has_page(const std::string& path) const
 {
-    return server_.options_.metrics && path == metrics_path;
+    return _server._options.metrics && path == metrics_path;
 }
 
 void Http_Connection::check_message(const std::string& method) const
@@ -125,7 +125,7 @@ void Http_Connection::check_message(const std::string& method) const
     const char* length = header("Content-Length");
     if (length && header("Transfer-Encoding"))
         throw Http_Refusal{400, nullptr, "two ways to tell the length"};
-    if (length && std::strtoull(length, nullptr, 10) > server_.options_.body_bytes)
+    if (length && std::strtoull(length, nullptr, 10) > _server._options.body_bytes)
         throw Http_Refusal{413, nullptr, "the body is too long"};
     if (const char* encoding = header("Content-Encoding"); encoding && !same_name(encoding, "identity"))
         throw Http_Refusal{415, nullptr, "no encoding of the body is known"};
@@ -135,20 +135,20 @@ void Http_Connection::check_message(const std::string& method) const
 
 bool Http_Connection::authenticate()
 {
-    if (!server_.options_.users)
+    if (!_server._options.users)
         return true;
     const char* authorization = header("Authorization");
-    if (authorization && peer_.authorization == authorization) {
-        user_ = peer_.user;
+    if (authorization && _peer.authorization == authorization) {
+        _user = _peer.user;
         return true;
     }
     char* password = nullptr;
-    char* user = authorization ? MHD_basic_auth_get_username_password(connection_, &password) : nullptr;
-    const bool accepted = user && server_.options_.users->accepts(user, password ? password : "");
+    char* user = authorization ? MHD_basic_auth_get_username_password(_connection, &password) : nullptr;
+    const bool accepted = user && _server._options.users->accepts(user, password ? password : "");
     if (accepted) {
-        peer_.authorization = authorization;
-        peer_.user = user;
-        user_ = user;
+        _peer.authorization = authorization;
+        _peer.user = user;
+        _user = user;
     }
     if (user)
         MHD_free(user);
@@ -162,9 +162,9 @@ bool Http_Connection::authenticate()
 
 bool Http_Connection::begin(const Http_Line& line)
 {
-    server_.watch_->limit(peer_.socket, Connection_Watch::body);
+    _server._watch->limit(_peer.socket, Connection_Watch::body);
     const bool is_message = !has_page(line.path) || (line.method != "GET" && line.method != "HEAD");
-    allowed_ = has_page(line.path) ? "GET, HEAD, POST" : "POST";
+    _allowed = has_page(line.path) ? "GET, HEAD, POST" : "POST";
     try {
         check_client();
         if (is_message)
@@ -175,43 +175,43 @@ bool Http_Connection::begin(const Http_Line& line)
     if (!authenticate())
         return refuse({401, nullptr, ""});
     if (is_message)
-        reader_ = std::make_unique<Xml_Reader>(Xml_Limits{.bytes = server_.options_.body_bytes});
+        _reader = std::make_unique<Xml_Reader>(Xml_Limits{.bytes = _server._options.body_bytes});
     return true;
 }
 
 bool Http_Connection::body(std::string_view piece)
 {
-    body_size_ += piece.size();
-    if (!queued_ && reader_ && reader_->fault() == Xml_Fault::NONE)
-        reader_->feed(piece);
-    else if (body_size_ > server_.options_.body_bytes + most_ignored)
+    _body_size += piece.size();
+    if (!_queued && _reader && _reader->fault() == Xml_Fault::NONE)
+        _reader->feed(piece);
+    else if (_body_size > _server._options.body_bytes + MOST_IGNORED)
         return false;
     return true;
 }
 
 bool Http_Connection::finish()
 {
-    if (queued_)
+    if (_queued)
         return true;
     // From here on it is us who take time.
-    server_.watch_->release(peer_.socket);
-    MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, 0U);
+    _server._watch->release(_peer.socket);
+    MHD_set_connection_option(_connection, MHD_CONNECTION_OPTION_TIMEOUT, 0U);
     try {
-        if (reader_)
+        if (_reader)
             answer_message();
         else
             answer_page();
     } catch (const Http_Refusal& refusal) {
         refuse(refusal);
     }
-    MHD_set_connection_option(connection_, MHD_CONNECTION_OPTION_TIMEOUT, idle_seconds);
-    return queued_;
+    MHD_set_connection_option(_connection, MHD_CONNECTION_OPTION_TIMEOUT, IDLE_SECONDS);
+    return _queued;
 }
 
 void Http_Connection::answer_page()
 {
     const char* const accept = header("Accept");
-    Http_Page page = server_.options_.metrics(accept ? accept : "");
+    Http_Page page = _server._options.metrics(accept ? accept : "");
     MHD_Response* const response =
         MHD_create_response_from_buffer(page.text.size(), page.text.data(), MHD_RESPMEM_MUST_COPY);
     if (response)
@@ -221,67 +221,67 @@ void Http_Connection::answer_page()
 
 void Http_Connection::answer_message()
 {
-    if (!reader_->finish())
-        throw Http_Refusal{reader_->fault() == Xml_Fault::TOO_LARGE ? 413U : 400U,
-                           reader_->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
+    if (!_reader->finish())
+        throw Http_Refusal{_reader->fault() == Xml_Fault::TOO_LARGE ? 413U : 400U,
+                           _reader->fault() == Xml_Fault::NOT_VALID ? "request-not-valid"
                                                                     : "request-not-well-formed",
-                           reader_->fault_text()};
-    message_ = read_message(reader_->document());
+                           _reader->fault_text()};
+    _message = read_message(_reader->document());
     check_headers({.operation = header("CIMOperation"),
                    .method = header("CIMMethod"),
                    .object = header("CIMObject"),
                    .protocol_version = header("CIMProtocolVersion"),
                    .batch = header("CIMBatch")},
-                  message_);
-    answer(message_);
+                  _message);
+    answer(_message);
 }
 
 void Http_Connection::answer(const Cim_Message& message)
 {
     if (Cim_Server::may_be_long(message))
         return answer_in_pieces(message);
-    Cim_Server::Reply reply = server_.server_.answer(message, user_, pipe_);
+    Cim_Server::Reply reply = _server._server.answer(message, _user, _pipe);
     // A short operation that has become long after all.
-    pipe_.finish(reply.broken);
-    rest_ = std::move(reply.body);
-    if (!pipe_.wait())
-        send(std::move(rest_));
+    _pipe.finish(reply.broken);
+    _rest = std::move(reply.body);
+    if (!_pipe.wait())
+        send(std::move(_rest));
     else
-        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece, Callbacks::read,
+        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, STREAMED_PIECE, Callbacks::read,
                                                         this, nullptr));
 }
 
 void Http_Connection::answer_in_pieces(const Cim_Message& message)
 {
-    maker_ = std::thread([this, &message] {
+    _maker = std::thread([this, &message] {
         bool broken = true;
         try {
-            Cim_Server::Reply reply = server_.server_.answer(message, user_, pipe_);
-            rest_ = std::move(reply.body);
+            Cim_Server::Reply reply = _server._server.answer(message, _user, _pipe);
+            _rest = std::move(reply.body);
             broken = reply.broken;
         } catch (...) {
-            failure_ = std::current_exception();
+            _failure = std::current_exception();
         }
-        pipe_.finish(broken);
+        _pipe.finish(broken);
     });
-    if (pipe_.wait()) {
-        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, streamed_piece, Callbacks::read,
+    if (_pipe.wait()) {
+        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, STREAMED_PIECE, Callbacks::read,
                                                         this, nullptr));
         return;
     }
-    maker_.join();
-    if (failure_)
-        std::rethrow_exception(failure_);
-    send(std::move(rest_));
+    _maker.join();
+    if (_failure)
+        std::rethrow_exception(_failure);
+    send(std::move(_rest));
 }
 
 bool Http_Connection::queue(unsigned status, MHD_Response* response)
 {
     if (!response)
         return false;
-    queued_ = MHD_queue_response(connection_, status, response) == MHD_YES;
+    _queued = MHD_queue_response(_connection, status, response) == MHD_YES;
     MHD_destroy_response(response);
-    return queued_;
+    return _queued;
 }
 
 bool Http_Connection::queue_message(MHD_Response* response)
@@ -308,7 +308,7 @@ bool Http_Connection::refuse(const Http_Refusal& refusal)
     if (!refusal.text.empty())
         MHD_add_response_header(response, "PGErrorDetail", percent_encoded(refusal.text).c_str());
     if (refusal.status == MHD_HTTP_METHOD_NOT_ALLOWED)
-        MHD_add_response_header(response, "Allow", allowed_);
+        MHD_add_response_header(response, "Allow", _allowed);
     if (refusal.status == MHD_HTTP_UNAUTHORIZED)
         MHD_add_response_header(response, "WWW-Authenticate", "Basic realm=\"kldrcim\", charset=\"UTF-8\"");
     MHD_add_response_header(response, "Connection", "close");

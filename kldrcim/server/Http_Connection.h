@@ -34,7 +34,7 @@ class Http_Connection
 {
 public:
     Http_Connection(Http_Server& server, Http_Peer& peer, MHD_Connection* connection)
-        : server_(server), peer_(peer), connection_(connection)
+        : _server(server), _peer(peer), _connection(connection)
     {
     }
     ~Http_Connection();
@@ -70,21 +70,21 @@ private:
     bool queue_message(MHD_Response* response);
     bool send(std::string body);
 
-    Http_Server& server_;
-    Http_Peer& peer_;
-    MHD_Connection* connection_;
+    Http_Server& _server;
+    Http_Peer& _peer;
+    MHD_Connection* _connection;
     /// Null unless a message is expected.
-    std::unique_ptr<Xml_Reader> reader_;
-    std::size_t body_size_ = 0;
+    std::unique_ptr<Xml_Reader> _reader;
+    std::size_t _body_size = 0;
     /// The methods that the path takes.
-    const char* allowed_ = "POST";
-    bool queued_ = false;
-    std::optional<std::string> user_;
-    Cim_Message message_;
-    Body_Pipe pipe_;
-    std::string rest_;
-    std::exception_ptr failure_;
-    std::thread maker_;
+    const char* _allowed = "POST";
+    bool _queued = false;
+    std::optional<std::string> _user;
+    Cim_Message _message;
+    Body_Pipe _pipe;
+    std::string _rest;
+    std::exception_ptr _failure;
+    std::thread _maker;
 };
 
 } // namespace KPRV::kldrcim

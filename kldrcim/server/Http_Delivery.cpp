@@ -11,7 +11,7 @@ namespace {
 
 constexpr long connect_seconds = 5, total_seconds = 10;
 /// Of an answer; the rest is not read.
-constexpr std::size_t most_answer = std::size_t(64) << 10;
+constexpr std::size_t MOST_ANSWER = std::size_t(64) << 10;
 constexpr long server_error = 500;
 
 struct Exchange
@@ -24,7 +24,7 @@ std::size_t take(const char*, std::size_t size, std::size_t count, void* data)
 {
     auto& exchange = *static_cast<Exchange*>(data);
     exchange.received += size * count;
-    return exchange.received > most_answer ? 0 : size * count;
+    return exchange.received > MOST_ANSWER ? 0 : size * count;
 }
 
 int progress(void* data, curl_off_t, curl_off_t, curl_off_t, curl_off_t)
@@ -78,7 +78,7 @@ Delivery deliver_by_http(const std::string& url, const std::string& message,
     const CURLcode code = curl_easy_perform(curl);
     long status = 0;
     curl_easy_getinfo(curl, CURLINFO_RESPONSE_CODE, &status);
-    const bool answered = code == CURLE_OK || (code == CURLE_WRITE_ERROR && exchange.received > most_answer);
+    const bool answered = code == CURLE_OK || (code == CURLE_WRITE_ERROR && exchange.received > MOST_ANSWER);
     return answered && status < server_error ? Delivery::DONE : Delivery::AGAIN;
 }
 

@@ -15,9 +15,9 @@ namespace KPRV::kldrcim {
 namespace {
 
 /// A header block that is larger does not fit.
-constexpr std::size_t connection_memory = std::size_t(48) << 10;
+constexpr std::size_t CONNECTION_MEMORY = std::size_t(48) << 10;
 /// Without a byte, in either direction.
-constexpr unsigned idle_limit = 30;
+constexpr unsigned IDLE_LIMIT = 30;
 
 union Socket_Address
 {
@@ -87,12 +87,12 @@ struct Http_Server::Callbacks
             if (!peer || !info)
                 return;
             peer->socket = info->connect_fd;
-            server.watch_->limit(peer->socket, Connection_Watch::first_headers);
+            server._watch->limit(peer->socket, Connection_Watch::first_headers);
             return;
         }
         auto* peer = static_cast<Http_Peer*>(*context);
         if (peer && peer->socket >= 0)
-            server.watch_->release(peer->socket);
+            server._watch->release(peer->socket);
         delete peer;
         *context = nullptr;
     }
@@ -134,52 +134,52 @@ struct Http_Server::Callbacks
 };
 
 Http_Server::Http_Server(Cim_Server& server, const Http_Options& options)
-    : server_(server), options_(options), watch_(std::make_unique<Connection_Watch>())
+    : _server(server), _options(options), _watch(std::make_unique<Connection_Watch>())
 {
 }
 
 Http_Server::~Http_Server()
 {
-    if (daemon_)
-        MHD_stop_daemon(daemon_);
+    if (_daemon)
+        MHD_stop_daemon(_daemon);
 }
 
 bool Http_Server::listen(std::string& error)
 {
     Socket_Address address;
-    if (!socket_address(options_, address)) {
-        error = "no address: " + options_.address;
+    if (!socket_address(_options, address)) {
+        error = "no address: " + _options.address;
         return false;
     }
     unsigned flags = MHD_USE_INTERNAL_POLLING_THREAD | MHD_USE_THREAD_PER_CONNECTION | MHD_USE_POLL;
     if (address.any.sa_family == AF_INET6)
         flags |= MHD_USE_IPv6;
     std::vector<MHD_OptionItem> more;
-    if (!options_.certificate.empty()) {
+    if (!_options.certificate.empty()) {
         flags |= MHD_USE_TLS;
-        more.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, options_.certificate.data()});
-        more.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, options_.key.data()});
+        more.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, _options.certificate.data()});
+        more.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, _options.key.data()});
         static char priorities[] = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2";
         more.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, priorities});
     }
-    if (!is_loopback(options_.address))
+    if (!is_loopback(_options.address))
         more.push_back({MHD_OPTION_PER_IP_CONNECTION_LIMIT,
-                        static_cast<intptr_t>(options_.connections_per_address), nullptr});
+                        static_cast<intptr_t>(_options.connections_per_address), nullptr});
     more.push_back({MHD_OPTION_END, 0, nullptr});
     errno = 0;
-    daemon_ = MHD_start_daemon(
-        flags, options_.port, nullptr, nullptr, Callbacks::request, this, MHD_OPTION_SOCK_ADDR, &address.any,
-        MHD_OPTION_CONNECTION_LIMIT, options_.connections, MHD_OPTION_CONNECTION_TIMEOUT, idle_limit,
-        MHD_OPTION_CONNECTION_MEMORY_LIMIT, connection_memory, MHD_OPTION_LISTENING_ADDRESS_REUSE, 1U,
+    _daemon = MHD_start_daemon(
+        flags, _options.port, nullptr, nullptr, Callbacks::request, this, MHD_OPTION_SOCK_ADDR, &address.any,
+        MHD_OPTION_CONNECTION_LIMIT, _options.connections, MHD_OPTION_CONNECTION_TIMEOUT, IDLE_LIMIT,
+        MHD_OPTION_CONNECTION_MEMORY_LIMIT, CONNECTION_MEMORY, MHD_OPTION_LISTENING_ADDRESS_REUSE, 1U,
         MHD_OPTION_NOTIFY_CONNECTION, Callbacks::connection, this, MHD_OPTION_NOTIFY_COMPLETED,
         Callbacks::completed, nullptr, MHD_OPTION_ARRAY, more.data(), MHD_OPTION_END);
-    if (!daemon_) {
+    if (!_daemon) {
         error =
-            "cannot listen on " + options_.address + ":" + std::to_string(options_.port) + ": " +
+            "cannot listen on " + _options.address + ":" + std::to_string(_options.port) + ": " +
             (errno != 0 ? std::generic_category().message(errno) : "the certificate or key cannot be used");
         return false;
     }
-    port_ = MHD_get_daemon_info(daemon_, MHD_DAEMON_INFO_BIND_PORT)->port;
+    _port = MHD_get_daemon_info(_daemon, MHD_DAEMON_INFO_BIND_PORT)->port;
     return true;
 }
 
@@ -192,8 +192,8 @@ std::unique_ptr<Http_Server> Http_Server::start(Cim_Server& server, const Http_O
 
 std::string Http_Server::url() const
 {
-    return (options_.certificate.empty() ? "http://" : "https://") + options_.address + ":" +
-           std::to_string(port_);
+    return (_options.certificate.empty() ? "http://" : "https://") + _options.address + ":" +
+           std::to_string(_port);
 }
 
 } // namespace KPRV::kldrcim

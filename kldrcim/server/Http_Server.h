@@ -59,7 +59,7 @@ public:
     /// Ends all connections; calls into providers that are under way are waited for.
     ~Http_Server();
 
-    std::uint16_t port() const { return port_; }
+    std::uint16_t port() const { return _port; }
     /// "http://127.0.0.1:5988".
     std::string url() const;
 
@@ -70,11 +70,11 @@ private:
     Http_Server(Cim_Server& server, const Http_Options& options);
     bool listen(std::string& error);
 
-    Cim_Server& server_;
-    Http_Options options_;
-    std::uint16_t port_ = 0;
-    std::unique_ptr<Connection_Watch> watch_;
-    MHD_Daemon* daemon_ = nullptr;
+    Cim_Server& _server;
+    Http_Options _options;
+    std::uint16_t _port = 0;
+    std::unique_ptr<Connection_Watch> _watch;
+    MHD_Daemon* _daemon = nullptr;
 };
 
 } // namespace KPRV::kldrcim

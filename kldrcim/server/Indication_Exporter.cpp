@@ -29,77 +29,77 @@ std::string export_message(const Instance_Value& indication, std::int64_t id)
 
 Indication_Exporter::Indication_Exporter(std::string url, std::string context, Log log,
                                          Delivery_Function deliver, Delivery_Patience patience)
-    : url_(std::move(url)), context_(std::move(context)), log_(std::move(log)), deliver_(std::move(deliver)),
-      patience_(patience), thread_([this] { run(); })
+    : _url(std::move(url)), _context(std::move(context)), _log(std::move(log)), _deliver(std::move(deliver)),
+      _patience(patience), _thread([this] { run(); })
 {
 }
 
 Indication_Exporter::~Indication_Exporter()
 {
     {
-        const Auto_Lock lock(mutex_);
-        stop_ = true;
+        const Auto_Lock lock(_mutex);
+        _stop = true;
     }
-    changed_.notify_all();
-    thread_.join();
+    _changed.notify_all();
+    _thread.join();
 }
 
 void Indication_Exporter::put(Instance_Value indication)
 {
     bool first_loss = false;
     {
-        const Auto_Lock lock(mutex_);
-        set_value(indication.properties, "SequenceContext", Value::text(context_));
-        set_value(indication.properties, "SequenceNumber", Value::signed_number(CMPI_sint64, number_));
-        messages_.push_back(export_message(indication, number_));
-        number_ = number_ == std::numeric_limits<std::int64_t>::max() ? 0 : number_ + 1;
-        if (messages_.size() > most_waiting) {
+        const Auto_Lock lock(_mutex);
+        set_value(indication.properties, "SequenceContext", Plain_Value::text(_context));
+        set_value(indication.properties, "SequenceNumber", Plain_Value::signed_number(CMPI_sint64, _number));
+        _messages.push_back(export_message(indication, _number));
+        _number = _number == std::numeric_limits<std::int64_t>::max() ? 0 : _number + 1;
+        if (_messages.size() > MOST_WAITING) {
             // The one in front is on its way.
-            messages_.erase(messages_.begin() + 1);
-            first_loss = !overflowed_;
-            overflowed_ = true;
+            _messages.erase(_messages.begin() + 1);
+            first_loss = !_overflowed;
+            _overflowed = true;
         }
     }
-    changed_.notify_all();
+    _changed.notify_all();
     if (first_loss)
-        log_("listener " + url_ + ": more than " + std::to_string(most_waiting) +
+        _log("listener " + _url + ": more than " + std::to_string(MOST_WAITING) +
              " indications wait, the oldest are dropped");
 }
 
 bool Indication_Exporter::pause(std::chrono::milliseconds time)
 {
     const auto end = std::chrono::steady_clock::now() + time;
-    while (!stop_ && std::chrono::steady_clock::now() < end)
-        changed_.wait_until(mutex_, end);
-    return !stop_;
+    while (!_stop && std::chrono::steady_clock::now() < end)
+        _changed.wait_until(_mutex, end);
+    return !_stop;
 }
 
 void Indication_Exporter::run()
 {
     const auto stopped = [this] {
-        const Auto_Lock lock(mutex_);
-        return stop_;
+        const Auto_Lock lock(_mutex);
+        return _stop;
     };
     unsigned failures = 0;
     for (;;) {
         std::string message;
         {
-            const Auto_Lock lock(mutex_);
-            while (messages_.empty() && !stop_)
-                changed_.wait(mutex_);
-            if (stop_)
+            const Auto_Lock lock(_mutex);
+            while (_messages.empty() && !_stop)
+                _changed.wait(_mutex);
+            if (_stop)
                 return;
-            message = messages_.front();
+            message = _messages.front();
         }
-        const Delivery delivery = deliver_(url_, message, stopped);
-        if (delivery == Delivery::AGAIN && ++failures == patience_.quick)
-            log_("listener " + url_ + ": no answer");
-        const Auto_Lock lock(mutex_);
+        const Delivery delivery = _deliver(_url, message, stopped);
+        if (delivery == Delivery::AGAIN && ++failures == _patience.quick)
+            _log("listener " + _url + ": no answer");
+        const Auto_Lock lock(_mutex);
         if (delivery == Delivery::DONE) {
             failures = 0;
-            overflowed_ = false;
-            messages_.pop_front();
-        } else if (!pause(failures < patience_.quick ? patience_.pause : patience_.long_pause)) {
+            _overflowed = false;
+            _messages.pop_front();
+        } else if (!pause(failures < _patience.quick ? _patience.pause : _patience.long_pause)) {
             return;
         }
     }

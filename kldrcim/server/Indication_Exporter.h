@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 #include "module/runtime/Standard_Mutex.h"
 
 #include <chrono>
@@ -46,7 +46,7 @@ class Indication_Exporter
 {
 public:
     /// Beyond these the oldest is dropped.
-    static constexpr std::size_t most_waiting = 1000;
+    static constexpr std::size_t MOST_WAITING = 1000;
 
     using Log = std::function<void(const std::string& text)>;
 
@@ -62,20 +62,20 @@ public:
 
 private:
     void run();
-    bool pause(std::chrono::milliseconds time) REQUIRES(mutex_);
+    bool pause(std::chrono::milliseconds time) REQUIRES(_mutex);
 
-    const std::string url_;
-    const std::string context_;
-    const Log log_;
-    const Delivery_Function deliver_;
-    const Delivery_Patience patience_;
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any changed_;
-    std::deque<std::string> messages_ GUARDED_BY(mutex_);
-    std::int64_t number_ GUARDED_BY(mutex_) = 0;
-    bool overflowed_ GUARDED_BY(mutex_) = false;
-    bool stop_ GUARDED_BY(mutex_) = false;
-    std::thread thread_;
+    const std::string _url;
+    const std::string _context;
+    const Log _log;
+    const Delivery_Function _deliver;
+    const Delivery_Patience _patience;
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _changed;
+    std::deque<std::string> _messages GUARDED_BY(_mutex);
+    std::int64_t _number GUARDED_BY(_mutex) = 0;
+    bool _overflowed GUARDED_BY(_mutex) = false;
+    bool _stop GUARDED_BY(_mutex) = false;
+    std::thread _thread;
 };
 
 } // namespace KPRV::kldrcim

@@ -120,7 +120,7 @@ Result get_property(const Operation_Call& call)
         property_of(call, call.path("InstanceName"), call.parameters.text("PropertyName")).name;
     Instance_Value instance;
     Result result = get_one(call, std::vector{name}, instance);
-    const Value* value = result.ok() ? instance.property(name) : nullptr;
+    const Plain_Value* value = result.ok() ? instance.property(name) : nullptr;
     if (value && !value->null)
         write_value(call.answer.object(), *value);
     return result;
@@ -131,7 +131,8 @@ Result set_property(const Operation_Call& call)
     call.parameters.required("PropertyName");
     const Path_Value path = call.path("InstanceName");
     const Feature_Info& feature = property_of(call, path, call.parameters.text("PropertyName"));
-    Value value = Instance_Reader(call.space.classes()).value(call.parameters.find("NewValue"), feature.type);
+    Plain_Value value =
+        Instance_Reader(call.space.classes()).value(call.parameters.find("NewValue"), feature.type);
     return modify(call, path, {{feature.name, std::move(value)}}, std::vector{feature.name});
 }
 

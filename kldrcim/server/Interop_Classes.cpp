@@ -60,13 +60,13 @@ Feature_Info feature_of(const Property_Row& row)
     info.type = row.type;
     info.key = row.key;
     info.target_class = row.target;
-    info.default_value = Value::null_of(row.type);
+    info.default_value = Plain_Value::null_of(row.type);
     return info;
 }
 
 } // namespace
 
-Interop_Classes::Interop_Classes(const Class_Catalogue& others) : others_(others)
+Interop_Classes::Interop_Classes(const Class_Catalogue& others) : _others(others)
 {
     for (const Class_Row& row : class_table) {
         Class_Info info;
@@ -78,24 +78,24 @@ Interop_Classes::Interop_Classes(const Class_Catalogue& others) : others_(others
             info.properties = above->properties;
         for (const Property_Row& property : row.properties)
             info.properties.push_back(feature_of(property));
-        own_.push_back(std::move(info));
+        _own.push_back(std::move(info));
     }
 }
 
 std::vector<std::string> Interop_Classes::class_names() const
 {
-    std::vector<std::string> names = others_.class_names();
-    for (const Class_Info& info : own_)
+    std::vector<std::string> names = _others.class_names();
+    for (const Class_Info& info : _own)
         names.push_back(info.name);
     return names;
 }
 
 const Class_Info* Interop_Classes::find(std::string_view name) const
 {
-    for (const Class_Info& info : own_)
+    for (const Class_Info& info : _own)
         if (same_name(info.name, name))
             return &info;
-    return others_.find(name);
+    return _others.find(name);
 }
 
 } // namespace KPRV::kldrcim

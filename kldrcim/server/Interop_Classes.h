@@ -18,11 +18,11 @@ public:
 
     std::vector<std::string> class_names() const override;
     const Class_Info* find(std::string_view name) const override;
-    std::string module_name() const override { return others_.module_name(); }
+    std::string module_name() const override { return _others.module_name(); }
 
 private:
-    const Class_Catalogue& others_;
-    std::deque<Class_Info> own_;
+    const Class_Catalogue& _others;
+    std::deque<Class_Info> _own;
 };
 
 } // namespace KPRV::kldrcim

@@ -13,12 +13,12 @@ constexpr const char* shown_classes[] = {"CIM_RegisteredProfile", "CIM_ElementCo
 
 /// A value with each path in it changed.
 template <class Change>
-void change_paths(Value& value, const Change& change)
+void change_paths(Plain_Value& value, const Change& change)
 {
     if (const Path_Value* path = value.as_path()) {
         Path_Value moved = *path;
         change(moved);
-        value = Value::path(std::move(moved));
+        value = Plain_Value::path(std::move(moved));
     }
 }
 
@@ -28,87 +28,87 @@ void change_paths(Value& value, const Change& change)
 class Moved_Objects final : public Receiver
 {
 public:
-    Moved_Objects(const Interop_Space& space, Receiver& receiver) : space_(space), receiver_(receiver) {}
+    Moved_Objects(const Interop_Space& space, Receiver& receiver) : _space(space), _receiver(receiver) {}
 
     bool instance(Instance_Value&& instance) override
     {
-        space_.move_in(instance.path);
+        _space.move_in(instance.path);
         for (Named_Value& property : instance.properties)
-            change_paths(property.value, [&](Path_Value& path) { space_.move_in(path); });
-        return receiver_.instance(std::move(instance));
+            change_paths(property.value, [&](Path_Value& path) { _space.move_in(path); });
+        return _receiver.instance(std::move(instance));
     }
     bool path(Path_Value&& path) override
     {
-        space_.move_in(path);
-        return receiver_.path(std::move(path));
+        _space.move_in(path);
+        return _receiver.path(std::move(path));
     }
 
 private:
-    const Interop_Space& space_;
-    Receiver& receiver_;
+    const Interop_Space& _space;
+    Receiver& _receiver;
 };
 
 Interop_Space::Interop_Space(std::string name, const Interop_Classes& classes,
                              std::vector<Interop_Objects*> objects, Broker_Space& model)
-    : name_(std::move(name)), classes_(classes), objects_(std::move(objects)), model_(model)
+    : _name(std::move(name)), _classes(classes), _objects(std::move(objects)), _model(model)
 {
 }
 
 bool Interop_Space::is_profile(std::string_view class_name) const
 {
     return std::ranges::any_of(profile_classes,
-                               [&](const char* each) { return classes_.is_a(class_name, each); });
+                               [&](const char* each) { return _classes.is_a(class_name, each); });
 }
 
 bool Interop_Space::is_shown_here(std::string_view class_name) const
 {
     return std::ranges::any_of(shown_classes,
-                               [&](const char* each) { return classes_.is_a(class_name, each); });
+                               [&](const char* each) { return _classes.is_a(class_name, each); });
 }
 
 Interop_Objects* Interop_Space::owner_of(std::string_view class_name) const
 {
     const auto found =
-        std::ranges::find_if(objects_, [&](const Interop_Objects* each) { return each->owns(class_name); });
-    return found == objects_.end() ? nullptr : *found;
+        std::ranges::find_if(_objects, [&](const Interop_Objects* each) { return each->owns(class_name); });
+    return found == _objects.end() ? nullptr : *found;
 }
 
 void Interop_Space::move_in(Path_Value& path) const
 {
     for (Named_Value& key : path.keys)
         change_paths(key.value, [&](Path_Value& end) { move_in(end); });
-    path.name_space = is_shown_here(path.class_name) ? name_ : model_.name();
+    path.name_space = is_shown_here(path.class_name) ? _name : _model.name();
 }
 
 void Interop_Space::move_out(Path_Value& path) const
 {
     for (Named_Value& key : path.keys)
         change_paths(key.value, [&](Path_Value& end) { move_out(end); });
-    path.name_space = model_.name();
+    path.name_space = _model.name();
 }
 
 Result Interop_Space::forward(Request request, Receiver& receiver)
 {
     move_out(request.path);
     Moved_Objects moved(*this, receiver);
-    return model_.run(std::move(request), &moved);
+    return _model.run(std::move(request), &moved);
 }
 
 Result Interop_Space::enumerate(const Request& request, Receiver& receiver)
 {
     const bool names = request.operation == Operation::ENUMERATE_INSTANCE_NAMES;
-    for (const Interop_Objects* each : objects_)
+    for (const Interop_Objects* each : _objects)
         for (Instance_Value& instance : each->instances()) {
-            if (!classes_.is_a(instance.path.class_name, request.path.class_name))
+            if (!_classes.is_a(instance.path.class_name, request.path.class_name))
                 continue;
-            instance.path.name_space = name_;
+            instance.path.name_space = _name;
             if (!(names ? receiver.path(std::move(instance.path)) : receiver.instance(std::move(instance))))
                 return {};
         }
     Result result;
-    for (const std::string& name : model_.classes().class_names()) {
-        const Class_Info* info = model_.classes().find(name);
-        if (!info->has_provider || !is_shown_here(name) || !classes_.is_a(name, request.path.class_name))
+    for (const std::string& name : _model.classes().class_names()) {
+        const Class_Info* info = _model.classes().find(name);
+        if (!info->has_provider || !is_shown_here(name) || !_classes.is_a(name, request.path.class_name))
             continue;
         Request one = request;
         one.path.class_name = name;
@@ -144,12 +144,12 @@ Result Interop_Space::traverse(const Request& request, Receiver& receiver)
     const bool names =
         request.operation == Operation::REFERENCE_NAMES || request.operation == Operation::ASSOCIATOR_NAMES;
     const auto fits = [&](const std::string& class_name, const std::string& wanted) {
-        return wanted.empty() || classes_.is_a(class_name, wanted);
+        return wanted.empty() || _classes.is_a(class_name, wanted);
     };
     const auto in_role = [&](const Named_Value& end, const std::string& role) {
         return role.empty() || same_name(end.name, role);
     };
-    for (const Interop_Objects* each : objects_)
+    for (const Interop_Objects* each : _objects)
         for (Instance_Value& link : each->instances()) {
             if (!fits(link.path.class_name, references ? filter.result_class : filter.association_class))
                 continue;
@@ -159,7 +159,7 @@ Result Interop_Space::traverse(const Request& request, Receiver& receiver)
             });
             if (near == link.path.keys.end())
                 continue;
-            link.path.name_space = name_;
+            link.path.name_space = _name;
             if (references) {
                 if (!(names ? receiver.path(std::move(link.path)) : receiver.instance(std::move(link))))
                     return {};
@@ -171,7 +171,7 @@ Result Interop_Space::traverse(const Request& request, Receiver& receiver)
                     !in_role(end, filter.result_role))
                     continue;
                 Path_Value path = *far;
-                path.name_space = name_;
+                path.name_space = _name;
                 if (names) {
                     receiver.path(std::move(path));
                     continue;
@@ -180,7 +180,7 @@ Result Interop_Space::traverse(const Request& request, Receiver& receiver)
                 Request one;
                 one.path = path;
                 if (get(one, found).ok() && !found.instances.empty()) {
-                    found.instances.front().path.name_space = name_;
+                    found.instances.front().path.name_space = _name;
                     receiver.instance(std::move(found.instances.front()));
                 }
             }
@@ -191,7 +191,7 @@ Result Interop_Space::traverse(const Request& request, Receiver& receiver)
 Result Interop_Space::run(Request request, Receiver* receiver)
 {
     const std::string& class_name = request.path.class_name;
-    if (!classes_.find(class_name))
+    if (!_classes.find(class_name))
         return failed(CMPI_RC_ERR_INVALID_CLASS, class_name);
     Collector collector;
     Receiver& target = receiver ? *receiver : static_cast<Receiver&>(collector);

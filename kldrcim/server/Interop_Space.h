@@ -27,16 +27,16 @@ public:
     Server_Objects(const std::string& host_name, const std::string& version,
                    const std::vector<std::string>& name_spaces);
 
-    const Instance_Value& object_manager() const { return instances_.front(); }
+    const Instance_Value& object_manager() const { return _instances.front(); }
 
     bool owns(std::string_view class_name) const override;
-    std::vector<Instance_Value> instances() const override { return instances_; }
+    std::vector<Instance_Value> instances() const override { return _instances; }
     Result create(Instance_Value) override;
     Result modify(const Instance_Value&, const Property_List&) override;
     Result remove(const Path_Value&) override;
 
 private:
-    std::vector<Instance_Value> instances_;
+    std::vector<Instance_Value> _instances;
 };
 
 /// The interop name space under one of its names: the server's own objects, and the registered profiles of
@@ -47,8 +47,8 @@ public:
     Interop_Space(std::string name, const Interop_Classes& classes, std::vector<Interop_Objects*> objects,
                   Broker_Space& model);
 
-    const std::string& name() const override { return name_; }
-    const Class_Catalogue& classes() const override { return classes_; }
+    const std::string& name() const override { return _name; }
+    const Class_Catalogue& classes() const override { return _classes; }
     Result run(Request request, Receiver* receiver) override;
 
 private:
@@ -65,10 +65,10 @@ private:
     void move_in(Path_Value& path) const;
     void move_out(Path_Value& path) const;
 
-    std::string name_;
-    const Interop_Classes& classes_;
-    std::vector<Interop_Objects*> objects_;
-    Broker_Space& model_;
+    std::string _name;
+    const Interop_Classes& _classes;
+    std::vector<Interop_Objects*> _objects;
+    Broker_Space& _model;
 };
 
 } // namespace KPRV::kldrcim

@@ -48,7 +48,7 @@ void write_out(Xml_Writer& writer, std::vector<Named_Value>& out, const Method_I
             for (Named_Value& each : out)
                 if (same_name(each.name, declared.name) && declared.out) {
                     if (each.value.null)
-                        each.value = Value::null_of(declared.type);
+                        each.value = Plain_Value::null_of(declared.type);
                     write_parameter(writer, each);
                 }
     if (!method)
@@ -70,7 +70,7 @@ Result call_method(const Operation_Call& call)
         return result;
     Xml_Writer& writer = call.answer.behind_values();
     if (result.return_value.type == CMPI_null && method && method->return_type != CMPI_null)
-        result.return_value = Value::null_of(method->return_type);
+        result.return_value = Plain_Value::null_of(method->return_type);
     if (result.return_value.type != CMPI_null)
         write_return_value(writer, result.return_value);
     write_out(writer, result.out, method);

@@ -11,44 +11,44 @@ using Tag = Xml_Tag;
 void Object_Answers::place(Path_Value& path) const
 {
     if (path.name_space.empty())
-        path.name_space = call_.space.name();
+        path.name_space = _call.space.name();
 }
 
 bool Object_Answers::instance(Instance_Value&& instance)
 {
-    Xml_Writer& writer = call_.answer.object();
-    if (kind_ == BARE) {
-        write_instance(writer, instance, form_);
-        return call_.answer.object_done();
+    Xml_Writer& writer = _call.answer.object();
+    if (_kind == BARE) {
+        write_instance(writer, instance, _form);
+        return _call.answer.object_done();
     }
-    const Tag tag = kind_ == NAMED    ? Tag::VALUE_NAMEDINSTANCE
-                    : kind_ == PULLED ? Tag::VALUE_INSTANCEWITHPATH
+    const Tag tag = _kind == NAMED    ? Tag::VALUE_NAMEDINSTANCE
+                    : _kind == PULLED ? Tag::VALUE_INSTANCEWITHPATH
                                       : Tag::VALUE_OBJECTWITHPATH;
     place(instance.path);
     writer.open(tag);
-    if (kind_ == NAMED)
+    if (_kind == NAMED)
         write_instance_name(writer, instance.path);
     else
-        write_instance_path(writer, instance.path, call_.server.host_name());
-    write_instance(writer, instance, form_);
+        write_instance_path(writer, instance.path, _call.server.host_name());
+    write_instance(writer, instance, _form);
     writer.close(tag);
-    return call_.answer.object_done();
+    return _call.answer.object_done();
 }
 
 bool Object_Answers::path(Path_Value&& path)
 {
-    Xml_Writer& writer = call_.answer.object();
+    Xml_Writer& writer = _call.answer.object();
     place(path);
-    if (kind_ == NAMED) {
+    if (_kind == NAMED) {
         write_instance_name(writer, path);
     } else {
-        if (kind_ == OBJECTS)
+        if (_kind == OBJECTS)
             writer.open(Tag::OBJECTPATH);
-        write_instance_path(writer, path, call_.server.host_name());
-        if (kind_ == OBJECTS)
+        write_instance_path(writer, path, _call.server.host_name());
+        if (_kind == OBJECTS)
             writer.close(Tag::OBJECTPATH);
     }
-    return call_.answer.object_done();
+    return _call.answer.object_done();
 }
 
 } // namespace KPRV::kldrcim

@@ -21,12 +21,12 @@ public:
     };
 
     Object_Answers(const Operation_Call& call, Instance_Form form, Form kind)
-        : call_(call), form_(std::move(form)), kind_(kind)
+        : _call(call), _form(std::move(form)), _kind(kind)
     {
     }
 
     /// What nobody reads any more is no failure: the connection is gone.
-    Result run(Request request) { return call_.space.run(std::move(request), this); }
+    Result run(Request request) { return _call.space.run(std::move(request), this); }
 
     bool instance(Instance_Value&& instance) override;
     bool path(Path_Value&& path) override;
@@ -34,9 +34,9 @@ public:
 private:
     void place(Path_Value& path) const;
 
-    const Operation_Call& call_;
-    Instance_Form form_;
-    Form kind_;
+    const Operation_Call& _call;
+    Instance_Form _form;
+    Form _kind;
 };
 
 } // namespace KPRV::kldrcim

@@ -6,50 +6,50 @@ namespace KPRV::kldrcim {
 
 void Pull_Contexts::sweep(Clock::time_point now)
 {
-    std::erase_if(kept_, [&](const auto& entry) { return entry.second.end <= now; });
+    std::erase_if(_kept, [&](const auto& entry) { return entry.second.end <= now; });
 }
 
 std::string Pull_Contexts::put(std::unique_ptr<Pull_Context> context, Clock::time_point now)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     sweep(now);
-    if (kept_.size() >= most)
+    if (_kept.size() >= MOST)
         return {};
     // Not to be guessed: a context is all that a client needs to read what another has asked for.
     std::random_device random;
     std::string name;
     do {
         name = std::to_string(std::uint64_t(random()) << 32 | random());
-    } while (kept_.contains(name));
+    } while (_kept.contains(name));
     const auto end = now + context->lifetime;
-    kept_.emplace(name, Kept{std::move(context), end});
+    _kept.emplace(name, Kept{std::move(context), end});
     return name;
 }
 
 void Pull_Contexts::put_back(const std::string& name, std::unique_ptr<Pull_Context> context,
                              Clock::time_point now)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     const auto end = now + context->lifetime;
-    kept_.emplace(name, Kept{std::move(context), end});
+    _kept.emplace(name, Kept{std::move(context), end});
 }
 
 std::unique_ptr<Pull_Context> Pull_Contexts::take(const std::string& name, Clock::time_point now)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     sweep(now);
-    const auto found = kept_.find(name);
-    if (found == kept_.end())
+    const auto found = _kept.find(name);
+    if (found == _kept.end())
         return nullptr;
     auto context = std::move(found->second.context);
-    kept_.erase(found);
+    _kept.erase(found);
     return context;
 }
 
 std::size_t Pull_Contexts::count() const
 {
-    const Auto_Lock lock(mutex_);
-    return kept_.size();
+    const Auto_Lock lock(_mutex);
+    return _kept.size();
 }
 
 } // namespace KPRV::kldrcim

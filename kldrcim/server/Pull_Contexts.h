@@ -44,7 +44,7 @@ class Pull_Contexts
 public:
     using Clock = std::chrono::steady_clock;
 
-    static constexpr std::size_t most = 20;
+    static constexpr std::size_t MOST = 20;
     static constexpr std::chrono::seconds usual_lifetime{30};
     static constexpr std::chrono::seconds longest_lifetime{90};
 
@@ -65,10 +65,10 @@ private:
         Clock::time_point end;
     };
 
-    void sweep(Clock::time_point now) REQUIRES(mutex_);
+    void sweep(Clock::time_point now) REQUIRES(_mutex);
 
-    mutable Standard_Mutex<> mutex_;
-    std::map<std::string, Kept> kept_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::map<std::string, Kept> _kept GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::kldrcim

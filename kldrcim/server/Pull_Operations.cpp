@@ -11,14 +11,14 @@ namespace KPRV::kldrcim {
 namespace {
 
 // Numbers of statuses that only these operations have.
-constexpr auto invalid_context = static_cast<CMPIrc>(21);
-constexpr auto invalid_timeout = static_cast<CMPIrc>(22);
-constexpr auto filter_unsupported = static_cast<CMPIrc>(25);
-constexpr auto continuing_unsupported = static_cast<CMPIrc>(26);
-constexpr auto limits_exceeded = static_cast<CMPIrc>(27);
+constexpr auto INVALID_CONTEXT = static_cast<CMPIrc>(21);
+constexpr auto INVALID_TIMEOUT = static_cast<CMPIrc>(22);
+constexpr auto FILTER_UNSUPPORTED = static_cast<CMPIrc>(25);
+constexpr auto CONTINUING_UNSUPPORTED = static_cast<CMPIrc>(26);
+constexpr auto LIMITS_EXCEEDED = static_cast<CMPIrc>(27);
 
 /// More are not given at once, whatever is asked for.
-constexpr std::uint64_t most_objects = 10000;
+constexpr std::uint64_t MOST_OBJECTS = 10000;
 
 /// What the instances of a query are: a class with the properties that it asks for.
 void write_row_class(Xml_Writer& writer, const Operation_Call& call, const Select_Query& query)
@@ -40,8 +40,8 @@ void write_end(const Operation_Call& call, const std::string& name, const Select
     Xml_Writer& writer = call.answer.behind_values();
     if (query && call.parameters.flag("ReturnQueryResultClass", false))
         write_row_class(writer, call, *query);
-    write_parameter(writer, {"EndOfSequence", Value::boolean(name.empty())});
-    write_parameter(writer, {"EnumerationContext", Value::text(name)});
+    write_parameter(writer, {"EndOfSequence", Plain_Value::boolean(name.empty())});
+    write_parameter(writer, {"EnumerationContext", Plain_Value::text(name)});
 }
 
 /// The next objects.
@@ -71,21 +71,21 @@ std::chrono::seconds lifetime_of(const Parameters& parameters)
         asked ? std::chrono::seconds(*asked) : Pull_Contexts::usual_lifetime;
     if (lifetime.count() == 0 || lifetime > Pull_Contexts::longest_lifetime)
         throw Wire_Error::status(
-            invalid_timeout, "1 to " + std::to_string(Pull_Contexts::longest_lifetime.count()) + " seconds");
+            INVALID_TIMEOUT, "1 to " + std::to_string(Pull_Contexts::longest_lifetime.count()) + " seconds");
     return lifetime;
 }
 
 void refuse_filters(const Parameters& parameters)
 {
     if (!parameters.text("FilterQuery").empty() || !parameters.text("FilterQueryLanguage").empty())
-        throw Wire_Error::status(filter_unsupported, "no filters");
+        throw Wire_Error::status(FILTER_UNSUPPORTED, "no filters");
 }
 
 /// What each opened enumeration has: nobody asks for what there is not, and it lives for as long as it says.
 std::unique_ptr<Pull_Context> new_context(const Operation_Call& call, Pull_Context::Kind kind)
 {
     if (call.parameters.flag("ContinueOnError", false))
-        throw Wire_Error::status(continuing_unsupported, "no continuing on errors");
+        throw Wire_Error::status(CONTINUING_UNSUPPORTED, "no continuing on errors");
     auto context = std::make_unique<Pull_Context>();
     context->kind = kind;
     context->lifetime = lifetime_of(call.parameters);
@@ -96,7 +96,7 @@ std::unique_ptr<Pull_Context> new_context(const Operation_Call& call, Pull_Conte
 Result open_and_write(const Operation_Call& call, Request request, std::unique_ptr<Pull_Context> context,
                       const Select_Query* query = nullptr)
 {
-    const std::uint64_t count = std::min(call.parameters.number("MaxObjectCount").value_or(0), most_objects);
+    const std::uint64_t count = std::min(call.parameters.number("MaxObjectCount").value_or(0), MOST_OBJECTS);
     Collector collector;
     std::optional<Query_Results> selected;
     if (query)
@@ -118,7 +118,7 @@ Result open_and_write(const Operation_Call& call, Request request, std::unique_p
     const std::string name = contexts.put(std::move(context));
     context = contexts.take(name);
     if (!context)
-        return failed(limits_exceeded, "too many open enumerations");
+        return failed(LIMITS_EXCEEDED, "too many open enumerations");
     write_objects(call, *context, count);
     contexts.put_back(name, std::move(context));
     write_end(call, name, query);
@@ -168,23 +168,23 @@ std::unique_ptr<Pull_Context> taken(const Operation_Call& call, const std::strin
     call.parameters.required("EnumerationContext");
     auto context = call.server.pull_contexts().take(name);
     if (!context)
-        throw Wire_Error::status(invalid_context, "no open enumeration " + name.substr(0, 64));
+        throw Wire_Error::status(INVALID_CONTEXT, "no open enumeration " + name.substr(0, 64));
     if (same_name(context->name_space, call.space.name()))
         return context;
     call.server.pull_contexts().put_back(name, std::move(context));
-    throw Wire_Error::status(invalid_context, "the enumeration is one of another namespace");
+    throw Wire_Error::status(INVALID_CONTEXT, "the enumeration is one of another namespace");
 }
 
 template <Pull_Context::Kind Kind>
 Result pull(const Operation_Call& call)
 {
     call.parameters.required("MaxObjectCount");
-    const std::uint64_t count = std::min(*call.parameters.number("MaxObjectCount"), most_objects);
+    const std::uint64_t count = std::min(*call.parameters.number("MaxObjectCount"), MOST_OBJECTS);
     const std::string name = call.parameters.text("EnumerationContext");
     auto context = taken(call, name);
     if (context->kind != Kind) {
         call.server.pull_contexts().put_back(name, std::move(context));
-        return failed(invalid_context, "the enumeration is of another kind");
+        return failed(INVALID_CONTEXT, "the enumeration is of another kind");
     }
     write_objects(call, *context, count);
     const bool more = context->size() != 0;

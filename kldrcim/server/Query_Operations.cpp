@@ -23,10 +23,10 @@ Select_Query read_query(const Operation_Call& call, const char* language, const 
 
 bool Query_Results::instance(Instance_Value&& instance)
 {
-    if (!query_.matches(instance, classes_))
+    if (!_query.matches(instance, _classes))
         return true;
-    query_.project(instance);
-    return next_.instance(std::move(instance));
+    _query.project(instance);
+    return _next.instance(std::move(instance));
 }
 
 namespace {

@@ -14,7 +14,7 @@ class Query_Results final : public Receiver
 {
 public:
     Query_Results(const Select_Query& query, const Class_Catalogue& classes, Receiver& next)
-        : query_(query), classes_(classes), next_(next)
+        : _query(query), _classes(classes), _next(next)
     {
     }
 
@@ -22,9 +22,9 @@ public:
     bool path(Path_Value&&) override { return true; }
 
 private:
-    const Select_Query& query_;
-    const Class_Catalogue& classes_;
-    Receiver& next_;
+    const Select_Query& _query;
+    const Class_Catalogue& _classes;
+    Receiver& _next;
 };
 
 } // namespace KPRV::kldrcim

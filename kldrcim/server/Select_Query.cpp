@@ -23,9 +23,9 @@ Truth truth_of(bool value)
 }
 
 /// Of parentheses and NOTs, each of which is a call.
-constexpr unsigned deepest_condition = 64;
+constexpr unsigned DEEPEST_CONDITION = 64;
 /// A chain of them is a tree as deep.
-constexpr unsigned most_comparisons = 256;
+constexpr unsigned MOST_COMPARISONS = 256;
 
 enum class Compare
 {
@@ -68,10 +68,10 @@ bool is_like(std::string_view text, std::string_view pattern)
 }
 
 /// Less than, equal, greater: -1, 0, 1. Nothing for two that cannot be compared.
-std::optional<int> order(const Value& a, const Value& b)
+std::optional<int> order(const Plain_Value& a, const Plain_Value& b)
 {
     const auto sign = [](auto x, auto y) { return x < y ? -1 : x > y ? 1 : 0; };
-    const auto is_text = [](const Value& value) {
+    const auto is_text = [](const Plain_Value& value) {
         return value.type == CMPI_string || value.type == CMPI_dateTime;
     };
     if (is_text(a) && is_text(b))
@@ -82,7 +82,7 @@ std::optional<int> order(const Value& a, const Value& b)
     if (!numbers)
         return std::nullopt;
     if (is_real(a.type) || is_real(b.type)) {
-        const auto real = [](const Value& value) {
+        const auto real = [](const Plain_Value& value) {
             return is_real(value.type)       ? value.as_real()
                    : is_unsigned(value.type) ? static_cast<double>(value.as_uint())
                                              : static_cast<double>(value.as_sint());
@@ -114,7 +114,7 @@ public:
     /// The names on the way to a property: "SourceInstance", "OperationalStatus".
     std::vector<std::string> property;
     Compare comparison = Compare::EQUAL;
-    Value value;
+    Plain_Value value;
     std::shared_ptr<const Condition> left, right;
 
     Truth evaluate(const Instance_Value& instance, const Class_Catalogue& classes) const
@@ -132,7 +132,7 @@ private:
     Truth compare(const Instance_Value& instance, const Class_Catalogue& classes) const
     {
         const Instance_Value* holder = &instance;
-        const Value* found = nullptr;
+        const Plain_Value* found = nullptr;
         for (std::size_t i = 0; i < property.size() && holder; ++i) {
             found = holder->property(property[i]);
             holder = found && !found->null ? found->as_instance() : nullptr;
@@ -174,17 +174,17 @@ private:
 class Query_Parser
 {
 public:
-    explicit Query_Parser(const std::string& text) : text_(text) { advance(); }
+    explicit Query_Parser(const std::string& text) : _text(text) { advance(); }
 
     std::optional<Select_Query> query(Query_Error& error)
     {
         Select_Query result;
         if (select(result) && end()) {
-            result.compared_ = std::move(compared_);
+            result._compared = std::move(_compared);
             return result;
         }
         error = {CMPI_RC_ERR_INVALID_QUERY,
-                 "at character " + std::to_string(failed_at_ + 1) + ": " + wanted_ + " is expected"};
+                 "at character " + std::to_string(_failed_at + 1) + ": " + _wanted + " is expected"};
         return std::nullopt;
     }
 
@@ -204,14 +204,14 @@ private:
 
     bool select(Select_Query& result)
     {
-        if (!word("SELECT") || !properties(result.properties_) || !word("FROM") || !name(result.class_name_))
+        if (!word("SELECT") || !properties(result._properties) || !word("FROM") || !name(result._class_name))
             return false;
         // An alias, as in FROM Class AS c, is one thing more than alerts need.
         if (!is_word("WHERE"))
             return true;
         advance();
-        result.condition_ = any_of(result.class_name_);
-        return result.condition_ != nullptr;
+        result._condition = any_of(result._class_name);
+        return result._condition != nullptr;
     }
 
     bool properties(std::vector<std::string>& names)
@@ -250,7 +250,7 @@ private:
 
     Part one(const std::string& class_name)
     {
-        if (++depth_ > deepest_condition)
+        if (++_depth > DEEPEST_CONDITION)
             return fail("less nesting"), nullptr;
         Part part;
         if (is_word("NOT")) {
@@ -264,13 +264,13 @@ private:
         } else {
             part = comparison(class_name);
         }
-        --depth_;
+        --_depth;
         return part;
     }
 
     Part comparison(const std::string& class_name)
     {
-        if (++comparisons_ > most_comparisons)
+        if (++_comparisons > MOST_COMPARISONS)
             return fail("fewer comparisons"), nullptr;
         auto part = std::make_shared<Condition>();
         if (!path(class_name, part->property))
@@ -278,7 +278,7 @@ private:
         if (is_word("IS"))
             return null_test(part);
         const auto* found = std::ranges::find_if(comparisons, [&](const auto& each) {
-            return (kind_ == Kind::SIGN || kind_ == Kind::WORD) && same_name(token_, each.first);
+            return (_kind == Kind::SIGN || _kind == Kind::WORD) && same_name(_token, each.first);
         });
         if (found == std::end(comparisons))
             return fail("a comparison"), nullptr;
@@ -286,11 +286,11 @@ private:
         part->comparison = found->second;
         if (found->second == Compare::ISA) {
             std::string ancestor;
-            if (kind_ == Kind::TEXT)
-                ancestor = token_, advance();
+            if (_kind == Kind::TEXT)
+                ancestor = _token, advance();
             else if (!name(ancestor))
                 return nullptr;
-            part->value = Value::text(ancestor);
+            part->value = Plain_Value::text(ancestor);
             return part;
         }
         return literal(part->value) ? part : nullptr;
@@ -328,49 +328,49 @@ private:
         }
         if (names.size() > 1 && same_name(names.front(), class_name))
             names.erase(names.begin());
-        compared_.push_back(names.front());
+        _compared.push_back(names.front());
         return names.size() <= 2 || fail("one embedded instance at most");
     }
 
-    bool literal(Value& value)
+    bool literal(Plain_Value& value)
     {
-        if (kind_ == Kind::TEXT)
-            value = Value::text(token_);
-        else if (kind_ == Kind::NUMBER)
+        if (_kind == Kind::TEXT)
+            value = Plain_Value::text(_token);
+        else if (_kind == Kind::NUMBER)
             return number(value);
         else if (is_word("TRUE") || is_word("FALSE"))
-            value = Value::boolean(is_word("TRUE"));
+            value = Plain_Value::boolean(is_word("TRUE"));
         else if (is_word("NULL"))
-            value = Value::null_of(CMPI_string);
+            value = Plain_Value::null_of(CMPI_string);
         else
             return fail("a text, a number, TRUE, FALSE or NULL");
         advance();
         return true;
     }
 
-    bool number(Value& value)
+    bool number(Plain_Value& value)
     {
-        const char* end = token_.data() + token_.size();
+        const char* end = _token.data() + _token.size();
         std::uint64_t magnitude = 0;
         std::int64_t negative = 0;
         double real = 0;
-        if (const auto read = std::from_chars(token_.data(), end, magnitude);
+        if (const auto read = std::from_chars(_token.data(), end, magnitude);
             read.ec == std::errc() && read.ptr == end)
-            value = Value::unsigned_number(CMPI_uint64, magnitude);
-        else if (const auto less = std::from_chars(token_.data(), end, negative);
+            value = Plain_Value::unsigned_number(CMPI_uint64, magnitude);
+        else if (const auto less = std::from_chars(_token.data(), end, negative);
                  less.ec == std::errc() && less.ptr == end)
-            value = Value::signed_number(CMPI_sint64, negative);
-        else if (const auto point = std::from_chars(token_.data(), end, real);
+            value = Plain_Value::signed_number(CMPI_sint64, negative);
+        else if (const auto point = std::from_chars(_token.data(), end, real);
                  point.ec == std::errc() && point.ptr == end)
-            value = Value::real(CMPI_real64, real);
+            value = Plain_Value::real(CMPI_real64, real);
         else
             return fail("a number");
         advance();
         return true;
     }
 
-    bool end() { return kind_ == Kind::END || fail("AND, OR or the end"); }
-    bool is_word(const char* wanted) const { return kind_ == Kind::WORD && same_name(token_, wanted); }
+    bool end() { return _kind == Kind::END || fail("AND, OR or the end"); }
+    bool is_word(const char* wanted) const { return _kind == Kind::WORD && same_name(_token, wanted); }
     bool word(const char* wanted)
     {
         if (!is_word(wanted))
@@ -380,50 +380,50 @@ private:
     }
     bool sign(std::string_view wanted)
     {
-        if (kind_ != Kind::SIGN || token_ != wanted)
+        if (_kind != Kind::SIGN || _token != wanted)
             return false;
         advance();
         return true;
     }
     bool name(std::string& result)
     {
-        if (kind_ != Kind::WORD)
+        if (_kind != Kind::WORD)
             return fail("a name");
-        result = token_;
+        result = _token;
         advance();
         return true;
     }
     bool fail(const char* wanted)
     {
-        if (wanted_.empty()) {
-            wanted_ = wanted;
-            failed_at_ = token_at_;
+        if (_wanted.empty()) {
+            _wanted = wanted;
+            _failed_at = _token_at;
         }
         return false;
     }
 
     void advance()
     {
-        at_ = std::min(text_.find_first_not_of(" \t\r\n", at_), text_.size());
-        token_at_ = at_;
-        token_.clear();
-        kind_ = Kind::END;
-        if (at_ == text_.size())
+        _at = std::min(_text.find_first_not_of(" \t\r\n", _at), _text.size());
+        _token_at = _at;
+        _token.clear();
+        _kind = Kind::END;
+        if (_at == _text.size())
             return;
-        const char c = text_[at_];
+        const char c = _text[_at];
         if (is_name_character(c) && !is_digit(c))
             return take(Kind::WORD, [](char each) { return is_name_character(each); });
-        if (is_digit(c) || (c == '-' && at_ + 1 < text_.size() && is_digit(text_[at_ + 1])))
+        if (is_digit(c) || (c == '-' && _at + 1 < _text.size() && is_digit(_text[_at + 1])))
             return take(Kind::NUMBER,
                         [](char each) { return is_name_character(each) || each == '.' || each == '-'; });
         if (c == '\'' || c == '"')
             return quoted(c);
         constexpr std::string_view pairs[] = {"<>", "!=", "<=", ">=", "::"};
         const bool is_pair =
-            std::ranges::find(pairs, std::string_view(text_).substr(at_, 2)) != std::end(pairs);
-        token_ = text_.substr(at_, is_pair ? 2 : 1);
-        at_ += token_.size();
-        kind_ = Kind::SIGN;
+            std::ranges::find(pairs, std::string_view(_text).substr(_at, 2)) != std::end(pairs);
+        _token = _text.substr(_at, is_pair ? 2 : 1);
+        _at += _token.size();
+        _kind = Kind::SIGN;
     }
 
     static bool is_digit(char c) { return c >= '0' && c <= '9'; }
@@ -437,38 +437,38 @@ private:
     template <class Belongs>
     void take(Kind kind, Belongs belongs)
     {
-        while (at_ < text_.size() && belongs(text_[at_]))
-            token_ += text_[at_++];
-        kind_ = kind;
+        while (_at < _text.size() && belongs(_text[_at]))
+            _token += _text[_at++];
+        _kind = kind;
     }
 
     /// A quote in the text is doubled, or stands behind a backslash.
     void quoted(char quote)
     {
-        for (++at_; at_ < text_.size(); ++at_) {
-            const bool more = at_ + 1 < text_.size();
-            if (text_[at_] == quote && !(more && text_[at_ + 1] == quote)) {
-                ++at_;
-                kind_ = Kind::TEXT;
+        for (++_at; _at < _text.size(); ++_at) {
+            const bool more = _at + 1 < _text.size();
+            if (_text[_at] == quote && !(more && _text[_at + 1] == quote)) {
+                ++_at;
+                _kind = Kind::TEXT;
                 return;
             }
-            if (more && (text_[at_] == quote || text_[at_] == '\\'))
-                ++at_;
-            token_ += text_[at_];
+            if (more && (_text[_at] == quote || _text[_at] == '\\'))
+                ++_at;
+            _token += _text[_at];
         }
-        kind_ = Kind::BROKEN;
+        _kind = Kind::BROKEN;
     }
 
-    const std::string& text_;
-    std::size_t at_ = 0;
-    std::size_t token_at_ = 0;
-    Kind kind_ = Kind::END;
-    std::string token_;
-    unsigned depth_ = 0;
-    unsigned comparisons_ = 0;
-    std::vector<std::string> compared_;
-    std::string wanted_;
-    std::size_t failed_at_ = 0;
+    const std::string& _text;
+    std::size_t _at = 0;
+    std::size_t _token_at = 0;
+    Kind _kind = Kind::END;
+    std::string _token;
+    unsigned _depth = 0;
+    unsigned _comparisons = 0;
+    std::vector<std::string> _compared;
+    std::string _wanted;
+    std::size_t _failed_at = 0;
 };
 
 std::optional<Select_Query> Select_Query::parse(const std::string& text, const std::string& language,
@@ -484,7 +484,7 @@ std::optional<Select_Query> Select_Query::parse(const std::string& text, const s
 
 std::string Select_Query::unknown_property(const Class_Info& info) const
 {
-    for (const auto* names : {&properties_, &compared_})
+    for (const auto* names : {&_properties, &_compared})
         for (const std::string& name : *names)
             if (!info.property(name))
                 return name;
@@ -493,17 +493,17 @@ std::string Select_Query::unknown_property(const Class_Info& info) const
 
 bool Select_Query::matches(const Instance_Value& instance, const Class_Catalogue& classes) const
 {
-    return classes.is_a(instance.path.class_name, class_name_) &&
-           (!condition_ || condition_->evaluate(instance, classes) == Truth::YES);
+    return classes.is_a(instance.path.class_name, _class_name) &&
+           (!_condition || _condition->evaluate(instance, classes) == Truth::YES);
 }
 
 void Select_Query::project(Instance_Value& instance) const
 {
-    if (properties_.empty())
+    if (_properties.empty())
         return;
     std::erase_if(instance.properties, [&](const Named_Value& property) {
         return !same_name(property.name, "SequenceContext") && !same_name(property.name, "SequenceNumber") &&
-               std::ranges::none_of(properties_,
+               std::ranges::none_of(_properties,
                                     [&](const std::string& name) { return same_name(name, property.name); });
     });
 }

@@ -30,9 +30,9 @@ public:
     static std::optional<Select_Query> parse(const std::string& text, const std::string& language,
                                              Query_Error& error);
 
-    const std::string& class_name() const { return class_name_; }
+    const std::string& class_name() const { return _class_name; }
     /// What is asked for; nothing for all.
-    const std::vector<std::string>& properties() const { return properties_; }
+    const std::vector<std::string>& properties() const { return _properties; }
     /// The first name, of those that are asked for or compared, that is no property of the class; empty if
     /// there is none.
     std::string unknown_property(const Class_Info& info) const;
@@ -46,10 +46,10 @@ public:
 private:
     friend class Query_Parser;
 
-    std::string class_name_;
-    std::vector<std::string> properties_;
-    std::vector<std::string> compared_;
-    std::shared_ptr<const Condition> condition_;
+    std::string _class_name;
+    std::vector<std::string> _properties;
+    std::vector<std::string> _compared;
+    std::shared_ptr<const Condition> _condition;
 };
 
 } // namespace KPRV::kldrcim

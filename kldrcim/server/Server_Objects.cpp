@@ -31,27 +31,29 @@ Result read_only()
 Server_Objects::Server_Objects(const std::string& host_name, const std::string& version,
                                const std::vector<std::string>& name_spaces)
 {
-    const Value manager = Value::text("kldrcim:" + host_name);
-    const Named_Value system_class{"SystemCreationClassName", Value::text("CIM_ComputerSystem")};
-    const Named_Value system{"SystemName", Value::text(host_name)};
-    constexpr std::uint64_t ok = 2, enabled = 2;
-    instances_.push_back(instance_of(
+    const Plain_Value manager = Plain_Value::text("kldrcim:" + host_name);
+    const Named_Value system_class{"SystemCreationClassName", Plain_Value::text("CIM_ComputerSystem")};
+    const Named_Value system{"SystemName", Plain_Value::text(host_name)};
+    constexpr std::uint64_t OK = 2, enabled = 2;
+    _instances.push_back(instance_of(
         manager_class,
-        {system_class, system, {"CreationClassName", Value::text(manager_class)}, {"Name", manager}},
-        {{"ElementName", Value::text("kldrcim")},
-         {"Description", Value::text("kldrcim " + version)},
-         {"Started", Value::boolean(true)},
-         {"EnabledState", Value::unsigned_number(CMPI_uint16, enabled)},
-         {"OperationalStatus", Value::array(CMPI_uint16, {Value::unsigned_number(CMPI_uint16, ok)})}}));
+        {system_class, system, {"CreationClassName", Plain_Value::text(manager_class)}, {"Name", manager}},
+        {{"ElementName", Plain_Value::text("kldrcim")},
+         {"Description", Plain_Value::text("kldrcim " + version)},
+         {"Started", Plain_Value::boolean(true)},
+         {"EnabledState", Plain_Value::unsigned_number(CMPI_uint16, enabled)},
+         {"OperationalStatus",
+          Plain_Value::array(CMPI_uint16, {Plain_Value::unsigned_number(CMPI_uint16, OK)})}}));
     for (const std::string& name : name_spaces)
-        instances_.push_back(instance_of(name_space_class,
-                                         {system_class,
-                                          system,
-                                          {"ObjectManagerCreationClassName", Value::text(manager_class)},
-                                          {"ObjectManagerName", manager},
-                                          {"CreationClassName", Value::text(name_space_class)},
-                                          {"Name", Value::text(name)}},
-                                         {{"ElementName", Value::text(name)}}));
+        _instances.push_back(
+            instance_of(name_space_class,
+                        {system_class,
+                         system,
+                         {"ObjectManagerCreationClassName", Plain_Value::text(manager_class)},
+                         {"ObjectManagerName", manager},
+                         {"CreationClassName", Plain_Value::text(name_space_class)},
+                         {"Name", Plain_Value::text(name)}},
+                        {{"ElementName", Plain_Value::text(name)}}));
 }
 
 bool Server_Objects::owns(std::string_view class_name) const

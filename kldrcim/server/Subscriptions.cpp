@@ -12,20 +12,20 @@ namespace {
 constexpr const char* filter_class = "CIM_IndicationFilter";
 constexpr const char* listener_class = "CIM_ListenerDestination";
 constexpr const char* subscription_class = "CIM_IndicationSubscription";
-constexpr std::uint64_t transient = 3;
+constexpr std::uint64_t TRANSIENT = 3;
 /// Of all three kinds.
-constexpr std::size_t most_instances = 1000;
-constexpr std::size_t longest_query = std::size_t(16) << 10;
+constexpr std::size_t MOST_INSTANCES = 1000;
+constexpr std::size_t LONGEST_QUERY = std::size_t(16) << 10;
 
 std::string text_of(const Instance_Value& instance, std::string_view name)
 {
-    const Value* value = instance.property(name);
+    const Plain_Value* value = instance.property(name);
     return value && !value->null ? value->as_text() : std::string();
 }
 
 const Path_Value* end_of(const Instance_Value& subscription, std::string_view role)
 {
-    const Value* value = subscription.property(role);
+    const Plain_Value* value = subscription.property(role);
     return value && !value->null ? value->as_path() : nullptr;
 }
 
@@ -44,9 +44,9 @@ std::string new_context(const std::string& system_name)
     return system_name + ":" + std::to_string(std::uint64_t(random()) << 32 | random());
 }
 
-void default_value(Instance_Value& instance, const char* name, Value value)
+void default_value(Instance_Value& instance, const char* name, Plain_Value value)
 {
-    const Value* present = instance.property(name);
+    const Plain_Value* present = instance.property(name);
     if (!present || present->null)
         set_value(instance.properties, name, std::move(value));
 }
@@ -62,10 +62,10 @@ struct Subscriptions::Active
     std::shared_ptr<Indication_Exporter> exporter;
 };
 
-Subscriptions::Subscriptions(Host& host, const Interop_Classes& classes, Options options)
-    : host_(host), classes_(classes), options_(std::move(options))
+Subscriptions::Subscriptions(Local_Server& host, const Interop_Classes& classes, Options options)
+    : _host(host), _classes(classes), _options(std::move(options))
 {
-    host_.set_sink(
+    _host.set_sink(
         [this](const std::string&, const Instance_Value& indication) { return distribute(indication); });
 }
 
@@ -73,106 +73,106 @@ Subscriptions::~Subscriptions()
 {
     // The module is asked to stop before those go who would be told.
     {
-        const Auto_Lock lock(mutex_);
-        providers_.clear();
+        const Auto_Lock lock(_mutex);
+        _providers.clear();
     }
-    host_.set_sink({});
+    _host.set_sink({});
 }
 
 bool Subscriptions::restore(std::string& error)
 {
     std::vector<Instance_Value> kept;
-    if (options_.state_file.empty())
+    if (_options.state_file.empty())
         return true;
-    if (!read_state(options_.state_file, classes_, kept, error))
+    if (!read_state(_options.state_file, _classes, kept, error))
         return false;
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     for (Instance_Value& instance : kept) {
         const std::string name = instance.path.class_name;
         const Result result = add(std::move(instance));
         if (!result.ok())
-            options_.log("a kept " + name + " is dropped: " + result.message);
+            _options.log("a kept " + name + " is dropped: " + result.message);
     }
     return true;
 }
 
 Subscriptions::Kind Subscriptions::kind_of(std::string_view class_name) const
 {
-    return classes_.is_a(class_name, filter_class)     ? Kind::FILTER
-           : classes_.is_a(class_name, listener_class) ? Kind::LISTENER
+    return _classes.is_a(class_name, filter_class)     ? Kind::FILTER
+           : _classes.is_a(class_name, listener_class) ? Kind::LISTENER
                                                        : Kind::SUBSCRIPTION;
 }
 
 bool Subscriptions::owns(std::string_view class_name) const
 {
-    return classes_.is_a(class_name, filter_class) || classes_.is_a(class_name, listener_class) ||
-           classes_.is_a(class_name, subscription_class);
+    return _classes.is_a(class_name, filter_class) || _classes.is_a(class_name, listener_class) ||
+           _classes.is_a(class_name, subscription_class);
 }
 
 std::vector<Instance_Value> Subscriptions::instances() const
 {
-    const Auto_Lock lock(mutex_);
-    return instances_;
+    const Auto_Lock lock(_mutex);
+    return _instances;
 }
 
 Instance_Value* Subscriptions::find(const Path_Value& path)
 {
     const auto found = std::ranges::find_if(
-        instances_, [&](const Instance_Value& each) { return same_object(each.path, path); });
-    return found == instances_.end() ? nullptr : &*found;
+        _instances, [&](const Instance_Value& each) { return same_object(each.path, path); });
+    return found == _instances.end() ? nullptr : &*found;
 }
 
 void Subscriptions::complete(Instance_Value& instance) const
 {
-    const Class_Info* info = classes_.find(instance.path.class_name);
+    const Class_Info* info = _classes.find(instance.path.class_name);
     instance.path.class_name = info->name;
     if (kind_of(info->name) == Kind::SUBSCRIPTION) {
-        constexpr std::uint64_t enabled = 2, ignore = 2, none = 2;
-        default_value(instance, "SubscriptionState", Value::unsigned_number(CMPI_uint16, enabled));
-        default_value(instance, "OnFatalErrorPolicy", Value::unsigned_number(CMPI_uint16, ignore));
-        default_value(instance, "RepeatNotificationPolicy", Value::unsigned_number(CMPI_uint16, none));
+        constexpr std::uint64_t ENABLED = 2, ignore = 2, none = 2;
+        default_value(instance, "SubscriptionState", Plain_Value::unsigned_number(CMPI_uint16, ENABLED));
+        default_value(instance, "OnFatalErrorPolicy", Plain_Value::unsigned_number(CMPI_uint16, ignore));
+        default_value(instance, "RepeatNotificationPolicy", Plain_Value::unsigned_number(CMPI_uint16, none));
         // Where the ends are is known: other names of this server, and of its name space, are not kept.
         for (const char* role : {"Filter", "Handler"})
             if (const Path_Value* end = end_of(instance, role)) {
                 Path_Value path = *end;
                 path.host.clear();
-                path.name_space = options_.interop_names.front();
-                set_value(instance.properties, role, Value::path(std::move(path)));
+                path.name_space = _options.interop_names.front();
+                set_value(instance.properties, role, Plain_Value::path(std::move(path)));
             }
     } else {
-        default_value(instance, "SystemCreationClassName", Value::text("CIM_ComputerSystem"));
-        default_value(instance, "SystemName", Value::text(options_.system_name));
-        default_value(instance, "CreationClassName", Value::text(info->name));
-        default_value(instance, "Name", Value::text(new_context(info->name)));
+        default_value(instance, "SystemCreationClassName", Plain_Value::text("CIM_ComputerSystem"));
+        default_value(instance, "SystemName", Plain_Value::text(_options.system_name));
+        default_value(instance, "CreationClassName", Plain_Value::text(info->name));
+        default_value(instance, "Name", Plain_Value::text(new_context(info->name)));
     }
     instance.path.keys.clear();
     for (const Feature_Info& feature : info->properties)
-        if (const Value* value = feature.key ? instance.property(feature.name) : nullptr)
+        if (const Plain_Value* value = feature.key ? instance.property(feature.name) : nullptr)
             instance.path.keys.push_back({feature.name, *value});
 }
 
 Result Subscriptions::check_filter(const Instance_Value& filter) const
 {
     const std::string query = text_of(filter, "Query");
-    if (query.size() > longest_query)
+    if (query.size() > LONGEST_QUERY)
         return failed(CMPI_RC_ERR_INVALID_QUERY, "the query is too long");
     Query_Error error;
     const auto parsed = Select_Query::parse(query, text_of(filter, "QueryLanguage"), error);
     if (!parsed)
         return failed(error.rc, error.text);
-    const Class_Info* info = classes_.find(parsed->class_name());
+    const Class_Info* info = _classes.find(parsed->class_name());
     if (!info || !info->is_indication)
         return failed(CMPI_RC_ERR_INVALID_CLASS, parsed->class_name() + " is no class of indications");
     std::vector<std::string> sources;
-    if (const Value* list = filter.property("SourceNamespaces"))
-        for (const Value& each : list->elements())
+    if (const Plain_Value* list = filter.property("SourceNamespaces"))
+        for (const Plain_Value& each : list->elements())
             sources.push_back(each.as_text());
     if (sources.empty() && !text_of(filter, "SourceNamespace").empty())
         sources.push_back(text_of(filter, "SourceNamespace"));
     // Who says none, or where filters live, means where the indications are.
     std::erase_if(sources, [&](const std::string& each) {
-        return same_name(each, host_.options().name_space) ||
-               std::ranges::any_of(options_.interop_names,
+        return same_name(each, _host.options().name_space) ||
+               std::ranges::any_of(_options.interop_names,
                                    [&](const std::string& name) { return same_name(name, each); });
     });
     return sources.empty() ? Result() : failed(CMPI_RC_ERR_INVALID_NAMESPACE, sources.front());
@@ -180,7 +180,7 @@ Result Subscriptions::check_filter(const Instance_Value& filter) const
 
 Result Subscriptions::add(Instance_Value instance)
 {
-    if (instances_.size() >= most_instances)
+    if (_instances.size() >= MOST_INSTANCES)
         return failed(CMPI_RC_ERR_FAILED, "too many filters, listeners and subscriptions");
     complete(instance);
     if (find(instance.path))
@@ -196,13 +196,13 @@ Result Subscriptions::add(Instance_Value instance)
     if (!result.ok())
         return result;
     result.paths.push_back(instance.path);
-    instances_.push_back(std::move(instance));
+    _instances.push_back(std::move(instance));
     return result;
 }
 
 Result Subscriptions::create(Instance_Value instance)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     Result result = add(std::move(instance));
     if (result.ok())
         keep();
@@ -216,7 +216,7 @@ Result Subscriptions::modify(const Instance_Value&, const Property_List&)
 
 bool Subscriptions::is_in_use(const Path_Value& path) const
 {
-    return std::ranges::any_of(instances_, [&](const Instance_Value& each) {
+    return std::ranges::any_of(_instances, [&](const Instance_Value& each) {
         const Path_Value* filter = end_of(each, "Filter");
         const Path_Value* handler = end_of(each, "Handler");
         return (filter && same_object(*filter, path)) || (handler && same_object(*handler, path));
@@ -225,14 +225,14 @@ bool Subscriptions::is_in_use(const Path_Value& path) const
 
 Result Subscriptions::remove(const Path_Value& path)
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     if (!find(path))
         return failed(CMPI_RC_ERR_NOT_FOUND, "");
     if (is_in_use(path))
         return failed(CMPI_RC_ERR_FAILED, "a subscription uses it");
     if (kind_of(path.class_name) == Kind::SUBSCRIPTION)
         deactivate(path);
-    std::erase_if(instances_, [&](const Instance_Value& each) { return same_object(each.path, path); });
+    std::erase_if(_instances, [&](const Instance_Value& each) { return same_object(each.path, path); });
     keep();
     return {};
 }
@@ -241,16 +241,16 @@ Result Subscriptions::remove(const Path_Value& path)
 Result Subscriptions::use_provider_classes(const std::string& class_name, std::vector<std::string>& used)
 {
     Result refused = failed(CMPI_RC_ERR_NOT_SUPPORTED, "nobody makes " + class_name);
-    for (const std::string& name : classes_.class_names()) {
-        const Class_Info* info = classes_.find(name);
-        if (!info->is_indication || !info->has_provider || !classes_.is_a(name, class_name))
+    for (const std::string& name : _classes.class_names()) {
+        const Class_Info* info = _classes.find(name);
+        if (!info->is_indication || !info->has_provider || !_classes.is_a(name, class_name))
             continue;
-        auto& [subscription, count] = providers_[name];
+        auto& [subscription, count] = _providers[name];
         if (!subscription) {
-            auto fresh = std::make_unique<Subscription>(host_, name);
-            if (const CMPIrc rc = fresh->add(host_.options().name_space); rc != CMPI_RC_OK) {
+            auto fresh = std::make_unique<Subscription>(_host, name);
+            if (const CMPIrc rc = fresh->add(_host.options().name_space); rc != CMPI_RC_OK) {
                 refused = failed(rc, name + " takes no subscription");
-                providers_.erase(name);
+                _providers.erase(name);
                 continue;
             }
             subscription = std::move(fresh);
@@ -263,9 +263,9 @@ Result Subscriptions::use_provider_classes(const std::string& class_name, std::v
 
 void Subscriptions::leave_provider_class(const std::string& provider_class)
 {
-    const auto found = providers_.find(provider_class);
-    if (found != providers_.end() && --found->second.second == 0)
-        providers_.erase(found);
+    const auto found = _providers.find(provider_class);
+    if (found != _providers.end() && --found->second.second == 0)
+        _providers.erase(found);
 }
 
 Result Subscriptions::activate(const Instance_Value& subscription)
@@ -285,14 +285,14 @@ Result Subscriptions::activate(const Instance_Value& subscription)
     if (Result result = use_provider_classes(query->class_name(), used); !result.ok())
         return result;
     const std::string url = text_of(*handler, "Destination");
-    std::shared_ptr<Indication_Exporter> exporter = exporters_[url].lock();
+    std::shared_ptr<Indication_Exporter> exporter = _exporters[url].lock();
     if (!exporter) {
-        exporter = std::make_shared<Indication_Exporter>(url, new_context(options_.system_name), options_.log,
-                                                         options_.deliver);
-        exporters_[url] = exporter;
+        exporter = std::make_shared<Indication_Exporter>(url, new_context(_options.system_name), _options.log,
+                                                         _options.deliver);
+        _exporters[url] = exporter;
     }
-    const Auto_Lock lock(delivery_mutex_);
-    active_.push_back(
+    const Auto_Lock lock(_delivery_mutex);
+    _active.push_back(
         std::make_shared<Active>(Active{subscription.path, std::move(*query), std::move(used), exporter}));
     return {};
 }
@@ -301,13 +301,13 @@ void Subscriptions::deactivate(const Path_Value& path)
 {
     std::shared_ptr<Active> gone;
     {
-        const Auto_Lock lock(delivery_mutex_);
+        const Auto_Lock lock(_delivery_mutex);
         const auto found =
-            std::ranges::find_if(active_, [&](const auto& each) { return same_object(each->path, path); });
-        if (found == active_.end())
+            std::ranges::find_if(_active, [&](const auto& each) { return same_object(each->path, path); });
+        if (found == _active.end())
             return;
         gone = *found;
-        active_.erase(found);
+        _active.erase(found);
     }
     for (const std::string& provider_class : gone->provider_classes)
         leave_provider_class(provider_class);
@@ -317,11 +317,11 @@ CMPIrc Subscriptions::distribute(const Instance_Value& indication)
 {
     std::vector<std::shared_ptr<Active>> all;
     {
-        const Auto_Lock lock(delivery_mutex_);
-        all = active_;
+        const Auto_Lock lock(_delivery_mutex);
+        all = _active;
     }
     for (const auto& each : all)
-        if (each->query.matches(indication, classes_)) {
+        if (each->query.matches(indication, _classes)) {
             Instance_Value own = indication;
             each->query.project(own);
             each->exporter->put(std::move(own));
@@ -332,20 +332,20 @@ CMPIrc Subscriptions::distribute(const Instance_Value& indication)
 /// What is to outlive this process: not the transient listeners, and not what hangs on them.
 void Subscriptions::keep()
 {
-    if (options_.state_file.empty())
+    if (_options.state_file.empty())
         return;
     const auto is_transient = [&](const Path_Value* listener) {
         const Instance_Value* found = listener ? find(*listener) : nullptr;
-        const Value* type = found ? found->property("PersistenceType") : nullptr;
-        return type && type->as_uint() == transient;
+        const Plain_Value* type = found ? found->property("PersistenceType") : nullptr;
+        return type && type->as_uint() == TRANSIENT;
     };
     std::vector<Instance_Value> kept;
-    for (const Instance_Value& each : instances_)
+    for (const Instance_Value& each : _instances)
         if (!is_transient(&each.path) && !is_transient(end_of(each, "Handler")))
             kept.push_back(each);
     std::string error;
-    if (!write_state(options_.state_file, kept, error))
-        options_.log(error);
+    if (!write_state(_options.state_file, kept, error))
+        _options.log(error);
 }
 
 } // namespace KPRV::kldrcim

@@ -24,7 +24,7 @@ public:
         Delivery_Function deliver = deliver_by_http;
     };
 
-    Subscriptions(Host& host, const Interop_Classes& classes, Options options);
+    Subscriptions(Local_Server& host, const Interop_Classes& classes, Options options);
     ~Subscriptions() override;
 
     /// What the file holds; false with `error` if it cannot be read. Subscriptions that the module refuses
@@ -47,29 +47,29 @@ private:
     struct Active;
 
     Kind kind_of(std::string_view class_name) const;
-    Instance_Value* find(const Path_Value& path) REQUIRES(mutex_);
-    Result add(Instance_Value instance) REQUIRES(mutex_);
+    Instance_Value* find(const Path_Value& path) REQUIRES(_mutex);
+    Result add(Instance_Value instance) REQUIRES(_mutex);
     Result check_filter(const Instance_Value& filter) const;
-    Result activate(const Instance_Value& subscription) REQUIRES(mutex_);
-    void deactivate(const Path_Value& path) REQUIRES(mutex_);
+    Result activate(const Instance_Value& subscription) REQUIRES(_mutex);
+    void deactivate(const Path_Value& path) REQUIRES(_mutex);
     Result use_provider_classes(const std::string& class_name, std::vector<std::string>& used)
-        REQUIRES(mutex_);
-    void leave_provider_class(const std::string& provider_class) REQUIRES(mutex_);
-    bool is_in_use(const Path_Value& path) const REQUIRES(mutex_);
+        REQUIRES(_mutex);
+    void leave_provider_class(const std::string& provider_class) REQUIRES(_mutex);
+    bool is_in_use(const Path_Value& path) const REQUIRES(_mutex);
     void complete(Instance_Value& instance) const;
     CMPIrc distribute(const Instance_Value& indication);
-    void keep() REQUIRES(mutex_);
+    void keep() REQUIRES(_mutex);
 
-    Host& host_;
-    const Interop_Classes& classes_;
-    const Options options_;
+    Local_Server& _host;
+    const Interop_Classes& _classes;
+    const Options _options;
     /// Held across calls of the module, which must not be those that deliver: these take the other one.
-    mutable Standard_Mutex<> mutex_;
-    std::vector<Instance_Value> instances_ GUARDED_BY(mutex_);
-    std::map<std::string, std::pair<std::unique_ptr<Subscription>, unsigned>> providers_ GUARDED_BY(mutex_);
-    mutable Standard_Mutex<> delivery_mutex_;
-    std::vector<std::shared_ptr<Active>> active_ GUARDED_BY(delivery_mutex_);
-    std::map<std::string, std::weak_ptr<Indication_Exporter>> exporters_ GUARDED_BY(mutex_);
+    mutable Standard_Mutex<> _mutex;
+    std::vector<Instance_Value> _instances GUARDED_BY(_mutex);
+    std::map<std::string, std::pair<std::unique_ptr<Subscription>, unsigned>> _providers GUARDED_BY(_mutex);
+    mutable Standard_Mutex<> _delivery_mutex;
+    std::vector<std::shared_ptr<Active>> _active GUARDED_BY(_delivery_mutex);
+    std::map<std::string, std::weak_ptr<Indication_Exporter>> _exporters GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::kldrcim

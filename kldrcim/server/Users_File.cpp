@@ -32,9 +32,9 @@ bool Users_File::read(const std::string& file, std::string& error)
             error = file + ":" + std::to_string(number) + ": no \"user:hash\" with a hash of crypt ($6$...)";
             return false;
         }
-        hashes_[line.substr(0, colon)] = line.substr(colon + 1);
+        _hashes[line.substr(0, colon)] = line.substr(colon + 1);
     }
-    if (hashes_.empty()) {
+    if (_hashes.empty()) {
         error = file + ": no user";
         return false;
     }
@@ -43,8 +43,8 @@ bool Users_File::read(const std::string& file, std::string& error)
 
 bool Users_File::accepts(const std::string& user, const std::string& password) const
 {
-    const auto found = hashes_.find(user);
-    const std::string& hash = found == hashes_.end() ? hashes_.begin()->second : found->second;
+    const auto found = _hashes.find(user);
+    const std::string& hash = found == _hashes.end() ? _hashes.begin()->second : found->second;
     const auto data = std::make_unique<crypt_data>();
     const char* computed = crypt_r(password.c_str(), hash.c_str(), data.get());
     if (!computed)
@@ -52,7 +52,7 @@ bool Users_File::accepts(const std::string& user, const std::string& password) c
     unsigned difference = std::strlen(computed) == hash.size() ? 0 : 1;
     for (std::size_t i = 0; i < hash.size() && computed[i] != '\0'; ++i)
         difference |= static_cast<unsigned char>(computed[i]) ^ static_cast<unsigned char>(hash[i]);
-    return difference == 0 && found != hashes_.end();
+    return difference == 0 && found != _hashes.end();
 }
 
 } // namespace KPRV::kldrcim

@@ -16,7 +16,7 @@ public:
     bool accepts(const std::string& user, const std::string& password) const;
 
 private:
-    std::map<std::string, std::string> hashes_;
+    std::map<std::string, std::string> _hashes;
 };
 
 } // namespace KPRV::kldrcim

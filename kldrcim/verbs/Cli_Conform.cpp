@@ -16,8 +16,8 @@ using Verdict = Conformance_Finding::Verdict;
 std::string expected_text(const Conformance_Step& step)
 {
     if (step.least == 0)
-        return step.most == many ? "any" : "at most " + std::to_string(step.most);
-    return std::to_string(step.least) + (step.most == many ? " or more" : "");
+        return step.most == MANY ? "any" : "at most " + std::to_string(step.most);
+    return std::to_string(step.least) + (step.most == MANY ? " or more" : "");
 }
 
 const char* word_of(Verdict verdict)
@@ -83,7 +83,7 @@ std::string findings_json(const std::vector<Conformance_Finding>& findings)
                 {"from", json_or_null(step.from)},
                 {"association", json_or_null(step.association)},
                 {"least", std::to_string(step.least)},
-                {"most", step.most == many ? "null" : std::to_string(step.most)},
+                {"most", step.most == MANY ? "null" : std::to_string(step.most)},
                 {"found", std::to_string(finding.found)},
                 {"verdict", json_string(word_of(finding.verdict))},
                 {"missing", json_array(missing, 2)},

@@ -28,7 +28,7 @@ int complain_of(const Result& result)
 const std::string& text_of(const Instance_Value& instance, const char* name)
 {
     static const std::string none;
-    const Value* const value = instance.property(name);
+    const Plain_Value* const value = instance.property(name);
     return value ? value->as_text() : none;
 }
 
@@ -38,9 +38,9 @@ constexpr std::uint64_t LOOPBACK_PLUG = 10;
 
 bool has_characteristic(const Instance_Value& test, std::uint64_t number)
 {
-    const Value* const value = test.property("Characteristics");
+    const Plain_Value* const value = test.property("Characteristics");
     return value && std::ranges::any_of(value->elements(),
-                                        [&](const Value& each) { return each.as_uint() == number; });
+                                        [&](const Plain_Value& each) { return each.as_uint() == number; });
 }
 
 std::string characteristics_of(const Instance_Value& test)
@@ -115,7 +115,7 @@ class Running_Test
 {
 public:
     Running_Test(Connection& connection, bool out_of_service, std::string element)
-        : connection_(connection), out_of_service_(out_of_service), element_(std::move(element))
+        : _connection(connection), _out_of_service(out_of_service), _element(std::move(element))
     {
     }
     ~Running_Test() { wait_for_end(); }
@@ -124,25 +124,25 @@ public:
 
     void wait_for_end()
     {
-        while (connection_.is_at_work())
+        while (_connection.is_at_work())
             wait();
     }
     /// For a moment. False if there is nothing to wait for any more.
     bool wait()
     {
         constexpr auto MOMENT = std::chrono::milliseconds(100);
-        interruption_.wait(MOMENT);
-        if (!connection_.is_in_process()) {
-            if (interruption_.count() != 0)
+        _interruption.wait(MOMENT);
+        if (!_connection.is_in_process()) {
+            if (_interruption.count() != 0)
                 complain("interrupted: the server goes on with the test", 0);
-            return interruption_.count() == 0;
+            return _interruption.count() == 0;
         }
-        if (interruption_.count() > 1)
+        if (_interruption.count() > 1)
             leave();
-        if (interruption_.count() == 1 && !told_) {
-            told_ = true;
-            complain(out_of_service_
-                         ? "interrupted: waiting until the test has brought " + element_ +
+        if (_interruption.count() == 1 && !_told) {
+            _told = true;
+            complain(_out_of_service
+                         ? "interrupted: waiting until the test has brought " + _element +
                                " back into service; a second signal leaves it as it is"
                          : "interrupted: waiting for the end of the test; a second signal ends it",
                      0);
@@ -150,23 +150,23 @@ public:
         return true;
     }
     /// The signal that has come; 0 for none.
-    int signal() const { return interruption_.latest(); }
+    int signal() const { return _interruption.latest(); }
 
 private:
     [[noreturn]] void leave()
     {
-        complain(out_of_service_ ? element_ + " is left out of service: the test was ended while it ran"
-                                 : "the test of " + element_ + " was ended while it ran",
+        complain(_out_of_service ? _element + " is left out of service: the test was ended while it ran"
+                                 : "the test of " + _element + " was ended while it ran",
                  0);
         // Not by the usual end, which would wait for the provider.
-        std::_Exit(status_of_signal(interruption_.latest()));
+        std::_Exit(status_of_signal(_interruption.latest()));
     }
 
-    Connection& connection_;
-    const bool out_of_service_;
-    const std::string element_;
-    bool told_ = false;
-    Interruption interruption_;
+    Connection& _connection;
+    const bool _out_of_service;
+    const std::string _element;
+    bool _told = false;
+    Interruption _interruption;
 };
 
 int run(const Cli_Options& options, Connection& connection)
@@ -178,14 +178,14 @@ int run(const Cli_Options& options, Connection& connection)
         return complain(error, USAGE_ERROR);
     Running_Test running(connection, takes_out_of_service(connection, test), options.arguments[2]);
     const Result started =
-        connection.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Value::path(element)}});
+        connection.invoke_method(test, "RunDiagnostic", {{"ManagedElement", Plain_Value::path(element)}});
     if (!started.ok())
         return complain_of(started);
     const std::uint64_t code = started.return_value.as_uint();
     if (code != JOB_STARTED)
         return complain("refused, RunDiagnostic returned " + std::to_string(code) + ": " + refusal(code),
                         REFUSED);
-    const Value* const reference = find_value(started.out, "Job");
+    const Plain_Value* const reference = find_value(started.out, "Job");
     if (!reference || !reference->as_path())
         return complain("the test was started without a job", FAILURE);
     const Path_Value& job = *reference->as_path();

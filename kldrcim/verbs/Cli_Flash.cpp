@@ -25,11 +25,11 @@ constexpr const char* controller_class = "KALDERA_PortController";
 constexpr const char* software_association = "KALDERA_AdapterElementSoftwareIdentity";
 
 /// Code of the CIM Schema: what is asked for.
-constexpr std::uint64_t option_update = 5;
+constexpr std::uint64_t OPTION_UPDATE = 5;
 
 std::string device_id(const Path_Value& controller)
 {
-    const Value* id = controller.key("DeviceID");
+    const Plain_Value* id = controller.key("DeviceID");
     return id ? id->as_text() : "";
 }
 
@@ -52,11 +52,12 @@ std::optional<std::string> firmware_version(Connection& connection, const Path_V
     for (const Path_Value& end :
          index.far_ends(software_association, "Dependent", controller, "Antecedent")) {
         const Instance_Value software = index.instance(end);
-        const Value* kinds = software.property("Classifications");
-        const Value* version = software.property("VersionString");
+        const Plain_Value* kinds = software.property("Classifications");
+        const Plain_Value* version = software.property("VersionString");
         if (kinds && version && !version->null &&
-            std::ranges::any_of(kinds->elements(),
-                                [](const Value& kind) { return kind.as_uint() == classification_firmware; }))
+            std::ranges::any_of(kinds->elements(), [](const Plain_Value& kind) {
+                return kind.as_uint() == CLASSIFICATION_FIRMWARE;
+            }))
             return visible_text(plain_text(*version));
     }
     return std::nullopt;
@@ -148,11 +149,11 @@ int flash(const Cli_Options& options, Connection& connection)
     // An image that an adapter has in part may be its end. Who reads the promise may count on it.
     const Signals_Held_Back held_back;
     complain(update.adapter + ": updating; SIGINT, SIGTERM and SIGHUP wait for the end of it", 0);
-    const Value install_options =
-        Value::array(CMPI_uint16, {Value::unsigned_number(CMPI_uint16, option_update)});
+    const Plain_Value install_options =
+        Plain_Value::array(CMPI_uint16, {Plain_Value::unsigned_number(CMPI_uint16, OPTION_UPDATE)});
     const Result answer = connection.invoke_method(services.paths.front(), "InstallFromURI",
-                                                   {{"URI", Value::text(uri)},
-                                                    {"Target", Value::path(*controller)},
+                                                   {{"URI", Plain_Value::text(uri)},
+                                                    {"Target", Plain_Value::path(*controller)},
                                                     {"InstallOptions", install_options}});
     if (!answer.ok())
         return complain(failure_text(answer), FAILURE);

@@ -8,7 +8,7 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-constexpr std::size_t width = 80;
+constexpr std::size_t WIDTH = 80;
 
 constexpr const char* paths_and_values =
     R"(PATH is [namespace:]Class.Key="text",Key2=42,Key3=true; inside a text, \" and \\ stand for a quote and a backslash. )"
@@ -61,7 +61,7 @@ std::string wrapped(const std::string& text, std::size_t indent)
     std::size_t column = indent;
     std::istringstream words(text);
     for (std::string word; words >> word;) {
-        if (column > indent && column + 1 + word.size() > width) {
+        if (column > indent && column + 1 + word.size() > WIDTH) {
             result += "\n" + std::string(indent, ' ');
             column = indent;
         }
@@ -74,11 +74,11 @@ std::string wrapped(const std::string& text, std::size_t indent)
 /// A head and what it means, side by side where the head leaves room.
 std::string entry(const std::string& head, const std::string& meaning)
 {
-    constexpr std::size_t indent = 26;
+    constexpr std::size_t INDENT = 26;
     const std::string line = "  " + head;
-    return (line.size() + 2 > indent ? line + "\n" + std::string(indent, ' ')
-                                     : line + std::string(indent - line.size(), ' ')) +
-           wrapped(meaning, indent);
+    return (line.size() + 2 > INDENT ? line + "\n" + std::string(INDENT, ' ')
+                                     : line + std::string(INDENT - line.size(), ' ')) +
+           wrapped(meaning, INDENT);
 }
 
 std::string paragraphs(const char* title, const std::string& text)

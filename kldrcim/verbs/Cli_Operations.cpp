@@ -16,20 +16,20 @@ class Plain_Operation
 {
 public:
     Plain_Operation(const Cli_Options& options, Connection& connection)
-        : options_(options), connection_(connection), catalogue_(connection.classes())
+        : _options(options), _connection(connection), _catalogue(connection.classes())
     {
     }
 
     int run()
     {
         Request request;
-        request.operation = find_verb(options_.verb)->operation;
+        request.operation = find_verb(_options.verb)->operation;
         if (!read_request(request))
-            return complain(error_, USAGE_ERROR);
+            return complain(_error, USAGE_ERROR);
         std::optional<Result_Filter> filter;
         if (answers_with_many(request.operation))
-            filter.emplace(options_, make_writer(options_));
-        const Result result = connection_.run(request, filter ? &*filter : nullptr);
+            filter.emplace(_options, make_writer(_options));
+        const Result result = _connection.run(request, filter ? &*filter : nullptr);
         // What came before a failure is worth reading; that it is not all is told behind it.
         if (filter)
             filter->end(result.ok());
@@ -39,7 +39,7 @@ public:
         }
         write(request, result);
         warn_of(result.failures);
-        const std::string missed = filter ? filter->missed_name(catalogue_) : "";
+        const std::string missed = filter ? filter->missed_name(_catalogue) : "";
         if (missed.empty())
             return 0;
         flush_output();
@@ -49,19 +49,19 @@ public:
     }
 
 private:
-    const std::string& argument(std::size_t index) const { return options_.arguments[index]; }
+    const std::string& argument(std::size_t index) const { return _options.arguments[index]; }
 
     bool read_request(Request& request)
     {
-        if (!typed_path(catalogue_, argument(0), request.path, error_) ||
-            (!request.path.name_space.empty() && !connection_.serves(request.path.name_space, error_)))
+        if (!typed_path(_catalogue, argument(0), request.path, _error) ||
+            (!request.path.name_space.empty() && !_connection.serves(request.path.name_space, _error)))
             return false;
-        request.properties = properties_for(options_);
+        request.properties = properties_for(_options);
         if (is_association_operation(request.operation))
             return read_filter(request);
         if ((request.properties &&
-             !check_properties(catalogue_, request.path.class_name, *request.properties, error_)) ||
-            !check_filter(options_, catalogue_, request.path.class_name, brings_names(request), error_))
+             !check_properties(_catalogue, request.path.class_name, *request.properties, _error)) ||
+            !check_filter(_options, _catalogue, request.path.class_name, brings_names(request), _error))
             return false;
         switch (request.operation) {
         case Operation::CREATE_INSTANCE:
@@ -87,21 +87,21 @@ private:
     /// unchecked.
     bool read_filter(Request& request)
     {
-        request.filter = options_.filter;
+        request.filter = _options.filter;
         if (request.operation == Operation::REFERENCES || request.operation == Operation::REFERENCE_NAMES)
             std::swap(request.filter.association_class, request.filter.result_class);
         if (request.path.keys.empty())
-            error_ = argument(0) + " is a class; " + options_.verb + " wants the path of an instance";
+            _error = argument(0) + " is a class; " + _options.verb + " wants the path of an instance";
         return !request.path.keys.empty();
     }
 
     bool read_assignments(const Request& request, const std::string& method, std::size_t from,
                           std::vector<Named_Value>& values)
     {
-        for (std::size_t i = from; i < options_.arguments.size(); ++i) {
+        for (std::size_t i = from; i < _options.arguments.size(); ++i) {
             Named_Value assignment;
-            if (!typed_assignment(catalogue_, request.path.class_name, method, argument(i), assignment,
-                                  error_))
+            if (!typed_assignment(_catalogue, request.path.class_name, method, argument(i), assignment,
+                                  _error))
                 return false;
             set_value(values, assignment.name, std::move(assignment.value));
         }
@@ -113,7 +113,7 @@ private:
         Instance_Value& instance = request.instance;
         if (!read_assignments(request, "", 1, instance.properties))
             return false;
-        if (const Class_Info* info = catalogue_.find(request.path.class_name))
+        if (const Class_Info* info = _catalogue.find(request.path.class_name))
             for (const Named_Value& property : instance.properties)
                 if (info->property(property.name)->key && !property.value.null)
                     set_value(request.path.keys, property.name, property.value);
@@ -139,11 +139,11 @@ private:
         if (result.exception || !result.message.empty())
             return text;
         if (result.rc == CMPI_RC_ERR_INVALID_CLASS)
-            text += ": " + connection_.subject() + " has no class " + unknown_class(request) +
+            text += ": " + _connection.subject() + " has no class " + unknown_class(request) +
                     "; \"kldrcim classes\" lists them";
         else if (result.rc == CMPI_RC_ERR_INVALID_NAMESPACE)
-            text += ": " + connection_.subject() + " has no namespace " +
-                    (request.path.name_space.empty() ? options_.name_space : request.path.name_space);
+            text += ": " + _connection.subject() + " has no namespace " +
+                    (request.path.name_space.empty() ? _options.name_space : request.path.name_space);
         else if (result.rc == CMPI_RC_ERR_METHOD_NOT_FOUND)
             text += ": " + request.path.class_name + " has no method " + request.method;
         return text;
@@ -164,9 +164,9 @@ private:
     void write(const Request& request, const Result& result) const
     {
         if (request.operation == Operation::GET_INSTANCE)
-            write_instance(options_, result.instances);
+            write_instance(_options, result.instances);
         else if (request.operation == Operation::INVOKE_METHOD)
-            write_method(options_, request, result);
+            write_method(_options, request, result);
         else if (request.operation == Operation::CREATE_INSTANCE)
             write_paths(result.paths);
     }
@@ -174,16 +174,16 @@ private:
     /// Of what was created.
     void write_paths(const std::vector<Path_Value>& paths) const
     {
-        const auto writer = make_writer(options_);
+        const auto writer = make_writer(_options);
         for (const Path_Value& path : paths)
             writer->path(Path_Value(path));
         writer->end(true);
     }
 
-    const Cli_Options& options_;
-    Connection& connection_;
-    const Class_Catalogue& catalogue_;
-    std::string error_;
+    const Cli_Options& _options;
+    Connection& _connection;
+    const Class_Catalogue& _catalogue;
+    std::string _error;
 };
 
 } // namespace

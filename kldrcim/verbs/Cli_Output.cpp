@@ -66,7 +66,7 @@ void write_method(const Cli_Options& options, const Request& request, const Resu
     values.insert(values.end(), result.out.begin(), result.out.end());
     if (options.format == Format::TABLE) {
         if (!meanings.empty())
-            values[0].value = Value::text(worded_text(meanings, result.return_value));
+            values[0].value = Plain_Value::text(worded_text(meanings, result.return_value));
         return put(values_as_block(values));
     }
     for (const Named_Value& value : values)

@@ -20,7 +20,7 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-constexpr std::size_t any = ~std::size_t(0);
+constexpr std::size_t ANY = ~std::size_t(0);
 
 constexpr const char* all_formats = "table json mof";
 constexpr const char* many_formats = "table json jsonl mof";
@@ -42,13 +42,13 @@ constexpr Cli_Verb verbs[] = {
      "enumerate instance names", nullptr},
     {"gi",       1, 1,   "PATH",                                    run_operation,   Op::GET_INSTANCE,            many_formats,  "--raw",
      "get one instance", nullptr},
-    {"ci",       2, any, "CLASS NAME=VALUE...",                     run_operation,   Op::CREATE_INSTANCE,         all_formats,  "",
+    {"ci",       2, ANY, "CLASS NAME=VALUE...",                     run_operation,   Op::CREATE_INSTANCE,         all_formats,  "",
      "create an instance", nullptr},
-    {"mi",       2, any, "PATH NAME=VALUE...",                      run_operation,   Op::MODIFY_INSTANCE,         all_formats,  "",
+    {"mi",       2, ANY, "PATH NAME=VALUE...",                      run_operation,   Op::MODIFY_INSTANCE,         all_formats,  "",
      "modify the named properties of an instance", nullptr},
     {"di",       1, 1,   "PATH",                                    run_operation,   Op::DELETE_INSTANCE,         all_formats,  "",
      "delete an instance", nullptr},
-    {"cm",       2, any, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "--raw",
+    {"cm",       2, ANY, "PATH METHOD [NAME=VALUE...]",             run_operation,   Op::INVOKE_METHOD,           all_formats,  "--raw",
      "call a method; PATH may name a class alone for a static one", nullptr},
     {"ai",       1, 1,   "PATH",                                    run_operation,   Op::ASSOCIATORS,             many_formats,  ends_with_words,
      "instances associated with one (associators)", nullptr},
@@ -83,7 +83,7 @@ constexpr Cli_Verb verbs[] = {
      "the hardware tests, and the ports and adapters that they can be run on\n"
      "run a test, by its name, on a port or adapter, by its address or PATH; the test takes the element out of service while it runs",
      "run: 3 the test was refused; 128 and its number after a signal. With --wait: 0 the test passed, 1 it failed."},
-    {"rpc",      0, any, "METHOD [PARAMETER...]\n--list [PATTERN]\n--raw TEXT", run_rpc, Op{},                    "table json", "--list --raw=",
+    {"rpc",      0, ANY, "METHOD [PARAMETER...]\n--list [PATTERN]\n--raw TEXT", run_rpc, Op{},                    "table json", "--list --raw=",
      "call a method of the agent's JSON-RPC protocol; \"+\" stands before a further call\n"
      "list its methods with their parameters\n"
      "send TEXT, or with \"-\" standard input, as it is; write the reply as it is", nullptr},

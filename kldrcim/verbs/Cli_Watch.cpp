@@ -19,37 +19,37 @@ constexpr const char* alert_class = "KALDERA_AlertIndication";
 class Inbox
 {
 public:
-    explicit Inbox(Interruption& interruption) : interruption_(interruption) {}
+    explicit Inbox(Interruption& interruption) : _interruption(interruption) {}
 
     void put(const std::string& name_space, const Instance_Value& indication)
     {
         {
-            const Auto_Lock lock(mutex_);
-            indications_.push_back(indication);
-            indications_.back().path.name_space = name_space;
+            const Auto_Lock lock(_mutex);
+            _indications.push_back(indication);
+            _indications.back().path.name_space = name_space;
         }
-        interruption_.wake();
+        _interruption.wake();
     }
     /// Waits; false when the watch is interrupted.
     bool take(Instance_Value& indication)
     {
         for (;;) {
-            interruption_.wait();
-            const Auto_Lock lock(mutex_);
-            if (interruption_.count() != 0)
+            _interruption.wait();
+            const Auto_Lock lock(_mutex);
+            if (_interruption.count() != 0)
                 return false;
-            if (indications_.empty())
+            if (_indications.empty())
                 continue;
-            indication = std::move(indications_.front());
-            indications_.pop_front();
+            indication = std::move(_indications.front());
+            _indications.pop_front();
             return true;
         }
     }
 
 private:
-    Interruption& interruption_;
-    Standard_Mutex<> mutex_;
-    std::deque<Instance_Value> indications_ GUARDED_BY(mutex_);
+    Interruption& _interruption;
+    Standard_Mutex<> _mutex;
+    std::deque<Instance_Value> _indications GUARDED_BY(_mutex);
 };
 
 void write(const Cli_Options& options, Instance_Value& indication)

@@ -44,46 +44,46 @@ const std::vector<Named_Value>& values_of(const Path_Value& path)
 } // namespace
 
 Result_Filter::Result_Filter(const Cli_Options& options, std::unique_ptr<Result_Writer> writer)
-    : options_(options), writer_(std::move(writer)), missed_(filter_names(options))
+    : _options(options), _writer(std::move(writer)), _missed(filter_names(options))
 {
     if (options.properties)
-        for (const std::string& name : missed_)
+        for (const std::string& name : _missed)
             if (!contains_name(*options.properties, name))
-                extra_.push_back(name);
+                _extra.push_back(name);
 }
 
 bool Result_Filter::instance(Instance_Value&& instance)
 {
-    return take(instances_, instance.path.class_name, instance.properties, std::move(instance));
+    return take(_instances, instance.path.class_name, instance.properties, std::move(instance));
 }
 
 bool Result_Filter::path(Path_Value&& path)
 {
-    are_paths_ = true;
-    return take(paths_, path.class_name, path.keys, std::move(path));
+    _are_paths = true;
+    return take(_paths, path.class_name, path.keys, std::move(path));
 }
 
 void Result_Filter::end(bool complete)
 {
-    hand_on(instances_);
-    hand_on(paths_);
-    if (!options_.total)
-        writer_->end(complete);
+    hand_on(_instances);
+    hand_on(_paths);
+    if (!_options.total)
+        _writer->end(complete);
     else if (complete)
-        put(std::to_string(count_) + "\n");
+        put(std::to_string(_count) + "\n");
 }
 
 std::string Result_Filter::missed_name(const Class_Catalogue& catalogue) const
 {
     const auto is_known = [&](const std::string& name) {
-        return std::ranges::any_of(classes_, [&](const std::string& class_name) {
+        return std::ranges::any_of(_classes, [&](const std::string& class_name) {
             const Class_Info* const info = catalogue.find(class_name);
             const Feature_Info* const property = info ? info->property(name) : nullptr;
-            return property && (property->key || !are_paths_);
+            return property && (property->key || !_are_paths);
         });
     };
-    const auto missed = std::ranges::find_if_not(missed_, is_known);
-    return missed == missed_.end() || classes_.empty() ? "" : *missed;
+    const auto missed = std::ranges::find_if_not(_missed, is_known);
+    return missed == _missed.end() || _classes.empty() ? "" : *missed;
 }
 
 template <class Thing>
@@ -91,12 +91,12 @@ bool Result_Filter::take(std::vector<Thing>& kept, const std::string& class_name
                          const std::vector<Named_Value>& values, Thing&& thing)
 {
     look_for_names(class_name, values);
-    if (!meets_conditions(options_, class_name, values))
+    if (!meets_conditions(_options, class_name, values))
         return true;
-    ++count_;
-    if (options_.total)
+    ++_count;
+    if (_options.total)
         return true;
-    if (options_.sort.empty())
+    if (_options.sort.empty())
         return give(std::move(thing));
     kept.push_back(std::move(thing));
     return true;
@@ -105,13 +105,13 @@ bool Result_Filter::take(std::vector<Thing>& kept, const std::string& class_name
 template <class Thing>
 void Result_Filter::hand_on(std::vector<Thing>& kept)
 {
-    const std::string name = sort_name(options_);
+    const std::string name = sort_name(_options);
     // What has no such value stands last, either way.
     std::ranges::stable_sort(kept, [&](const Thing& a, const Thing& b) {
-        const Value *first = find_value(values_of(a), name), *second = find_value(values_of(b), name);
+        const Plain_Value *first = find_value(values_of(a), name), *second = find_value(values_of(b), name);
         if (!first || first->null || !second || second->null)
             return first && !first->null && (!second || second->null);
-        return is_backward(options_) ? stands_before(*second, *first) : stands_before(*first, *second);
+        return is_backward(_options) ? stands_before(*second, *first) : stands_before(*first, *second);
     });
     for (Thing& thing : kept)
         if (!give(std::move(thing)))
@@ -120,22 +120,22 @@ void Result_Filter::hand_on(std::vector<Thing>& kept)
 
 void Result_Filter::look_for_names(const std::string& class_name, const std::vector<Named_Value>& values)
 {
-    std::erase_if(missed_, [&](const std::string& name) { return find_value(values, name) != nullptr; });
-    if (!missed_.empty())
-        classes_.insert(class_name);
+    std::erase_if(_missed, [&](const std::string& name) { return find_value(values, name) != nullptr; });
+    if (!_missed.empty())
+        _classes.insert(class_name);
 }
 
 bool Result_Filter::give(Instance_Value&& instance)
 {
-    if (!extra_.empty())
+    if (!_extra.empty())
         std::erase_if(instance.properties,
-                      [&](const Named_Value& property) { return contains_name(extra_, property.name); });
-    return writer_->instance(std::move(instance));
+                      [&](const Named_Value& property) { return contains_name(_extra, property.name); });
+    return _writer->instance(std::move(instance));
 }
 
 bool Result_Filter::give(Path_Value&& path)
 {
-    return writer_->path(std::move(path));
+    return _writer->path(std::move(path));
 }
 
 bool meets_conditions(const Cli_Options& options, const std::string& class_name,

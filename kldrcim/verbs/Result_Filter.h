@@ -33,17 +33,17 @@ private:
     bool give(Instance_Value&& instance);
     bool give(Path_Value&& path);
 
-    const Cli_Options& options_;
-    const std::unique_ptr<Result_Writer> writer_;
+    const Cli_Options& _options;
+    const std::unique_ptr<Result_Writer> _writer;
     /// Asked for to be looked at, not to be shown.
-    std::vector<std::string> extra_;
+    std::vector<std::string> _extra;
     /// Names that no result had yet, and the classes of those results.
-    std::vector<std::string> missed_;
-    std::set<std::string> classes_;
-    bool are_paths_ = false;
-    std::vector<Instance_Value> instances_;
-    std::vector<Path_Value> paths_;
-    std::size_t count_ = 0;
+    std::vector<std::string> _missed;
+    std::set<std::string> _classes;
+    bool _are_paths = false;
+    std::vector<Instance_Value> _instances;
+    std::vector<Path_Value> _paths;
+    std::size_t _count = 0;
 };
 
 /// Whether what has these values is as each --where wants it.

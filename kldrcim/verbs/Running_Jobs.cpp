@@ -6,7 +6,7 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-constexpr std::uint64_t job_over = 7;
+constexpr std::uint64_t JOB_OVER = 7;
 
 } // namespace
 
@@ -14,8 +14,8 @@ std::string running_jobs(Connection& connection)
 {
     std::string jobs;
     for (const Instance_Value& job : connection.enumerate_instances("KALDERA_ConcreteJob").instances) {
-        const Value* const state = job.property("JobState");
-        if (!state || state->null || state->as_uint() != job_over)
+        const Plain_Value* const state = job.property("JobState");
+        if (!state || state->null || state->as_uint() != JOB_OVER)
             jobs += (jobs.empty() ? "" : ", ") + path_text(job.path);
     }
     return jobs;

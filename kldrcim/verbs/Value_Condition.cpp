@@ -24,7 +24,7 @@ bool matches(const std::string& pattern, const std::string& text)
 
 /// Asks no catalogue: this runs while an answer is read, and a server's catalogue would ask on the same
 /// connection.
-bool equals(const std::string& text, const Value& value)
+bool equals(const std::string& text, const Plain_Value& value)
 {
     if (const Path_Value* const path = value.as_path()) {
         Path_Error error;
@@ -34,12 +34,13 @@ bool equals(const std::string& text, const Value& value)
     if (value.type == CMPI_string)
         return value.as_text() == text;
     static const No_Catalogue no_classes;
-    Value typed;
+    Plain_Value typed;
     std::string error;
     return typed_value(no_classes, value.type, text, "", typed, error) && typed == value;
 }
 
-bool holds_for_one(const Where_Clause& condition, std::span<const Value_Meaning> meanings, const Value& value)
+bool holds_for_one(const Where_Clause& condition, std::span<const Value_Meaning> meanings,
+                   const Plain_Value& value)
 {
     const bool is_pattern = condition.kind == Where_Clause::MATCHES;
     if (value.null)
@@ -50,13 +51,13 @@ bool holds_for_one(const Where_Clause& condition, std::span<const Value_Meaning>
     return equals(condition.value, value) || (word && same_name(word, condition.value));
 }
 
-bool is_number(const Value& value)
+bool is_number(const Plain_Value& value)
 {
     return is_integer(value.type) || is_real(value.type);
 }
 
 /// Wide enough for each of 64 bits.
-long double number_of(const Value& value)
+long double number_of(const Plain_Value& value)
 {
     if (is_real(value.type))
         return value.as_real();
@@ -66,12 +67,12 @@ long double number_of(const Value& value)
 
 } // namespace
 
-bool holds(const Where_Clause& condition, std::span<const Value_Meaning> meanings, const Value* value)
+bool holds(const Where_Clause& condition, std::span<const Value_Meaning> meanings, const Plain_Value* value)
 {
-    static const Value nothing;
+    static const Plain_Value nothing;
     bool is_found = false;
     if (value && value->is_array() && !value->elements().empty())
-        is_found = std::ranges::any_of(value->elements(), [&](const Value& element) {
+        is_found = std::ranges::any_of(value->elements(), [&](const Plain_Value& element) {
             return holds_for_one(condition, meanings, element);
         });
     else
@@ -89,7 +90,7 @@ bool check_condition(const Class_Catalogue& catalogue, const Class_Info& info, c
     if (std::ranges::any_of(
             meanings, [&](const Value_Meaning& meaning) { return same_name(meaning.word, condition.value); }))
         return true;
-    Value value;
+    Plain_Value value;
     const auto element_type = static_cast<CMPIType>(property->type & ~CMPI_ARRAY);
     if (typed_value(catalogue, element_type, condition.value, info.name + "." + property->name, value, error))
         return true;
@@ -97,9 +98,9 @@ bool check_condition(const Class_Catalogue& catalogue, const Class_Info& info, c
     return false;
 }
 
-bool stands_before(const Value& a, const Value& b)
+bool stands_before(const Plain_Value& a, const Plain_Value& b)
 {
-    const auto rank = [](const Value& value) { return value.is_array() ? 2 : !is_number(value); };
+    const auto rank = [](const Plain_Value& value) { return value.is_array() ? 2 : !is_number(value); };
     if (rank(a) != rank(b))
         return rank(a) < rank(b);
     if (a.is_array())

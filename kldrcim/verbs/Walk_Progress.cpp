@@ -11,23 +11,23 @@ using namespace std::chrono_literals;
 Walk_Progress::Walk_Progress()
 {
     if (isatty(STDERR_FILENO))
-        thread_ = std::thread([this] { show(); });
+        _thread = std::thread([this] { show(); });
 }
 
 void Walk_Progress::at(const std::string& class_name, std::size_t count)
 {
-    const Auto_Lock lock(mutex_);
-    class_name_ = class_name;
-    count_ = count;
+    const Auto_Lock lock(_mutex);
+    _class_name = class_name;
+    _count = count;
 }
 
 void Walk_Progress::show()
 {
-    const Auto_Lock lock(mutex_);
+    const Auto_Lock lock(_mutex);
     auto next = std::chrono::steady_clock::now() + 1s;
     bool is_shown = false;
-    while (!is_over_) {
-        if (change_.wait_until(mutex_, next) == std::cv_status::no_timeout)
+    while (!_is_over) {
+        if (_change.wait_until(_mutex, next) == std::cv_status::no_timeout)
             continue;
         put_line();
         is_shown = true;
@@ -39,21 +39,21 @@ void Walk_Progress::show()
 
 void Walk_Progress::put_line()
 {
-    std::fprintf(stderr, "\r\33[Kkldrcim: asking for %s", class_name_.c_str());
-    if (count_ != 0)
-        std::fprintf(stderr, ", %zu so far", count_);
+    std::fprintf(stderr, "\r\33[Kkldrcim: asking for %s", _class_name.c_str());
+    if (_count != 0)
+        std::fprintf(stderr, ", %zu so far", _count);
     std::fflush(stderr);
 }
 
 void Walk_Progress::end()
 {
     {
-        const Auto_Lock lock(mutex_);
-        is_over_ = true;
+        const Auto_Lock lock(_mutex);
+        _is_over = true;
     }
-    change_.notify_all();
-    if (thread_.joinable())
-        thread_.join();
+    _change.notify_all();
+    if (_thread.joinable())
+        _thread.join();
 }
 
 } // namespace KPRV::kldrcim

@@ -26,14 +26,14 @@ public:
 
 private:
     void show();
-    void put_line() REQUIRES(mutex_);
+    void put_line() REQUIRES(_mutex);
 
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any change_;
-    std::string class_name_ GUARDED_BY(mutex_);
-    std::size_t count_ GUARDED_BY(mutex_) = 0;
-    bool is_over_ GUARDED_BY(mutex_) = false;
-    std::thread thread_;
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _change;
+    std::string _class_name GUARDED_BY(_mutex);
+    std::size_t _count GUARDED_BY(_mutex) = 0;
+    bool _is_over GUARDED_BY(_mutex) = false;
+    std::thread _thread;
 };
 
 } // namespace KPRV::kldrcim

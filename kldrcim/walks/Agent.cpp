@@ -14,8 +14,9 @@ Result call_agent(Connection& connection, const std::string& request)
 {
     Path_Value path;
     path.class_name = agent_class;
-    path.keys = {{"Name", Value::text(agent_name)}};
-    Result result = connection.invoke_method(path, "executeMethod", {{"request", Value::text(request)}});
+    path.keys = {{"Name", Plain_Value::text(agent_name)}};
+    Result result =
+        connection.invoke_method(path, "executeMethod", {{"request", Plain_Value::text(request)}});
     if (result.ok() && !find_value(result.out, "response")) {
         result.rc = CMPI_RC_ERR_FAILED;
         result.message = "executeMethod gave no response";

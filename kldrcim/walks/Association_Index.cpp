@@ -11,7 +11,7 @@ namespace {
 /// Null if the link has no such end.
 const Path_Value* end_of(const Path_Value& link, const char* role)
 {
-    const Value* value = link.key(role);
+    const Plain_Value* value = link.key(role);
     return value ? value->as_path() : nullptr;
 }
 
@@ -20,14 +20,14 @@ const Path_Value* end_of(const Path_Value& link, const char* role)
 void Association_Index::note_failure(const std::string& class_name, const Result& result)
 {
     if (!result.ok())
-        failures_.push_back({class_name, result.rc, result.message});
+        _failures.push_back({class_name, result.rc, result.message});
 }
 
 const std::vector<Path_Value>& Association_Index::names(const std::string& class_name)
 {
-    auto [at, is_new] = names_.try_emplace(class_name);
+    auto [at, is_new] = _names.try_emplace(class_name);
     if (is_new) {
-        Result result = connection_.enumerate_instance_names(class_name);
+        Result result = _connection.enumerate_instance_names(class_name);
         note_failure(class_name, result);
         at->second = std::move(result.paths);
     }
@@ -40,7 +40,7 @@ std::vector<Path_Value> Association_Index::far_ends(const char* association, con
 {
     // The references of an association are its keys, so that names tell all.
     const std::vector<Path_Value>& all = names(association);
-    auto [positions, is_new] = positions_.try_emplace(std::string(association) + "." + near_role);
+    auto [positions, is_new] = _positions.try_emplace(std::string(association) + "." + near_role);
     if (is_new)
         for (std::size_t i = 0; i < all.size(); ++i)
             if (const Path_Value* near = end_of(all[i], near_role))
@@ -62,11 +62,11 @@ std::vector<Path_Value> Association_Index::far_ends(const char* association, con
 
 const Association_Index::Class_Instances& Association_Index::class_instances(const std::string& class_name)
 {
-    auto [at, is_new] = instances_.try_emplace(lower_name(class_name));
+    auto [at, is_new] = _instances.try_emplace(lower_name(class_name));
     Class_Instances& kept = at->second;
     if (!is_new)
         return kept;
-    Result result = connection_.enumerate_instances(class_name);
+    Result result = _connection.enumerate_instances(class_name);
     note_failure(class_name, result);
     kept.instances = std::move(result.instances);
     for (std::size_t i = 0; i < kept.instances.size(); ++i)

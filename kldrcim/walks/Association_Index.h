@@ -14,7 +14,7 @@ using namespace broker;
 class Association_Index
 {
 public:
-    explicit Association_Index(Connection& connection) : connection_(connection) {}
+    explicit Association_Index(Connection& connection) : _connection(connection) {}
 
     /// The far ends of the links of an association whose near role holds the object, each once, in the order
     /// of the enumeration. With `above_role`, only of links where that role holds `above`.
@@ -32,7 +32,7 @@ public:
     Instance_Value instance(const Path_Value& path);
 
     /// Enumerations that failed, in the order in which they were made.
-    const std::vector<Provider_Failure>& failures() const { return failures_; }
+    const std::vector<Provider_Failure>& failures() const { return _failures; }
 
 private:
     struct Class_Instances
@@ -45,12 +45,12 @@ private:
     const Class_Instances& class_instances(const std::string& class_name);
     void note_failure(const std::string& class_name, const Result& result);
 
-    Connection& connection_;
-    std::unordered_map<std::string, std::vector<Path_Value>> names_;
+    Connection& _connection;
+    std::unordered_map<std::string, std::vector<Path_Value>> _names;
     /// By association and near role: positions in the links by the identity of the near end.
-    std::unordered_map<std::string, Positions> positions_;
-    std::unordered_map<std::string, Class_Instances> instances_;
-    std::vector<Provider_Failure> failures_;
+    std::unordered_map<std::string, Positions> _positions;
+    std::unordered_map<std::string, Class_Instances> _instances;
+    std::vector<Provider_Failure> _failures;
 };
 
 } // namespace KPRV::kldrcim

@@ -18,36 +18,37 @@ using Verdict = Conformance_Finding::Verdict;
 /// An empty text tells a client as little as none.
 bool has_value(const Instance_Value& instance, const std::string& property)
 {
-    const Value* value = instance.property(property);
+    const Plain_Value* value = instance.property(property);
     return value && !value->null && (value->type != CMPI_string || !value->as_text().empty());
 }
 
 class Conformance_Walk
 {
 public:
-    explicit Conformance_Walk(Connection& connection) : connection_(connection) {}
+    explicit Conformance_Walk(Connection& connection) : _connection(connection) {}
 
     Conformance_Finding take(const Conformance_Step& step)
     {
-        finding_ = {.step = &step};
-        Instances& found = objects_[step.name];
+        _finding = {.step = &step};
+        Instances& found = _objects[step.name];
         if (step.from)
-            follow(step, objects_[step.from], found);
+            follow(step, _objects[step.from], found);
         else
             enumerate(step, found);
-        finding_.found = found.size();
-        if (finding_.verdict != Verdict::NO_START)
+        _finding.found = found.size();
+        if (_finding.verdict != Verdict::NO_START)
             judge(step, found);
-        return finding_;
+        return _finding;
     }
 
 private:
     void enumerate(const Conformance_Step& step, Instances& found)
     {
-        Result all = connection_.enumerate_instances(step.class_name);
+        Result all = _connection.enumerate_instances(step.class_name);
         note_failure(all);
         for (Instance_Value& instance : all.instances)
-            if (const Value* name = instance.property("RegisteredName"); name && name->as_text() == step.name)
+            if (const Plain_Value* name = instance.property("RegisteredName");
+                name && name->as_text() == step.name)
                 found.push_back(std::move(instance));
         count(step, found.size(), 1, found.size());
     }
@@ -55,7 +56,7 @@ private:
     void follow(const Conformance_Step& step, const Instances& starts, Instances& found)
     {
         if (starts.empty()) {
-            finding_.verdict = Verdict::NO_START;
+            _finding.verdict = Verdict::NO_START;
             return;
         }
         std::size_t wrong = 0, example = 0;
@@ -81,10 +82,10 @@ private:
                           .result_class = step.class_name,
                           .role = step.near_role,
                           .result_role = step.far_role};
-        Result result = connection_.run(request);
+        Result result = _connection.run(request);
         note_failure(result);
         std::erase_if(result.instances, [&](const Instance_Value& instance) {
-            return !connection_.classes().is_a(instance.path.class_name, step.class_name);
+            return !_connection.classes().is_a(instance.path.class_name, step.class_name);
         });
         return result.instances;
     }
@@ -96,7 +97,7 @@ private:
         std::string text = have == 0 ? "none" : std::to_string(have);
         if (step.from)
             text += " at " + std::to_string(wrong) + " of " + std::to_string(starts);
-        finding_.missing.push_back(text);
+        _finding.missing.push_back(text);
     }
 
     void judge(const Conformance_Step& step, const Instances& found)
@@ -107,24 +108,24 @@ private:
                 return !has_value(instance, property);
             });
             if (without)
-                finding_.missing.push_back(property + " in " + std::to_string(without) + " of " +
+                _finding.missing.push_back(property + " in " + std::to_string(without) + " of " +
                                            std::to_string(found.size()));
         }
-        if (!finding_.missing.empty())
-            finding_.verdict = Verdict::MISSING;
+        if (!_finding.missing.empty())
+            _finding.verdict = Verdict::MISSING;
         else if (found.empty())
-            finding_.verdict = Verdict::NONE;
+            _finding.verdict = Verdict::NONE;
     }
 
     void note_failure(const Result& result)
     {
         if (!result.ok())
-            finding_.missing.push_back(status_name(result.rc));
+            _finding.missing.push_back(status_name(result.rc));
     }
 
-    Connection& connection_;
-    std::map<std::string, Instances> objects_;
-    Conformance_Finding finding_{};
+    Connection& _connection;
+    std::map<std::string, Instances> _objects;
+    Conformance_Finding _finding{};
 };
 
 } // namespace

@@ -27,7 +27,7 @@ struct Conformance_Step
 };
 
 /// For `most`: as many as there are.
-constexpr unsigned many = ~0u;
+constexpr unsigned MANY = ~0u;
 
 /// All steps in the order of the walk; the last one has no name.
 extern const Conformance_Step conformance_steps[];

@@ -15,11 +15,11 @@ using Clock = std::chrono::steady_clock;
 constexpr std::uint64_t JOB_OVER = 7;
 constexpr std::uint64_t PASSED = 2;
 constexpr const char* running = "running";
-constexpr int most_looks = 50;
+constexpr int MOST_LOOKS = 50;
 
 std::string state_words(const Result& job)
 {
-    const Value* const state =
+    const Plain_Value* const state =
         job.ok() && !job.instances.empty() ? job.instances[0].property("JobState") : nullptr;
     if (!state)
         return "unknown";
@@ -64,13 +64,13 @@ void collect(Connection& connection, const char* class_name, const std::string& 
     const std::string head = job_id + ":";
     for (const Instance_Value& each : connection.enumerate_instances(class_name).instances) {
         const auto text_of = [&](const char* name) {
-            const Value* const value = each.property(name);
+            const Plain_Value* const value = each.property(name);
             return value ? value->as_text() : std::string();
         };
         const std::string id = text_of("InstanceID");
         if (!id.starts_with(head))
             continue;
-        const Value* const state = each.property("CompletionState");
+        const Plain_Value* const state = each.property("CompletionState");
         const bool passed = state && state->as_uint() == PASSED;
         report.records.push_back({std::strtoul(id.c_str() + head.size(), nullptr, 10),
                                   time_of_day(text_of("CreationTimeStamp")),
@@ -84,7 +84,7 @@ void collect(Connection& connection, const char* class_name, const std::string& 
 Run_Report records_of(Connection& connection, const Path_Value& job)
 {
     Run_Report report;
-    const Value* const id = job.key("InstanceID");
+    const Plain_Value* const id = job.key("InstanceID");
     for (const char* class_name : {"KALDERA_DiagnosticServiceRecord", "KALDERA_DiagnosticCompletionRecord"})
         collect(connection, class_name, id ? id->as_text() : "", report);
     std::ranges::sort(report.records, {}, &Run_Record::number);
@@ -122,7 +122,7 @@ Run_Report follow_job(Connection& connection, const Path_Value& job, const std::
     }
     Run_Report report = records_of(connection, job);
     // A job is closed before its results are written; in this process its thread has been waited for.
-    for (int looks = 0; !connection.is_in_process() && looks < most_looks && goes_on && !has_result(report);
+    for (int looks = 0; !connection.is_in_process() && looks < MOST_LOOKS && goes_on && !has_result(report);
          ++looks) {
         goes_on = pause();
         report = records_of(connection, job);

@@ -25,7 +25,7 @@ bool takes(const Element_Kind& kind, const std::string& test_class_name)
 bool find_address(Connection& connection, const Element_Kind& kind, const std::string& flat, Path_Value& path)
 {
     for (const Path_Value& each : connection.enumerate_instance_names(kind.class_name).paths) {
-        const Value* const id = each.key("DeviceID");
+        const Plain_Value* const id = each.key("DeviceID");
         if (!id || address_digits(id->as_text()) != flat)
             continue;
         path = each;
@@ -54,7 +54,7 @@ bool find_test(Connection& connection, const std::string& name, Path_Value& path
 {
     const std::string wanted = lower_name(name);
     for (const Path_Value& each : connection.enumerate_instance_names(test_class).paths) {
-        const Value* const key = each.key("Name");
+        const Plain_Value* const key = each.key("Name");
         const std::string known = key ? lower_name(key->as_text()) : "";
         if (known != wanted && known != name_prefix + wanted)
             continue;

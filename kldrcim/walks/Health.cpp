@@ -17,8 +17,8 @@ namespace KPRV::kldrcim {
 namespace {
 
 constexpr const char* counters_class = "KALDERA_FCPortStatistics";
-constexpr std::uint64_t converged = 1;
-constexpr std::uint64_t completion_failed = 5;
+constexpr std::uint64_t CONVERGED = 1;
+constexpr std::uint64_t COMPLETION_FAILED = 5;
 
 /// Counters at an earlier look, by the statistics' identifier.
 using First_Look = std::unordered_map<std::string, Instance_Value>;
@@ -33,26 +33,26 @@ class Check
 {
 public:
     Check(Connection& connection, const Health_Options& options)
-        : connection_(connection), options_(options), index_(connection)
+        : _connection(connection), _options(options), _index(connection)
     {
     }
 
     Health_Report run()
     {
         look_first();
-        facts_ = read_host_facts(index_, {});
+        _facts = read_host_facts(_index, {});
         look_at_host();
-        for (const Adapter_Facts& adapter : facts_.adapters)
+        for (const Adapter_Facts& adapter : _facts.adapters)
             look_at_adapter(adapter);
         compare_paths();
         compare_firmware();
         look_at_tests();
-        for (const Provider_Failure& failure : index_.failures())
+        for (const Provider_Failure& failure : _index.failures())
             note("no-answer", Node_Kind::SYSTEM, {{.class_name = failure.provider_class}},
                  std::string(status_name(failure.rc)) +
                      (failure.message.empty() ? "" : ": " + failure.message));
         finish();
-        return std::move(report_);
+        return std::move(_report);
     }
 
 private:
@@ -65,12 +65,12 @@ private:
               std::string detail = {})
     {
         if (!is_ignored(*kind, element))
-            report_.findings.push_back({kind, element_kind, element, std::move(detail)});
+            _report.findings.push_back({kind, element_kind, element, std::move(detail)});
     }
 
     bool is_ignored(const Finding_Kind& kind, const Instance_Value& element) const
     {
-        return std::ranges::any_of(options_.ignored, [&](const std::string& word) {
+        return std::ranges::any_of(_options.ignored, [&](const std::string& word) {
             const std::string id = lower_name(text_of(element, "DeviceID")),
                               name = lower_name(text_of(element, "Name"));
             return word == kind.name || word == id || word == name || name.ends_with("_" + word);
@@ -79,29 +79,29 @@ private:
 
     void look_first()
     {
-        if (!options_.pause)
+        if (!_options.pause)
             return;
-        report_.errors_grown = 0;
-        for (Instance_Value& each : connection_.enumerate_instances(counters_class).instances) {
+        _report.errors_grown = 0;
+        for (Instance_Value& each : _connection.enumerate_instances(counters_class).instances) {
             const std::string id = text_of(each, "InstanceID");
-            first_look_.emplace(id, std::move(each));
+            _first_look.emplace(id, std::move(each));
         }
-        options_.pause();
+        _options.pause();
     }
 
     /// The library's own answer tells a host without adapters from one whose library nobody has found.
     bool has_adapter_library()
     {
         std::string error;
-        const Result answer = call_agent(connection_, *rpc_request("discovery.getHost", {}, error));
+        const Result answer = call_agent(_connection, *rpc_request("discovery.getHost", {}, error));
         return !answer.ok() || read_rpc_reply(agent_reply(answer)).result != "null";
     }
 
     void look_at_host()
     {
-        if (facts_.adapters.empty() && index_.failures().empty())
+        if (_facts.adapters.empty() && _index.failures().empty())
             note(has_adapter_library() ? "no-adapter" : "adapter-library-missing", Node_Kind::SYSTEM,
-                 facts_.system);
+                 _facts.system);
     }
 
     void look_at_status(Node_Kind kind, const Instance_Value& element)
@@ -112,16 +112,16 @@ private:
         if (const Finding_Kind* finding = finding_of_status(kind, *status))
             note(finding, kind, element);
         else if (kind == Node_Kind::FC_PORT || kind == Node_Kind::ETHERNET_PORT)
-            ++report_.ports_in_service;
+            ++_report.ports_in_service;
     }
 
     void look_at_adapter(const Adapter_Facts& adapter)
     {
-        ++report_.adapters;
+        ++_report.adapters;
         look_at_status(Node_Kind::ADAPTER, adapter.controller);
         look_at_drivers(adapter);
         for (const Port_Facts& port : adapter.ports) {
-            ++report_.ports;
+            ++_report.ports;
             look_at_status(port.is_ethernet ? Node_Kind::ETHERNET_PORT : Node_Kind::FC_PORT, port.port);
             look_at_speed(port.port);
             look_at_counters(port);
@@ -135,14 +135,14 @@ private:
     {
         const auto has = [&](const char* what) {
             return std::ranges::any_of(adapter.software, [&](const Instance_Value& each) {
-                return number_of(each, "Classifications") == classification_driver &&
+                return number_of(each, "Classifications") == CLASSIFICATION_DRIVER &&
                        text_of(each, "ElementName") == what;
             });
         };
         const bool has_ethernet = std::ranges::any_of(adapter.ports, &Port_Facts::is_ethernet);
         if (text_of(adapter.controller, "Name").empty())
             note("driver-missing", Node_Kind::ADAPTER, adapter.controller);
-        else if (number_of(adapter.controller, "ControllerType") != converged && !has("Storage driver"))
+        else if (number_of(adapter.controller, "ControllerType") != CONVERGED && !has("Storage driver"))
             note("driver-missing", Node_Kind::ADAPTER, adapter.controller, "storage driver");
         else if (has_ethernet && !has("Network driver"))
             note("driver-missing", Node_Kind::ADAPTER, adapter.controller, "network driver");
@@ -157,14 +157,14 @@ private:
 
     void look_at_counters(const Port_Facts& port)
     {
-        const auto first = first_look_.find(text_of(port.statistics, "InstanceID"));
-        if (first == first_look_.end())
+        const auto first = _first_look.find(text_of(port.statistics, "InstanceID"));
+        if (first == _first_look.end())
             return;
         std::string detail;
         for (const char* counter : error_counters()) {
             const std::uint64_t grown = growth(number_of(first->second, counter).value_or(0),
                                                number_of(port.statistics, counter).value_or(0));
-            *report_.errors_grown += grown;
+            *_report.errors_grown += grown;
             if (grown)
                 detail += (detail.empty() ? "" : ", ") + std::string(counter) + " +" + std::to_string(grown);
         }
@@ -175,12 +175,12 @@ private:
     void compare_paths()
     {
         std::map<std::string, std::vector<const Target_Facts*>> seen;
-        for (const Adapter_Facts& adapter : facts_.adapters)
+        for (const Adapter_Facts& adapter : _facts.adapters)
             for (const Port_Facts& port : adapter.ports)
                 for (const Target_Facts& target : port.targets)
                     seen[target.address].push_back(&target);
-        report_.targets = seen.size();
-        for (const Adapter_Facts& adapter : facts_.adapters)
+        _report.targets = seen.size();
+        for (const Adapter_Facts& adapter : _facts.adapters)
             for (const Port_Facts& port : adapter.ports)
                 for (const Target_Facts& target : port.targets)
                     if (seen[target.address].size() == 1)
@@ -190,11 +190,11 @@ private:
     void compare_firmware()
     {
         std::map<std::string, std::string> newest;
-        for (const Adapter_Facts& adapter : facts_.adapters)
+        for (const Adapter_Facts& adapter : _facts.adapters)
             if (std::string& best = newest[adapter.model()];
                 strverscmp(best.c_str(), adapter.firmware().c_str()) < 0)
                 best = adapter.firmware();
-        for (const Adapter_Facts& adapter : facts_.adapters) {
+        for (const Adapter_Facts& adapter : _facts.adapters) {
             const std::string model = adapter.model(), own = adapter.firmware();
             if (!model.empty() && !own.empty() && own != newest[model])
                 note("firmware-differs", Node_Kind::ADAPTER, adapter.controller,
@@ -212,8 +212,8 @@ private:
             const Instance_Value* failed = nullptr;
         };
         std::map<std::pair<std::string, std::string>, Run> last;
-        for (const Instance_Value& record : index_.instances("KALDERA_DiagnosticCompletionRecord")) {
-            const auto ends = index_.far_ends("KALDERA_CompletionRecordAppliesToElement", "Antecedent",
+        for (const Instance_Value& record : _index.instances("KALDERA_DiagnosticCompletionRecord")) {
+            const auto ends = _index.far_ends("KALDERA_CompletionRecordAppliesToElement", "Antecedent",
                                               record.path, "Dependent");
             const std::string id = text_of(record, "InstanceID");
             const std::size_t dash = id.rfind('-');
@@ -223,12 +223,12 @@ private:
             Run& run = last[{path_identity(ends[0]), text_of(record, "ServiceName")}];
             if (number > run.number)
                 run = {number, ends[0], nullptr};
-            if (number == run.number && number_of(record, "CompletionState") == completion_failed)
+            if (number == run.number && number_of(record, "CompletionState") == COMPLETION_FAILED)
                 run.failed = &record;
         }
         for (const auto& [place, run] : last)
             if (run.failed)
-                note("diagnostic-failed", kind_of(run.element), index_.instance(run.element),
+                note("diagnostic-failed", kind_of(run.element), _index.instance(run.element),
                      place.second + ": " + text_of(*run.failed, "RecordData"));
     }
 
@@ -241,17 +241,17 @@ private:
 
     void finish()
     {
-        std::ranges::stable_sort(report_.findings, {}, &Health_Finding::kind);
-        for (const Health_Finding& finding : report_.findings)
-            report_.rank = worse(report_.rank, finding.kind->rank);
+        std::ranges::stable_sort(_report.findings, {}, &Health_Finding::kind);
+        for (const Health_Finding& finding : _report.findings)
+            _report.rank = worse(_report.rank, finding.kind->rank);
     }
 
-    Connection& connection_;
-    const Health_Options& options_;
-    Association_Index index_;
-    First_Look first_look_;
-    Host_Facts facts_;
-    Health_Report report_;
+    Connection& _connection;
+    const Health_Options& _options;
+    Association_Index _index;
+    First_Look _first_look;
+    Host_Facts _facts;
+    Health_Report _report;
 };
 
 } // namespace

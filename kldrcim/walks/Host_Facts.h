@@ -61,7 +61,7 @@ struct Host_Facts_Options
 Host_Facts read_host_facts(Association_Index& index, const Host_Facts_Options& options);
 
 /// Codes of the CIM Schema: which software is what.
-inline constexpr std::uint64_t classification_driver = 2;
-inline constexpr std::uint64_t classification_firmware = 10;
+inline constexpr std::uint64_t CLASSIFICATION_DRIVER = 2;
+inline constexpr std::uint64_t CLASSIFICATION_FIRMWARE = 10;
 
 } // namespace KPRV::kldrcim

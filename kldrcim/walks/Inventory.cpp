@@ -116,41 +116,41 @@ Nodes all_of(const Inventory_Node& node, Node_Kind kind)
 class Comparison
 {
 public:
-    Comparison(const Inventory_Node& before, const Inventory_Node& now) : before_(before), now_(now)
+    Comparison(const Inventory_Node& before, const Inventory_Node& now) : _before(before), _now(now)
     {
-        diff_.without_software = is_in_one(SOFTWARE);
-        diff_.without_connectors = is_in_one(CARD) || is_in_one(CONNECTOR);
+        _diff.without_software = is_in_one(SOFTWARE);
+        _diff.without_connectors = is_in_one(CARD) || is_in_one(CONNECTOR);
     }
 
     Inventory_Diff run()
     {
-        diff_.two_hosts = has_no_adapter_in_common();
-        if (diff_.two_hosts) {
+        _diff.two_hosts = has_no_adapter_in_common();
+        if (_diff.two_hosts) {
             compare_everywhere(TARGET, [](const Inventory_Node& node) { return node.name; });
             compare_everywhere(UNIT, identifier_of);
         } else {
-            compare_attributes(now_, attributes_of(before_), attributes_of(now_));
-            compare_children(before_, now_);
+            compare_attributes(_now, attributes_of(_before), attributes_of(_now));
+            compare_children(_before, _now);
         }
-        return std::move(diff_);
+        return std::move(_diff);
     }
 
 private:
     bool is_in_one(Node_Kind kind) const
     {
-        return count_beneath(before_, kind) == 0 ? count_beneath(now_, kind) != 0
-                                                 : count_beneath(now_, kind) == 0;
+        return count_beneath(_before, kind) == 0 ? count_beneath(_now, kind) != 0
+                                                 : count_beneath(_now, kind) == 0;
     }
 
     bool is_left_out(Node_Kind kind) const
     {
-        return (kind == SOFTWARE && diff_.without_software) ||
-               ((kind == CARD || kind == CONNECTOR) && diff_.without_connectors);
+        return (kind == SOFTWARE && _diff.without_software) ||
+               ((kind == CARD || kind == CONNECTOR) && _diff.without_connectors);
     }
 
     bool has_no_adapter_in_common() const
     {
-        const auto before = by_key(all_of(before_, ADAPTER)), now = by_key(all_of(now_, ADAPTER));
+        const auto before = by_key(all_of(_before, ADAPTER)), now = by_key(all_of(_now, ADAPTER));
         return !before.empty() && !now.empty() &&
                std::ranges::none_of(before, [&](const auto& each) { return now.contains(each.first); });
     }
@@ -158,7 +158,7 @@ private:
     void note(Inventory_Change::Kind kind, const Inventory_Node& node,
               std::vector<Attribute_Change> attributes = {})
     {
-        diff_.changes.push_back({kind, &node, {above_.rbegin(), above_.rend()}, std::move(attributes)});
+        _diff.changes.push_back({kind, &node, {_above.rbegin(), _above.rend()}, std::move(attributes)});
     }
 
     void compare_attributes(const Inventory_Node& now, const std::vector<Attribute>& before_values,
@@ -203,9 +203,9 @@ private:
     void compare(const Inventory_Node& before, const Inventory_Node& now)
     {
         compare_attributes(now, attributes_of(before), attributes_of(now));
-        above_.push_back(&now);
+        _above.push_back(&now);
         compare_children(before, now);
-        above_.pop_back();
+        _above.pop_back();
     }
 
     /// Without regard to where they hang, each once; those without a key are left out.
@@ -219,7 +219,7 @@ private:
                     found.try_emplace(name, node);
             return found;
         };
-        const auto olds = keyed(before_), news = keyed(now_);
+        const auto olds = keyed(_before), news = keyed(_now);
         for (const auto& [name, node] : olds)
             if (!news.contains(name))
                 note(Inventory_Change::Kind::WENT, *node);
@@ -231,10 +231,10 @@ private:
                 note(Inventory_Change::Kind::CAME, *node);
     }
 
-    const Inventory_Node& before_;
-    const Inventory_Node& now_;
-    Inventory_Diff diff_;
-    Nodes above_;
+    const Inventory_Node& _before;
+    const Inventory_Node& _now;
+    Inventory_Diff _diff;
+    Nodes _above;
 };
 
 } // namespace

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include <unordered_map>
 
@@ -19,14 +19,14 @@ public:
     Number of(const Path_Value& path);
     /// `none` if it has none.
     Number find(const Path_Value& path) const;
-    std::size_t size() const { return class_of_.size(); }
+    std::size_t size() const { return _class_of.size(); }
     /// As the first path named it.
-    const std::string& class_name(Number number) const { return classes_[class_of_[number]]; }
+    const std::string& class_name(Number number) const { return _classes[_class_of[number]]; }
 
 private:
-    std::unordered_map<std::string, Number> numbers_;
-    std::vector<std::uint16_t> class_of_;
-    std::vector<std::string> classes_;
+    std::unordered_map<std::string, Number> _numbers;
+    std::vector<std::uint16_t> _class_of;
+    std::vector<std::string> _classes;
 };
 
 } // namespace KPRV::kldrcim

@@ -21,12 +21,12 @@ std::optional<double> reading(const Json::Value& readings, const char* member, d
 Optics_Readings Optics_Reader::read(const std::string& port)
 {
     std::string error;
-    if (is_refused_)
+    if (_is_refused)
         return {};
-    const Result answer = call_agent(connection_, *rpc_request("diagnostics.getOpticsPOM", {port}, error));
-    is_refused_ = !answer.ok();
+    const Result answer = call_agent(_connection, *rpc_request("diagnostics.getOpticsPOM", {port}, error));
+    _is_refused = !answer.ok();
     Json::Value reply;
-    if (is_refused_ || !Json::Reader().parse(read_rpc_reply(agent_reply(answer)).result, reply) ||
+    if (_is_refused || !Json::Reader().parse(read_rpc_reply(agent_reply(answer)).result, reply) ||
         !reply.isObject())
         return {};
     const Json::Value& readings = reply;

@@ -21,15 +21,15 @@ struct Optics_Readings
 class Optics_Reader
 {
 public:
-    explicit Optics_Reader(Connection& connection) : connection_(connection) {}
+    explicit Optics_Reader(Connection& connection) : _connection(connection) {}
 
     /// Of an FC port, by its address in colon form. Without any reading for an empty slot, or optics that are
     /// not monitored.
     Optics_Readings read(const std::string& port);
 
 private:
-    Connection& connection_;
-    bool is_refused_ = false;
+    Connection& _connection;
+    bool _is_refused = false;
 };
 
 } // namespace KPRV::kldrcim

@@ -28,14 +28,14 @@ class Profile_Walk
 {
 public:
     Profile_Walk(Association_Index& index, const Class_Catalogue& catalogue)
-        : index_(index), catalogue_(catalogue)
+        : _index(index), _catalogue(catalogue)
     {
     }
 
     std::vector<Profile_Branch> run()
     {
         std::vector<Profile_Branch> roots;
-        for (const Instance_Value& profile : index_.instances(profile_root_class))
+        for (const Instance_Value& profile : _index.instances(profile_root_class))
             if (ends(standards, profile.path).empty())
                 roots.push_back(branch(profile.path));
         return roots;
@@ -46,25 +46,25 @@ private:
 
     std::vector<Path_Value> ends(const Way& way, const Path_Value& path)
     {
-        return index_.far_ends(way.association, way.near_role, path, way.far_role);
+        return _index.far_ends(way.association, way.near_role, path, way.far_role);
     }
 
     Kind kind_of(const Path_Value& path) const
     {
         // A subprofile is a profile to the schema.
-        if (catalogue_.is_a(path.class_name, "CIM_RegisteredSubProfile"))
+        if (_catalogue.is_a(path.class_name, "CIM_RegisteredSubProfile"))
             return Kind::SUBPROFILE;
-        return catalogue_.is_a(path.class_name, "CIM_RegisteredProfile") ? Kind::PROFILE : Kind::ELEMENT;
+        return _catalogue.is_a(path.class_name, "CIM_RegisteredProfile") ? Kind::PROFILE : Kind::ELEMENT;
     }
 
-    Profile_Branch leaf(Kind kind, const Path_Value& path) { return {kind, index_.instance(path), 0, {}}; }
+    Profile_Branch leaf(Kind kind, const Path_Value& path) { return {kind, _index.instance(path), 0, {}}; }
 
     /// A profile or subprofile with what conforms to it. Profiles that conform to each other in a circle are
     /// entered once.
     Profile_Branch branch(const Path_Value& path)
     {
         Profile_Branch result = leaf(kind_of(path), path);
-        if (!entered_.insert(path_identity(path)).second)
+        if (!_entered.insert(path_identity(path)).second)
             return result;
         std::vector<Profile_Branch> elements, below;
         for (const Path_Value& end : ends(conforming, path)) {
@@ -89,9 +89,9 @@ private:
         return result;
     }
 
-    Association_Index& index_;
-    const Class_Catalogue& catalogue_;
-    std::unordered_set<std::string> entered_;
+    Association_Index& _index;
+    const Class_Catalogue& _catalogue;
+    std::unordered_set<std::string> _entered;
 };
 
 } // namespace

@@ -4,7 +4,7 @@ namespace KPRV::kldrcim {
 
 std::optional<std::uint64_t> number_of(const Instance_Value& instance, const char* property)
 {
-    const Value* value = instance.property(property);
+    const Plain_Value* value = instance.property(property);
     if (value && value->is_array())
         value = value->elements().empty() ? nullptr : &value->elements().front();
     if (!value || value->null)
@@ -14,7 +14,7 @@ std::optional<std::uint64_t> number_of(const Instance_Value& instance, const cha
 
 std::string text_of(const Instance_Value& instance, const char* property)
 {
-    const Value* const value = instance.property(property);
+    const Plain_Value* const value = instance.property(property);
     return value && !value->null ? value->as_text() : "";
 }
 

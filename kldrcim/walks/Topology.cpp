@@ -45,7 +45,7 @@ class Each_Of final : public Receiver
 {
 public:
     Each_Of(const Topology_Options& options, const std::string& class_name, Each each)
-        : options_(options), class_name_(class_name), each_(std::move(each))
+        : _options(options), _class_name(class_name), _each(std::move(each))
     {
         tell();
     }
@@ -56,55 +56,55 @@ public:
 private:
     bool take(const Path_Value& path, const Instance_Value* instance)
     {
-        each_(path, instance);
-        if (++count_ % 256 == 0)
+        _each(path, instance);
+        if (++_count % 256 == 0)
             tell();
         return true;
     }
     void tell() const
     {
-        if (options_.progress)
-            options_.progress(class_name_, count_);
+        if (_options.progress)
+            _options.progress(_class_name, _count);
     }
 
-    const Topology_Options& options_;
-    const std::string& class_name_;
-    Each each_;
-    std::size_t count_ = 0;
+    const Topology_Options& _options;
+    const std::string& _class_name;
+    Each _each;
+    std::size_t _count = 0;
 };
 
 /// Numbers of the objects that a role of an association holds: neighbours often share them.
 class Role_Numbers
 {
 public:
-    Role_Numbers(Object_Numbers& numbers, const char* role) : numbers_(numbers), role_(role) {}
+    Role_Numbers(Object_Numbers& numbers, const char* role) : _numbers(numbers), _role(role) {}
 
     /// Null if the link has no such end.
     const Path_Value* end_of(const Path_Value& link) const
     {
-        const Value* const value = role_ ? link.key(role_) : nullptr;
+        const Plain_Value* const value = _role ? link.key(_role) : nullptr;
         return value ? value->as_path() : nullptr;
     }
     Number of(const Path_Value& end)
     {
-        if (last_ == Object_Numbers::none || !(end == path_)) {
-            last_ = numbers_.of(end);
-            path_ = end;
+        if (_last == Object_Numbers::none || !(end == _path)) {
+            _last = _numbers.of(end);
+            _path = end;
         }
-        return last_;
+        return _last;
     }
 
 private:
-    Object_Numbers& numbers_;
-    const char* role_;
-    Path_Value path_;
-    Number last_ = Object_Numbers::none;
+    Object_Numbers& _numbers;
+    const char* _role;
+    Path_Value _path;
+    Number _last = Object_Numbers::none;
 };
 
 class Walk
 {
 public:
-    Walk(Connection& connection, const Topology_Options& options) : connection_(connection), options_(options)
+    Walk(Connection& connection, const Topology_Options& options) : _connection(connection), _options(options)
     {
     }
 
@@ -112,33 +112,33 @@ public:
     {
         ask(topology_root_class, Operation::ENUMERATE_INSTANCES,
             [&](const Path_Value& path, const Instance_Value* system) {
-                const Number number = numbers_.of(path);
+                const Number number = _numbers.of(path);
                 meet(number, Node_Kind::SYSTEM);
-                topology_.nodes[number].text = options_.text_of(Node_Kind::SYSTEM, *system);
-                topology_.roots.push_back(number);
+                _topology.nodes[number].text = _options.text_of(Node_Kind::SYSTEM, *system);
+                _topology.roots.push_back(number);
             });
         for (const Topology_Step* step = topology_steps; step->association; ++step)
             if (takes(*step))
                 follow(*step);
         prune_adapters();
         read_instances();
-        if (options_.merge_units)
+        if (_options.merge_units)
             merge_units();
-        return std::move(topology_);
+        return std::move(_topology);
     }
 
 private:
     bool takes(const Topology_Step& step) const
     {
-        if (options_.depth != 0 && depth_of(step.to) > options_.depth)
+        if (_options.depth != 0 && depth_of(step.to) > _options.depth)
             return false;
         switch (step.taken) {
         case Topology_Step::WITH_SOFTWARE:
-            return options_.software;
+            return _options.software;
         case Topology_Step::WITH_CONNECTORS:
-            return options_.connectors;
+            return _options.connectors;
         case Topology_Step::CROSS_LINK:
-            return options_.cross_links;
+            return _options.cross_links;
         default:
             return true;
         }
@@ -147,28 +147,28 @@ private:
     template <class Each>
     void ask(const std::string& class_name, Operation operation, Each each)
     {
-        Each_Of<Each> receiver(options_, class_name, std::move(each));
+        Each_Of<Each> receiver(_options, class_name, std::move(each));
         Request request;
         request.operation = operation;
         request.path.class_name = class_name;
         if (operation == Operation::ENUMERATE_INSTANCES)
-            request.properties = options_.properties;
-        const Result result = connection_.run(request, &receiver);
+            request.properties = _options.properties;
+        const Result result = _connection.run(request, &receiver);
         if (!result.ok())
-            topology_.failures.push_back({class_name, result.rc, result.message});
+            _topology.failures.push_back({class_name, result.rc, result.message});
     }
 
     bool is_node(Number number, Node_Kind kind) const
     {
-        return number < topology_.nodes.size() && topology_.nodes[number].is_met &&
-               topology_.nodes[number].kind == kind;
+        return number < _topology.nodes.size() && _topology.nodes[number].is_met &&
+               _topology.nodes[number].kind == kind;
     }
 
     void meet(Number number, Node_Kind kind)
     {
-        if (number >= topology_.nodes.size())
-            topology_.nodes.resize(std::max<std::size_t>(number + 1, numbers_.size()));
-        Topology::Node& node = topology_.nodes[number];
+        if (number >= _topology.nodes.size())
+            _topology.nodes.resize(std::max<std::size_t>(number + 1, _numbers.size()));
+        Topology::Node& node = _topology.nodes[number];
         if (!node.is_met)
             node = {kind, true, {}};
     }
@@ -177,32 +177,32 @@ private:
     bool is_wanted(Node_Kind kind, const Path_Value& path) const
     {
         const bool is_port = kind == Node_Kind::FC_PORT || kind == Node_Kind::ETHERNET_PORT;
-        const std::string& wanted = kind == Node_Kind::ADAPTER ? options_.adapter
-                                    : is_port                  ? options_.port
+        const std::string& wanted = kind == Node_Kind::ADAPTER ? _options.adapter
+                                    : is_port                  ? _options.port
                                                                : "";
-        const Value* const id = path.key("DeviceID");
+        const Plain_Value* const id = path.key("DeviceID");
         return wanted.empty() || (id && address_digits(id->as_text()) == address_digits(wanted));
     }
 
     /// The links of the step from what was met. An association that two steps follow was kept by the first.
     void follow(const Topology_Step& step)
     {
-        if (!has_node(topology_, {step.from}))
+        if (!has_node(_topology, {step.from}))
             return;
         Topology::Step_Links found = {&step, {}};
         if (step.above_role)
-            found.links = std::move(kept_);
+            found.links = std::move(_kept);
         else
             read_links(step, found.links);
         // Each far end once for each start, where it first came.
         if (step.taken == Topology_Step::CROSS_LINK)
             std::erase_if(found.links, [&](const Link& link) { return !is_node(link.to, step.to); });
-        if (step.to == Node_Kind::UNIT && options_.count_units)
+        if (step.to == Node_Kind::UNIT && _options.count_units)
             found.links = counted(found.links);
         else
             for (const Link& link : found.links)
                 meet(link.to, step.to);
-        topology_.steps.push_back(std::move(found));
+        _topology.steps.push_back(std::move(found));
     }
 
     void read_links(const Topology_Step& step, std::vector<Link>& links)
@@ -210,8 +210,8 @@ private:
         // A path names initiator, target and unit at once: the unit is kept for the step behind.
         const Topology_Step* const behind = &step + 1;
         const bool is_shared = behind->above_role && takes(*behind);
-        Role_Numbers near(numbers_, step.near_role), far(numbers_, step.far_role),
-            last(numbers_, is_shared ? behind->far_role : nullptr);
+        Role_Numbers near(_numbers, step.near_role), far(_numbers, step.far_role),
+            last(_numbers, is_shared ? behind->far_role : nullptr);
         ask(step.association, Operation::ENUMERATE_INSTANCE_NAMES,
             [&](const Path_Value& link, const Instance_Value*) {
                 const Path_Value* const start = near.end_of(link);
@@ -224,10 +224,10 @@ private:
                 const Number to = far.of(*end);
                 links.push_back({from, 0, to});
                 if (const Path_Value* const beyond = last.end_of(link))
-                    kept_.push_back({to, from, last.of(*beyond)});
+                    _kept.push_back({to, from, last.of(*beyond)});
             });
         make_unique(links);
-        make_unique(kept_);
+        make_unique(_kept);
     }
 
     /// By start and what is above it, each far end once, where it first came.
@@ -259,11 +259,11 @@ private:
         for (std::size_t i = 0, next = 0; i < links.size(); i = next) {
             while (next < links.size() && place(links[next]) == place(links[i]))
                 ++next;
-            const Number number = static_cast<Number>(std::max(topology_.nodes.size(), numbers_.size()));
+            const Number number = static_cast<Number>(std::max(_topology.nodes.size(), _numbers.size()));
             meet(number, Node_Kind::UNITS);
             const Instance_Value units = {
-                .properties = {{"Count", Value::unsigned_number(CMPI_uint64, next - i)}}};
-            topology_.nodes[number].text = options_.text_of(Node_Kind::UNITS, units);
+                .properties = {{"Count", Plain_Value::unsigned_number(CMPI_uint64, next - i)}}};
+            _topology.nodes[number].text = _options.text_of(Node_Kind::UNITS, units);
             result.push_back({links[i].from, links[i].above, number});
         }
         return result;
@@ -272,15 +272,15 @@ private:
     /// With one port named, adapters without it are left out.
     void prune_adapters()
     {
-        if (options_.port.empty())
+        if (_options.port.empty())
             return;
-        std::vector<bool> has_port(topology_.nodes.size());
-        for (const Topology::Step_Links& each : topology_.steps)
+        std::vector<bool> has_port(_topology.nodes.size());
+        for (const Topology::Step_Links& each : _topology.steps)
             if (each.step->from == Node_Kind::ADAPTER &&
                 (each.step->to == Node_Kind::FC_PORT || each.step->to == Node_Kind::ETHERNET_PORT))
                 for (const Link& link : each.links)
                     has_port[link.from] = true;
-        for (Topology::Step_Links& each : topology_.steps)
+        for (Topology::Step_Links& each : _topology.steps)
             if (each.step->to == Node_Kind::ADAPTER)
                 std::erase_if(each.links, [&](const Link& link) { return !has_port[link.to]; });
     }
@@ -289,40 +289,40 @@ private:
     void read_instances()
     {
         std::vector<std::string> class_names;
-        for (const Topology::Step_Links& each : topology_.steps)
+        for (const Topology::Step_Links& each : _topology.steps)
             for (const Link& link : each.links)
-                if (link.to < numbers_.size() &&
-                    std::ranges::find(class_names, numbers_.class_name(link.to)) == class_names.end())
-                    class_names.push_back(numbers_.class_name(link.to));
+                if (link.to < _numbers.size() &&
+                    std::ranges::find(class_names, _numbers.class_name(link.to)) == class_names.end())
+                    class_names.push_back(_numbers.class_name(link.to));
         for (const std::string& class_name : class_names)
             ask(class_name, Operation::ENUMERATE_INSTANCES,
                 [&](const Path_Value& path, const Instance_Value* instance) {
-                    keep_text(numbers_.find(path), *instance);
+                    keep_text(_numbers.find(path), *instance);
                 });
         tell_of_the_missing();
     }
 
     void keep_text(Number number, const Instance_Value& instance)
     {
-        if (number >= topology_.nodes.size() || !topology_.nodes[number].is_met ||
-            !topology_.nodes[number].text.empty())
+        if (number >= _topology.nodes.size() || !_topology.nodes[number].is_met ||
+            !_topology.nodes[number].text.empty())
             return;
-        topology_.nodes[number].text = options_.text_of(topology_.nodes[number].kind, instance);
-        if (options_.merge_units && topology_.nodes[number].kind == Node_Kind::UNIT)
+        _topology.nodes[number].text = _options.text_of(_topology.nodes[number].kind, instance);
+        if (_options.merge_units && _topology.nodes[number].kind == Node_Kind::UNIT)
             if (const std::string identifier = unit_identifier(instance); !identifier.empty())
-                units_[identifier].push_back(number);
+                _units[identifier].push_back(number);
     }
 
     /// The unit that the links meet first stands for all of its identifier.
     void merge_units()
     {
-        std::vector<Number> first(topology_.nodes.size());
+        std::vector<Number> first(_topology.nodes.size());
         for (Number i = 0; i < first.size(); ++i)
             first[i] = i;
-        for (const auto& [identifier, numbers] : units_)
+        for (const auto& [identifier, numbers] : _units)
             for (const Number number : numbers)
                 first[number] = std::ranges::min(numbers);
-        for (Topology::Step_Links& each : topology_.steps)
+        for (Topology::Step_Links& each : _topology.steps)
             if (each.step->to == Node_Kind::UNIT) {
                 for (Link& link : each.links)
                     link.to = first[link.to];
@@ -333,30 +333,30 @@ private:
     /// Of nodes that the module has no instance of, their keys are known: they are asked for again.
     void tell_of_the_missing()
     {
-        const std::size_t failures = topology_.failures.size();
-        for (const Topology::Step_Links& each : topology_.steps) {
+        const std::size_t failures = _topology.failures.size();
+        for (const Topology::Step_Links& each : _topology.steps) {
             const bool is_complete = std::ranges::none_of(
-                each.links, [&](const Link& link) { return topology_.nodes[link.to].text.empty(); });
+                each.links, [&](const Link& link) { return _topology.nodes[link.to].text.empty(); });
             if (is_complete)
                 continue;
-            const Role_Numbers far(numbers_, each.step->far_role);
+            const Role_Numbers far(_numbers, each.step->far_role);
             ask(each.step->association, Operation::ENUMERATE_INSTANCE_NAMES,
                 [&](const Path_Value& link, const Instance_Value*) {
                     if (const Path_Value* const end = far.end_of(link))
-                        keep_text(numbers_.find(*end), {*end, end->keys});
+                        keep_text(_numbers.find(*end), {*end, end->keys});
                 });
         }
-        topology_.failures.resize(failures);
+        _topology.failures.resize(failures);
     }
 
-    Connection& connection_;
-    const Topology_Options& options_;
-    Object_Numbers numbers_;
-    Topology topology_;
+    Connection& _connection;
+    const Topology_Options& _options;
+    Object_Numbers _numbers;
+    Topology _topology;
     /// From targets to units, under the initiator that sees them.
-    std::vector<Link> kept_;
+    std::vector<Link> _kept;
     /// By identifier, if units are merged.
-    std::unordered_map<std::string, std::vector<Number>> units_;
+    std::unordered_map<std::string, std::vector<Number>> _units;
 };
 
 } // namespace

@@ -23,24 +23,24 @@ std::string lun_of(const Instance_Value& unit)
 class Path_Walk
 {
 public:
-    explicit Path_Walk(Association_Index& index) : index_(index) {}
+    explicit Path_Walk(Association_Index& index) : _index(index) {}
 
     std::vector<Logical_Unit> run()
     {
-        for (const Path_Value& link : index_.names(path_class)) {
+        for (const Path_Value& link : _index.names(path_class)) {
             const Path_Value* const initiator = end_of(link, "Initiator");
             const Path_Value* const target = end_of(link, "Target");
             const Path_Value* const unit = end_of(link, "LogicalUnit");
             if (initiator && target && unit)
-                add(*initiator, *target, index_.instance(*unit));
+                add(*initiator, *target, _index.instance(*unit));
         }
-        return std::move(units_);
+        return std::move(_units);
     }
 
 private:
     static const Path_Value* end_of(const Path_Value& link, const char* role)
     {
-        const Value* const value = link.key(role);
+        const Plain_Value* const value = link.key(role);
         return value ? value->as_path() : nullptr;
     }
 
@@ -59,37 +59,37 @@ private:
                           near.troubled.properties.empty() ? far.troubled : near.troubled};
         const std::string identifier = unit_identifier(unit);
         const auto [at, is_new] =
-            known_.try_emplace(identifier.empty() ? path_identity(unit.path) : identifier, units_.size());
+            _known.try_emplace(identifier.empty() ? path_identity(unit.path) : identifier, _units.size());
         if (is_new)
-            units_.push_back({std::move(unit), identifier, {}});
-        units_[at->second].paths.push_back(std::move(path));
+            _units.push_back({std::move(unit), identifier, {}});
+        _units[at->second].paths.push_back(std::move(path));
     }
 
     /// What there is to know of an endpoint. The far one is named for both sides: near address, "_", far
     /// address.
     const End& end(const Path_Value& path)
     {
-        const auto [at, is_new] = ends_.try_emplace(path_identity(path));
+        const auto [at, is_new] = _ends.try_emplace(path_identity(path));
         if (!is_new)
             return at->second;
-        const Instance_Value endpoint = index_.instance(path);
+        const Instance_Value endpoint = _index.instance(path);
         const std::string name = text_of(endpoint, "Name");
         at->second.address = name.substr(name.find('_') + 1);
         if (const auto status = number_of(endpoint, "OperationalStatus"); status && !is_in_service(*status))
             at->second.troubled = endpoint;
         for (const Path_Value& port :
-             index_.far_ends("KALDERA_DeviceSAPImplementation", "Dependent", path, "Antecedent"))
+             _index.far_ends("KALDERA_DeviceSAPImplementation", "Dependent", path, "Antecedent"))
             for (const Path_Value& adapter :
-                 index_.far_ends("KALDERA_ControlledBy", "Dependent", port, "Antecedent"))
+                 _index.far_ends("KALDERA_ControlledBy", "Dependent", port, "Antecedent"))
                 at->second.adapter = path_identity(adapter);
         return at->second;
     }
 
-    Association_Index& index_;
-    std::vector<Logical_Unit> units_;
+    Association_Index& _index;
+    std::vector<Logical_Unit> _units;
     /// Places of the units by their identifiers.
-    std::unordered_map<std::string, std::size_t> known_;
-    std::unordered_map<std::string, End> ends_;
+    std::unordered_map<std::string, std::size_t> _known;
+    std::unordered_map<std::string, End> _ends;
 };
 
 } // namespace

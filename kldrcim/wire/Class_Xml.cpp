@@ -61,41 +61,41 @@ class Class_Writer
 public:
     Class_Writer(Xml_Writer& writer, const Class_Catalogue& catalogue, const Class_Info& info,
                  const Class_Form& form)
-        : writer_(writer), catalogue_(catalogue), info_(info), form_(form),
-          superclass_(catalogue.find(info.superclass))
+        : _writer(writer), _catalogue(catalogue), _info(info), _form(form),
+          _superclass(catalogue.find(info.superclass))
     {
     }
 
     void write()
     {
-        writer_.open(Tag::CLASS).attribute(At::NAME, info_.name);
-        if (!info_.superclass.empty())
-            writer_.attribute(At::SUPERCLASS, info_.superclass);
-        if (form_.qualifiers && info_.is_association)
-            write_qualifier(writer_, "Association");
-        if (form_.qualifiers && info_.is_indication)
-            write_qualifier(writer_, "Indication");
-        for (const Feature_Info& property : info_.properties)
+        _writer.open(Tag::CLASS).attribute(At::NAME, _info.name);
+        if (!_info.superclass.empty())
+            _writer.attribute(At::SUPERCLASS, _info.superclass);
+        if (_form.qualifiers && _info.is_association)
+            write_qualifier(_writer, "Association");
+        if (_form.qualifiers && _info.is_indication)
+            write_qualifier(_writer, "Indication");
+        for (const Feature_Info& property : _info.properties)
             if (is_wanted(property))
                 write_property(property);
-        for (const Method_Info& method : info_.methods)
-            if (!form_.local_only || is_own(method, superclass_ ? superclass_->method(method.name) : nullptr))
+        for (const Method_Info& method : _info.methods)
+            if (!_form.local_only || is_own(method, _superclass ? _superclass->method(method.name) : nullptr))
                 write_method(method);
-        writer_.close(Tag::CLASS);
+        _writer.close(Tag::CLASS);
     }
 
 private:
     bool is_wanted(const Feature_Info& property) const
     {
-        return (!form_.local_only || is_own(property, inherited(property))) &&
-               (!form_.properties || std::ranges::any_of(*form_.properties, [&](const std::string& name) {
+        return (!_form.local_only || is_own(property, inherited(property))) &&
+               (!_form.properties || std::ranges::any_of(*_form.properties, [&](const std::string& name) {
                    return same_name(name, property.name);
                }));
     }
 
     const Feature_Info* inherited(const Feature_Info& property) const
     {
-        return superclass_ ? superclass_->property(property.name) : nullptr;
+        return _superclass ? _superclass->property(property.name) : nullptr;
     }
 
     /// True for what the class declares, or declares anew: what is known of it is not what was inherited.
@@ -103,15 +103,15 @@ private:
     bool is_own(const Info& info, const Info* inherited) const
     {
         return !inherited || !same_declaration(info, *inherited) ||
-               !same_meanings(words_.of(info.name), inherited_words_.of(info.name));
+               !same_meanings(_words.of(info.name), _inherited_words.of(info.name));
     }
 
     void write_origin(const std::string& origin, bool is_own)
     {
-        if (form_.origins)
-            writer_.attribute(At::CLASSORIGIN, origin);
+        if (_form.origins)
+            _writer.attribute(At::CLASSORIGIN, origin);
         if (!is_own)
-            writer_.attribute(At::PROPAGATED, "true");
+            _writer.attribute(At::PROPAGATED, "true");
     }
 
     /// Tag, name and type of a property or parameter.
@@ -119,94 +119,94 @@ private:
     {
         const bool is_array = (feature.type & CMPI_ARRAY) != 0;
         const bool is_reference = (feature.type & ~CMPI_ARRAY) == CMPI_ref;
-        latest_ = is_reference ? is_array ? references : reference : is_array ? array : plain;
-        writer_.open(latest_).attribute(At::NAME, feature.name);
+        _latest = is_reference ? is_array ? references : reference : is_array ? array : plain;
+        _writer.open(_latest).attribute(At::NAME, feature.name);
         if (!is_reference)
-            writer_.attribute(At::TYPE, wire_type_name(feature.type));
+            _writer.attribute(At::TYPE, wire_type_name(feature.type));
         else if (!feature.target_class.empty())
-            writer_.attribute(At::REFERENCECLASS, feature.target_class);
+            _writer.attribute(At::REFERENCECLASS, feature.target_class);
     }
 
     void write_embedded_class(const Feature_Info& feature)
     {
         if ((feature.type & ~CMPI_ARRAY) == CMPI_instance)
-            write_qualifier(writer_, "EmbeddedInstance", feature.target_class);
+            write_qualifier(_writer, "EmbeddedInstance", feature.target_class);
     }
 
     void write_property(const Feature_Info& property)
     {
-        const std::string origin = origin_of_property(catalogue_, info_.name, property.name);
+        const std::string origin = origin_of_property(_catalogue, _info.name, property.name);
         open(property, Tag::PROPERTY, Tag::PROPERTY_ARRAY, Tag::PROPERTY_REFERENCE, Tag::PROPERTY_ARRAY);
         write_origin(origin, is_own(property, inherited(property)));
-        if (form_.qualifiers) {
+        if (_form.qualifiers) {
             if (property.key)
-                write_qualifier(writer_, "Key");
+                write_qualifier(_writer, "Key");
             write_embedded_class(property);
             write_words(property.name);
         }
-        write_value(writer_, property.default_value);
-        writer_.close(latest_);
+        write_value(_writer, property.default_value);
+        _writer.close(_latest);
     }
 
     void write_words(const std::string& feature)
     {
         std::vector<std::string> numbers, words;
-        for (const Value_Meaning& meaning : in_order_of_numbers(words_.of(feature))) {
+        for (const Value_Meaning& meaning : in_order_of_numbers(_words.of(feature))) {
             numbers.push_back(value_map_text(meaning));
             words.push_back(meaning.word);
         }
         if (words.empty())
             return;
-        write_qualifier(writer_, "ValueMap", numbers);
-        write_qualifier(writer_, "Values", words);
+        write_qualifier(_writer, "ValueMap", numbers);
+        write_qualifier(_writer, "Values", words);
     }
 
     std::string origin_of_method(const std::string& name) const
     {
         std::string origin;
-        for (const Class_Info* each = &info_; each && each->method(name);
-             each = catalogue_.find(each->superclass))
+        for (const Class_Info* each = &_info; each && each->method(name);
+             each = _catalogue.find(each->superclass))
             origin = each->name;
         return origin;
     }
 
     void write_method(const Method_Info& method)
     {
-        writer_.open(Tag::METHOD).attribute(At::NAME, method.name);
+        _writer.open(Tag::METHOD).attribute(At::NAME, method.name);
         if (method.return_type != CMPI_null)
-            writer_.attribute(At::TYPE, wire_type_name(method.return_type));
+            _writer.attribute(At::TYPE, wire_type_name(method.return_type));
         write_origin(origin_of_method(method.name),
-                     is_own(method, superclass_ ? superclass_->method(method.name) : nullptr));
-        if (form_.qualifiers && method.is_static)
-            write_qualifier(writer_, "Static");
-        if (form_.qualifiers)
+                     is_own(method, _superclass ? _superclass->method(method.name) : nullptr));
+        if (_form.qualifiers && method.is_static)
+            write_qualifier(_writer, "Static");
+        if (_form.qualifiers)
             write_words(method.name);
         for (const Feature_Info& parameter : method.parameters) {
             open(parameter, Tag::PARAMETER, Tag::PARAMETER_ARRAY, Tag::PARAMETER_REFERENCE,
                  Tag::PARAMETER_REFARRAY);
-            if (form_.qualifiers)
+            if (_form.qualifiers)
                 write_direction(parameter);
-            writer_.close(latest_);
+            _writer.close(_latest);
         }
-        writer_.close(Tag::METHOD);
+        _writer.close(Tag::METHOD);
     }
 
     void write_direction(const Feature_Info& parameter)
     {
-        write_qualifier(writer_, "In", parameter.in ? "TRUE" : "FALSE");
+        write_qualifier(_writer, "In", parameter.in ? "TRUE" : "FALSE");
         if (parameter.out)
-            write_qualifier(writer_, "Out");
+            write_qualifier(_writer, "Out");
         write_embedded_class(parameter);
     }
 
-    Xml_Writer& writer_;
-    const Class_Catalogue& catalogue_;
-    const Class_Info& info_;
-    const Class_Form& form_;
-    const Class_Info* superclass_;
-    const Class_Words words_{info_.name};
-    const Class_Words inherited_words_{info_.superclass};
-    Tag latest_ = Tag::PROPERTY;
+    Xml_Writer& _writer;
+    const Class_Catalogue& _catalogue;
+    const Class_Info& _info;
+    const Class_Form& _form;
+    const Class_Info* _superclass;
+    const Class_Words _words{_info.name};
+    const Class_Words _inherited_words{_info.superclass};
+    Tag _latest = Tag::PROPERTY;
 };
 
 /// The text of a qualifier; nothing if the element has none of that name.

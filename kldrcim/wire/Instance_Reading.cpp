@@ -13,7 +13,7 @@ using Tag = Xml_Tag;
 using At = Xml_Attribute;
 
 /// Of instances in instances.
-constexpr unsigned deepest = 16;
+constexpr unsigned DEEPEST = 16;
 
 std::string required(Xml_Node node, At attribute)
 {
@@ -43,7 +43,7 @@ bool is_array(Xml_Node value)
 }
 
 /// A number of a type that nobody declares.
-Value undeclared_number(std::string_view text)
+Plain_Value undeclared_number(std::string_view text)
 {
     if (text.find_first_of(".eEnN") != std::string_view::npos && text.find_first_of("xX") == text.npos)
         return value_of_wire_text(text, CMPI_real64);
@@ -116,7 +116,7 @@ Path_Value Instance_Reader::path(Xml_Node node) const
         return path;
     case Tag::INSTANCENAME: {
         path.class_name = required(node, At::CLASSNAME);
-        const Class_Info* owner = catalogue_.find(path.class_name);
+        const Class_Info* owner = _catalogue.find(path.class_name);
         for (const Xml_Node each : node.children())
             path.keys.push_back(key(each, owner));
         return path;
@@ -139,15 +139,15 @@ Named_Value Instance_Reader::key(Xml_Node node, const Class_Info* owner) const
     return {declared ? declared->name : std::string(), key_value(node, declared)};
 }
 
-Value Instance_Reader::key_value(Xml_Node node, const Feature_Info* declared) const
+Plain_Value Instance_Reader::key_value(Xml_Node node, const Feature_Info* declared) const
 {
     if (node.is(Tag::VALUE_REFERENCE))
-        return Value::path(path(node));
+        return Plain_Value::path(path(node));
     const std::string_view text = node.text();
     if (declared && declared->type == CMPI_ref) {
         Path_Error error;
         if (const std::optional<Path_Value> path = parse_path(text, error))
-            return Value::path(*path);
+            return Plain_Value::path(*path);
         throw Wire_Error::status(CMPI_RC_ERR_TYPE_MISMATCH, declared->name + " is no reference");
     }
     if (declared && !declared->type)
@@ -161,55 +161,55 @@ Value Instance_Reader::key_value(Xml_Node node, const Feature_Info* declared) co
     return value_of_wire_text(text, kind == "boolean" ? CMPI_boolean : CMPI_string);
 }
 
-Value Instance_Reader::scalar(Xml_Node node, CMPIType type) const
+Plain_Value Instance_Reader::scalar(Xml_Node node, CMPIType type) const
 {
     if (node.is(Tag::VALUE_NULL))
-        return Value::null_of(type);
+        return Plain_Value::null_of(type);
     if (node.is(Tag::VALUE_REFERENCE) != (type == CMPI_ref))
         throw Wire_Error::status(CMPI_RC_ERR_TYPE_MISMATCH, "<" + std::string(name_of(node.tag())) +
                                                                 "> is no value of type " +
                                                                 type_word_name(type));
     if (type == CMPI_ref)
-        return Value::path(path(node));
+        return Plain_Value::path(path(node));
     return type == CMPI_instance ? embedded(node.text()) : value_of_wire_text(node.text(), type);
 }
 
-Value Instance_Reader::value(Xml_Node node, CMPIType type) const
+Plain_Value Instance_Reader::value(Xml_Node node, CMPIType type) const
 {
     if (!node)
-        return Value::null_of(type);
+        return Plain_Value::null_of(type);
     const bool wanted = (type & CMPI_ARRAY) != 0;
     const auto element_type = static_cast<CMPIType>(type & ~CMPI_ARRAY);
     if (is_array(node) != wanted) {
         // Some clients cannot tell an array of one from its element.
         if (wanted)
-            return Value::array(element_type, {scalar(node, element_type)});
+            return Plain_Value::array(element_type, {scalar(node, element_type)});
         throw Wire_Error::status(CMPI_RC_ERR_TYPE_MISMATCH, "an array is no " + type_word_name(type));
     }
     if (!wanted)
         return scalar(node, type);
-    std::vector<Value> elements;
+    std::vector<Plain_Value> elements;
     std::size_t count = 0;
     for ([[maybe_unused]] const Xml_Node each : node.children())
         ++count;
     elements.reserve(count);
     for (const Xml_Node each : node.children())
         elements.push_back(scalar(each, element_type));
-    return Value::array(element_type, std::move(elements));
+    return Plain_Value::array(element_type, std::move(elements));
 }
 
-Value Instance_Reader::embedded(std::string_view text) const
+Plain_Value Instance_Reader::embedded(std::string_view text) const
 {
     Xml_Reader reader;
-    if (depth_ == deepest || !reader.feed(text) || !reader.finish())
+    if (_depth == DEEPEST || !reader.feed(text) || !reader.finish())
         throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER,
-                                 depth_ == deepest ? "instances are embedded too deep"
+                                 _depth == DEEPEST ? "instances are embedded too deep"
                                                    : "no embedded instance: " + reader.fault_text());
     if (!reader.document().root().is(Tag::INSTANCE))
         throw Wire_Error::status(CMPI_RC_ERR_TYPE_MISMATCH, "what is embedded is no instance");
     Instance_Reader inner(*this);
-    ++inner.depth_;
-    return Value::instance(inner.instance(reader.document().root()));
+    ++inner._depth;
+    return Plain_Value::instance(inner.instance(reader.document().root()));
 }
 
 Named_Value Instance_Reader::property(Xml_Node node, const Class_Info* owner) const
@@ -239,7 +239,7 @@ Instance_Value Instance_Reader::instance(Xml_Node node) const
         throw Wire_Error::not_valid("no <INSTANCE>");
     Instance_Value instance;
     instance.path.class_name = required(node, At::CLASSNAME);
-    const Class_Info* owner = catalogue_.find(instance.path.class_name);
+    const Class_Info* owner = _catalogue.find(instance.path.class_name);
     for (const Xml_Node each : node.children())
         if (!each.is(Tag::QUALIFIER))
             instance.properties.push_back(property(each, owner));
@@ -261,13 +261,13 @@ Named_Value Instance_Reader::parameter(Xml_Node node, const Feature_Info* declar
     const Xml_Node held = node.first();
     // Where a value stands as itself, not as its text.
     if (held.is(Tag::INSTANCE))
-        return {required(node, At::NAME), Value::instance(instance(held))};
+        return {required(node, At::NAME), Plain_Value::instance(instance(held))};
     if (held.is(Tag::INSTANCENAME) || held.is(Tag::CLASSNAME))
-        return {required(node, At::NAME), Value::path(path(held))};
+        return {required(node, At::NAME), Plain_Value::path(path(held))};
     return {required(node, At::NAME), value(held, type)};
 }
 
-Value Instance_Reader::return_value(Xml_Node node) const
+Plain_Value Instance_Reader::return_value(Xml_Node node) const
 {
     const CMPIType named =
         is_embedded(node) ? CMPIType(CMPI_instance) : wire_type_of(node.attribute(At::PARAMTYPE));

@@ -12,7 +12,7 @@ namespace KPRV::kldrcim {
 class Instance_Reader
 {
 public:
-    explicit Instance_Reader(const Class_Catalogue& catalogue) : catalogue_(catalogue) {}
+    explicit Instance_Reader(const Class_Catalogue& catalogue) : _catalogue(catalogue) {}
 
     /// INSTANCENAME, CLASSNAME, and each kind of path around them. Keys have the type of their class; without
     /// one that is known that of TYPE, or else string, boolean, uint64, sint64 or real64 by VALUETYPE.
@@ -27,23 +27,23 @@ public:
     Instance_Value instance_with_path(Xml_Node node) const;
 
     /// A value element as a value of the type, whose array bit counts; an absent one is null.
-    Value value(Xml_Node node, CMPIType type) const;
+    Plain_Value value(Xml_Node node, CMPIType type) const;
 
     /// PARAMVALUE. Its type is that of the declaration, if there is one.
     Named_Value parameter(Xml_Node node, const Feature_Info* declared) const;
     /// RETURNVALUE.
-    Value return_value(Xml_Node node) const;
+    Plain_Value return_value(Xml_Node node) const;
 
 private:
     Named_Value key(Xml_Node node, const Class_Info* owner) const;
-    Value key_value(Xml_Node node, const Feature_Info* declared) const;
+    Plain_Value key_value(Xml_Node node, const Feature_Info* declared) const;
     Named_Value property(Xml_Node node, const Class_Info* owner) const;
-    Value scalar(Xml_Node node, CMPIType type) const;
-    Value embedded(std::string_view text) const;
+    Plain_Value scalar(Xml_Node node, CMPIType type) const;
+    Plain_Value embedded(std::string_view text) const;
 
-    const Class_Catalogue& catalogue_;
+    const Class_Catalogue& _catalogue;
     /// How many instances this one is embedded in.
-    unsigned depth_ = 0;
+    unsigned _depth = 0;
 };
 
 } // namespace KPRV::kldrcim

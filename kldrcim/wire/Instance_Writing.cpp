@@ -44,7 +44,7 @@ void write_key(Xml_Writer& writer, const Named_Value& key)
 }
 
 /// An instance as the text of a value: its elements, escaped once more.
-std::string embedded_text(const Value& value)
+std::string embedded_text(const Plain_Value& value)
 {
     std::string text;
     if (const Instance_Value* instance = value.as_instance()) {
@@ -55,7 +55,7 @@ std::string embedded_text(const Value& value)
 }
 
 /// Neither array nor null.
-void write_scalar(Xml_Writer& writer, const Value& value)
+void write_scalar(Xml_Writer& writer, const Plain_Value& value)
 {
     if (const Path_Value* path = value.as_path())
         return write_reference(writer, *path);
@@ -89,7 +89,7 @@ void write_property(Xml_Writer& writer, const Named_Value& property, std::string
 }
 
 /// What RETURNVALUE and PARAMVALUE have in common.
-void write_typed_value(Xml_Writer& writer, const Value& value)
+void write_typed_value(Xml_Writer& writer, const Plain_Value& value)
 {
     writer.attribute(At::PARAMTYPE, wire_type_name(value.type));
     if (value.element_type() == CMPI_instance)
@@ -170,7 +170,7 @@ void write_text_array(Xml_Writer& writer, const std::vector<std::string>& texts)
     writer.close(Tag::VALUE_ARRAY);
 }
 
-void write_value(Xml_Writer& writer, const Value& value)
+void write_value(Xml_Writer& writer, const Plain_Value& value)
 {
     if (value.null)
         return;
@@ -178,7 +178,7 @@ void write_value(Xml_Writer& writer, const Value& value)
         return write_scalar(writer, value);
     const Tag tag = value.element_type() == CMPI_ref ? Tag::VALUE_REFARRAY : Tag::VALUE_ARRAY;
     writer.open(tag);
-    for (const Value& element : value.elements()) {
+    for (const Plain_Value& element : value.elements()) {
         if (element.null)
             writer.open(Tag::VALUE_NULL).empty();
         else
@@ -209,7 +209,7 @@ void write_parameter(Xml_Writer& writer, const Named_Value& parameter)
     writer.close(Tag::PARAMVALUE);
 }
 
-void write_return_value(Xml_Writer& writer, const Value& value)
+void write_return_value(Xml_Writer& writer, const Plain_Value& value)
 {
     writer.open(Tag::RETURNVALUE);
     write_typed_value(writer, value);

@@ -36,7 +36,7 @@ void write_class_path(Xml_Writer& writer, std::string_view name_space, std::stri
 void write_local_class_path(Xml_Writer& writer, std::string_view name_space, std::string_view name);
 
 /// VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY, with as much of a path as it has; nothing for null.
-void write_value(Xml_Writer& writer, const Value& value);
+void write_value(Xml_Writer& writer, const Plain_Value& value);
 /// VALUE or VALUE.ARRAY of texts.
 void write_text_value(Xml_Writer& writer, std::string_view text);
 void write_text_array(Xml_Writer& writer, const std::vector<std::string>& texts);
@@ -46,7 +46,7 @@ void write_instance(Xml_Writer& writer, const Instance_Value& instance, const In
 
 /// PARAMVALUE of a method, or RETURNVALUE where the tag is that. A null value keeps its type.
 void write_parameter(Xml_Writer& writer, const Named_Value& parameter);
-void write_return_value(Xml_Writer& writer, const Value& value);
+void write_return_value(Xml_Writer& writer, const Plain_Value& value);
 
 /// Where a feature was first declared: the class itself, or the highest of its ancestors that has it.
 std::string origin_of_property(const Class_Catalogue& catalogue, std::string_view class_name,

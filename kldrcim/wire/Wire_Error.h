@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include <stdexcept>
 
@@ -17,13 +17,13 @@ public:
     /// A message that is right by its form, and whose operation fails with this status.
     static Wire_Error status(CMPIrc rc, const std::string& text) { return {rc, text}; }
 
-    bool is_not_valid() const { return rc_ == CMPI_RC_OK; }
-    CMPIrc rc() const { return rc_; }
+    bool is_not_valid() const { return _rc == CMPI_RC_OK; }
+    CMPIrc rc() const { return _rc; }
 
 private:
-    Wire_Error(CMPIrc rc, const std::string& text) : std::runtime_error(text), rc_(rc) {}
+    Wire_Error(CMPIrc rc, const std::string& text) : std::runtime_error(text), _rc(rc) {}
 
-    CMPIrc rc_;
+    CMPIrc _rc;
 };
 
 } // namespace KPRV::kldrcim

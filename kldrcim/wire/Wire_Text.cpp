@@ -26,9 +26,9 @@ std::string_view without_blanks(std::string_view text)
 
 [[noreturn]] void refuse(std::string_view text, CMPIType type)
 {
-    constexpr std::size_t shown = 80;
+    constexpr std::size_t SHOWN = 80;
     throw Wire_Error::status(CMPI_RC_ERR_TYPE_MISMATCH,
-                             "\"" + std::string(text.substr(0, shown)) + "\" is no " + wire_type_name(type));
+                             "\"" + std::string(text.substr(0, SHOWN)) + "\" is no " + wire_type_name(type));
 }
 
 /// One UTF-16 unit; nothing for a text that is not one such character.
@@ -55,15 +55,15 @@ std::string text_of_unit(std::uint64_t unit)
     return {static_cast<char>(0xE0 | unit >> 12), low(6), low(0)};
 }
 
-Value boolean_of(std::string_view text)
+Plain_Value boolean_of(std::string_view text)
 {
     const std::string_view word = without_blanks(text);
     if (same_name(word, "true") || same_name(word, "false"))
-        return Value::boolean(same_name(word, "true"));
+        return Plain_Value::boolean(same_name(word, "true"));
     refuse(text, CMPI_boolean);
 }
 
-Value integer_of(std::string_view text, CMPIType type)
+Plain_Value integer_of(std::string_view text, CMPIType type)
 {
     std::string_view digits = without_blanks(text);
     const bool negative = digits.starts_with('-');
@@ -84,12 +84,12 @@ Value integer_of(std::string_view text, CMPIType type)
     if (number > bound)
         refuse(text, type);
     if (is_unsigned(type))
-        return Value::unsigned_number(type, number);
-    return Value::signed_number(type,
-                                static_cast<std::int64_t>(negative ? std::uint64_t(0) - number : number));
+        return Plain_Value::unsigned_number(type, number);
+    return Plain_Value::signed_number(
+        type, static_cast<std::int64_t>(negative ? std::uint64_t(0) - number : number));
 }
 
-Value real_of(std::string_view text, CMPIType type)
+Plain_Value real_of(std::string_view text, CMPIType type)
 {
     std::string_view digits = without_blanks(text);
     if (digits.starts_with('+'))
@@ -101,11 +101,11 @@ Value real_of(std::string_view text, CMPIType type)
                            std::abs(number) > static_cast<double>(std::numeric_limits<float>::max());
     if (error != std::errc() || at != end || too_large)
         refuse(text, type);
-    return Value::real(type, number);
+    return Plain_Value::real(type, number);
 }
 
 /// Shortest form that reads as the same number; it has a point in any case.
-std::string real_text(const Value& value)
+std::string real_text(const Plain_Value& value)
 {
     const double number = value.as_real();
     if (std::isnan(number))
@@ -150,7 +150,7 @@ const char* key_kind(CMPIType type)
     return is_integer(type) || is_real(type) ? "numeric" : "string";
 }
 
-std::string wire_text(const Value& value)
+std::string wire_text(const Plain_Value& value)
 {
     if (value.type == CMPI_boolean)
         return value.as_bool() ? "TRUE" : "FALSE";
@@ -163,7 +163,7 @@ std::string wire_text(const Value& value)
     return value.type == CMPI_char16 ? text_of_unit(value.as_uint()) : value.as_text();
 }
 
-Value value_of_wire_text(std::string_view text, CMPIType type)
+Plain_Value value_of_wire_text(std::string_view text, CMPIType type)
 {
     if (type == CMPI_boolean)
         return boolean_of(text);
@@ -173,16 +173,16 @@ Value value_of_wire_text(std::string_view text, CMPIType type)
         return real_of(text, type);
     if (type == CMPI_char16) {
         if (const auto unit = unit_of(text))
-            return Value::unsigned_number(type, *unit);
+            return Plain_Value::unsigned_number(type, *unit);
         refuse(text, type);
     }
     if (type == CMPI_dateTime) {
         const std::string_view moment = without_blanks(text);
         if (!is_datetime_text(moment) && !is_interval_text(moment))
             refuse(text, type);
-        return Value::datetime(std::string(moment));
+        return Plain_Value::datetime(std::string(moment));
     }
-    return Value::text(std::string(text));
+    return Plain_Value::text(std::string(text));
 }
 
 } // namespace KPRV::kldrcim

@@ -17,10 +17,10 @@ CMPIType wire_type_of(std::string_view name);
 const char* key_kind(CMPIType type);
 
 /// The text of a value that is neither null, nor an array, nor an object.
-std::string wire_text(const Value& value);
+std::string wire_text(const Plain_Value& value);
 
 /// The value of a text: numbers also hexadecimal, with a plus or blanks, booleans in any case. Status 13 for
 /// a text that is no value of the type, or beyond its range. Not for objects.
-Value value_of_wire_text(std::string_view text, CMPIType type);
+Plain_Value value_of_wire_text(std::string_view text, CMPIType type);
 
 } // namespace KPRV::kldrcim

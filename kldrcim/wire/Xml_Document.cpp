@@ -4,38 +4,38 @@ namespace KPRV::kldrcim {
 
 Xml_Tag Xml_Node::tag() const
 {
-    return document_->nodes_[index_].tag;
+    return _document->_nodes[_index].tag;
 }
 
 std::string_view Xml_Node::text() const
 {
-    if (!document_)
+    if (!_document)
         return {};
-    const auto& element = document_->nodes_[index_];
-    return std::string_view(document_->text_).substr(element.text, element.text_size);
+    const auto& element = _document->_nodes[_index];
+    return std::string_view(_document->_text).substr(element.text, element.text_size);
 }
 
 bool Xml_Node::has(Xml_Attribute attribute) const
 {
-    return document_ && document_->find(document_->nodes_[index_], attribute);
+    return _document && _document->find(_document->_nodes[_index], attribute);
 }
 
 std::string_view Xml_Node::attribute(Xml_Attribute attribute) const
 {
-    const auto* found = document_ ? document_->find(document_->nodes_[index_], attribute) : nullptr;
+    const auto* found = _document ? _document->find(_document->_nodes[_index], attribute) : nullptr;
     if (!found)
         return {};
-    return std::string_view(document_->text_).substr(found->text, found->text_size);
+    return std::string_view(_document->_text).substr(found->text, found->text_size);
 }
 
 Xml_Node Xml_Node::first() const
 {
-    return document_ ? document_->node(document_->nodes_[index_].first_child) : Xml_Node();
+    return _document ? _document->node(_document->_nodes[_index].first_child) : Xml_Node();
 }
 
 Xml_Node Xml_Node::next() const
 {
-    return document_ ? document_->node(document_->nodes_[index_].next) : Xml_Node();
+    return _document ? _document->node(_document->_nodes[_index].next) : Xml_Node();
 }
 
 Xml_Node Xml_Node::child(Xml_Tag tag) const
@@ -54,8 +54,8 @@ Xml_Node::Children Xml_Node::children() const
 const Xml_Document::Attribute* Xml_Document::find(const Element& element, Xml_Attribute name) const
 {
     for (std::uint32_t i = 0; i < element.attribute_count; ++i)
-        if (attributes_[element.attributes + i].name == name)
-            return &attributes_[element.attributes + i];
+        if (_attributes[element.attributes + i].name == name)
+            return &_attributes[element.attributes + i];
     return nullptr;
 }
 

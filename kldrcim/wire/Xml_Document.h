@@ -16,9 +16,9 @@ class Xml_Node
 public:
     Xml_Node() = default;
 
-    explicit operator bool() const { return document_ != nullptr; }
+    explicit operator bool() const { return _document != nullptr; }
     Xml_Tag tag() const;
-    bool is(Xml_Tag tag) const { return document_ && this->tag() == tag; }
+    bool is(Xml_Tag tag) const { return _document && this->tag() == tag; }
     /// Of an element that holds text; references are resolved.
     std::string_view text() const;
     bool has(Xml_Attribute attribute) const;
@@ -37,10 +37,10 @@ public:
 
 private:
     friend class Xml_Document;
-    Xml_Node(const Xml_Document* document, std::uint32_t index) : document_(document), index_(index) {}
+    Xml_Node(const Xml_Document* document, std::uint32_t index) : _document(document), _index(index) {}
 
-    const Xml_Document* document_ = nullptr;
-    std::uint32_t index_ = 0;
+    const Xml_Document* _document = nullptr;
+    std::uint32_t _index = 0;
 };
 
 /// The elements of one XML text, in a few bytes for each: a text takes several times its size, and never ten
@@ -55,26 +55,26 @@ public:
     Xml_Document& operator=(Xml_Document&&) = default;
 
     /// No element before the first has been read.
-    Xml_Node root() const { return node(nodes_.empty() ? none : 0); }
+    Xml_Node root() const { return node(_nodes.empty() ? NONE : 0); }
     /// Bytes that it takes.
     std::size_t size() const
     {
-        return text_.size() + nodes_.size() * sizeof(Element) + attributes_.size() * sizeof(Attribute);
+        return _text.size() + _nodes.size() * sizeof(Element) + _attributes.size() * sizeof(Attribute);
     }
 
 private:
     friend class Xml_Node;
     friend class Xml_Reader;
 
-    static constexpr std::uint32_t none = ~std::uint32_t(0);
+    static constexpr std::uint32_t NONE = ~std::uint32_t(0);
 
     struct Element
     {
         Xml_Tag tag;
         std::uint8_t attribute_count = 0;
         std::uint32_t attributes = 0;
-        std::uint32_t first_child = none;
-        std::uint32_t next = none;
+        std::uint32_t first_child = NONE;
+        std::uint32_t next = NONE;
         std::uint32_t text = 0;
         std::uint32_t text_size = 0;
     };
@@ -85,40 +85,40 @@ private:
         std::uint32_t text_size;
     };
 
-    Xml_Node node(std::uint32_t index) const { return index == none ? Xml_Node() : Xml_Node(this, index); }
+    Xml_Node node(std::uint32_t index) const { return index == NONE ? Xml_Node() : Xml_Node(this, index); }
     const Attribute* find(const Element& element, Xml_Attribute name) const;
 
     // In pieces: nothing is copied while they grow.
-    std::deque<Element> nodes_;
-    std::deque<Attribute> attributes_;
-    std::string text_;
+    std::deque<Element> _nodes;
+    std::deque<Attribute> _attributes;
+    std::string _text;
 };
 
 class Xml_Node::Iterator
 {
 public:
-    explicit Iterator(Xml_Node node) : node_(node) {}
-    Xml_Node operator*() const { return node_; }
+    explicit Iterator(Xml_Node node) : _node(node) {}
+    Xml_Node operator*() const { return _node; }
     Iterator& operator++()
     {
-        node_ = node_.next();
+        _node = _node.next();
         return *this;
     }
-    bool operator!=(const Iterator& other) const { return bool(node_) != bool(other.node_); }
+    bool operator!=(const Iterator& other) const { return bool(_node) != bool(other._node); }
 
 private:
-    Xml_Node node_;
+    Xml_Node _node;
 };
 
 class Xml_Node::Children
 {
 public:
-    explicit Children(Xml_Node first) : first_(first) {}
-    Iterator begin() const { return Iterator(first_); }
+    explicit Children(Xml_Node first) : _first(first) {}
+    Iterator begin() const { return Iterator(_first); }
     static Iterator end() { return Iterator(Xml_Node()); }
 
 private:
-    Xml_Node first_;
+    Xml_Node _first;
 };
 
 } // namespace KPRV::kldrcim

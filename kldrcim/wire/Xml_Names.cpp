@@ -25,7 +25,7 @@ constexpr std::string_view attribute_names[] = {
     KLDR_XML_ATTRIBUTES(X)
 #undef X
 };
-constexpr std::size_t tag_count = std::size(tag_rows);
+constexpr std::size_t TAG_COUNT = std::size(tag_rows);
 
 constexpr std::size_t number(Xml_Tag tag)
 {
@@ -38,20 +38,20 @@ const Names& tags_by_name()
 {
     static const Names names = [] {
         Names result;
-        for (std::size_t i = 0; i < tag_count; ++i)
+        for (std::size_t i = 0; i < TAG_COUNT; ++i)
             result.emplace(tag_rows[i].name, static_cast<std::uint8_t>(i));
         return result;
     }();
     return names;
 }
 
-using Contents = std::array<std::bitset<tag_count>, tag_count>;
+using Contents = std::array<std::bitset<TAG_COUNT>, TAG_COUNT>;
 
 /// What each element may hold, by number.
 Contents read_contents()
 {
     Contents result;
-    for (std::size_t parent = 0; parent < tag_count; ++parent) {
+    for (std::size_t parent = 0; parent < TAG_COUNT; ++parent) {
         std::string_view rest = tag_rows[parent].content;
         while (!rest.empty()) {
             const std::string_view word = rest.substr(0, rest.find(' '));

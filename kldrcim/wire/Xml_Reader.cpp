@@ -11,9 +11,9 @@ namespace KPRV::kldrcim {
 namespace {
 
 /// Of a tag or comment; expat looks at one from its beginning each time that a piece is added.
-constexpr std::size_t longest_token = std::size_t(1) << 20;
+constexpr std::size_t LONGEST_TOKEN = std::size_t(1) << 20;
 /// Positions in a document have 32 bits.
-constexpr std::size_t most_bytes = std::size_t(1) << 30;
+constexpr std::size_t MOST_BYTES = std::size_t(1) << 30;
 
 bool is_blank(std::string_view text)
 {
@@ -29,13 +29,13 @@ struct Xml_Reader::Events
     static void guarded(void* data, Step step)
     {
         Xml_Reader& reader = *static_cast<Xml_Reader*>(data);
-        if (reader.fault_ != Xml_Fault::NONE || reader.thrown_)
+        if (reader._fault != Xml_Fault::NONE || reader._thrown)
             return;
         try {
             step(reader);
         } catch (...) {
-            reader.thrown_ = std::current_exception();
-            XML_StopParser(reader.parser_.get(), XML_FALSE);
+            reader._thrown = std::current_exception();
+            XML_StopParser(reader._parser.get(), XML_FALSE);
         }
     }
 
@@ -65,15 +65,15 @@ void Xml_Reader::Free_Parser::operator()(XML_ParserStruct* parser) const
 }
 
 Xml_Reader::Xml_Reader(const Xml_Limits& limits, Receiver receiver)
-    : limits_(limits), receiver_(std::move(receiver)), parser_(XML_ParserCreate("UTF-8"))
+    : _limits(limits), _receiver(std::move(receiver)), _parser(XML_ParserCreate("UTF-8"))
 {
-    if (!parser_)
+    if (!_parser)
         throw std::bad_alloc();
-    limits_.bytes = std::min(limits_.bytes, most_bytes);
-    XML_SetUserData(parser_.get(), this);
-    XML_SetElementHandler(parser_.get(), Events::start, Events::end);
-    XML_SetCharacterDataHandler(parser_.get(), Events::characters);
-    XML_SetStartDoctypeDeclHandler(parser_.get(), Events::document_type);
+    _limits.bytes = std::min(_limits.bytes, MOST_BYTES);
+    XML_SetUserData(_parser.get(), this);
+    XML_SetElementHandler(_parser.get(), Events::start, Events::end);
+    XML_SetCharacterDataHandler(_parser.get(), Events::characters);
+    XML_SetStartDoctypeDeclHandler(_parser.get(), Events::document_type);
 }
 
 Xml_Reader::~Xml_Reader() = default;
@@ -81,119 +81,119 @@ Xml_Reader::~Xml_Reader() = default;
 bool Xml_Reader::feed(std::string_view piece)
 {
     // The mark of UTF-16, which expat would take.
-    if (bytes_ == 0 && !piece.empty() && static_cast<unsigned char>(piece[0]) >= 0xFE)
+    if (_bytes == 0 && !piece.empty() && static_cast<unsigned char>(piece[0]) >= 0xFE)
         stop(Xml_Fault::NOT_WELL_FORMED, "not in UTF-8");
-    bytes_ += piece.size();
+    _bytes += piece.size();
     // What has been handed over is gone.
-    const std::size_t kept = receiver_ ? document_.size() : bytes_;
-    if (fault_ == Xml_Fault::NONE && kept > limits_.bytes)
-        stop(Xml_Fault::TOO_LARGE, "longer than " + std::to_string(limits_.bytes) + " bytes");
+    const std::size_t kept = _receiver ? _document.size() : _bytes;
+    if (_fault == Xml_Fault::NONE && kept > _limits.bytes)
+        stop(Xml_Fault::TOO_LARGE, "longer than " + std::to_string(_limits.bytes) + " bytes");
     // An int counts what expat takes at a time.
-    while (fault_ == Xml_Fault::NONE && piece.size() > longest_token) {
-        parse(piece.substr(0, longest_token), false);
-        piece.remove_prefix(longest_token);
+    while (_fault == Xml_Fault::NONE && piece.size() > LONGEST_TOKEN) {
+        parse(piece.substr(0, LONGEST_TOKEN), false);
+        piece.remove_prefix(LONGEST_TOKEN);
     }
-    return fault_ == Xml_Fault::NONE && parse(piece, false);
+    return _fault == Xml_Fault::NONE && parse(piece, false);
 }
 
 bool Xml_Reader::finish()
 {
-    return fault_ == Xml_Fault::NONE && parse({}, true);
+    return _fault == Xml_Fault::NONE && parse({}, true);
 }
 
 bool Xml_Reader::parse(std::string_view piece, bool last)
 {
-    XML_Parser parser = parser_.get();
+    XML_Parser parser = _parser.get();
     const XML_Status status = XML_Parse(parser, piece.data(), static_cast<int>(piece.size()), last);
-    if (thrown_)
-        std::rethrow_exception(std::exchange(thrown_, nullptr));
-    if (fault_ == Xml_Fault::NONE && status != XML_STATUS_OK) {
+    if (_thrown)
+        std::rethrow_exception(std::exchange(_thrown, nullptr));
+    if (_fault == Xml_Fault::NONE && status != XML_STATUS_OK) {
         if (XML_GetErrorCode(parser) == XML_ERROR_NO_MEMORY)
             throw std::bad_alloc();
         stop(Xml_Fault::NOT_WELL_FORMED, XML_ErrorString(XML_GetErrorCode(parser)));
     }
     const auto at = static_cast<std::size_t>(std::max<XML_Index>(XML_GetCurrentByteIndex(parser), 0));
-    if (fault_ == Xml_Fault::NONE && !last && bytes_ - std::min(at, bytes_) > 2 * longest_token)
+    if (_fault == Xml_Fault::NONE && !last && _bytes - std::min(at, _bytes) > 2 * LONGEST_TOKEN)
         stop(Xml_Fault::TOO_LARGE, "a tag or comment without end");
-    return fault_ == Xml_Fault::NONE;
+    return _fault == Xml_Fault::NONE;
 }
 
 void Xml_Reader::stop(Xml_Fault fault, const std::string& text)
 {
-    XML_Parser parser = parser_.get();
-    fault_ = fault;
-    fault_text_ = "line " + std::to_string(XML_GetCurrentLineNumber(parser)) + ", column " +
+    XML_Parser parser = _parser.get();
+    _fault = fault;
+    _fault_text = "line " + std::to_string(XML_GetCurrentLineNumber(parser)) + ", column " +
                   std::to_string(XML_GetCurrentColumnNumber(parser) + 1) + ": " + text;
     XML_StopParser(parser, XML_FALSE);
 }
 
 std::uint32_t Xml_Reader::keep(std::string_view text)
 {
-    const auto at = static_cast<std::uint32_t>(document_.text_.size());
-    document_.text_.append(text);
+    const auto at = static_cast<std::uint32_t>(_document._text.size());
+    _document._text.append(text);
     return at;
 }
 
 void Xml_Reader::start(const char* name, const char** attributes)
 {
-    if (open_.size() >= limits_.depth)
-        return stop(Xml_Fault::TOO_LARGE, "more than " + std::to_string(limits_.depth) + " elements deep");
+    if (_open.size() >= _limits.depth)
+        return stop(Xml_Fault::TOO_LARGE, "more than " + std::to_string(_limits.depth) + " elements deep");
     const std::optional<Xml_Tag> tag = tag_of(name);
-    auto& nodes = document_.nodes_;
-    if (!tag || (!open_.empty() && !may_hold(nodes[open_.back().index].tag, *tag)))
+    auto& nodes = _document._nodes;
+    if (!tag || (!_open.empty() && !may_hold(nodes[_open.back().index].tag, *tag)))
         return stop(Xml_Fault::NOT_VALID,
                     "no element <" + std::string(name).substr(0, 64) + "> " +
-                        (open_.empty() ? std::string("known")
-                                       : "in <" + std::string(name_of(nodes[open_.back().index].tag)) + ">"));
+                        (_open.empty() ? std::string("known")
+                                       : "in <" + std::string(name_of(nodes[_open.back().index].tag)) + ">"));
     const auto index = static_cast<std::uint32_t>(nodes.size());
     auto& element = nodes.emplace_back(Xml_Document::Element{.tag = *tag});
-    element.attributes = static_cast<std::uint32_t>(document_.attributes_.size());
+    element.attributes = static_cast<std::uint32_t>(_document._attributes.size());
     unsigned count = 0;
     for (; *attributes; attributes += 2) {
-        if (++count > limits_.attributes)
+        if (++count > _limits.attributes)
             return stop(Xml_Fault::TOO_LARGE, "too many attributes");
         if (const auto known = attribute_of(attributes[0])) {
             const std::string_view value = attributes[1];
-            document_.attributes_.push_back({*known, keep(value), static_cast<std::uint32_t>(value.size())});
+            _document._attributes.push_back({*known, keep(value), static_cast<std::uint32_t>(value.size())});
             ++element.attribute_count;
         }
     }
-    element.text = static_cast<std::uint32_t>(document_.text_.size());
-    if (!open_.empty()) {
-        Open_Element& parent = open_.back();
-        (parent.latest_child == Xml_Document::none ? nodes[parent.index].first_child
+    element.text = static_cast<std::uint32_t>(_document._text.size());
+    if (!_open.empty()) {
+        Open_Element& parent = _open.back();
+        (parent.latest_child == Xml_Document::NONE ? nodes[parent.index].first_child
                                                    : nodes[parent.latest_child].next) = index;
         parent.latest_child = index;
     }
-    open_.push_back({index, Xml_Document::none});
+    _open.push_back({index, Xml_Document::NONE});
 }
 
 void Xml_Reader::end()
 {
-    const std::uint32_t index = open_.back().index;
-    open_.pop_back();
-    if (receiver_ && !open_.empty() && document_.nodes_[open_.back().index].tag == Xml_Tag::IRETURNVALUE)
+    const std::uint32_t index = _open.back().index;
+    _open.pop_back();
+    if (_receiver && !_open.empty() && _document._nodes[_open.back().index].tag == Xml_Tag::IRETURNVALUE)
         hand_over(index);
 }
 
 void Xml_Reader::hand_over(std::uint32_t index)
 {
-    receiver_(document_.node(index));
-    const Xml_Document::Element& element = document_.nodes_[index];
+    _receiver(_document.node(index));
+    const Xml_Document::Element& element = _document._nodes[index];
     const std::uint32_t attributes = element.attributes;
     const std::uint32_t text =
-        element.attribute_count == 0 ? element.text : document_.attributes_[attributes].text;
-    document_.text_.resize(text);
-    document_.attributes_.resize(attributes, Xml_Document::Attribute{});
-    document_.nodes_.erase(document_.nodes_.begin() + index, document_.nodes_.end());
-    Open_Element& parent = open_.back();
-    document_.nodes_[parent.index].first_child = Xml_Document::none;
-    parent.latest_child = Xml_Document::none;
+        element.attribute_count == 0 ? element.text : _document._attributes[attributes].text;
+    _document._text.resize(text);
+    _document._attributes.resize(attributes, Xml_Document::Attribute{});
+    _document._nodes.erase(_document._nodes.begin() + index, _document._nodes.end());
+    Open_Element& parent = _open.back();
+    _document._nodes[parent.index].first_child = Xml_Document::NONE;
+    parent.latest_child = Xml_Document::NONE;
 }
 
 void Xml_Reader::characters(std::string_view text)
 {
-    auto& element = document_.nodes_[open_.back().index];
+    auto& element = _document._nodes[_open.back().index];
     if (holds_text(element.tag)) {
         keep(text);
         element.text_size += static_cast<std::uint32_t>(text.size());

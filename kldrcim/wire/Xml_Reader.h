@@ -56,13 +56,13 @@ public:
     /// At the end of the text; false if it has a fault or is not complete.
     bool finish();
 
-    Xml_Fault fault() const { return fault_; }
+    Xml_Fault fault() const { return _fault; }
     /// "line 3, column 7: no element <X> in <Y>"; empty without a fault.
-    const std::string& fault_text() const { return fault_text_; }
+    const std::string& fault_text() const { return _fault_text; }
 
-    const Xml_Document& document() const { return document_; }
+    const Xml_Document& document() const { return _document; }
     /// Takes the document out of the reader.
-    Xml_Document take() { return std::move(document_); }
+    Xml_Document take() { return std::move(_document); }
 
 private:
     struct Events;
@@ -85,15 +85,15 @@ private:
     std::uint32_t keep(std::string_view text);
     void hand_over(std::uint32_t index);
 
-    Xml_Limits limits_;
-    Receiver receiver_;
-    std::unique_ptr<XML_ParserStruct, Free_Parser> parser_;
-    Xml_Document document_;
-    std::vector<Open_Element> open_;
-    std::size_t bytes_ = 0;
-    Xml_Fault fault_ = Xml_Fault::NONE;
-    std::string fault_text_;
-    std::exception_ptr thrown_;
+    Xml_Limits _limits;
+    Receiver _receiver;
+    std::unique_ptr<XML_ParserStruct, Free_Parser> _parser;
+    Xml_Document _document;
+    std::vector<Open_Element> _open;
+    std::size_t _bytes = 0;
+    Xml_Fault _fault = Xml_Fault::NONE;
+    std::string _fault_text;
+    std::exception_ptr _thrown;
 };
 
 } // namespace KPRV::kldrcim

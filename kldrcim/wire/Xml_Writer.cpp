@@ -91,50 +91,50 @@ void append(std::string& out, std::string_view text, bool in_attribute)
 
 void Xml_Writer::end_tag()
 {
-    if (in_tag_)
-        out_ += '>';
-    in_tag_ = false;
+    if (_in_tag)
+        _out += '>';
+    _in_tag = false;
 }
 
 Xml_Writer& Xml_Writer::open(Xml_Tag tag)
 {
     end_tag();
-    out_ += '<';
-    out_ += name_of(tag);
-    in_tag_ = true;
+    _out += '<';
+    _out += name_of(tag);
+    _in_tag = true;
     return *this;
 }
 
 Xml_Writer& Xml_Writer::attribute(Xml_Attribute name, std::string_view value)
 {
-    out_ += ' ';
-    out_ += name_of(name);
-    out_ += "=\"";
-    append(out_, value, true);
-    out_ += '"';
+    _out += ' ';
+    _out += name_of(name);
+    _out += "=\"";
+    append(_out, value, true);
+    _out += '"';
     return *this;
 }
 
 Xml_Writer& Xml_Writer::text(std::string_view text)
 {
     end_tag();
-    append(out_, text, false);
+    append(_out, text, false);
     return *this;
 }
 
 Xml_Writer& Xml_Writer::close(Xml_Tag tag)
 {
     end_tag();
-    out_ += "</";
-    out_ += name_of(tag);
-    out_ += '>';
+    _out += "</";
+    _out += name_of(tag);
+    _out += '>';
     return *this;
 }
 
 Xml_Writer& Xml_Writer::empty()
 {
-    out_ += "/>";
-    in_tag_ = false;
+    _out += "/>";
+    _in_tag = false;
     return *this;
 }
 

@@ -14,7 +14,7 @@ namespace KPRV::kldrcim {
 class Xml_Writer
 {
 public:
-    explicit Xml_Writer(std::string& out) : out_(out) {}
+    explicit Xml_Writer(std::string& out) : _out(out) {}
 
     Xml_Writer& open(Xml_Tag tag);
     /// Only directly behind `open`. A line break becomes a blank, as every reader would make it.
@@ -29,8 +29,8 @@ public:
 private:
     void end_tag();
 
-    std::string& out_;
-    bool in_tag_ = false;
+    std::string& _out;
+    bool _in_tag = false;
 };
 
 /// The line that every text begins with.

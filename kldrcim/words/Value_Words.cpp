@@ -24,18 +24,18 @@ Class_Words::Class_Words(std::string_view class_name, Words words)
     const std::string name = lower_name(class_name);
     const auto class_of = [](const Mapped_Feature& each) { return std::string_view(each.class_name); };
     // Not equal_range: clang 14 knows no range of two iterators.
-    features_ = {std::ranges::lower_bound(mapped_features(), name, {}, class_of),
+    _features = {std::ranges::lower_bound(mapped_features(), name, {}, class_of),
                  std::ranges::upper_bound(mapped_features(), name, {}, class_of)};
 }
 
 std::span<const Value_Meaning> Class_Words::of(std::string_view feature) const
 {
     const auto found = std::ranges::find_if(
-        features_, [&](const Mapped_Feature& each) { return same_name(each.name, feature); });
-    return found == features_.end() ? std::span<const Value_Meaning>() : found->meanings;
+        _features, [&](const Mapped_Feature& each) { return same_name(each.name, feature); });
+    return found == _features.end() ? std::span<const Value_Meaning>() : found->meanings;
 }
 
-const char* word_of(std::span<const Value_Meaning> meanings, const Value& number)
+const char* word_of(std::span<const Value_Meaning> meanings, const Plain_Value& number)
 {
     if (number.null || !std::holds_alternative<std::uint64_t>(number.data))
         return nullptr;
@@ -45,7 +45,7 @@ const char* word_of(std::span<const Value_Meaning> meanings, const Value& number
     return found == meanings.end() ? nullptr : found->word;
 }
 
-std::string worded_text(std::span<const Value_Meaning> meanings, const Value& value)
+std::string worded_text(std::span<const Value_Meaning> meanings, const Plain_Value& value)
 {
     if (meanings.empty() || value.null || (value.is_array() && value.elements().empty()))
         return plain_text(value);
@@ -54,7 +54,7 @@ std::string worded_text(std::span<const Value_Meaning> meanings, const Value& va
         return plain_text(value) + (word ? " (" + std::string(word) + ")" : "");
     }
     std::string text;
-    for (const Value& element : value.elements())
+    for (const Plain_Value& element : value.elements())
         text += (text.empty() ? "" : ", ") + worded_text(meanings, element);
     return text;
 }

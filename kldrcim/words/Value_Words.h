@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include <span>
 #include <string>
@@ -50,14 +50,14 @@ public:
     std::span<const Value_Meaning> of(std::string_view feature) const;
 
 private:
-    std::span<const Mapped_Feature> features_;
+    std::span<const Mapped_Feature> _features;
 };
 
 /// The word of a number; null for one that has none, and for what is no number.
-const char* word_of(std::span<const Value_Meaning> meanings, const Value& number);
+const char* word_of(std::span<const Value_Meaning> meanings, const Plain_Value& number);
 
 /// The value as people read it, "11 (In Service)": plain, but each number with its word. Numbers of an array
 /// stand side by side.
-std::string worded_text(std::span<const Value_Meaning> meanings, const Value& value);
+std::string worded_text(std::span<const Value_Meaning> meanings, const Plain_Value& value);
 
 } // namespace KPRV::kldrcim

@@ -68,14 +68,14 @@ void ProviderUtil::getRawWWNFromStr(const char* text, unsigned char* wwn)
 
 String ProviderUtil::getNodeMACOrWWNFromTag(const String& tag, const String&)
 {
-    constexpr uint32 group = 19, group_size = 4, rest = group + group_size + 1;
-    if (tag.size() < rest)
+    constexpr uint32 GROUP = 19, GROUP_SIZE = 4, REST = GROUP + GROUP_SIZE + 1;
+    if (tag.size() < REST)
         return String();
     String address;
     // No address begins with these digits: a MAC has its place in the last group alone.
-    if (!tag.equal(group, "0000", group_size))
-        address = tag.substr(group, group_size);
-    address.append(tag.substr(rest));
+    if (!tag.equal(GROUP, "0000", GROUP_SIZE))
+        address = tag.substr(GROUP, GROUP_SIZE);
+    address.append(tag.substr(REST));
     return address;
 }
 

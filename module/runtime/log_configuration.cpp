@@ -38,10 +38,10 @@ static void trim_end(char* line)
 /// The value of a "LOG_LEVEL = value" line; null for every other line.
 static const char* level_value(const char* line)
 {
-    constexpr size_t key_size = sizeof(LEVEL_KEY) - 1;
-    if (strncmp(line, LEVEL_KEY, key_size) != 0)
+    constexpr size_t KEY_SIZE = sizeof(LEVEL_KEY) - 1;
+    if (strncmp(line, LEVEL_KEY, KEY_SIZE) != 0)
         return nullptr;
-    const char* const separator = skip_space(line + key_size);
+    const char* const separator = skip_space(line + KEY_SIZE);
     return *separator == '=' ? skip_space(separator + 1) : nullptr;
 }
 

@@ -1,7 +1,7 @@
 // Association requests that go to several providers, as clients and up-calls send them.
 #include "broker/Association_Routing.h"
 
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 #include "contracts/cmpi/cmpimacs.h"
 
@@ -10,7 +10,7 @@ namespace {
 
 Path_Value object(const char* class_name, const char* key, const char* text)
 {
-    return {.class_name = class_name, .keys = {{key, Value::text(text)}}};
+    return {.class_name = class_name, .keys = {{key, Plain_Value::text(text)}}};
 }
 
 const Path_Value the_system = object("KALDERA_ComputerSystem", "Name", "10.0.0.5");
@@ -19,17 +19,17 @@ const Path_Value tape = object("KALDERA_TapeDrive", "DeviceID", "tape_only");
 class Association_Routing : public Toy_Test
 {
 protected:
-    Association_Routing() { host = open_toy(TOY_FABRIC); }
+    Association_Routing() { server = open_toy(TOY_FABRIC); }
 
     Result ask(Operation operation, const Path_Value& path, const Association_Filter& filter = {})
     {
-        return host->run({.operation = operation, .path = path, .filter = filter});
+        return server->run({.operation = operation, .path = path, .filter = filter});
     }
 
     std::vector<std::string> classes(const char* class_name, const Association_Filter& filter = {})
     {
         return association_classes(
-            host->catalogue(),
+            server->catalogue(),
             {.operation = Operation::ASSOCIATORS, .path = {.class_name = class_name}, .filter = filter});
     }
 
@@ -140,16 +140,16 @@ TEST_F(Association_Routing, UnknownAndUnservedClasses)
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED,
               ask(Operation::ASSOCIATOR_NAMES, tape, {.association_class = "TOY_Port"}).rc);
     // A module that hides its classes can be asked by name only.
-    host = open_toy(TOY_PLAIN);
+    server = open_toy(TOY_PLAIN);
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, ask(Operation::ASSOCIATOR_NAMES, item(1)).rc);
     EXPECT_EQ(1u, ask(Operation::ASSOCIATOR_NAMES, item(1), {.association_class = "TOY_Link"}).paths.size());
 }
 
 TEST_F(Association_Routing, UpCallsNeedNoClassEither)
 {
-    const CMPIBroker* broker = host->broker().cmpi();
-    Argument<Context_Object> context(*host->broker().core());
-    Call_Frame frame(host->broker().core(), context.cmpi());
+    const CMPIBroker* broker = server->broker().cmpi();
+    Argument<Context_Object> context(*server->broker().core());
+    Call_Frame frame(server->broker().core(), context.cmpi());
     CMPIObjectPath* path = CMNewObjectPath(broker, "root/toy", "KALDERA_ComputerSystem", nullptr);
     CMAddKey(path, "Name", "10.0.0.5", CMPI_chars);
     auto count = [](CMPIEnumeration* found) {

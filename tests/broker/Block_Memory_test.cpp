@@ -11,7 +11,7 @@
 namespace KPRV::broker {
 namespace {
 
-constexpr std::size_t size = Block_Memory::block_size;
+constexpr std::size_t size = Block_Memory::BLOCK_SIZE;
 
 class Block_Memory_Test : public testing::Test
 {

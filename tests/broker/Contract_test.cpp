@@ -1,5 +1,5 @@
 // Every way of breaking the contract is seen, named, and survived.
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 namespace KPRV::broker {
 namespace {
@@ -16,14 +16,14 @@ class Contract_Test : public testing::TestWithParam<Misdeed>
 
 TEST_P(Contract_Test, IsReported)
 {
-    auto host = open_toy(TOY_PLAIN);
-    host->store().add("root/other", {.path = {.class_name = "TOY_Other"}});
-    call(*host, GetParam().method);
-    std::vector<std::string> violations = host->violations().list();
-    ASSERT_EQ(1u, violations.size()) << host->violations().text();
+    auto server = open_toy(TOY_PLAIN);
+    server->store().add("root/other", {.path = {.class_name = "TOY_Other"}});
+    call(*server, GetParam().method);
+    std::vector<std::string> violations = server->violations().list();
+    ASSERT_EQ(1u, violations.size()) << server->violations().text();
     EXPECT_EQ(GetParam().violation, violations[0]);
     // The host goes on as if nothing had been.
-    EXPECT_EQ(2u, host->enumerate_instances("TOY_Item").instances.size());
+    EXPECT_EQ(2u, server->enumerate_instances("TOY_Item").instances.size());
 }
 
 constexpr Misdeed misdeeds[] = {
@@ -58,42 +58,42 @@ INSTANTIATE_TEST_SUITE_P(Misdeeds, Contract_Test, testing::ValuesIn(misdeeds),
 
 TEST(Contract, ForeignObjectsAreSeenAsSelfAndAsArgument)
 {
-    auto host = open_toy(TOY_PLAIN);
-    call(*host, "ForeignObject");
+    auto server = open_toy(TOY_PLAIN);
+    call(*server, "ForeignObject");
     EXPECT_EQ("CMGetCharsPtr: this is not a string of this server\n"
               "CMAddArg: this is not a string of this server\n",
-              host->violations().text());
+              server->violations().text());
 }
 
 TEST(Contract, ObjectsEndWithTheirCall)
 {
-    auto host = open_toy(TOY_PLAIN);
-    call(*host, "Keep");
-    EXPECT_EQ("", host->violations().text());
-    call(*host, "UseKept");
+    auto server = open_toy(TOY_PLAIN);
+    call(*server, "Keep");
+    EXPECT_EQ("", server->violations().text());
+    call(*server, "UseKept");
     EXPECT_EQ("CMGetCharsPtr: a string made by CMNewString is used after its end\n",
-              host->violations().text());
+              server->violations().text());
 }
 
 TEST(Contract, NothingMayFollowTheEnd)
 {
-    auto host = open_toy(TOY_PLAIN);
-    Result result = call(*host, "AfterDone");
-    EXPECT_EQ("CMReturnData: after CMReturnDone\nCMReturnDone: a second time\n", host->violations().text());
+    auto server = open_toy(TOY_PLAIN);
+    Result result = call(*server, "AfterDone");
+    EXPECT_EQ("CMReturnData: after CMReturnDone\nCMReturnDone: a second time\n", server->violations().text());
     EXPECT_EQ(2u, result.done_count);
     EXPECT_EQ(0u, result.return_value.as_uint());
 }
 
 TEST(Contract, ACloneThatIsNotReleasedIsLost)
 {
-    auto host = open_toy(TOY_PLAIN);
-    call(*host, "LostClone");
-    EXPECT_EQ(1u, host->ledger().live());
-    EXPECT_EQ(1u, host->ledger().live(Object_Kind::STRING));
+    auto server = open_toy(TOY_PLAIN);
+    call(*server, "LostClone");
+    EXPECT_EQ(1u, server->ledger().live());
+    EXPECT_EQ(1u, server->ledger().live(Object_Kind::STRING));
     char* text = nullptr;
     std::size_t size = 0;
     std::FILE* out = open_memstream(&text, &size);
-    host->ledger().report(out);
+    server->ledger().report(out);
     std::fclose(out);
     std::string report(text, size);
     free(text);
@@ -103,19 +103,19 @@ TEST(Contract, ACloneThatIsNotReleasedIsLost)
 
 TEST(Contract, AnExceptionBecomesAFailedResult)
 {
-    auto host = open_toy(TOY_PLAIN);
-    Result result = call(*host, "Throws");
+    auto server = open_toy(TOY_PLAIN);
+    Result result = call(*server, "Throws");
     EXPECT_EQ(CMPI_RC_ERR_FAILED, result.rc);
     EXPECT_EQ("thrown by the toy", result.exception);
-    EXPECT_EQ(0u, host->ledger().live());
+    EXPECT_EQ(0u, server->ledger().live());
 }
 
 TEST(Contract, OutParametersMustBeThoseOfTheMethod)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    call(*host, "Echo", {{"Text", Value::boolean(true)}, {"More", Value::boolean(true)}});
+    auto server = open_toy(TOY_DESCRIBED);
+    call(*server, "Echo", {{"Text", Plain_Value::boolean(true)}, {"More", Plain_Value::boolean(true)}});
     EXPECT_EQ("TOY_Item: Echo.Text is string, not boolean\nTOY_Item: Echo has no out parameter More\n",
-              host->violations().text());
+              server->violations().text());
 }
 
 } // namespace

@@ -1,7 +1,7 @@
 // Results that are handed over as the provider returns them.
 #include "broker/values/Path_Identity.h"
 #include "broker/values/Receiver.h"
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 #include <cstdlib>
 #include <stdexcept>
@@ -9,10 +9,10 @@
 namespace KPRV::broker {
 namespace {
 
-/// Notes what comes, and what the host holds meanwhile.
+/// Notes what comes, and what the server holds meanwhile.
 struct Notes final : Receiver
 {
-    explicit Notes(Host& asked) : host(asked) {}
+    explicit Notes(Local_Server& asked) : server(asked) {}
 
     bool instance(Instance_Value&& instance) override
     {
@@ -21,14 +21,14 @@ struct Notes final : Receiver
     }
     bool path(Path_Value&& path) override
     {
-        most_live = std::max(most_live, host.ledger().live());
+        most_live = std::max(most_live, server.ledger().live());
         paths.push_back(std::move(path));
         if (throws)
             throw std::runtime_error("the disk is full");
         return paths.size() != enough;
     }
 
-    Host& host;
+    Local_Server& server;
     std::size_t enough = 0;
     bool throws = false;
     std::size_t most_live = 0;
@@ -49,7 +49,7 @@ protected:
     }
 
     Request enumerate{.operation = Operation::ENUMERATE_INSTANCES, .path = {.class_name = "TOY_Many"}};
-    Notes notes{*host};
+    Notes notes{*server};
 };
 
 TEST_F(Receiver_Test, GetsAllInTheirOrderAndTheResultKeepsNone)
@@ -57,7 +57,7 @@ TEST_F(Receiver_Test, GetsAllInTheirOrderAndTheResultKeepsNone)
     for (const Operation operation : {Operation::ENUMERATE_INSTANCES, Operation::ENUMERATE_INSTANCE_NAMES}) {
         notes.paths.clear();
         enumerate.operation = operation;
-        const Result result = host->run(enumerate, &notes);
+        const Result result = server->run(enumerate, &notes);
         EXPECT_EQ(CMPI_RC_OK, result.rc);
         EXPECT_EQ(1u, result.done_count);
         EXPECT_FALSE(result.stopped);
@@ -71,7 +71,7 @@ TEST_F(Receiver_Test, GetsAllInTheirOrderAndTheResultKeepsNone)
 
 TEST_F(Receiver_Test, OneObjectAtATimeIsAliveOfAProviderThatReleasesThem)
 {
-    host->run(enumerate, &notes);
+    server->run(enumerate, &notes);
     // The instance and its path; the request's own arguments do not count.
     EXPECT_EQ(2u, notes.most_live);
 }
@@ -85,19 +85,19 @@ TEST_F(Receiver_Test, WhatAProviderLeavesStaysGoodUntilItsCallEnds)
          {std::pair(0, "."), std::pair(1 << 20, "."), std::pair(1 << 20, "./none")}) {
         SCOPED_TRACE(std::to_string(bound) + " " + folder);
         setenv("TMPDIR", folder, 1);
-        Host_Options options;
+        Server_Options options;
         options.most_object_memory = static_cast<std::size_t>(bound);
         options.most_shells = 100;
-        host = open_toy(TOY_DESCRIBED, options);
-        Notes kept(*host);
-        const Result result = host->run(enumerate, &kept);
+        server = open_toy(TOY_DESCRIBED, options);
+        Notes kept(*server);
+        const Result result = server->run(enumerate, &kept);
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
         EXPECT_EQ(30000u, kept.paths.size());
         EXPECT_EQ("a text that stands for 30000", kept.last.property("Text")->as_text());
         // Path, instance, text, moment and numbers of each.
         EXPECT_LE(150000u, kept.most_live);
-        EXPECT_EQ(0u, host->ledger().live());
-        for (const Ledger::Entry& entry : host->ledger().entries())
+        EXPECT_EQ(0u, server->ledger().live());
+        for (const Ledger::Entry& entry : server->ledger().entries())
             EXPECT_EQ(0u, entry.released) << entry.maker;
     }
     unsetenv("TMPDIR");
@@ -106,7 +106,7 @@ TEST_F(Receiver_Test, WhatAProviderLeavesStaysGoodUntilItsCallEnds)
 TEST_F(Receiver_Test, SeesTheListedPropertiesAlone)
 {
     enumerate.properties = {{"text"}};
-    host->run(enumerate, &notes);
+    server->run(enumerate, &notes);
     ASSERT_EQ(1u, notes.last.properties.size());
     EXPECT_EQ("Text", notes.last.properties[0].name);
 }
@@ -114,7 +114,7 @@ TEST_F(Receiver_Test, SeesTheListedPropertiesAlone)
 TEST_F(Receiver_Test, EndsTheDeliveryAndTheProviderDoesNotNotice)
 {
     notes.enough = 3;
-    const Result result = host->run(enumerate, &notes);
+    const Result result = server->run(enumerate, &notes);
     EXPECT_EQ(3u, notes.paths.size());
     EXPECT_TRUE(result.stopped);
     EXPECT_EQ(CMPI_RC_OK, result.rc);
@@ -124,7 +124,7 @@ TEST_F(Receiver_Test, EndsTheDeliveryAndTheProviderDoesNotNotice)
 TEST_F(Receiver_Test, HasWhatCameBeforeAFailure)
 {
     setenv("TOY_MANY_FAILS", "1", 1);
-    const Result result = host->run(enumerate, &notes);
+    const Result result = server->run(enumerate, &notes);
     EXPECT_EQ(CMPI_RC_ERR_FAILED, result.rc);
     EXPECT_EQ("no more of them", result.message);
     EXPECT_EQ(300u, notes.paths.size());
@@ -133,7 +133,7 @@ TEST_F(Receiver_Test, HasWhatCameBeforeAFailure)
 TEST_F(Receiver_Test, WhatItThrowsGoesRoundTheProvider)
 {
     notes.throws = true;
-    EXPECT_THROW(host->run(enumerate, &notes), std::runtime_error);
+    EXPECT_THROW(server->run(enumerate, &notes), std::runtime_error);
     EXPECT_EQ(1u, notes.paths.size());
 }
 
@@ -141,7 +141,7 @@ TEST_F(Receiver_Test, OneProviderCanBeAsked)
 {
     enumerate.path.class_name = "TOY_Nobody";
     enumerate.operation = Operation::ENUMERATE_INSTANCE_NAMES;
-    EXPECT_EQ(CMPI_RC_OK, host->run_at("TOY_Many", enumerate, &notes).rc);
+    EXPECT_EQ(CMPI_RC_OK, server->run_at("TOY_Many", enumerate, &notes).rc);
     EXPECT_EQ(300u, notes.paths.size());
 }
 
@@ -152,17 +152,17 @@ protected:
     Result ask(Operation operation, const char* class_name, const char* key, const char* value,
                Receiver* receiver)
     {
-        return host->run(
-            {.operation = operation, .path = {.class_name = class_name, .keys = {{key, Value::text(value)}}}},
-            receiver);
+        return server->run({.operation = operation,
+                            .path = {.class_name = class_name, .keys = {{key, Plain_Value::text(value)}}}},
+                           receiver);
     }
     Result ask_the_system(Operation operation, Receiver* receiver = nullptr)
     {
         return ask(operation, "KALDERA_ComputerSystem", "Name", "10.0.0.5", receiver);
     }
 
-    std::unique_ptr<Host> host = open_toy(TOY_FABRIC);
-    Notes notes{*host};
+    std::unique_ptr<Local_Server> server = open_toy(TOY_FABRIC);
+    Notes notes{*server};
 };
 
 TEST_F(Receiver_Of_Associations, WhatSeveralReportComesOnce)
@@ -182,15 +182,15 @@ TEST_F(Receiver_Of_Associations, WhatSeveralReportComesOnce)
 
 TEST_F(Receiver_Of_Associations, OnceItHasEnoughNobodyElseIsAsked)
 {
-    host->calls().record(true);
+    server->calls().record(true);
     ask_the_system(Operation::REFERENCE_NAMES);
-    const std::size_t all = host->calls().calls("CMReturnObjectPath").size();
-    host->calls().clear();
+    const std::size_t all = server->calls().calls("CMReturnObjectPath").size();
+    server->calls().clear();
     notes.enough = 1;
     const Result result = ask_the_system(Operation::REFERENCE_NAMES, &notes);
     EXPECT_EQ(1u, notes.paths.size());
     EXPECT_TRUE(result.stopped);
-    EXPECT_LT(host->calls().calls("CMReturnObjectPath").size(), all);
+    EXPECT_LT(server->calls().calls("CMReturnObjectPath").size(), all);
 }
 
 TEST_F(Receiver_Of_Associations, AFailingProviderIsNamed)

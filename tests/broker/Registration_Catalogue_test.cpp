@@ -1,4 +1,4 @@
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 #include "contracts/cmpi/cmpimacs.h"
 
@@ -7,8 +7,8 @@ namespace {
 
 TEST(Registration_Catalogue, ReadsClassesOutOfTheModule)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    const Class_Catalogue& catalogue = host->catalogue();
+    auto server = open_toy(TOY_DESCRIBED);
+    const Class_Catalogue& catalogue = server->catalogue();
     EXPECT_EQ("toy", catalogue.module_name());
     EXPECT_EQ(2u, catalogue.class_names().size());
     const Class_Info* info = catalogue.find("toy_ITEM");
@@ -27,18 +27,18 @@ TEST(Registration_Catalogue, ReadsClassesOutOfTheModule)
 
 TEST(Registration_Catalogue, Defaults)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    const Class_Info* info = host->catalogue().find("TOY_Item");
-    EXPECT_EQ(Value::boolean(true), info->property("Flag")->default_value);
-    EXPECT_EQ(Value::null_of(CMPI_uint8), info->property("U8")->default_value);
+    auto server = open_toy(TOY_DESCRIBED);
+    const Class_Info* info = server->catalogue().find("TOY_Item");
+    EXPECT_EQ(Plain_Value::boolean(true), info->property("Flag")->default_value);
+    EXPECT_EQ(Plain_Value::null_of(CMPI_uint8), info->property("U8")->default_value);
     ASSERT_EQ(2u, info->property("Numbers")->default_value.elements().size());
     EXPECT_EQ(7u, info->property("Numbers")->default_value.elements()[1].as_uint());
 }
 
 TEST(Registration_Catalogue, Methods)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    const Method_Info* method = host->catalogue().find("TOY_Item")->method("echo");
+    auto server = open_toy(TOY_DESCRIBED);
+    const Method_Info* method = server->catalogue().find("TOY_Item")->method("echo");
     ASSERT_TRUE(method);
     EXPECT_TRUE(method->is_static);
     EXPECT_EQ(CMPI_uint32, method->return_type);
@@ -48,18 +48,18 @@ TEST(Registration_Catalogue, Methods)
 
 TEST(No_Catalogue, KnowsNothing)
 {
-    auto host = open_toy(TOY_PLAIN);
-    EXPECT_FALSE(host->catalogue().is_known());
-    EXPECT_TRUE(host->catalogue().is_a("A", "a"));
-    EXPECT_FALSE(host->catalogue().is_a("A", "B"));
+    auto server = open_toy(TOY_PLAIN);
+    EXPECT_FALSE(server->catalogue().is_known());
+    EXPECT_TRUE(server->catalogue().is_a("A", "a"));
+    EXPECT_FALSE(server->catalogue().is_a("A", "B"));
 }
 
 TEST(Described_Classes, CatchWrongPropertiesAndKeys)
 {
-    auto host = open_toy(TOY_DESCRIBED);
-    const CMPIBroker* broker = host->broker().cmpi();
-    Argument<Context_Object> context(*host->broker().core());
-    Call_Frame frame(host->broker().core(), context.cmpi());
+    auto server = open_toy(TOY_DESCRIBED);
+    const CMPIBroker* broker = server->broker().cmpi();
+    Argument<Context_Object> context(*server->broker().core());
+    Call_Frame frame(server->broker().core(), context.cmpi());
     CMPIObjectPath* path = CMNewObjectPath(broker, "root/toy", "TOY_Item", nullptr);
     CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
     CMPIUint64 number = 1;
@@ -74,7 +74,7 @@ TEST(Described_Classes, CatchWrongPropertiesAndKeys)
               "CMAddKey: TOY_Item has no key U8\n"
               "CMSetProperty: TOY_Item.U8 is uint8, not uint64\n"
               "CMSetProperty: TOY_Item has no property None\n",
-              host->violations().text());
+              server->violations().text());
 }
 
 } // namespace

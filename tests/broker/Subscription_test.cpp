@@ -1,6 +1,6 @@
 #include "broker/Subscription.h"
 
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 #include <atomic>
 
@@ -12,7 +12,7 @@ class Subscription_Test : public Toy_Test
 protected:
     Subscription_Test()
     {
-        host->set_sink([this](const std::string&, const Instance_Value&) {
+        server->set_sink([this](const std::string&, const Instance_Value&) {
             ++enabled;
             return CMPI_RC_OK;
         });
@@ -23,7 +23,7 @@ protected:
 
 TEST_F(Subscription_Test, EnablesWithTheFirstFilterOfAll)
 {
-    Subscription subscription(*host, "TOY_Alert");
+    Subscription subscription(*server, "TOY_Alert");
     EXPECT_EQ(CMPI_RC_OK, subscription.add("root/one"));
     EXPECT_EQ(CMPI_RC_OK, subscription.add("root/one"));
     EXPECT_EQ(CMPI_RC_OK, subscription.add("root/two"));
@@ -41,9 +41,9 @@ TEST_F(Subscription_Test, EnablesWithTheFirstFilterOfAll)
 
 TEST_F(Subscription_Test, HandsOnWhatTheProviderRefuses)
 {
-    Subscription silent(*host, "TOY_Silent");
+    Subscription silent(*server, "TOY_Silent");
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, silent.add("root/toy"));
-    Subscription alert(*host, "TOY_Alert");
+    Subscription alert(*server, "TOY_Alert");
     EXPECT_EQ(CMPI_RC_ERR_INVALID_NAMESPACE, alert.add(""));
     EXPECT_EQ(0u, alert.count(""));
     EXPECT_EQ(0, enabled);

@@ -1,4 +1,4 @@
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 namespace KPRV::broker {
 namespace {
@@ -8,26 +8,26 @@ class Up_Calls_Test : public Toy_Test
 protected:
     Up_Calls_Test()
     {
-        host = open_toy(TOY_PLAIN);
-        host->store().add("root/other", other("a"));
-        host->store().add("root/other", other("b"));
+        server = open_toy(TOY_PLAIN);
+        server->store().add("root/other", other("a"));
+        server->store().add("root/other", other("b"));
     }
 
     static Instance_Value other(const char* key)
     {
-        return {.path = {.class_name = "TOY_Other", .keys = {{"Key", Value::text(key)}}},
-                .properties = {{"Key", Value::text(key)}, {"Value", Value::text("v")}}};
+        return {.path = {.class_name = "TOY_Other", .keys = {{"Key", Plain_Value::text(key)}}},
+                .properties = {{"Key", Plain_Value::text(key)}, {"Value", Plain_Value::text("v")}}};
     }
 
     Result up(const char* method, const char* name_space = "root/other", const char* key = "",
               const char* class_name = "TOY_Other")
     {
-        return call(*host, method,
-                    {{"Namespace", Value::text(name_space)},
-                     {"Class", Value::text(class_name)},
-                     {"Key", Value::text(key)},
-                     {"Value", Value::text("new")},
-                     {"Method", Value::text("Echo")}});
+        return call(*server, method,
+                    {{"Namespace", Plain_Value::text(name_space)},
+                     {"Class", Plain_Value::text(class_name)},
+                     {"Key", Plain_Value::text(key)},
+                     {"Value", Plain_Value::text("new")},
+                     {"Method", Plain_Value::text("Echo")}});
     }
 };
 
@@ -50,7 +50,7 @@ TEST_F(Up_Calls_Test, NobodyServesTheClassOrNameSpace)
 {
     EXPECT_EQ(unsigned(CMPI_RC_ERR_INVALID_CLASS), up("CountOthers", "root/toy").return_value.as_uint());
     EXPECT_EQ(unsigned(CMPI_RC_ERR_INVALID_NAMESPACE), up("CountOthers", "root/none").return_value.as_uint());
-    host = open_toy(TOY_PLAIN, {.unknown_class_rc = CMPI_RC_ERR_NOT_FOUND});
+    server = open_toy(TOY_PLAIN, {.unknown_class_rc = CMPI_RC_ERR_NOT_FOUND});
     EXPECT_EQ(unsigned(CMPI_RC_ERR_NOT_FOUND), up("CountOthers", "root/toy").return_value.as_uint());
 }
 
@@ -61,7 +61,7 @@ TEST_F(Up_Calls_Test, GetModifyCreateAndDelete)
                        ->property("Value")
                        ->as_text());
     EXPECT_EQ(0u, up("ModifyOther", "root/other", "a").return_value.as_uint());
-    EXPECT_EQ("new", host->store().instances("root/other").at(0).property("Value")->as_text());
+    EXPECT_EQ("new", server->store().instances("root/other").at(0).property("Value")->as_text());
     EXPECT_EQ(unsigned(CMPI_RC_ERR_NOT_FOUND), up("GetOther", "root/other", "c").return_value.as_uint());
     EXPECT_EQ("c",
               find_value(up("CreateOther", "root/other", "c").out, "Path")->as_path()->key("Key")->as_text());
@@ -73,9 +73,9 @@ TEST_F(Up_Calls_Test, GetModifyCreateAndDelete)
 
 TEST_F(Up_Calls_Test, MethodsOfTheServer)
 {
-    host->store().on_method("root/other", "TOY_Other", "Echo", [](const Request& request) {
+    server->store().on_method("root/other", "TOY_Other", "Echo", [](const Request& request) {
         Result result;
-        result.return_value = Value::unsigned_number(CMPI_uint32, 7);
+        result.return_value = Plain_Value::unsigned_number(CMPI_uint32, 7);
         result.out = request.in;
         return result;
     });
@@ -86,7 +86,7 @@ TEST_F(Up_Calls_Test, MethodsOfTheServer)
 
 TEST_F(Up_Calls_Test, ElementsWithTheNullBitAreStillGood)
 {
-    host = open_toy(TOY_PLAIN, Host_Options::pegasus_like());
+    server = open_toy(TOY_PLAIN, Server_Options::pegasus_like());
     EXPECT_EQ(2u, find_value(up("CountOthers", "root/toy", "", "TOY_Item").out, "Count")->as_uint());
 }
 

@@ -5,8 +5,8 @@
 #include <atomic>
 #include <string>
 
-/// A provider library for the tests of the host, as a stranger would write one: it knows CMPI and nothing of
-/// us.
+/// A provider library for the tests of the server, as a stranger would write one: it knows CMPI and nothing
+/// of us.
 namespace toy {
 
 inline constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
@@ -19,12 +19,12 @@ inline CMPIStatus failed(CMPIrc rc)
 class Broker_Slot
 {
 public:
-    void operator=(const CMPIBroker* broker) { broker_ = broker; }
-    operator const CMPIBroker*() const { return broker_; }
-    const CMPIBroker* operator->() const { return broker_; }
+    void operator=(const CMPIBroker* broker) { _broker = broker; }
+    operator const CMPIBroker*() const { return _broker; }
+    const CMPIBroker* operator->() const { return _broker; }
 
 private:
-    std::atomic<const CMPIBroker*> broker_ = nullptr;
+    std::atomic<const CMPIBroker*> _broker = nullptr;
 };
 
 extern Broker_Slot broker;

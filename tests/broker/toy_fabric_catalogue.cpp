@@ -67,7 +67,7 @@ struct Tables
                     1,
                     &repository};
             list.push_back(&made);
-            // The name of the real module: the host then looks for the adapter library.
+            // The name of the real module: the server then looks for the adapter library.
             if (source.served)
                 registrations.push_back({"kldrprovider_Module", source.name, nullptr, &made, nullptr});
         }

@@ -78,14 +78,14 @@ protected:
             {},
             "root/kaldera",
             "KALDERA_AgentService",
-            {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
+            {{"Name", broker::Plain_Value::text("Kaldera Agent Service Provider")}}};
         const std::string request =
             R"({"method": ")" + std::string(method) + R"(", "params": )" + json_text(params) + "}";
-        const broker::Result result =
-            server->invoke_method(service, "executeMethod", {{"request", broker::Value::text(request)}});
+        const broker::Result result = server->invoke_method(
+            service, "executeMethod", {{"request", broker::Plain_Value::text(request)}});
         EXPECT_TRUE(result.ok()) << result.rc << " " << thrown_text(result).value_or("");
         EXPECT_EQ(1u, result.done_count);
-        const broker::Value* const response = find_value(result.out, "response");
+        const broker::Plain_Value* const response = find_value(result.out, "response");
         Json::Value reply;
         EXPECT_TRUE(response && !response->null);
         if (response && !response->null)

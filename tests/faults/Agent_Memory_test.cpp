@@ -10,16 +10,18 @@ namespace {
 
 using Agent_Memory = Fault_Fixture;
 
-broker::Result call(broker::Host& server)
+broker::Result call(broker::Local_Server& server)
 {
-    const broker::Path_Value service = {{},
-                                        "root/kaldera",
-                                        "KALDERA_AgentService",
-                                        {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
+    const broker::Path_Value service = {
+        {},
+        "root/kaldera",
+        "KALDERA_AgentService",
+        {{"Name", broker::Plain_Value::text("Kaldera Agent Service Provider")}}};
     // The last method that is entered.
     return server.invoke_method(
         service, "executeMethod",
-        {{"request", broker::Value::text(R"({"method": "diagnostics.getDPortTestResults", "params": []})")}});
+        {{"request",
+          broker::Plain_Value::text(R"({"method": "diagnostics.getDPortTestResults", "params": []})")}});
 }
 
 TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
@@ -40,7 +42,7 @@ TEST_F(Agent_Memory, OfTheFirstCallIsNoMatterOfTheNext)
         }
         // Found, since it complains of its parameters.
         const broker::Result whole = call(*server);
-        const broker::Value* const response = broker::find_value(whole.out, "response");
+        const broker::Plain_Value* const response = broker::find_value(whole.out, "response");
         ASSERT_TRUE(response);
         EXPECT_NE(std::string::npos, response->as_text().find("Mismatch in number of parameters"));
     });

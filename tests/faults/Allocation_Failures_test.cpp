@@ -95,7 +95,7 @@ TEST_F(Allocation_Failures, OfAMethod)
     starve("SetAlarmState", [&] {
         return server->invoke_method(
             alarm, "SetAlarmState",
-            {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, ON)}});
+            {{"RequestedAlarmState", broker::Plain_Value::unsigned_number(CMPI_uint16, ON)}});
     });
 }
 
@@ -110,7 +110,7 @@ TEST_F(Allocation_Failures, OfTheAgent)
           std::string(R"({"method": "discovery.getPortByWwn", "params": ["10:00:02:4b:4c:20:00:00"]})")})
         starve(request, [&] {
             return server->invoke_method(service, "executeMethod",
-                                         {{"request", broker::Value::text(request)}});
+                                         {{"request", broker::Plain_Value::text(request)}});
         });
 }
 
@@ -124,12 +124,12 @@ TEST_F(Allocation_Failures, OfAFirmwareUpdate)
     // The library agrees, and stays as it is.
     simulator.add_fault(R"({"call": "adapterUpdateFlash", "do": "answer",
                             "answer": {"status": 0, "message": "done"}})");
-    const broker::Value update = broker::Value::unsigned_number(CMPI_uint16, 5);
+    const broker::Plain_Value update = broker::Plain_Value::unsigned_number(CMPI_uint16, 5);
     const auto install = [&] {
         return server->invoke_method(service, "InstallFromURI",
-                                     {{"URI", broker::Value::text("file:///firmware/image")},
-                                      {"Target", broker::Value::path(controller)},
-                                      {"InstallOptions", broker::Value::array(CMPI_uint16, {update})}});
+                                     {{"URI", broker::Plain_Value::text("file:///firmware/image")},
+                                      {"Target", broker::Plain_Value::path(controller)},
+                                      {"InstallOptions", broker::Plain_Value::array(CMPI_uint16, {update})}});
     };
     // The last text is for the log alone, so that its loss changes no answer.
     for (const bool once : {false, true})

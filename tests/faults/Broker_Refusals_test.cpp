@@ -84,7 +84,7 @@ TEST_F(Broker_Refusals, OfTheOtherOperations)
     refuse_each("delete", [&] { server->delete_instance(port); });
     broker::Instance_Value changed;
     changed.path = port;
-    broker::set_value(changed.properties, "ElementName", broker::Value::text("x"));
+    broker::set_value(changed.properties, "ElementName", broker::Plain_Value::text("x"));
     refuse_each("modify", [&] { server->modify_instance(changed); });
     refuse_each("create", [&] { server->create_instance(changed); });
     EXPECT_LT(50u, refused);
@@ -105,8 +105,9 @@ TEST_F(Broker_Refusals, OfAMethod)
 {
     const broker::Path_Value alarm = server->enumerate_instances("KALDERA_AlarmDevice").instances.at(0).path;
     refuse_each("SetAlarmState", [&] {
-        server->invoke_method(alarm, "SetAlarmState",
-                              {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, 1)}});
+        server->invoke_method(
+            alarm, "SetAlarmState",
+            {{"RequestedAlarmState", broker::Plain_Value::unsigned_number(CMPI_uint16, 1)}});
     });
     EXPECT_LT(10u, refused);
 }

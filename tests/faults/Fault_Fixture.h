@@ -29,7 +29,7 @@ protected:
     {
         simulator.load_file(std::string(KLDR_INVENTORIES "/") + inventory);
         std::string error;
-        server = broker::Host::open(module_under_test(), {}, error);
+        server = broker::Local_Server::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;
         classes = enumerable_classes(*server);
         healthy = look();
@@ -83,7 +83,7 @@ protected:
     }
 
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
-    std::unique_ptr<broker::Host> server;
+    std::unique_ptr<broker::Local_Server> server;
     std::vector<std::string> classes;
     Picture healthy;
 

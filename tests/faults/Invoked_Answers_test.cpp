@@ -46,13 +46,13 @@ protected:
             constexpr unsigned ON = 3;
             return server->invoke_method(
                 alarm, "SetAlarmState",
-                {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, ON)}});
+                {{"RequestedAlarmState", broker::Plain_Value::unsigned_number(CMPI_uint16, ON)}});
         }
-        const broker::Value update = broker::Value::unsigned_number(CMPI_uint16, 5);
+        const broker::Plain_Value update = broker::Plain_Value::unsigned_number(CMPI_uint16, 5);
         return server->invoke_method(service, "InstallFromURI",
-                                     {{"URI", broker::Value::text("file://" + firmware.path("image"))},
-                                      {"Target", broker::Value::path(controller)},
-                                      {"InstallOptions", broker::Value::array(CMPI_uint16, {update})}});
+                                     {{"URI", broker::Plain_Value::text("file://" + firmware.path("image"))},
+                                      {"Target", broker::Plain_Value::path(controller)},
+                                      {"InstallOptions", broker::Plain_Value::array(CMPI_uint16, {update})}});
     }
     /// The return value, of a call that must succeed as such.
     std::uint64_t outcome()

@@ -1,4 +1,4 @@
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "tests/support/In_Child.h"
 #include "tests/support/Log_Lines.h"
 #include "tests/support/Temp_Folder.h"
@@ -66,7 +66,7 @@ void with_library(const std::string& bytes, bool opens, Body&& body)
     void* library = dlopen(folder.path("libdzntj.so").c_str(), RTLD_NOW);
     EXPECT_EQ(opens, library != nullptr);
     std::string error;
-    auto server = broker::Host::open(KLDR_MODULE, {}, error);
+    auto server = broker::Local_Server::open(KLDR_MODULE, {}, error);
     ASSERT_TRUE(server) << error;
     body(*server, parse_log(folder.read(".cimple/messages")));
     server->unload(true);
@@ -87,7 +87,7 @@ TEST(Missing_Symbols, EachIsNamedInTheLogAndLeavesTheOthersAlone)
             continue;
         SCOPED_TRACE(symbol);
         in_child([&] {
-            with_library(library_without(symbol), true, [&](broker::Host& server, const auto& lines) {
+            with_library(library_without(symbol), true, [&](broker::Local_Server& server, const auto& lines) {
                 unsigned named = 0;
                 for (const Log_Line& line : lines)
                     named += line.text.find(symbol + " not found.") == 0;
@@ -103,7 +103,7 @@ TEST(Missing_Symbols, ACallOfOneEndsTheProcess)
 {
     GTEST_FLAG_SET(death_test_style, "threadsafe");
     EXPECT_EXIT(with_library(library_without("getAllAdaptersIndexString"), true,
-                             [](broker::Host& server, const auto&) {
+                             [](broker::Local_Server& server, const auto&) {
                                  signal(SIGSEGV, SIG_DFL);
                                  server.enumerate_instances("KALDERA_PortController");
                              }),
@@ -122,7 +122,7 @@ std::string library_of_other_word_size()
 TEST(Missing_Symbols, ALibraryOfTheOtherWordSizeIsAsGoodAsNone)
 {
     in_child([] {
-        with_library(library_of_other_word_size(), false, [](broker::Host& server, const auto&) {
+        with_library(library_of_other_word_size(), false, [](broker::Local_Server& server, const auto&) {
             for (const char* name : {"KALDERA_ComputerSystem", "KALDERA_PortController", "KALDERA_FCPort"})
                 EXPECT_EQ(CMPI_RC_OK, server.enumerate_instances(name).rc) << name;
             EXPECT_TRUE(server.enumerate_instances("KALDERA_FCPort").instances.empty());

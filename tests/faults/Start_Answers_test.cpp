@@ -49,7 +49,7 @@ protected:
         restore();
         simulator.add_fault(bad.fault(GetParam().entry_point));
         std::string error;
-        server = broker::Host::open(module_under_test(), {}, error);
+        server = broker::Local_Server::open(module_under_test(), {}, error);
         EXPECT_TRUE(server) << error;
         Picture picture = elsewhere([&] { return look(); });
         server->unload(true);
@@ -100,7 +100,7 @@ TEST_P(Unguarded_Load, EndsTheProcessIfTheLibraryThrows)
             restore();
             simulator.add_fault(bad.fault(GetParam().entry_point));
             std::string error;
-            broker::Host::open(module_under_test(), {}, error);
+            broker::Local_Server::open(module_under_test(), {}, error);
         });
     }
 }

@@ -30,7 +30,7 @@ protected:
     {
         restore();
         std::string error;
-        server = broker::Host::open(module_under_test(), {}, error);
+        server = broker::Local_Server::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;
     }
     void close_host()
@@ -84,7 +84,7 @@ protected:
     }
 
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
-    std::unique_ptr<broker::Host> server;
+    std::unique_ptr<broker::Local_Server> server;
 
 private:
     Temp_Folder _home;

@@ -67,8 +67,8 @@ protected:
         constexpr unsigned STARTED = 4096;
         constexpr unsigned STATE_FAILED = 5;
         const std::size_t before = records().size();
-        const broker::Result result =
-            server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", broker::Value::path(element)}});
+        const broker::Result result = server->invoke_method(
+            test, "RunDiagnostic", {{"ManagedElement", broker::Plain_Value::path(element)}});
         if (thrown_text(result))
             return LEAVES;
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;

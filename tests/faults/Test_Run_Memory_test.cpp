@@ -33,7 +33,7 @@ protected:
     broker::Result start()
     {
         return server->invoke_method(test, "RunDiagnostic",
-                                     {{"ManagedElement", broker::Value::path(element)}});
+                                     {{"ManagedElement", broker::Plain_Value::path(element)}});
     }
     /// Until the thread of a test has left the server.
     void wait_for_the_end()

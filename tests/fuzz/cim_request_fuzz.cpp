@@ -13,8 +13,8 @@ namespace {
 class Echo final : public Cim_Space
 {
 public:
-    const std::string& name() const override { return name_; }
-    const Class_Catalogue& classes() const override { return classes_; }
+    const std::string& name() const override { return _name; }
+    const Class_Catalogue& classes() const override { return _classes; }
     Result run(Request request, Receiver* receiver) override
     {
         Result result;
@@ -22,7 +22,7 @@ public:
         instance.path = request.path;
         instance.properties.insert(instance.properties.end(), request.in.begin(), request.in.end());
         result.out = request.in;
-        result.return_value = Value::unsigned_number(CMPI_uint32, 0);
+        result.return_value = Plain_Value::unsigned_number(CMPI_uint32, 0);
         if (receiver) {
             receiver->instance(std::move(instance));
             receiver->path(std::move(request.path));
@@ -34,8 +34,8 @@ public:
     }
 
 private:
-    const std::string name_ = "root/toy";
-    const Toy_Classes classes_;
+    const std::string _name = "root/toy";
+    const Toy_Classes _classes;
 };
 
 struct Reading_Sink final : Body_Sink

@@ -16,7 +16,7 @@ namespace {
 class Bare_Server : broker::Up_Calls
 {
 public:
-    Bare_Server() : core(std::make_shared<broker::Core>(broker::Host_Options())), broker(core, *this)
+    Bare_Server() : core(std::make_shared<broker::Core>(broker::Server_Options())), broker(core, *this)
     {
         core->catalogue = &_catalogue;
     }
@@ -50,47 +50,47 @@ std::string any_name(Bytes& bytes, const Meta_Class& meta_class)
 broker::Path_Value any_path(Bytes& bytes, unsigned depth);
 broker::Instance_Value any_instance(Bytes& bytes, unsigned depth);
 
-broker::Value any_scalar(Bytes& bytes, unsigned depth)
+broker::Plain_Value any_scalar(Bytes& bytes, unsigned depth)
 {
     switch (bytes.below(depth ? 8 : 6)) {
     case 0:
-        return broker::Value::boolean(bytes.byte() & 1);
+        return broker::Plain_Value::boolean(bytes.byte() & 1);
     case 1: {
         constexpr CMPIType types[] = {CMPI_uint8, CMPI_uint16, CMPI_uint32, CMPI_uint64, CMPI_char16};
-        return broker::Value::unsigned_number(types[bytes.below(5)], bytes.number<std::uint64_t>());
+        return broker::Plain_Value::unsigned_number(types[bytes.below(5)], bytes.number<std::uint64_t>());
     }
     case 2: {
         constexpr CMPIType types[] = {CMPI_sint8, CMPI_sint16, CMPI_sint32, CMPI_sint64};
-        return broker::Value::signed_number(types[bytes.below(4)], bytes.number<std::int64_t>());
+        return broker::Plain_Value::signed_number(types[bytes.below(4)], bytes.number<std::int64_t>());
     }
     case 3:
-        return broker::Value::real(bytes.byte() & 1 ? CMPI_real32 : CMPI_real64, bytes.number<float>());
+        return broker::Plain_Value::real(bytes.byte() & 1 ? CMPI_real32 : CMPI_real64, bytes.number<float>());
     case 4:
-        return broker::Value::datetime(bytes.byte() & 1 ? "20260101120000.000000+000" : bytes.text());
+        return broker::Plain_Value::datetime(bytes.byte() & 1 ? "20260101120000.000000+000" : bytes.text());
     case 5:
-        return broker::Value::text(bytes.text());
+        return broker::Plain_Value::text(bytes.text());
     case 6:
-        return broker::Value::path(any_path(bytes, depth - 1));
+        return broker::Plain_Value::path(any_path(bytes, depth - 1));
     default:
-        return broker::Value::instance(any_instance(bytes, depth - 1));
+        return broker::Plain_Value::instance(any_instance(bytes, depth - 1));
     }
 }
 
-broker::Value any_value(Bytes& bytes, unsigned depth)
+broker::Plain_Value any_value(Bytes& bytes, unsigned depth)
 {
     const unsigned shape = bytes.below(8);
     if (shape == 0) {
-        broker::Value value = any_scalar(bytes, depth);
-        return broker::Value::null_of(value.type);
+        broker::Plain_Value value = any_scalar(bytes, depth);
+        return broker::Plain_Value::null_of(value.type);
     }
     if (shape > 2)
         return any_scalar(bytes, depth);
-    std::vector<broker::Value> elements{any_scalar(bytes, depth)};
+    std::vector<broker::Plain_Value> elements{any_scalar(bytes, depth)};
     const CMPIType type = elements[0].type;
     for (unsigned n = bytes.below(4); n > 0; --n)
-        if (broker::Value more = any_scalar(bytes, depth); more.type == type)
+        if (broker::Plain_Value more = any_scalar(bytes, depth); more.type == type)
             elements.push_back(more);
-    return broker::Value::array(type, elements);
+    return broker::Plain_Value::array(type, elements);
 }
 
 std::vector<broker::Named_Value> any_values(Bytes& bytes, const Meta_Class& meta_class, unsigned depth)

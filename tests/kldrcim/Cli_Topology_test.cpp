@@ -1,5 +1,5 @@
 // The verbs that follow associations, as users run them on the small host.
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 #include "tests/kldrcim/Run_Kldrcim.h"
 
 #include <json/json.h>

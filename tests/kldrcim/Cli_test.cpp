@@ -1,6 +1,6 @@
 // The program as users run it.
 #include "kldrcim/verbs/Cli_Verbs.h"
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 #include "tests/kldrcim/Run_Kldrcim.h"
 
 #include <json/json.h>

@@ -1,5 +1,5 @@
 // The walk of a profile's client over a module that knows nothing of profiles.
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 #include "tests/kldrcim/Run_Kldrcim.h"
 
 #include "kldrcim/local/Local_Connection.h"

@@ -11,16 +11,18 @@ namespace {
 
 Instance_Value sample()
 {
-    Path_Value other = {.name_space = "n", .class_name = "C", .keys = {{"K", Value::text("a\"b")}}};
-    return {.path = {.class_name = "C", .keys = {{"K", Value::text("x")}}},
+    Path_Value other = {.name_space = "n", .class_name = "C", .keys = {{"K", Plain_Value::text("a\"b")}}};
+    return {.path = {.class_name = "C", .keys = {{"K", Plain_Value::text("x")}}},
             .properties = {
-                {"Zeta", Value::text("a \"b\" \\ \n\x01")},
-                {"Alpha", Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0))},
-                {"None", Value::null_of(CMPI_string)},
-                {"List", Value::array(CMPI_string, {Value::text("p"), Value::null_of(CMPI_string)})},
-                {"Ref", Value::path(other)},
-                {"Real", Value::real(CMPI_real64, 2)},
-                {"Part", Value::instance({.path = other, .properties = {{"K", Value::boolean(true)}}})}}};
+                {"Zeta", Plain_Value::text("a \"b\" \\ \n\x01")},
+                {"Alpha", Plain_Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0))},
+                {"None", Plain_Value::null_of(CMPI_string)},
+                {"List", Plain_Value::array(CMPI_string,
+                                            {Plain_Value::text("p"), Plain_Value::null_of(CMPI_string)})},
+                {"Ref", Plain_Value::path(other)},
+                {"Real", Plain_Value::real(CMPI_real64, 2)},
+                {"Part",
+                 Plain_Value::instance({.path = other, .properties = {{"K", Plain_Value::boolean(true)}}})}}};
 }
 
 TEST(Format_Mof, EscapesAndNests)
@@ -58,13 +60,14 @@ TEST(Format_Json, EmptyListsAndUnspeakableNumbers)
 {
     EXPECT_EQ("[]", json_array({}));
     EXPECT_EQ("{}", json_values({}));
-    EXPECT_EQ("null", json_text(Value::real(CMPI_real64, std::numeric_limits<double>::quiet_NaN())));
+    EXPECT_EQ("null", json_text(Plain_Value::real(CMPI_real64, std::numeric_limits<double>::quiet_NaN())));
 }
 
 Instance_Value row(const char* name, std::uint64_t number)
 {
     return {.path = {.class_name = "C"},
-            .properties = {{"Name", Value::text(name)}, {"N", Value::unsigned_number(CMPI_uint8, number)}}};
+            .properties = {{"Name", Plain_Value::text(name)},
+                           {"N", Plain_Value::unsigned_number(CMPI_uint8, number)}}};
 }
 
 TEST(Format_Table, FewColumnsMakeATable)
@@ -90,8 +93,8 @@ TEST(Format_Table, ColumnsCanBeChosen)
 
 TEST(Format_Table, NullsAndControlCharactersOfBlocks)
 {
-    EXPECT_EQ("  A = x?[0m\n",
-              values_as_block({{"A", Value::text("x\x1B[0m")}, {"None", Value::null_of(CMPI_uint8)}}));
+    EXPECT_EQ("  A = x?[0m\n", values_as_block({{"A", Plain_Value::text("x\x1B[0m")},
+                                                {"None", Plain_Value::null_of(CMPI_uint8)}}));
     EXPECT_EQ("", instances_as_table({}, nullptr, 80));
 }
 

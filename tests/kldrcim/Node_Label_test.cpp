@@ -1,6 +1,6 @@
 #include "kldrcim/formats/Node_Label.h"
 
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 namespace KPRV::kldrcim {
 namespace {
@@ -11,9 +11,9 @@ std::string line(Node_Kind kind, const char* class_name, std::vector<Named_Value
         node_label({kind, {.path = {.class_name = class_name}, .properties = std::move(properties)}}));
 }
 
-Value states(std::vector<Value> elements)
+Plain_Value states(std::vector<Plain_Value> elements)
 {
-    return Value::array(CMPI_uint16, std::move(elements));
+    return Plain_Value::array(CMPI_uint16, std::move(elements));
 }
 
 TEST(Node_Label, Addresses)
@@ -37,7 +37,7 @@ TEST(Node_Label, UnitsTellVendorAndProduct)
 {
     auto unit = [](const char* id) {
         return line(Node_Kind::UNIT, "KALDERA_StorageExtent",
-                    {{"DeviceID", Value::text(id)}, {"ElementName", Value::text("LUN_3")}});
+                    {{"DeviceID", Plain_Value::text(id)}, {"ElementName", Plain_Value::text("LUN_3")}});
     };
     EXPECT_EQ("disk LUN_3 ACME Big Disk", unit("1_2_ACME_Big Disk_LUN_3"));
     EXPECT_EQ("disk LUN_3 ACME Big_Disk", unit("1_2_ACME_Big_Disk_LUN_3"));
@@ -68,10 +68,10 @@ TEST(Node_Label, StatesOfAPortInTheWordsOfThoseWhoLookAfterIt)
             const Node_Label label = node_label(
                 {kind,
                  {.path = {},
-                  .properties = {
-                      {"OperationalStatus",
-                       states({Value::unsigned_number(CMPI_uint16, std::uint64_t(row.operational))})},
-                      {"EnabledState", Value::unsigned_number(CMPI_uint16, std::uint64_t(row.enabled))}}}});
+                  .properties = {{"OperationalStatus", states({Plain_Value::unsigned_number(
+                                                           CMPI_uint16, std::uint64_t(row.operational))})},
+                                 {"EnabledState",
+                                  Plain_Value::unsigned_number(CMPI_uint16, std::uint64_t(row.enabled))}}}});
             EXPECT_EQ(row.words, label.facts.back());
             EXPECT_EQ(row.condition, label.condition) << row.words;
         }
@@ -80,25 +80,26 @@ TEST(Node_Label, StatesOfAPortInTheWordsOfThoseWhoLookAfterIt)
 TEST(Node_Label, WithoutAStatusItIsWhetherAPortIsEnabled)
 {
     for (const auto& [enabled, words] : {std::pair{2, "enabled"}, {3, "disabled"}, {99, "state 99"}})
-        EXPECT_EQ(std::string("FC port ") + words,
-                  line(Node_Kind::FC_PORT, "P",
-                       {{"EnabledState", Value::unsigned_number(CMPI_uint16, std::uint64_t(enabled))}}));
+        EXPECT_EQ(
+            std::string("FC port ") + words,
+            line(Node_Kind::FC_PORT, "P",
+                 {{"EnabledState", Plain_Value::unsigned_number(CMPI_uint16, std::uint64_t(enabled))}}));
 }
 
 TEST(Node_Label, WhatIsMissingLeavesNoTrace)
 {
     EXPECT_EQ("host", line(Node_Kind::SYSTEM, "S", {}));
     EXPECT_EQ("adapter ()", line(Node_Kind::ADAPTER, "A", {}));
-    EXPECT_EQ("FC port", line(Node_Kind::FC_PORT, "P", {{"Speed", Value::null_of(CMPI_uint64)}}));
+    EXPECT_EQ("FC port", line(Node_Kind::FC_PORT, "P", {{"Speed", Plain_Value::null_of(CMPI_uint64)}}));
     EXPECT_EQ("host", line(Node_Kind::SYSTEM, "S", {{"OperationalStatus", states({})}}));
-    EXPECT_EQ("host",
-              line(Node_Kind::SYSTEM, "S", {{"OperationalStatus", states({Value::null_of(CMPI_uint16)})}}));
-    EXPECT_EQ("software x", line(Node_Kind::SOFTWARE, "S", {{"InstanceID", Value::text("x")}}));
+    EXPECT_EQ("host", line(Node_Kind::SYSTEM, "S",
+                           {{"OperationalStatus", states({Plain_Value::null_of(CMPI_uint16)})}}));
+    EXPECT_EQ("software x", line(Node_Kind::SOFTWARE, "S", {{"InstanceID", Plain_Value::text("x")}}));
 }
 
 TEST(Node_Label, ATerminalIsNotMoved)
 {
-    EXPECT_EQ("host a?[2Jb\\n", line(Node_Kind::SYSTEM, "S", {{"Name", Value::text("a\33[2Jb\n")}}));
+    EXPECT_EQ("host a?[2Jb\\n", line(Node_Kind::SYSTEM, "S", {{"Name", Plain_Value::text("a\33[2Jb\n")}}));
 }
 
 } // namespace

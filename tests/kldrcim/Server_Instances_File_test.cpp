@@ -24,8 +24,8 @@ class One_Class final : public Class_Catalogue
 public:
     One_Class()
     {
-        info_.name = "CIM_Thing";
-        info_.properties = {
+        _info.name = "CIM_Thing";
+        _info.properties = {
             feature("Name", CMPI_string, true), feature("Number", CMPI_uint16, true),
             feature("Signed", CMPI_sint8),      feature("Real", CMPI_real64),
             feature("Truth", CMPI_boolean),     feature("When", CMPI_dateTime),
@@ -33,15 +33,15 @@ public:
             feature("Numbers", CMPI_uint16A),   feature("Inner", CMPI_instance),
         };
     }
-    std::vector<std::string> class_names() const override { return {info_.name}; }
+    std::vector<std::string> class_names() const override { return {_info.name}; }
     const Class_Info* find(std::string_view name) const override
     {
-        return same_name(name, info_.name) ? &info_ : nullptr;
+        return same_name(name, _info.name) ? &_info : nullptr;
     }
     std::string module_name() const override { return {}; }
 
 private:
-    Class_Info info_;
+    Class_Info _info;
 };
 
 struct Server_Instances_File : testing::Test
@@ -78,23 +78,24 @@ TEST_F(Server_Instances_File, InstancesWithTheTypesOfTheirClass)
     ASSERT_EQ(1u, store.instances("root/n").size());
     const Instance_Value instance = store.instances("root/n")[0];
     EXPECT_EQ("Root/N:cim_thing.Name=\"NULL\",Number=42", path_text(instance.path));
-    EXPECT_EQ(Value::text("NULL"), *instance.property("Name"));
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint16, 42), *instance.property("Number"));
-    EXPECT_EQ(Value::signed_number(CMPI_sint8, -128), *instance.property("Signed"));
-    EXPECT_EQ(Value::real(CMPI_real64, 0.5), *instance.property("Real"));
-    EXPECT_EQ(Value::boolean(true), *instance.property("Truth"));
-    EXPECT_EQ(Value::datetime("20260101120000.000000+060"), *instance.property("When"));
+    EXPECT_EQ(Plain_Value::text("NULL"), *instance.property("Name"));
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint16, 42), *instance.property("Number"));
+    EXPECT_EQ(Plain_Value::signed_number(CMPI_sint8, -128), *instance.property("Signed"));
+    EXPECT_EQ(Plain_Value::real(CMPI_real64, 0.5), *instance.property("Real"));
+    EXPECT_EQ(Plain_Value::boolean(true), *instance.property("Truth"));
+    EXPECT_EQ(Plain_Value::datetime("20260101120000.000000+060"), *instance.property("When"));
     EXPECT_EQ("b", instance.property("Other")->as_path()->key("Name")->as_text());
-    EXPECT_EQ(Value::array(CMPI_string, {Value::text("a, b"), Value::text("{c}"), Value::text("")}),
+    EXPECT_EQ(Plain_Value::array(
+                  CMPI_string, {Plain_Value::text("a, b"), Plain_Value::text("{c}"), Plain_Value::text("")}),
               *instance.property("Words"));
-    EXPECT_EQ(Value::array(CMPI_uint16, {}), *instance.property("Numbers"));
+    EXPECT_EQ(Plain_Value::array(CMPI_uint16, {}), *instance.property("Numbers"));
 }
 
 TEST_F(Server_Instances_File, NullsKeepTheirTypeAndMakeNoKey)
 {
     EXPECT_EQ("", with("Name", "null"));
     const Instance_Value instance = store.instances("n").at(0);
-    EXPECT_EQ(Value::null_of(CMPI_string), *instance.property("Name"));
+    EXPECT_EQ(Plain_Value::null_of(CMPI_string), *instance.property("Name"));
     EXPECT_TRUE(instance.path.keys.empty());
 }
 
@@ -105,13 +106,13 @@ TEST_F(Server_Instances_File, ClassesOfTheServersOwnTakeTypesFromTheSuperclass)
         "List": [1, 2], "None": null, "Empty": []}}])"));
     const Instance_Value instance = store.instances("n").at(0);
     EXPECT_EQ("n:PG_Thing.Number=7", path_text(instance.path));
-    EXPECT_EQ(Value::text("t"), *instance.property("Text"));
-    EXPECT_EQ(Value::boolean(false), *instance.property("Truth2"));
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)), *instance.property("Big"));
-    EXPECT_EQ(Value::signed_number(CMPI_sint64, -1), *instance.property("Minus"));
-    EXPECT_EQ(Value::real(CMPI_real64, 0.5), *instance.property("Half"));
+    EXPECT_EQ(Plain_Value::text("t"), *instance.property("Text"));
+    EXPECT_EQ(Plain_Value::boolean(false), *instance.property("Truth2"));
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)), *instance.property("Big"));
+    EXPECT_EQ(Plain_Value::signed_number(CMPI_sint64, -1), *instance.property("Minus"));
+    EXPECT_EQ(Plain_Value::real(CMPI_real64, 0.5), *instance.property("Half"));
     EXPECT_EQ(CMPIType(CMPI_uint64A), instance.property("List")->type);
-    EXPECT_EQ(Value::null_of(CMPI_string), *instance.property("None"));
+    EXPECT_EQ(Plain_Value::null_of(CMPI_string), *instance.property("None"));
     EXPECT_EQ(CMPIType(CMPI_stringA), instance.property("Empty")->type);
     EXPECT_TRUE(store.serves(catalogue, {.name_space = "n", .class_name = "CIM_Thing"}));
 }

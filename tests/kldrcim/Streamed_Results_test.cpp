@@ -27,8 +27,8 @@ public:
     {
         int ends[2];
         EXPECT_EQ(0, pipe(ends));
-        pid_ = fork();
-        if (pid_ == 0) {
+        _pid = fork();
+        if (_pid == 0) {
             dup2(ends[1], STDOUT_FILENO);
             close(ends[0]);
             close(ends[1]);
@@ -40,21 +40,21 @@ public:
             _exit(127);
         }
         close(ends[1]);
-        output_ = ends[0];
+        _output = ends[0];
     }
     ~Piped()
     {
-        close(output_);
+        close(_output);
         rusage usage;
-        wait4(pid_, nullptr, 0, &usage);
+        wait4(_pid, nullptr, 0, &usage);
     }
 
     /// What comes next; empty at the end, or if nothing comes for a long time.
     std::string read_some()
     {
-        pollfd ready = {output_, POLLIN, 0};
+        pollfd ready = {_output, POLLIN, 0};
         char buffer[65536];
-        const ssize_t size = poll(&ready, 1, 60000) == 1 ? read(output_, buffer, sizeof buffer) : 0;
+        const ssize_t size = poll(&ready, 1, 60000) == 1 ? read(_output, buffer, sizeof buffer) : 0;
         return {buffer, static_cast<std::size_t>(std::max<ssize_t>(size, 0))};
     }
     /// Reads to the end; its memory at its most, in kilobytes.
@@ -63,13 +63,13 @@ public:
         while (!read_some().empty())
             continue;
         rusage usage = {};
-        wait4(pid_, nullptr, 0, &usage);
+        wait4(_pid, nullptr, 0, &usage);
         return usage.ru_maxrss;
     }
 
 private:
-    pid_t pid_;
-    int output_;
+    pid_t _pid;
+    int _output;
 };
 
 std::vector<std::string> command(const char* verb, const char* format)

@@ -4,7 +4,7 @@
 #include "kldrcim/local/Local_Connection.h"
 #include "kldrcim/walks/Profile_Tree.h"
 
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 namespace KPRV::kldrcim {
 namespace {
@@ -12,12 +12,12 @@ namespace {
 class Topology_Test : public Toy_Test
 {
 protected:
-    Topology_Test() { host = open_toy(TOY_FABRIC); }
-    void SetUp() override { connection.emplace(*host); }
+    Topology_Test() { server = open_toy(TOY_FABRIC); }
+    void SetUp() override { connection.emplace(*server); }
 
     unsigned count(const std::string& class_name)
     {
-        auto* ask = reinterpret_cast<unsigned (*)(const char*)>(host->module().symbol("fabric_count"));
+        auto* ask = reinterpret_cast<unsigned (*)(const char*)>(server->module().symbol("fabric_count"));
         return ask(class_name.c_str());
     }
 
@@ -42,7 +42,7 @@ protected:
 TEST_F(Topology_Test, AsksEachClassOnce)
 {
     EXPECT_TRUE(walk({.software = true, .connectors = true, .cross_links = true}).failures.empty());
-    for (const std::string& name : host->catalogue().class_names()) {
+    for (const std::string& name : server->catalogue().class_names()) {
         // Profiles have a tree of their own.
         bool of_the_plan = name.starts_with("KALDERA_") && name.find("Profile") == name.npos;
         EXPECT_EQ(of_the_plan ? 1u : 0u, count(name)) << name;
@@ -52,9 +52,9 @@ TEST_F(Topology_Test, AsksEachClassOnce)
 TEST_F(Topology_Test, ProfilesAskEachOfTheirClassesOnce)
 {
     Association_Index index(*connection);
-    walk_profiles(index, host->catalogue());
+    walk_profiles(index, server->catalogue());
     EXPECT_TRUE(index.failures().empty());
-    for (const std::string& name : host->catalogue().class_names()) {
+    for (const std::string& name : server->catalogue().class_names()) {
         bool asked =
             name == "TOY_Service" || (name.starts_with("KALDERA_") && name.find("Profile") != name.npos);
         EXPECT_EQ(asked ? 1u : 0u, count(name)) << name;
@@ -90,7 +90,7 @@ TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
 {
     Association_Index index(*connection);
     Path_Value initiator = {.class_name = "KALDERA_SCSIProtocolEndpoint",
-                            .keys = {{"Name", Value::text("1000024b4c100000")}}};
+                            .keys = {{"Name", Plain_Value::text("1000024b4c100000")}}};
     const char* paths = "KALDERA_SCSIInitiatorTargetLogicalUnitPath";
     // Three paths, two targets.
     EXPECT_EQ(2u, index.far_ends(paths, "Initiator", initiator, "Target").size());
@@ -102,7 +102,7 @@ TEST_F(Topology_Test, FarEndsComeOnceAndOnlyInTheirRole)
 TEST_F(Topology_Test, AnInstanceThatTheModuleDoesNotHaveKeepsItsKeys)
 {
     Association_Index index(*connection);
-    Path_Value gone = {.class_name = "KALDERA_FCPort", .keys = {{"DeviceID", Value::text("gone")}}};
+    Path_Value gone = {.class_name = "KALDERA_FCPort", .keys = {{"DeviceID", Plain_Value::text("gone")}}};
     EXPECT_EQ("gone", index.instance(gone).property("DeviceID")->as_text());
     EXPECT_TRUE(index.failures().empty());
 }
@@ -110,10 +110,11 @@ TEST_F(Topology_Test, AnInstanceThatTheModuleDoesNotHaveKeepsItsKeys)
 TEST_F(Topology_Test, FailuresAreToldOnce)
 {
     Association_Index index(*connection);
-    Path_Value tape = {.class_name = "KALDERA_TapeDrive", .keys = {{"DeviceID", Value::text("tape_only")}}};
+    Path_Value tape = {.class_name = "KALDERA_TapeDrive",
+                       .keys = {{"DeviceID", Plain_Value::text("tape_only")}}};
     index.far_ends("TOY_Broken", "Antecedent", tape, "Dependent");
     index.far_ends("TOY_Broken", "Dependent", tape, "Antecedent");
-    index.instance({.class_name = "TOY_Unheard", .keys = {{"K", Value::text("k")}}});
+    index.instance({.class_name = "TOY_Unheard", .keys = {{"K", Plain_Value::text("k")}}});
     ASSERT_EQ(2u, index.failures().size());
     EXPECT_EQ("out of order", index.failures()[0].message);
     EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, index.failures()[1].rc);

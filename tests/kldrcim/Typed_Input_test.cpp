@@ -1,4 +1,4 @@
-#include "tests/broker/Toy_Host.h"
+#include "tests/broker/Toy_Server.h"
 
 #include "kldrcim/input/Typed_Input.h"
 
@@ -16,7 +16,7 @@ protected:
         return error;
     }
 
-    std::unique_ptr<Host> host = open_toy(TOY_DESCRIBED);
+    std::unique_ptr<Local_Server> host = open_toy(TOY_DESCRIBED);
     Named_Value assignment;
 };
 
@@ -24,29 +24,30 @@ TEST_F(Typed_Input_Test, TakesTheTypeOfTheClass)
 {
     EXPECT_EQ("", assign("u16=0xFFFF"));
     EXPECT_EQ("U16", assignment.name);
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint16, 65535), assignment.value);
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint16, 65535), assignment.value);
     EXPECT_EQ("", assign("S8=-128"));
-    EXPECT_EQ(Value::signed_number(CMPI_sint8, -128), assignment.value);
+    EXPECT_EQ(Plain_Value::signed_number(CMPI_sint8, -128), assignment.value);
     EXPECT_EQ("", assign("Name=12"));
-    EXPECT_EQ(Value::text("12"), assignment.value);
+    EXPECT_EQ(Plain_Value::text("12"), assignment.value);
     EXPECT_EQ("", assign("Name=\"a \\\"b\\\"\""));
-    EXPECT_EQ(Value::text("a \"b\""), assignment.value);
+    EXPECT_EQ(Plain_Value::text("a \"b\""), assignment.value);
     EXPECT_EQ("", assign("Name="));
-    EXPECT_EQ(Value::text(""), assignment.value);
+    EXPECT_EQ(Plain_Value::text(""), assignment.value);
     EXPECT_EQ("", assign("Flag=False"));
-    EXPECT_EQ(Value::boolean(false), assignment.value);
+    EXPECT_EQ(Plain_Value::boolean(false), assignment.value);
     EXPECT_EQ("", assign("R32=1e3"));
     EXPECT_EQ(1000, assignment.value.as_real());
     EXPECT_EQ("", assign("Nothing=NULL"));
-    EXPECT_EQ(Value::null_of(CMPI_string), assignment.value);
+    EXPECT_EQ(Plain_Value::null_of(CMPI_string), assignment.value);
     EXPECT_EQ("", assign("Other=TOY_Item.Id=5,Name=\"n\""));
     EXPECT_EQ(CMPI_uint32, assignment.value.as_path()->key("Id")->type);
     EXPECT_EQ("", assign("Texts={a, \"b, c\"}"));
-    EXPECT_EQ(Value::array(CMPI_string, {Value::text("a"), Value::text("b, c")}), assignment.value);
+    EXPECT_EQ(Plain_Value::array(CMPI_string, {Plain_Value::text("a"), Plain_Value::text("b, c")}),
+              assignment.value);
     EXPECT_EQ("", assign("Empty={}"));
-    EXPECT_EQ(Value::array(CMPI_boolean, {}), assignment.value);
+    EXPECT_EQ(Plain_Value::array(CMPI_boolean, {}), assignment.value);
     EXPECT_EQ("", assign("text={\"not\": \"a list\"}", "Echo"));
-    EXPECT_EQ(Value::text("{\"not\": \"a list\"}"), assignment.value);
+    EXPECT_EQ(Plain_Value::text("{\"not\": \"a list\"}"), assignment.value);
 }
 
 TEST_F(Typed_Input_Test, NamesWhatDoesNotFit)
@@ -68,7 +69,7 @@ TEST_F(Typed_Input_Test, Paths)
     std::string error;
     EXPECT_TRUE(typed_path(host->catalogue(), "toy_item.id=5,name=\"n\"", path, error));
     EXPECT_EQ("TOY_Item", path.class_name);
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint32, 5), *path.key("Id"));
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint32, 5), *path.key("Id"));
     EXPECT_FALSE(typed_path(host->catalogue(), "TOY_Item.U8=5", path, error));
     EXPECT_EQ("TOY_Item has no key \"U8\"", error);
     error.clear();
@@ -81,16 +82,17 @@ TEST_F(Typed_Input_Test, Paths)
 
 TEST(Guessed_Value, LooksAtTheText)
 {
-    EXPECT_EQ(Value::boolean(true), guessed_value("true"));
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint64, 5), guessed_value("5"));
-    EXPECT_EQ(Value::signed_number(CMPI_sint64, -5), guessed_value("-5"));
-    EXPECT_EQ(Value::real(CMPI_real64, 0.5), guessed_value("0.5"));
-    EXPECT_EQ(Value::text("5"), guessed_value("\"5\""));
-    EXPECT_EQ(Value::text("nan"), guessed_value("nan"));
+    EXPECT_EQ(Plain_Value::boolean(true), guessed_value("true"));
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint64, 5), guessed_value("5"));
+    EXPECT_EQ(Plain_Value::signed_number(CMPI_sint64, -5), guessed_value("-5"));
+    EXPECT_EQ(Plain_Value::real(CMPI_real64, 0.5), guessed_value("0.5"));
+    EXPECT_EQ(Plain_Value::text("5"), guessed_value("\"5\""));
+    EXPECT_EQ(Plain_Value::text("nan"), guessed_value("nan"));
     EXPECT_EQ(CMPI_dateTime, guessed_value("20260102030405.000006+060").type);
     EXPECT_EQ(CMPI_uint64A, guessed_value("{1, 2}").type);
     // A list of one kind or of texts.
-    EXPECT_EQ(Value::array(CMPI_string, {Value::text("1"), Value::text("a")}), guessed_value("{1, a}"));
+    EXPECT_EQ(Plain_Value::array(CMPI_string, {Plain_Value::text("1"), Plain_Value::text("a")}),
+              guessed_value("{1, a}"));
 }
 
 } // namespace

@@ -5,9 +5,9 @@
 namespace KPRV::kldrcim {
 namespace {
 
-Value number(std::uint64_t value)
+Plain_Value number(std::uint64_t value)
 {
-    return Value::unsigned_number(CMPI_uint16, value);
+    return Plain_Value::unsigned_number(CMPI_uint16, value);
 }
 
 TEST(Value_Words, NumbersRangesAndTheRest)
@@ -55,13 +55,14 @@ TEST(Value_Words, ArraysNullsAndWhatIsNoNumber)
 {
     const auto status = Class_Words("KALDERA_FCPort").of("OperationalStatus");
     EXPECT_EQ("2 (OK), 11 (In Service)",
-              worded_text(status, Value::array(CMPI_uint16, {number(2), number(11)})));
-    EXPECT_EQ("{}", worded_text(status, Value::array(CMPI_uint16, {})));
-    EXPECT_EQ("2 (OK), null",
-              worded_text(status, Value::array(CMPI_uint16, {number(2), Value::null_of(CMPI_uint16)})));
-    EXPECT_EQ("null", worded_text(status, Value::null_of(CMPI_uint16)));
-    EXPECT_EQ("eleven", worded_text(status, Value::text("eleven")));
-    EXPECT_EQ("{3, 4}", worded_text({}, Value::array(CMPI_uint16, {number(3), number(4)})));
+              worded_text(status, Plain_Value::array(CMPI_uint16, {number(2), number(11)})));
+    EXPECT_EQ("{}", worded_text(status, Plain_Value::array(CMPI_uint16, {})));
+    EXPECT_EQ(
+        "2 (OK), null",
+        worded_text(status, Plain_Value::array(CMPI_uint16, {number(2), Plain_Value::null_of(CMPI_uint16)})));
+    EXPECT_EQ("null", worded_text(status, Plain_Value::null_of(CMPI_uint16)));
+    EXPECT_EQ("eleven", worded_text(status, Plain_Value::text("eleven")));
+    EXPECT_EQ("{3, 4}", worded_text({}, Plain_Value::array(CMPI_uint16, {number(3), number(4)})));
 }
 
 } // namespace

@@ -9,7 +9,7 @@ protected:
     Adapter_Answers_test() { simulator.load_file(inventory("demo.json")); }
 };
 
-TEST_F(Adapter_Answers_test, adapters_are_listed_in_their_order)
+TEST_F(Adapter_Answers_test, AdaptersAreListedInTheirOrder)
 {
     EXPECT_EQ(
         call("getAllAdaptersIndexString"),
@@ -18,14 +18,14 @@ TEST_F(Adapter_Answers_test, adapters_are_listed_in_their_order)
     EXPECT_EQ(simulator.symbol<unsigned()>("getNumberOfAdapters")(), 3u);
 }
 
-TEST_F(Adapter_Answers_test, ids_count_from_one)
+TEST_F(Adapter_Answers_test, IdsCountFromOne)
 {
     EXPECT_EQ(call("getAdapterId", "{'indexStr': '20:00:02:4b:4c:10:00:00'}"), json("{'adapterId': 1}"));
     EXPECT_EQ(call("getAdapterId", "{'indexStr': '20:00:02:4B:4C:30:00:00'}"), json("{'adapterId': 3}"));
     EXPECT_EQ(error_code(call("getAdapterId", "{'indexStr': '10:00:02:4b:4c:10:00:00'}")), 2);
 }
 
-TEST_F(Adapter_Answers_test, a_port_leads_to_its_adapters_id)
+TEST_F(Adapter_Answers_test, APortLeadsToItsAdaptersId)
 {
     EXPECT_EQ(call("getAdapterIdByPort", "{'indexStr': '02:4b:4c:20:00:01'}"), json("{'adapterId': 2}"));
     EXPECT_EQ(call("getAdapterIdByPort", "{'indexStr': '10:00:02:4b:4c:30:00:00'}"),
@@ -33,7 +33,7 @@ TEST_F(Adapter_Answers_test, a_port_leads_to_its_adapters_id)
     EXPECT_EQ(error_code(call("getAdapterIdByPort", "{'indexStr': '20:00:02:4b:4c:10:00:00'}")), 2);
 }
 
-TEST_F(Adapter_Answers_test, an_adapter_is_found_by_wwn_or_mac_each_under_its_own_name)
+TEST_F(Adapter_Answers_test, AnAdapterIsFoundByWwnOrMacEachUnderItsOwnName)
 {
     EXPECT_EQ(call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:20:00:00'}"),
               call("getHbaByWwn", "{'mac': '02:4b:4c:20:00:00'}"));
@@ -43,7 +43,7 @@ TEST_F(Adapter_Answers_test, an_adapter_is_found_by_wwn_or_mac_each_under_its_ow
     EXPECT_EQ(error_code(call("getHbaByWwn", "{'wwn': '2000024b4c200000'}")), 2);
 }
 
-TEST_F(Adapter_Answers_test, a_system_makers_card_tells_what_its_author_wrote)
+TEST_F(Adapter_Answers_test, ASystemMakersCardTellsWhatItsAuthorWrote)
 {
     const Json::Value hba = call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:30:00:00'}")["hbaData"];
     EXPECT_EQ(hba["oem"], "DELL");
@@ -53,7 +53,7 @@ TEST_F(Adapter_Answers_test, a_system_makers_card_tells_what_its_author_wrote)
     EXPECT_FALSE(hba.isMember("fruNum"));
 }
 
-TEST_F(Adapter_Answers_test, the_flash_tells_whether_it_can_be_read)
+TEST_F(Adapter_Answers_test, TheFlashTellsWhetherItCanBeRead)
 {
     EXPECT_EQ(call("getFlashInfo", "{'indexStr': '20:00:02:4b:4c:10:00:00'}"), json("{'flashStatus': true}"));
     EXPECT_EQ(call("getFlashInfo", "{'indexStr': '20:00:02:4b:4c:30:00:00'}"),
@@ -61,7 +61,7 @@ TEST_F(Adapter_Answers_test, the_flash_tells_whether_it_can_be_read)
     EXPECT_EQ(error_code(call("getFlashInfo", "{'indexStr': '20:00:02:4b:4c:99:00:00'}")), 2);
 }
 
-TEST_F(Adapter_Answers_test, the_state_that_is_set_is_read_back)
+TEST_F(Adapter_Answers_test, TheStateThatIsSetIsReadBack)
 {
     const char* adapter = "{'wwn': '20:00:02:4b:4c:10:00:00'}";
     EXPECT_EQ(call("setAdapterState", "{'indexStr': '20:00:02:4b:4c:10:00:00', 'enableState': false}"),

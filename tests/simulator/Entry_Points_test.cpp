@@ -33,13 +33,13 @@ class Entry_Points_test : public Simulator_Fixture
 {
 };
 
-TEST_F(Entry_Points_test, exports_every_symbol_that_the_module_resolves)
+TEST_F(Entry_Points_test, ExportsEverySymbolThatTheModuleResolves)
 {
     for (const auto& [name, is_json] : entry_points)
         EXPECT_NO_THROW(simulator.symbol<void()>(name)) << name;
 }
 
-TEST_F(Entry_Points_test, every_json_entry_point_answers_an_object_whatever_is_asked)
+TEST_F(Entry_Points_test, EveryJsonEntryPointAnswersAnObjectWhateverIsAsked)
 {
     for (const auto& [name, is_json] : entry_points) {
         if (!is_json)
@@ -52,7 +52,7 @@ TEST_F(Entry_Points_test, every_json_entry_point_answers_an_object_whatever_is_a
     }
 }
 
-TEST_F(Entry_Points_test, what_nothing_answers_is_refused_by_name)
+TEST_F(Entry_Points_test, WhatNothingAnswersIsRefusedByName)
 {
     simulator.load_file(inventory("demo.json"));
     for (const auto& [name, is_json] : entry_points) {
@@ -63,7 +63,7 @@ TEST_F(Entry_Points_test, what_nothing_answers_is_refused_by_name)
     }
 }
 
-TEST_F(Entry_Points_test, a_request_that_lacks_a_member_is_refused)
+TEST_F(Entry_Points_test, ARequestThatLacksAMemberIsRefused)
 {
     const Json::Value answer = call("getCompleteRemotePort", "{'pPortWwn': 'a', 'lPortWwn': 'b'}");
     EXPECT_EQ(error_code(answer), 1);
@@ -72,13 +72,13 @@ TEST_F(Entry_Points_test, a_request_that_lacks_a_member_is_refused)
     EXPECT_EQ(error_code(call("getHbaByWwn", "{'wwn': 7}")), 1);
 }
 
-TEST_F(Entry_Points_test, the_fabric_statistics_are_asked_for_with_an_upper_case_d)
+TEST_F(Entry_Points_test, TheFabricStatisticsAreAskedForWithAnUpperCaseD)
 {
     EXPECT_EQ(error_code(call("getDynamicFabricStatistics", "{'wwn': 'a', 'vfID': 0}")), 2);
     EXPECT_EQ(error_code(call("getDynamicFabricStatistics", "{'wwn': 'a', 'vfId': 0}")), 1);
 }
 
-TEST_F(Entry_Points_test, exports_nothing_of_its_own_but_entry_points_and_control_functions)
+TEST_F(Entry_Points_test, ExportsNothingOfItsOwnButEntryPointsAndControlFunctions)
 {
     void* library = dlopen(SIMULATOR_LIBRARY, RTLD_NOW);
     ASSERT_NE(library, nullptr);

@@ -92,7 +92,7 @@ protected:
     Inbox box;
 };
 
-TEST_F(Events, of_a_script_come_in_order_on_a_thread_of_the_library)
+TEST_F(Events, OfAScriptComeInOrderOnAThreadOfTheLibrary)
 {
     simulator.load_text(R"({"events": [{"after": 5, "event": {"eventId": 1}},
                                        {"times": 3, "every": 2, "text": "not {json"},
@@ -103,7 +103,7 @@ TEST_F(Events, of_a_script_come_in_order_on_a_thread_of_the_library)
     EXPECT_NE(box.threads.at(0), std::this_thread::get_id());
 }
 
-TEST_F(Events, of_a_script_come_anew_with_each_registration)
+TEST_F(Events, OfAScriptComeAnewWithEachRegistration)
 {
     simulator.load_text(R"({"events": [{"text": "a"}, {"text": "b"}]})");
     subscribe();
@@ -114,7 +114,7 @@ TEST_F(Events, of_a_script_come_anew_with_each_registration)
     EXPECT_EQ(box.told(), (Texts{"a", "b", "a", "b"}));
 }
 
-TEST_F(Events, of_a_script_take_their_time)
+TEST_F(Events, OfAScriptTakeTheirTime)
 {
     simulator.load_text(R"({"events": [{"after": 30, "text": "a"}, {"after": 30, "text": "b"}]})");
     const auto begin = std::chrono::steady_clock::now();
@@ -123,7 +123,7 @@ TEST_F(Events, of_a_script_take_their_time)
     EXPECT_GE(std::chrono::steady_clock::now() - begin, 60ms);
 }
 
-TEST_F(Events, are_wanted_by_nobody_without_both_registrations)
+TEST_F(Events, AreWantedByNobodyWithoutBothRegistrations)
 {
     simulator.load_text(R"({"events": [{"text": "a"}]})");
     set_callback(receive);
@@ -133,7 +133,7 @@ TEST_F(Events, are_wanted_by_nobody_without_both_registrations)
     EXPECT_TRUE(box.wait_for(1));
 }
 
-TEST_F(Events, stop_with_the_registration)
+TEST_F(Events, StopWithTheRegistration)
 {
     simulator.load_text(R"({"events": [{"text": "a"}, {"after": 20, "text": "b"}]})");
     // On a busy machine the second may come before it can be stopped.
@@ -153,7 +153,7 @@ TEST_F(Events, stop_with_the_registration)
     EXPECT_EQ(told, Texts{"a"});
 }
 
-TEST_F(Events, that_nobody_was_told_are_dropped_or_told_first)
+TEST_F(Events, ThatNobodyWasToldAreDroppedOrToldFirst)
 {
     simulator.queue_event("old");
     subscribe(true);
@@ -167,7 +167,7 @@ TEST_F(Events, that_nobody_was_told_are_dropped_or_told_first)
     EXPECT_EQ(box.told(), (Texts{"new", "kept"}));
 }
 
-TEST_F(Events, are_not_kept_without_limit)
+TEST_F(Events, AreNotKeptWithoutLimit)
 {
     for (int i = 0; i < 1100; i++)
         simulator.queue_event(std::to_string(i));
@@ -176,7 +176,7 @@ TEST_F(Events, are_not_kept_without_limit)
     EXPECT_EQ(box.told().front(), "76");
 }
 
-TEST_F(Events, do_not_come_after_the_callback_is_gone)
+TEST_F(Events, DoNotComeAfterTheCallbackIsGone)
 {
     box.stay = 20ms;
     // On a busy machine the call may end before the callback is taken away.
@@ -201,7 +201,7 @@ TEST_F(Events, do_not_come_after_the_callback_is_gone)
     EXPECT_EQ(told, Texts{"long"});
 }
 
-TEST_F(Events, survive_a_receiver_that_throws)
+TEST_F(Events, SurviveAReceiverThatThrows)
 {
     want();
     set_callback(receive_and_throw);
@@ -213,7 +213,7 @@ TEST_F(Events, survive_a_receiver_that_throws)
     set_callback(nullptr);
 }
 
-TEST_F(Events, of_a_file_stand_in_for_those_of_the_inventory)
+TEST_F(Events, OfAFileStandInForThoseOfTheInventory)
 {
     const Temp_Folder folder;
     folder.write("events.json", R"([{"text": "from the file"}])");
@@ -227,7 +227,7 @@ TEST_F(Events, of_a_file_stand_in_for_those_of_the_inventory)
     EXPECT_EQ(box.told(), Texts{"from the file"});
 }
 
-TEST_F(Events, have_a_shape_that_is_checked)
+TEST_F(Events, HaveAShapeThatIsChecked)
 {
     for (const char* events :
          {R"({})", R"([1])", R"([{}])", R"([{"event": 1, "text": "a"}])", R"([{"text": 1}])",
@@ -268,7 +268,7 @@ protected:
     }
 };
 
-TEST_F(State_Events, of_ports_and_adapters_are_told_when_they_change)
+TEST_F(State_Events, OfPortsAndAdaptersAreToldWhenTheyChange)
 {
     const char* off = "{'indexStr': '10:00:02:4b:4c:20:00:00', 'port': {'portStatus': false}, "
                       "'propArray': ['portStatus']}";
@@ -291,7 +291,7 @@ TEST_F(State_Events, of_ports_and_adapters_are_told_when_they_change)
     EXPECT_EQ(told_by("setAdapterState", stop, 0), Texts{});
 }
 
-TEST_F(State_Events, of_logical_ports_are_told)
+TEST_F(State_Events, OfLogicalPortsAreTold)
 {
     const std::string port = "'pwwn': '10:00:02:4b:4c:20:00:00', 'vfId': 0, ";
     EXPECT_EQ(told_by("createVport", ("{" + port +
@@ -303,7 +303,7 @@ TEST_F(State_Events, of_logical_ports_are_told)
               Texts{"3/2 1000024b4c200000 ZNT_LPORT_DELETE"});
 }
 
-TEST_F(State_Events, of_authentication_are_told)
+TEST_F(State_Events, OfAuthenticationAreTold)
 {
     const auto request = [](const char* enabled) {
         return std::string("{'pPortWwn': '10:00:02:4b:4c:20:00:00', 'portAuth': {'enabled': ") + enabled +
@@ -316,7 +316,7 @@ TEST_F(State_Events, of_authentication_are_told)
               Texts{"8/2 1000024b4c200000 ZNT_AUTH_DISABLE"});
 }
 
-TEST_F(State_Events, of_firmware_are_told_when_it_is_written)
+TEST_F(State_Events, OfFirmwareAreToldWhenItIsWritten)
 {
     const Temp_Folder folder;
     folder.write("image", "firmware-version=9.9.9.9\n");

@@ -23,14 +23,14 @@ protected:
     }
 };
 
-TEST_F(Faults_test, answers_null)
+TEST_F(Faults_test, AnswersNull)
 {
     fault("{'call': 'getHbaByWwn', 'do': 'null'}");
     EXPECT_TRUE(call("getHbaByWwn", first_hba).isNull());
     EXPECT_TRUE(call("getHost").isObject());
 }
 
-TEST_F(Faults_test, answers_an_error_of_any_shape)
+TEST_F(Faults_test, AnswersAnErrorOfAnyShape)
 {
     fault("{'call': 'getHbaByWwn', 'do': 'error', 'code': -7, 'message': 'gone', 'times': 1}");
     EXPECT_EQ(call("getHbaByWwn", first_hba),
@@ -40,7 +40,7 @@ TEST_F(Faults_test, answers_an_error_of_any_shape)
     EXPECT_EQ(call("getHost"), json("{'error': null}"));
 }
 
-TEST_F(Faults_test, throws_what_the_callers_must_tell_apart)
+TEST_F(Faults_test, ThrowsWhatTheCallersMustTellApart)
 {
     fault("{'call': 'getHbaByWwn', 'do': 'throw', 'code': 12, 'message': 'lost', 'times': 1}");
     try {
@@ -66,13 +66,13 @@ TEST_F(Faults_test, throws_what_the_callers_must_tell_apart)
     }
 }
 
-TEST_F(Faults_test, answers_something_else)
+TEST_F(Faults_test, AnswersSomethingElse)
 {
     fault("{'call': 'getAllAdaptersIndexString', 'do': 'answer', 'answer': {'indexStrings': 'none'}}");
     EXPECT_EQ(call("getAllAdaptersIndexString"), json("{'indexStrings': 'none'}"));
 }
 
-TEST_F(Faults_test, leaves_members_out)
+TEST_F(Faults_test, LeavesMembersOut)
 {
     fault("{'call': 'getHbaByWwn', 'do': 'remove', 'member': 'driver'}");
     fault("{'call': 'getHbaByWwn', 'do': 'remove', 'member': 'hbaData.isCNA'}");
@@ -85,7 +85,7 @@ TEST_F(Faults_test, leaves_members_out)
     EXPECT_EQ(call("getAllAdaptersIndexString"), json("{'indexStrings': ['20:00:02:4b:4c:12:00:00']}"));
 }
 
-TEST_F(Faults_test, puts_values_of_any_type_into_the_answer)
+TEST_F(Faults_test, PutsValuesOfAnyTypeIntoTheAnswer)
 {
     fault("{'call': 'getHbaByWwn', 'do': 'set', 'member': 'hbaData', 'value': []}");
     EXPECT_EQ(call("getHbaByWwn", first_hba)["hbaData"], json("[]"));
@@ -99,7 +99,7 @@ TEST_F(Faults_test, puts_values_of_any_type_into_the_answer)
     EXPECT_EQ(call("getAllAdaptersIndexString"), json("{'indexStrings': ['20:00:02:4b:4c:11:00:00', 3]}"));
 }
 
-TEST_F(Faults_test, the_inventory_itself_stays_whole)
+TEST_F(Faults_test, TheInventoryItselfStaysWhole)
 {
     const Json::Value before = call("getHbaByWwn", first_hba);
     fault("{'call': 'getHbaByWwn', 'do': 'remove', 'member': 'hbaData.model'}");
@@ -108,7 +108,7 @@ TEST_F(Faults_test, the_inventory_itself_stays_whole)
     EXPECT_EQ(call("getHbaByWwn", first_hba), before);
 }
 
-TEST_F(Faults_test, hits_only_the_address_that_it_names)
+TEST_F(Faults_test, HitsOnlyTheAddressThatItNames)
 {
     fault("{'call': '*', 'address': '20:00:02:4b:4c:12:00:00', 'do': 'null'}");
     EXPECT_TRUE(call("getHbaByWwn", first_hba).isObject());
@@ -117,7 +117,7 @@ TEST_F(Faults_test, hits_only_the_address_that_it_names)
     EXPECT_TRUE(call("getHost").isObject());
 }
 
-TEST_F(Faults_test, hits_the_calls_that_it_counts)
+TEST_F(Faults_test, HitsTheCallsThatItCounts)
 {
     fault("{'call': 'getHost', 'at': 2, 'do': 'null'}");
     fault("{'call': 'getGlobalInfo', 'at': 2, 'times': 2, 'do': 'null'}");
@@ -133,7 +133,7 @@ TEST_F(Faults_test, hits_the_calls_that_it_counts)
     EXPECT_EQ(nulls("getAllAdaptersIndexString"), ".xxxx");
 }
 
-TEST_F(Faults_test, what_fails_is_not_done)
+TEST_F(Faults_test, WhatFailsIsNotDone)
 {
     const char* disable = "{'indexStr': '20:00:02:4b:4c:11:00:00', 'enableState': false}";
     for (const char* kind : {"null", "error", "throw"}) {
@@ -147,7 +147,7 @@ TEST_F(Faults_test, what_fails_is_not_done)
     }
 }
 
-TEST_F(Faults_test, answers_late)
+TEST_F(Faults_test, AnswersLate)
 {
     fault("{'call': 'getHost', 'do': 'delay', 'milliseconds': 30}");
     const auto start = std::chrono::steady_clock::now();
@@ -155,7 +155,7 @@ TEST_F(Faults_test, answers_late)
     EXPECT_GE(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(30));
 }
 
-TEST_F(Faults_test, numbers_and_texts_fail_as_their_callers_know_it)
+TEST_F(Faults_test, NumbersAndTextsFailAsTheirCallersKnowIt)
 {
     fault("{'call': 'getNumberOfAdapters', 'do': 'null'}");
     fault("{'call': 'get_agt_version', 'do': 'error'}");
@@ -167,7 +167,7 @@ TEST_F(Faults_test, numbers_and_texts_fail_as_their_callers_know_it)
     EXPECT_EQ(integer("free_hba_lib"), -1);
 }
 
-TEST_F(Faults_test, an_inventory_brings_its_own_and_takes_the_others_away)
+TEST_F(Faults_test, AnInventoryBringsItsOwnAndTakesTheOthersAway)
 {
     fault("{'call': 'getGlobalInfo', 'do': 'null'}");
     simulator.load_text(R"({"faults": [{"call": "getHost", "do": "null"}]})");

@@ -32,7 +32,7 @@ protected:
 
 const char* const DONE = "{'status': 0, 'message': 'Flash update successful'}";
 
-TEST_F(Flash_Answers_test, the_version_that_an_image_names_is_read_back)
+TEST_F(Flash_Answers_test, TheVersionThatAnImageNamesIsReadBack)
 {
     EXPECT_EQ(update_with("firmware-version=3.2.2.0\n"), json(DONE));
     EXPECT_EQ(version(), "3.2.2.0");
@@ -41,7 +41,7 @@ TEST_F(Flash_Answers_test, the_version_that_an_image_names_is_read_back)
     EXPECT_EQ(version(), "4.0-rc1");
 }
 
-TEST_F(Flash_Answers_test, an_image_that_names_none_leaves_the_version)
+TEST_F(Flash_Answers_test, AnImageThatNamesNoneLeavesTheVersion)
 {
     for (const char* text : {"x", "firmware-version=\n", "firmware-version=a b\n", " firmware-version=9\n",
                              "my-firmware-version=9\n"}) {
@@ -52,7 +52,7 @@ TEST_F(Flash_Answers_test, an_image_that_names_none_leaves_the_version)
     EXPECT_EQ(version(), "3.2.1.0");
 }
 
-TEST_F(Flash_Answers_test, what_is_no_image_is_refused_with_a_status)
+TEST_F(Flash_Answers_test, WhatIsNoImageIsRefusedWithAStatus)
 {
     EXPECT_EQ(update_with("")["status"].asUInt(), 2u);
     Json::Value answer = update(folder.path("none.bin"));
@@ -64,7 +64,7 @@ TEST_F(Flash_Answers_test, what_is_no_image_is_refused_with_a_status)
     EXPECT_EQ(answer["message"].asString(), "cannot read " + folder.path() + ": not a regular file");
 }
 
-TEST_F(Flash_Answers_test, nothing_is_written_where_nobody_is)
+TEST_F(Flash_Answers_test, NothingIsWrittenWhereNobodyIs)
 {
     folder.write("fw.bin", "firmware-version=9\n");
     EXPECT_EQ(error_code(update(folder.path("fw.bin"), "20:00:02:4b:4c:99:00:00")), 2);
@@ -75,7 +75,7 @@ TEST_F(Flash_Answers_test, nothing_is_written_where_nobody_is)
     EXPECT_EQ(version(), "3.2.1.0");
 }
 
-TEST_F(Flash_Answers_test, an_adapter_can_be_one_that_fails)
+TEST_F(Flash_Answers_test, AnAdapterCanBeOneThatFails)
 {
     simulator.load_text(R"({"adapters": [{"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00"},
                                           "flashUpdate": {"status": 7, "message": "Flash is locked"},

@@ -45,7 +45,7 @@ protected:
     }
 };
 
-TEST_F(Hardware_Tests_test, pass_by_default)
+TEST_F(Hardware_Tests_test, PassByDefault)
 {
     load("{}");
     EXPECT_EQ(memory(), json("{'failed': false, 'output': 'Test passed'}"));
@@ -57,7 +57,7 @@ TEST_F(Hardware_Tests_test, pass_by_default)
     EXPECT_EQ(pci("10:00:02:4b:4c:20:00:00"), json("{'failed': false, 'output': 'Test passed'}"));
 }
 
-TEST_F(Hardware_Tests_test, fail_as_told)
+TEST_F(Hardware_Tests_test, FailAsTold)
 {
     load("{'diagMemoryTest': {'outcome': 'fail', 'status': 17, 'expected value': 5, 'type': 'march',"
          " 'output': 'bit 3'}}",
@@ -74,7 +74,7 @@ TEST_F(Hardware_Tests_test, fail_as_told)
     EXPECT_EQ(eth_loopback()["GoodFrameRcv"], Json::Value(1));
 }
 
-TEST_F(Hardware_Tests_test, go_wrong_as_told)
+TEST_F(Hardware_Tests_test, GoWrongAsTold)
 {
     load("{'diagMemoryTest': {'outcome': 'error', 'code': 7, 'message': 'busy'}}",
          "{'diagLoopbackTest': {'outcome': 'std::runtime_error', 'message': 'lost'}}",
@@ -84,7 +84,7 @@ TEST_F(Hardware_Tests_test, go_wrong_as_told)
     EXPECT_THROW(eth_loopback(), int);
 }
 
-TEST_F(Hardware_Tests_test, take_their_time_and_hold_nobody_up)
+TEST_F(Hardware_Tests_test, TakeTheirTimeAndHoldNobodyUp)
 {
     load("{'diagMemoryTest': {'milliseconds': 500}}");
     const auto begin = std::chrono::steady_clock::now();
@@ -100,7 +100,7 @@ TEST_F(Hardware_Tests_test, take_their_time_and_hold_nobody_up)
     EXPECT_GE(std::chrono::steady_clock::now() - begin, std::chrono::milliseconds(500));
 }
 
-TEST_F(Hardware_Tests_test, need_what_they_test)
+TEST_F(Hardware_Tests_test, NeedWhatTheyTest)
 {
     load("{}");
     EXPECT_EQ(2, error_code(pci("02:4b:4c:20:00:99")));
@@ -108,7 +108,7 @@ TEST_F(Hardware_Tests_test, need_what_they_test)
     EXPECT_EQ(1, error_code(call("diagMemoryTest", "{}")));
 }
 
-TEST_F(Hardware_Tests_test, are_refused_where_they_make_no_sense)
+TEST_F(Hardware_Tests_test, AreRefusedWhereTheyMakeNoSense)
 {
     EXPECT_NE(std::string::npos, refusal("{'getHost': {}}").find("is no entry point that tests"));
     EXPECT_NE(std::string::npos,

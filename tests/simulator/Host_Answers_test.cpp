@@ -7,7 +7,7 @@ class Host_Answers_test : public Simulator_Fixture
 {
 };
 
-TEST_F(Host_Answers_test, the_host_tells_maker_and_model)
+TEST_F(Host_Answers_test, TheHostTellsMakerAndModel)
 {
     EXPECT_EQ(call("getHost"),
               json("{'result': {'hostManufacturer': 'KLDR', 'hostModel': 'Simulated host'}}"));
@@ -15,12 +15,12 @@ TEST_F(Host_Answers_test, the_host_tells_maker_and_model)
     EXPECT_EQ(call("getHost"), json("{'result': {'hostManufacturer': ''}}"));
 }
 
-TEST_F(Host_Answers_test, a_host_without_adapters_says_so)
+TEST_F(Host_Answers_test, AHostWithoutAdaptersSaysSo)
 {
     EXPECT_EQ(call("getGlobalInfo"), json("{'numOfAdapters': 0, 'adapter': []}"));
 }
 
-TEST_F(Host_Answers_test, the_overview_has_a_record_per_adapter_and_an_element_per_physical_port)
+TEST_F(Host_Answers_test, TheOverviewHasARecordPerAdapterAndAnElementPerPhysicalPort)
 {
     simulator.load_file(inventory("demo.json"));
     const Json::Value info = call("getGlobalInfo");
@@ -39,7 +39,7 @@ TEST_F(Host_Answers_test, the_overview_has_a_record_per_adapter_and_an_element_p
         'fcoeMac': ['02:4b:4c:20:00:00', '02:4b:4c:20:00:01']})"));
 }
 
-TEST_F(Host_Answers_test, ports_of_one_kind_only_leave_empty_places)
+TEST_F(Host_Answers_test, PortsOfOneKindOnlyLeaveEmptyPlaces)
 {
     simulator.load_text(R"({"adapters": [{"hbaData": {"hbaMAC": "02:4b:4c:20:00:00"},
                                           "ethPorts": [{"mac": "02:4b:4c:20:00:00"}]},

@@ -9,7 +9,7 @@ class Inventory_test : public Simulator_Fixture
 {
 };
 
-TEST_F(Inventory_test, an_fc_hba_needs_no_more_than_addresses)
+TEST_F(Inventory_test, AnFcHbaNeedsNoMoreThanAddresses)
 {
     simulator.load_file(inventory("one_hba.json"));
     EXPECT_EQ(call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:10:00:00'}"), json(R"({
@@ -24,7 +24,7 @@ TEST_F(Inventory_test, an_fc_hba_needs_no_more_than_addresses)
         'portStatus': true, 'portStatusValue': 11, 'isMezz': false, 'beaconState': false})"));
 }
 
-TEST_F(Inventory_test, a_mac_makes_a_converged_adapter)
+TEST_F(Inventory_test, AMacMakesAConvergedAdapter)
 {
     simulator.load_file(inventory("one_cna.json"));
     const Json::Value adapter = call("getHbaByWwn", "{'mac': '02:4b:4c:20:00:00'}");
@@ -39,7 +39,7 @@ TEST_F(Inventory_test, a_mac_makes_a_converged_adapter)
     EXPECT_TRUE(call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:20:00:01'}")["isFCoE"].asBool());
 }
 
-TEST_F(Inventory_test, what_is_null_is_left_out_of_the_answer)
+TEST_F(Inventory_test, WhatIsNullIsLeftOutOfTheAnswer)
 {
     simulator.load_text(R"({"adapters": [
         {"hbaData": {"hbaMAC": "02:4b:4c:20:00:00", "hasEthPort": null, "uuid": null},
@@ -57,7 +57,7 @@ TEST_F(Inventory_test, what_is_null_is_left_out_of_the_answer)
     EXPECT_EQ(error_code(call("getEthPortByEthMac", "{'mac': '02:4b:4c:20:00:02'}")), 2);
 }
 
-TEST_F(Inventory_test, extra_members_join_the_answer)
+TEST_F(Inventory_test, ExtraMembersJoinTheAnswer)
 {
     simulator.load_text(R"({"host": {"hostModel": "X", "extra": {"hostName": "h"}}, "adapters": [
         {"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00", "extra": {"pcieSpeed": [1, 2], "slot": null}}}]})");
@@ -69,7 +69,7 @@ TEST_F(Inventory_test, extra_members_join_the_answer)
     EXPECT_FALSE(hba.isMember("extra"));
 }
 
-TEST_F(Inventory_test, an_adapter_is_listed_by_the_address_its_author_chose)
+TEST_F(Inventory_test, AnAdapterIsListedByTheAddressItsAuthorChose)
 {
     simulator.load_text(R"({"adapters": [{"address": "20:00:02:4b:4c:20:00:00",
         "hbaData": {"wwn": "20:00:02:4b:4c:20:00:00", "hbaMAC": "02:4b:4c:20:00:00"}}]})");
@@ -77,7 +77,7 @@ TEST_F(Inventory_test, an_adapter_is_listed_by_the_address_its_author_chose)
     EXPECT_EQ(call("getAdapterId", "{'indexStr': '02:4b:4c:20:00:00'}"), json("{'adapterId': 1}"));
 }
 
-TEST_F(Inventory_test, the_authors_answer_comes_from_the_port_the_adapter_or_the_host)
+TEST_F(Inventory_test, TheAuthorsAnswerComesFromThePortTheAdapterOrTheHost)
 {
     simulator.load_text(R"({"answers": {"getOpticsSFP": "host", "getServerTime": "noon"}, "adapters": [
         {"hbaData": {"wwn": "20:00:02:4b:4c:10:00:00"}, "answers": {"getOpticsSFP": "adapter"},
@@ -92,7 +92,7 @@ TEST_F(Inventory_test, the_authors_answer_comes_from_the_port_the_adapter_or_the
     EXPECT_FALSE(call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:10:00:00'}").isMember("answers"));
 }
 
-TEST_F(Inventory_test, the_rich_host_has_every_kind_of_thing)
+TEST_F(Inventory_test, TheRichHostHasEveryKindOfThing)
 {
     simulator.load_file(inventory("rich.json"));
     std::map<std::string, int> counts;
@@ -133,7 +133,7 @@ TEST_F(Inventory_test, the_rich_host_has_every_kind_of_thing)
                                                   {"without statistics", 1}}));
 }
 
-TEST_F(Inventory_test, every_inventory_that_comes_with_the_simulator_is_good)
+TEST_F(Inventory_test, EveryInventoryThatComesWithTheSimulatorIsGood)
 {
     const std::pair<const char*, unsigned> shipped[] = {
         {"demo.json", 3}, {"empty.json", 0}, {"one_cna.json", 1}, {"one_hba.json", 1},

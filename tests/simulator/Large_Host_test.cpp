@@ -24,7 +24,7 @@ protected:
     }
 };
 
-TEST_F(Large_Host_test, every_unit_behind_every_port_is_there)
+TEST_F(Large_Host_test, EveryUnitBehindEveryPortIsThere)
 {
     unsigned ports = 0;
     unsigned targets = 0;
@@ -50,7 +50,7 @@ TEST_F(Large_Host_test, every_unit_behind_every_port_is_there)
     EXPECT_EQ(luns, 16u * 4 * (60 * 64 + 4));
 }
 
-TEST_F(Large_Host_test, a_quarter_of_the_adapters_is_converged)
+TEST_F(Large_Host_test, AQuarterOfTheAdaptersIsConverged)
 {
     unsigned converged = 0;
     const Json::Value info = call("getGlobalInfo");

@@ -35,7 +35,7 @@ protected:
     unsigned adapters() { return simulator.symbol<unsigned()>("getNumberOfAdapters")(); }
 };
 
-TEST_F(Life_test, a_host_without_an_inventory_has_no_adapters_and_initialises)
+TEST_F(Life_test, AHostWithoutAnInventoryHasNoAdaptersAndInitialises)
 {
     EXPECT_EQ(call("init_hba_lib", "{'appId': 2}"), json("{'result': 0}"));
     EXPECT_TRUE(simulator.status()["initialised"].asBool());
@@ -46,7 +46,7 @@ TEST_F(Life_test, a_host_without_an_inventory_has_no_adapters_and_initialises)
     EXPECT_FALSE(simulator.status()["initialised"].asBool());
 }
 
-TEST_F(Life_test, the_environment_names_the_inventory_anew_after_each_goodbye)
+TEST_F(Life_test, TheEnvironmentNamesTheInventoryAnewAfterEachGoodbye)
 {
     setenv("KLDR_SIMULATOR_INVENTORY", inventory("one_hba.json").c_str(), 1);
     integer("free_hba_lib");
@@ -57,7 +57,7 @@ TEST_F(Life_test, the_environment_names_the_inventory_anew_after_each_goodbye)
     EXPECT_EQ(adapters(), 2u);
 }
 
-TEST_F(Life_test, an_inventory_that_a_test_gave_outlives_the_goodbye)
+TEST_F(Life_test, AnInventoryThatATestGaveOutlivesTheGoodbye)
 {
     simulator.load_file(inventory("twins.json"));
     integer("free_hba_lib");
@@ -66,7 +66,7 @@ TEST_F(Life_test, an_inventory_that_a_test_gave_outlives_the_goodbye)
     EXPECT_EQ(adapters(), 0u);
 }
 
-TEST_F(Life_test, the_version_may_be_any_text_or_none)
+TEST_F(Life_test, TheVersionMayBeAnyTextOrNone)
 {
     simulator.load_text(R"({"library": {"version": "4.1.0"}})");
     const char* kept = version();
@@ -75,7 +75,7 @@ TEST_F(Life_test, the_version_may_be_any_text_or_none)
     EXPECT_STREQ(kept, "4.1.0");
 }
 
-TEST_F(Life_test, initialising_may_fail_by_result_or_by_any_object)
+TEST_F(Life_test, InitialisingMayFailByResultOrByAnyObject)
 {
     simulator.load_text(R"({"library": {"init": 7}})");
     EXPECT_EQ(call("init_hba_lib", "{'appId': 2}"), json("{'result': 7}"));
@@ -83,7 +83,7 @@ TEST_F(Life_test, initialising_may_fail_by_result_or_by_any_object)
     EXPECT_EQ(call("init_hba_lib", "{'appId': 2}"), json("{}"));
 }
 
-TEST_F(Life_test, log_lines_reach_the_callback_while_it_is_registered)
+TEST_F(Life_test, LogLinesReachTheCallbackWhileItIsRegistered)
 {
     EXPECT_FALSE(simulator.log(1, "port.c", 3, "x"));
     register_log(receive_log);
@@ -95,7 +95,7 @@ TEST_F(Life_test, log_lines_reach_the_callback_while_it_is_registered)
     EXPECT_FALSE(simulator.log(4, "port.c", 12, "late"));
 }
 
-TEST_F(Life_test, events_reach_a_caller_that_has_registered_twice)
+TEST_F(Life_test, EventsReachACallerThatHasRegisteredTwice)
 {
     register_event(receive_event);
     EXPECT_FALSE(simulator.event("{}"));
@@ -110,7 +110,7 @@ TEST_F(Life_test, events_reach_a_caller_that_has_registered_twice)
     EXPECT_EQ(simulator.requests("registerEventProcessingCb").at(1), json("{'callback': false}"));
 }
 
-TEST_F(Life_test, request_ids_are_never_given_twice)
+TEST_F(Life_test, RequestIdsAreNeverGivenTwice)
 {
     const int first = integer("getRequestID");
     EXPECT_EQ(integer("getRequestID"), first + 1);

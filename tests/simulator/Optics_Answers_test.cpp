@@ -31,7 +31,7 @@ protected:
     Json::Value eth_optics() { return optics("02:4b:4c:20:00:00"); }
 };
 
-TEST_F(Optics_Answers_test, an_sfp_tells_what_its_author_wrote_padded_as_in_its_memory)
+TEST_F(Optics_Answers_test, AnSfpTellsWhatItsAuthorWrotePaddedAsInItsMemory)
 {
     simulator.load_file(inventory("rich.json"));
     EXPECT_EQ(optics("10:00:02:4b:4c:a1:00:00"),
@@ -40,7 +40,7 @@ TEST_F(Optics_Answers_test, an_sfp_tells_what_its_author_wrote_padded_as_in_its_
         'extendedID': 'SFP+'})"));
 }
 
-TEST_F(Optics_Answers_test, by_default_there_is_an_sfp_that_suits_the_adapter)
+TEST_F(Optics_Answers_test, ByDefaultThereIsAnSfpThatSuitsTheAdapter)
 {
     simulator.load_file(inventory("one_hba.json"));
     EXPECT_EQ(optics("10:00:02:4b:4c:10:00:00"),
@@ -53,7 +53,7 @@ TEST_F(Optics_Answers_test, by_default_there_is_an_sfp_that_suits_the_adapter)
     EXPECT_EQ(optics("02:4b:4c:20:00:01"), optics("10:00:02:4b:4c:20:00:01"));
 }
 
-TEST_F(Optics_Answers_test, an_empty_slot_is_an_error)
+TEST_F(Optics_Answers_test, AnEmptySlotIsAnError)
 {
     simulator.load_file(inventory("demo.json"));
     EXPECT_EQ(error_code(optics("10:00:02:4b:4c:10:00:01")), 5);
@@ -62,7 +62,7 @@ TEST_F(Optics_Answers_test, an_empty_slot_is_an_error)
     EXPECT_EQ(error_code(optics("20:00:02:4b:4c:10:00:00")), 2);
 }
 
-TEST_F(Optics_Answers_test, the_functions_of_one_physical_port_share_what_is_plugged_in)
+TEST_F(Optics_Answers_test, TheFunctionsOfOnePhysicalPortShareWhatIsPluggedIn)
 {
     load_cna(", 'optics': {'serialNo': 'A'}", "");
     EXPECT_EQ(eth_optics()["serialNo"], "A               ");
@@ -75,7 +75,7 @@ TEST_F(Optics_Answers_test, the_functions_of_one_physical_port_share_what_is_plu
     EXPECT_EQ(eth_optics()["transceiver"], "10G_BASE-LRM");
 }
 
-TEST_F(Optics_Answers_test, members_may_be_left_out_and_added)
+TEST_F(Optics_Answers_test, MembersMayBeLeftOutAndAdded)
 {
     load_cna(
         ", 'optics': {'transceiver': null, 'vendorName': null, 'extra': {'serialNo': 7, 'wavelength': 850}}",
@@ -87,7 +87,7 @@ TEST_F(Optics_Answers_test, members_may_be_left_out_and_added)
     EXPECT_EQ(answer["wavelength"], Json::Value(850));
 }
 
-TEST_F(Optics_Answers_test, monitored_optics_tell_their_readings)
+TEST_F(Optics_Answers_test, MonitoredOpticsTellTheirReadings)
 {
     load_cna(", 'optics': {'readings': {'temperature': -5, 'txPower': null}}",
              ", 'optics': {'readings': null}");
@@ -97,7 +97,7 @@ TEST_F(Optics_Answers_test, monitored_optics_tell_their_readings)
     EXPECT_FALSE(fc_optics().isMember("readings"));
 }
 
-TEST_F(Optics_Answers_test, the_port_itself_does_not_tell_them)
+TEST_F(Optics_Answers_test, ThePortItselfDoesNotTellThem)
 {
     simulator.load_file(inventory("rich.json"));
     const Json::Value port = call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:a1:00:00'}");

@@ -34,7 +34,7 @@ protected:
     Json::Value profiled() { return call("getAdvIoProfile", at_port().c_str())["advancedIoProfiles"]; }
 };
 
-TEST_F(Path_Record_Answers_test, masks_are_kept_in_the_order_of_their_making)
+TEST_F(Path_Record_Answers_test, MasksAreKeptInTheOrderOfTheirMaking)
 {
     EXPECT_EQ(masked(), json("[]"));
     done("setLunMaskData", masks("[" + lun(2) + ", " + lun(0, ", 'note': 'boot'") + "]"));
@@ -45,7 +45,7 @@ TEST_F(Path_Record_Answers_test, masks_are_kept_in_the_order_of_their_making)
     EXPECT_EQ(masked(), json("[]"));
 }
 
-TEST_F(Path_Record_Answers_test, a_change_of_masks_is_made_as_a_whole_or_not_at_all)
+TEST_F(Path_Record_Answers_test, AChangeOfMasksIsMadeAsAWholeOrNotAtAll)
 {
     done("setLunMaskData", masks("[" + lun(0) + "]"));
     EXPECT_EQ(refused("setLunMaskData", masks("[" + lun(1) + ", " + lun(0) + "]")), DUPLICATE);
@@ -63,7 +63,7 @@ TEST_F(Path_Record_Answers_test, a_change_of_masks_is_made_as_a_whole_or_not_at_
     EXPECT_EQ(masked(), json("[" + lun(0) + "]"));
 }
 
-TEST_F(Path_Record_Answers_test, a_record_says_itself_what_it_is_about_and_nothing_else_does)
+TEST_F(Path_Record_Answers_test, ARecordSaysItselfWhatItIsAboutAndNothingElseDoes)
 {
     // A record cannot lead to another port than the one that it is set for.
     done("setLunMaskData", masks("[" + lun(0, ", 'wwn': '10:00:02:4b:4c:10:00:01'") + "]"));
@@ -73,7 +73,7 @@ TEST_F(Path_Record_Answers_test, a_record_says_itself_what_it_is_about_and_nothi
               DUPLICATE);
 }
 
-TEST_F(Path_Record_Answers_test, a_profile_takes_the_place_of_the_one_before)
+TEST_F(Path_Record_Answers_test, AProfileTakesThePlaceOfTheOneBefore)
 {
     EXPECT_EQ(profiled(), json("[]"));
     done("setAdvIoProfile", profiles("[" + lun(0, ", 'threshold': 1") + "]"));
@@ -87,7 +87,7 @@ TEST_F(Path_Record_Answers_test, a_profile_takes_the_place_of_the_one_before)
     EXPECT_EQ(refused("setAdvIoProfile", at_port()), REQUEST);
 }
 
-TEST_F(Path_Record_Answers_test, profiles_are_cleared_with_what_lies_below)
+TEST_F(Path_Record_Answers_test, ProfilesAreClearedWithWhatLiesBelow)
 {
     const std::string behind = ", 'lPortWwn': '10:00:02:4b:4c:10:00:00'";
     const std::string array = behind + ", 'rPortWwn': '50:24:b4:c0:00:40:00:01'";
@@ -106,7 +106,7 @@ TEST_F(Path_Record_Answers_test, profiles_are_cleared_with_what_lies_below)
     EXPECT_EQ(refused("clearAdvIoProfile", at_port(", 'lPortWwn': 'nowhere'")), ADDRESS);
 }
 
-TEST_F(Path_Record_Answers_test, a_virtual_port_takes_its_records_with_it)
+TEST_F(Path_Record_Answers_test, AVirtualPortTakesItsRecordsWithIt)
 {
     done("createVport", new_vport());
     const std::string of_vport = "[" + lun(0, ", 'lPortWwn': '10:01:02:4b:4c:10:00:00'") + "]";

@@ -17,7 +17,7 @@ protected:
     }
 };
 
-TEST_F(Port_Answers_test, ports_are_listed_by_kind)
+TEST_F(Port_Answers_test, PortsAreListedByKind)
 {
     EXPECT_EQ(call("getFcPhyPortIndicesByAdapter", "{'indexStr': '02:4b:4c:20:00:00'}"),
               json("{'indexStrings': ['10:00:02:4b:4c:20:00:00', '10:00:02:4b:4c:20:00:01']}"));
@@ -28,7 +28,7 @@ TEST_F(Port_Answers_test, ports_are_listed_by_kind)
     EXPECT_EQ(error_code(call("getFcPhyPortIndicesByAdapter", "{'indexStr': '10:00:02:4b:4c:20:00:00'}")), 2);
 }
 
-TEST_F(Port_Answers_test, a_port_tells_what_its_author_wrote)
+TEST_F(Port_Answers_test, APortTellsWhatItsAuthorWrote)
 {
     const Json::Value idle = call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:10:00:01'}");
     EXPECT_EQ(idle["operatingSpeed"], Json::Value(99999));
@@ -38,13 +38,13 @@ TEST_F(Port_Answers_test, a_port_tells_what_its_author_wrote)
               Json::Value(9000));
 }
 
-TEST_F(Port_Answers_test, an_fc_port_is_no_ethernet_port)
+TEST_F(Port_Answers_test, AnFcPortIsNoEthernetPort)
 {
     EXPECT_EQ(error_code(call("getEthPortByEthMac", "{'mac': '10:00:02:4b:4c:10:00:00'}")), 2);
     EXPECT_TRUE(call("getPortByWwn", "{'mac': '02:4b:4c:20:00:01'}")["portStatus"].asBool());
 }
 
-TEST_F(Port_Answers_test, an_fcoe_ports_own_mac_leads_to_it_and_a_shared_one_to_the_ethernet_port)
+TEST_F(Port_Answers_test, AnFcoePortsOwnMacLeadsToItAndASharedOneToTheEthernetPort)
 {
     simulator.load_text(R"({"adapters": [{"hbaData": {"hbaMAC": "02:4b:4c:20:00:00"},
         "fcPorts": [{"wwn": "10:00:02:4b:4c:20:00:00", "fcoeMac": "02:4b:4c:20:00:0a"},
@@ -56,7 +56,7 @@ TEST_F(Port_Answers_test, an_fcoe_ports_own_mac_leads_to_it_and_a_shared_one_to_
     EXPECT_EQ(record["fcoeMac"], json("['02:4b:4c:20:00:0a', '02:4b:4c:20:00:01']"));
 }
 
-TEST_F(Port_Answers_test, what_is_set_is_read_back_and_nothing_else)
+TEST_F(Port_Answers_test, WhatIsSetIsReadBackAndNothingElse)
 {
     EXPECT_EQ(set_fc_port("{'beaconState': true, 'maxFrameSize': 512}", "['beaconState']"),
               json("{'status': 0}"));
@@ -66,7 +66,7 @@ TEST_F(Port_Answers_test, what_is_set_is_read_back_and_nothing_else)
     EXPECT_EQ(fc_port()["alias"], "left");
 }
 
-TEST_F(Port_Answers_test, disabling_a_port_shows_in_its_state)
+TEST_F(Port_Answers_test, DisablingAPortShowsInItsState)
 {
     set_fc_port("{'portStatus': false}", "['portStatus']");
     EXPECT_FALSE(fc_port()["portStatus"].asBool());
@@ -79,7 +79,7 @@ TEST_F(Port_Answers_test, disabling_a_port_shows_in_its_state)
               Json::Value(10));
 }
 
-TEST_F(Port_Answers_test, a_request_that_makes_no_sense_changes_nothing)
+TEST_F(Port_Answers_test, ARequestThatMakesNoSenseChangesNothing)
 {
     const Json::Value before = fc_port();
     EXPECT_EQ(error_code(set_fc_port("{'beaconState': 1}", "['beaconState']")), 1);

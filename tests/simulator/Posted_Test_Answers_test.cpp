@@ -69,7 +69,7 @@ protected:
     }
 };
 
-TEST_F(Posted_Test_Answers_test, each_test_is_posted_started_and_passed)
+TEST_F(Posted_Test_Answers_test, EachTestIsPostedStartedAndPassed)
 {
     for (const Post& each : posts) {
         SCOPED_TRACE(each.function);
@@ -85,7 +85,7 @@ TEST_F(Posted_Test_Answers_test, each_test_is_posted_started_and_passed)
     }
 }
 
-TEST_F(Posted_Test_Answers_test, a_test_that_lacks_a_member_or_leads_nowhere_is_refused)
+TEST_F(Posted_Test_Answers_test, ATestThatLacksAMemberOrLeadsNowhereIsRefused)
 {
     const std::tuple<const char*, const char*, int> wrong[] = {
         {"SlowTest", HBA, REQUEST},
@@ -113,7 +113,7 @@ TEST_F(Posted_Test_Answers_test, a_test_that_lacks_a_member_or_leads_nowhere_is_
     EXPECT_EQ(refused("getDiagnosticsResults", named("1")), NOT_FOUND);
 }
 
-TEST_F(Posted_Test_Answers_test, what_cannot_work_fails_and_says_why)
+TEST_F(Posted_Test_Answers_test, WhatCannotWorkFailsAndSaysWhy)
 {
     const std::pair<std::string, std::string> failing[] = {
         {"'function': 'LoopbackTest', 'portWwn': '10:00:02:4b:4c:10:00:01', " LOOP,
@@ -139,7 +139,7 @@ TEST_F(Posted_Test_Answers_test, what_cannot_work_fails_and_says_why)
     EXPECT_EQ(results("off")["results"][0]["reason"], "the port is disabled");
 }
 
-TEST_F(Posted_Test_Answers_test, after_a_failure_the_rest_runs_only_if_asked_to)
+TEST_F(Posted_Test_Answers_test, AfterAFailureTheRestRunsOnlyIfAskedTo)
 {
     load("{'failing': ['MemoryTest']}");
     for (const char* id : {"go on", "stop"})
@@ -152,7 +152,7 @@ TEST_F(Posted_Test_Answers_test, after_a_failure_the_rest_runs_only_if_asked_to)
     EXPECT_EQ(results("stop")["state"], "Completed");
 }
 
-TEST_F(Posted_Test_Answers_test, tests_run_one_after_the_other_and_can_be_cancelled)
+TEST_F(Posted_Test_Answers_test, TestsRunOneAfterTheOtherAndCanBeCancelled)
 {
     load("{'milliseconds': 600000}");
     done("postDiagnostics", post("1", "QuickTest", HBA));
@@ -169,7 +169,7 @@ TEST_F(Posted_Test_Answers_test, tests_run_one_after_the_other_and_can_be_cancel
     EXPECT_EQ(refused("cancelTests", named("1")), CONFLICT);
 }
 
-TEST_F(Posted_Test_Answers_test, a_running_test_ends_by_itself)
+TEST_F(Posted_Test_Answers_test, ARunningTestEndsByItself)
 {
     load("{'milliseconds': 5}");
     done("postDiagnostics", post("1", "QuickTest", HBA));
@@ -178,7 +178,7 @@ TEST_F(Posted_Test_Answers_test, a_running_test_ends_by_itself)
     EXPECT_EQ(outcomes("1"), "Comp:Passed");
 }
 
-TEST_F(Posted_Test_Answers_test, an_id_is_known_from_its_first_test_on_and_used_once)
+TEST_F(Posted_Test_Answers_test, AnIdIsKnownFromItsFirstTestOnAndUsedOnce)
 {
     EXPECT_EQ(refused("startTests", start("1")), NOT_FOUND);
     EXPECT_EQ(refused("cancelTests", named("1")), NOT_FOUND);
@@ -194,7 +194,7 @@ TEST_F(Posted_Test_Answers_test, an_id_is_known_from_its_first_test_on_and_used_
     EXPECT_EQ(refused("startTests", start("2")), CONFLICT);
 }
 
-TEST_F(Posted_Test_Answers_test, of_very_many_requests_the_oldest_is_forgotten)
+TEST_F(Posted_Test_Answers_test, OfVeryManyRequestsTheOldestIsForgotten)
 {
     for (int number = 0; number <= 1024; ++number)
         done("postDiagnostics", post(std::to_string(number), "QuickTest", HBA));
@@ -203,7 +203,7 @@ TEST_F(Posted_Test_Answers_test, of_very_many_requests_the_oldest_is_forgotten)
     EXPECT_EQ(results("1024")["state"], "Posted");
 }
 
-TEST_F(Posted_Test_Answers_test, a_diagnostic_port_is_enabled_and_tells_its_results)
+TEST_F(Posted_Test_Answers_test, ADiagnosticPortIsEnabledAndTellsItsResults)
 {
     const std::string enable = "{'requestID': '5', 'portWwn': '10:00:02:4b:4c:10:00:00', 'state': ";
     const char* port = "{'portWwn': '10:00:02:4b:4c:10:00:00'}";
@@ -226,7 +226,7 @@ TEST_F(Posted_Test_Answers_test, a_diagnostic_port_is_enabled_and_tells_its_resu
     EXPECT_EQ(refused("getDPortTestResult", "{'portWwn': 'nowhere'}"), ADDRESS);
 }
 
-TEST_F(Posted_Test_Answers_test, one_of_several_threads_starts_a_request)
+TEST_F(Posted_Test_Answers_test, OneOfSeveralThreadsStartsARequest)
 {
     done("postDiagnostics", post("1", "QuickTest", HBA));
     std::atomic<int> started = 0;

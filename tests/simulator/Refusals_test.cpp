@@ -188,19 +188,19 @@ class Refusals_test : public Simulator_Fixture
 {
 };
 
-TEST_F(Refusals_test, each_mistake_is_told_with_its_line)
+TEST_F(Refusals_test, EachMistakeIsToldWithItsLine)
 {
     for (const Refusal& refusal : refusals)
         EXPECT_EQ(reason_of(simulator, refusal.inventory), std::string("inventory:") + refusal.reason);
 }
 
-TEST_F(Refusals_test, sixty_four_levels_are_not_too_many)
+TEST_F(Refusals_test, SixtyFourLevelsAreNotTooMany)
 {
     std::string text = "{\"answers\": {\"getHost\": " + std::string(62, '[') + std::string(62, ']') + "}}";
     EXPECT_EQ(reason_of(simulator, text), "");
 }
 
-TEST_F(Refusals_test, a_refused_inventory_leaves_no_adapters_and_initialising_says_why)
+TEST_F(Refusals_test, ARefusedInventoryLeavesNoAdaptersAndInitialisingSaysWhy)
 {
     simulator.load_file(inventory("twins.json"));
     const std::string reason = reason_of(simulator, "{\"host\": 7}");
@@ -213,7 +213,7 @@ TEST_F(Refusals_test, a_refused_inventory_leaves_no_adapters_and_initialising_sa
     EXPECT_EQ(call("init_hba_lib", "{'appId': 2}"), json("{'result': 0}"));
 }
 
-TEST_F(Refusals_test, a_refused_file_of_the_environment_is_told_once_on_standard_error)
+TEST_F(Refusals_test, ARefusedFileOfTheEnvironmentIsToldOnceOnStandardError)
 {
     const auto path = std::filesystem::current_path() / ("refused_" + std::to_string(getpid()) + ".json");
     std::ofstream(path) << "{\n\"adapters\": 7}";
@@ -230,7 +230,7 @@ TEST_F(Refusals_test, a_refused_file_of_the_environment_is_told_once_on_standard
     std::filesystem::remove(path);
 }
 
-TEST_F(Refusals_test, a_file_that_cannot_be_read_is_refused)
+TEST_F(Refusals_test, AFileThatCannotBeReadIsRefused)
 {
     const std::pair<std::string, std::string> unreadable[] = {
         {"no/such/file.json", "No such file or directory"},
@@ -240,13 +240,13 @@ TEST_F(Refusals_test, a_file_that_cannot_be_read_is_refused)
         EXPECT_EQ(thrown_text([&] { simulator.load_file(path); }), path + ":0: cannot be read: " + reason);
 }
 
-TEST_F(Refusals_test, an_empty_file_is_no_inventory)
+TEST_F(Refusals_test, AnEmptyFileIsNoInventory)
 {
     EXPECT_EQ(thrown_text([&] { simulator.load_file("/dev/null"); }),
               "/dev/null:1: Syntax error: value, object or array expected.");
 }
 
-TEST_F(Refusals_test, a_fault_that_is_added_is_checked_like_one_of_the_inventory)
+TEST_F(Refusals_test, AFaultThatIsAddedIsCheckedLikeOneOfTheInventory)
 {
     EXPECT_EQ(thrown_text([&] { simulator.add_fault("{\"call\": \"*\",\n\"do\": \"sing\"}"); }),
               "fault:2: unknown fault \"sing\"");

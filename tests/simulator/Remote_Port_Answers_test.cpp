@@ -42,7 +42,7 @@ protected:
     }
 };
 
-TEST_F(Remote_Port_Answers_test, all_that_a_port_sees_is_listed_in_order)
+TEST_F(Remote_Port_Answers_test, AllThatAPortSeesIsListedInOrder)
 {
     EXPECT_EQ(call("getAllRemotePorts", request(fc_port)), json(R"([
         {'remotePortWwn': '50:24:b4:c0:00:a1:00:01', 'remoteNodeWwn': '50:24:b4:c0:00:a1:00:00'},
@@ -52,7 +52,7 @@ TEST_F(Remote_Port_Answers_test, all_that_a_port_sees_is_listed_in_order)
     EXPECT_EQ(call("getAllRemotePorts", request("10:00:02:4B:4C:A1:00:01")), json("[]"));
 }
 
-TEST_F(Remote_Port_Answers_test, the_kinds_of_device_are_told_apart)
+TEST_F(Remote_Port_Answers_test, TheKindsOfDeviceAreToldApart)
 {
     EXPECT_EQ(remote_port(disk_array)["deviceData"],
               json("{'isTarget': true, 'type': 'Disk', 'stateMofValue': 11}"));
@@ -64,7 +64,7 @@ TEST_F(Remote_Port_Answers_test, the_kinds_of_device_are_told_apart)
         'deviceData': {'isTarget': false, 'type': 'Unknown', 'stateMofValue': 11}, 'lunList': []})"));
 }
 
-TEST_F(Remote_Port_Answers_test, a_unit_tells_what_its_author_wrote_padded_as_inquiry_data_is)
+TEST_F(Remote_Port_Answers_test, AUnitTellsWhatItsAuthorWrotePaddedAsInquiryDataIs)
 {
     const Json::Value luns = remote_port(disk_array)["lunList"];
     EXPECT_EQ(luns[0], json(R"({'number': 0, 'vendor': 'KLDR    ', 'productID': 'ARRAY 4000      ',
@@ -76,7 +76,7 @@ TEST_F(Remote_Port_Answers_test, a_unit_tells_what_its_author_wrote_padded_as_in
     EXPECT_EQ(id_types, (std::vector<int>{3, 2, 1, 8, 0, 10, 5}));
 }
 
-TEST_F(Remote_Port_Answers_test, a_unit_may_lack_description_and_serial_number)
+TEST_F(Remote_Port_Answers_test, AUnitMayLackDescriptionAndSerialNumber)
 {
     const Json::Value plain = remote_port("50:24:b4:c0:00:a3:00:01", "10:00:02:4b:4c:a2:00:00")["lunList"][0];
     EXPECT_EQ(plain["number"].asUInt(), 4026531840u);
@@ -88,7 +88,7 @@ TEST_F(Remote_Port_Answers_test, a_unit_may_lack_description_and_serial_number)
     EXPECT_EQ(mixed[1]["lunDescription"], "5024b4c000a40002");
 }
 
-TEST_F(Remote_Port_Answers_test, the_units_alone_can_be_asked_for)
+TEST_F(Remote_Port_Answers_test, TheUnitsAloneCanBeAskedFor)
 {
     EXPECT_EQ(call("getAllLunsByRemotePort", request(fc_port, tape_drive)),
               remote_port(tape_drive)["lunList"]);
@@ -96,7 +96,7 @@ TEST_F(Remote_Port_Answers_test, the_units_alone_can_be_asked_for)
     EXPECT_EQ(error_code(call("getAllLunsByRemotePort", request(fc_port, fc_port))), 2);
 }
 
-TEST_F(Remote_Port_Answers_test, only_the_port_that_sees_a_remote_port_answers_for_it)
+TEST_F(Remote_Port_Answers_test, OnlyThePortThatSeesARemotePortAnswersForIt)
 {
     EXPECT_EQ(error_code(remote_port(disk_array, "10:00:02:4b:4c:a1:00:01")), 2);
     EXPECT_EQ(error_code(remote_port(disk_array, "nowhere")), 2);
@@ -108,7 +108,7 @@ TEST_F(Remote_Port_Answers_test, only_the_port_that_sees_a_remote_port_answers_f
     EXPECT_EQ(error_code(call("getAllRemotePorts", other_logical_port)), 2);
 }
 
-TEST_F(Remote_Port_Answers_test, an_address_that_is_no_text_is_refused)
+TEST_F(Remote_Port_Answers_test, AnAddressThatIsNoTextIsRefused)
 {
     Json::Value strange = request(fc_port, tape_drive);
     strange["rPortWwn"] = Json::Value(Json::objectValue);
@@ -117,7 +117,7 @@ TEST_F(Remote_Port_Answers_test, an_address_that_is_no_text_is_refused)
     EXPECT_EQ(error_code(call("getAllRemotePorts", strange)), 1);
 }
 
-TEST_F(Remote_Port_Answers_test, a_remote_port_needs_no_more_than_an_address)
+TEST_F(Remote_Port_Answers_test, ARemotePortNeedsNoMoreThanAnAddress)
 {
     EXPECT_EQ(written(""), json(R"({'remotePortWwn': '50:24:b4:c0:00:00:00:01',
         'deviceData': {'isTarget': true, 'type': 'Disk', 'stateMofValue': 11}, 'lunList': []})"));
@@ -127,7 +127,7 @@ TEST_F(Remote_Port_Answers_test, a_remote_port_needs_no_more_than_an_address)
          'lunDescIdType': 3}])"));
 }
 
-TEST_F(Remote_Port_Answers_test, what_is_null_is_left_out_and_what_is_extra_joins_unchecked)
+TEST_F(Remote_Port_Answers_test, WhatIsNullIsLeftOutAndWhatIsExtraJoinsUnchecked)
 {
     EXPECT_EQ(written(", 'deviceData': null, 'lunList': null"),
               json("{'remotePortWwn': '50:24:b4:c0:00:00:00:01'}"));
@@ -143,7 +143,7 @@ TEST_F(Remote_Port_Answers_test, what_is_null_is_left_out_and_what_is_extra_join
     EXPECT_EQ(lun["deviceData"], json("[]"));
 }
 
-TEST_F(Remote_Port_Answers_test, several_ports_may_see_one_remote_port_of_the_host)
+TEST_F(Remote_Port_Answers_test, SeveralPortsMaySeeOneRemotePortOfTheHost)
 {
     simulator.load_file(inventory("demo.json"));
     const std::string array = "50:24:b4:c0:00:40:00:01";
@@ -153,7 +153,7 @@ TEST_F(Remote_Port_Answers_test, several_ports_may_see_one_remote_port_of_the_ho
     EXPECT_EQ(error_code(remote_port(array, "10:00:02:4b:4c:20:00:00")), 2);
 }
 
-TEST_F(Remote_Port_Answers_test, a_fault_hits_one_remote_port_by_its_address)
+TEST_F(Remote_Port_Answers_test, AFaultHitsOneRemotePortByItsAddress)
 {
     simulator.add_fault(
         R"({"call": "getCompleteRemotePort", "address": "50:24:b4:c0:00:a2:00:01", "do": "null"})");

@@ -48,7 +48,7 @@ protected:
     Json::Value adapter() { return call("getAdvAdapterData", "{'indexStr': '20:00:02:4b:4c:10:00:00'}"); }
 };
 
-TEST_F(Setting_Answers_test, each_is_told_of_what_has_it)
+TEST_F(Setting_Answers_test, EachIsToldOfWhatHasIt)
 {
     for (const Setting_Case& each : settings) {
         SCOPED_TRACE(each.get);
@@ -57,7 +57,7 @@ TEST_F(Setting_Answers_test, each_is_told_of_what_has_it)
     }
 }
 
-TEST_F(Setting_Answers_test, to_read_one_changes_nothing_that_others_read)
+TEST_F(Setting_Answers_test, ToReadOneChangesNothingThatOthersRead)
 {
     simulator.load_text(
         R"({"host": {"hostModel": null}, "adapters": [{"hbaData": {"hbaMAC": "02:4b:4c:20:00:00"},
@@ -77,7 +77,7 @@ TEST_F(Setting_Answers_test, to_read_one_changes_nothing_that_others_read)
     EXPECT_EQ(read(), before);
 }
 
-TEST_F(Setting_Answers_test, what_is_named_is_set_and_nothing_else)
+TEST_F(Setting_Answers_test, WhatIsNamedIsSetAndNothingElse)
 {
     const Json::Value before = fcoe();
     done("setFcoeByPort", fcoe("{'vlanId': 1003, 'fcoePriority': 5}", "['vlanId']"));
@@ -87,7 +87,7 @@ TEST_F(Setting_Answers_test, what_is_named_is_set_and_nothing_else)
     EXPECT_EQ(call("getFcoeByPort", "{'indexStr': '10:00:02:4b:4c:20:00:01'}")["vlanId"], Json::Value(1002));
 }
 
-TEST_F(Setting_Answers_test, what_is_no_member_or_of_another_kind_is_refused)
+TEST_F(Setting_Answers_test, WhatIsNoMemberOrOfAnotherKindIsRefused)
 {
     const Json::Value before = fcoe();
     EXPECT_EQ(refused("setFcoeByPort", fcoe("{'vlan': 7}", "['vlan']")), REQUEST);
@@ -102,7 +102,7 @@ TEST_F(Setting_Answers_test, what_is_no_member_or_of_another_kind_is_refused)
     EXPECT_EQ(fcoe(), before);
 }
 
-TEST_F(Setting_Answers_test, an_fc_function_is_set_by_name_too)
+TEST_F(Setting_Answers_test, AnFcFunctionIsSetByNameToo)
 {
     const std::string request =
         "{'portWwn': '10:00:02:4b:4c:10:00:00', 'fcPortData': {'topology': 'Loop'}, 'paramsConfigured': ";
@@ -111,7 +111,7 @@ TEST_F(Setting_Answers_test, an_fc_function_is_set_by_name_too)
     EXPECT_EQ(refused("setFcByFcWwn", request + "['speed']}"), REQUEST);
 }
 
-TEST_F(Setting_Answers_test, a_secret_can_be_given_and_is_never_told)
+TEST_F(Setting_Answers_test, ASecretCanBeGivenAndIsNeverTold)
 {
     const Json::Value before = authentication();
     EXPECT_FALSE(before["secretSet"].asBool());
@@ -127,7 +127,7 @@ TEST_F(Setting_Answers_test, a_secret_can_be_given_and_is_never_told)
     EXPECT_EQ(refused("resetPortAuthentication", "{'pPortWwn': 'nowhere'}"), ADDRESS);
 }
 
-TEST_F(Setting_Answers_test, the_mode_and_the_trunk_of_an_adapter_are_kept)
+TEST_F(Setting_Answers_test, TheModeAndTheTrunkOfAnAdapterAreKept)
 {
     EXPECT_EQ(adapter()["adapterMode"], "HBA");
     done("setAdapterMode", "{'indexStr': '20:00:02:4b:4c:10:00:00', 'adapterMode': 'CNA'}");
@@ -151,7 +151,7 @@ TEST_F(Setting_Answers_test, the_mode_and_the_trunk_of_an_adapter_are_kept)
               REQUEST);
 }
 
-TEST_F(Setting_Answers_test, adapters_and_ports_have_an_alias)
+TEST_F(Setting_Answers_test, AdaptersAndPortsHaveAnAlias)
 {
     done("setAdapterAlias", "{'type': 'Node', 'Node': '20:00:02:4b:4c:10:00:00', 'alias': 'upper'}");
     EXPECT_EQ(call("getHbaByWwn", "{'wwn': '20:00:02:4b:4c:10:00:00'}")["hbaData"]["alias"], "upper");
@@ -166,7 +166,7 @@ TEST_F(Setting_Answers_test, adapters_and_ports_have_an_alias)
     EXPECT_EQ(refused("setPortAlias", "{'type': 'Port', 'alias': 'left'}"), REQUEST);
 }
 
-TEST_F(Setting_Answers_test, an_ethernet_port_is_set)
+TEST_F(Setting_Answers_test, AnEthernetPortIsSet)
 {
     const std::string request = "{'mac': '02:4b:4c:20:00:00', 'ethPort': {'mtu': 1500, 'portStatus': false, "
                                 "'wwn': 'a'}, 'propArray': ";
@@ -181,7 +181,7 @@ TEST_F(Setting_Answers_test, an_ethernet_port_is_set)
               ADDRESS);
 }
 
-TEST_F(Setting_Answers_test, an_inventory_may_say_what_is_set)
+TEST_F(Setting_Answers_test, AnInventoryMaySayWhatIsSet)
 {
     simulator.load_text(R"({"adapters": [{"hbaData": {"hbaMAC": "02:4b:4c:20:00:00"},
         "settings": {"advancedAdapter": {"temperature": 71}},
@@ -196,7 +196,7 @@ TEST_F(Setting_Answers_test, an_inventory_may_say_what_is_set)
     EXPECT_FALSE(call("getPortByWwn", "{'wwn': '10:00:02:4b:4c:20:00:00'}").isMember("settings"));
 }
 
-TEST_F(Setting_Answers_test, logs_are_cleared_for_ports_that_are_there)
+TEST_F(Setting_Answers_test, LogsAreClearedForPortsThatAreThere)
 {
     done("clearLogsForPort", "{'propArray': ['10:00:02:4b:4c:10:00:00', '02:4b:4c:20:00:00']}");
     EXPECT_EQ(refused("clearLogsForPort", "{'propArray': ['10:00:02:4b:4c:10:00:00', 'nowhere']}"), ADDRESS);
@@ -204,7 +204,7 @@ TEST_F(Setting_Answers_test, logs_are_cleared_for_ports_that_are_there)
     EXPECT_EQ(refused("clearLogsForPort", "{'propArray': 'all'}"), REQUEST);
 }
 
-TEST_F(Setting_Answers_test, the_host_tells_its_time_and_its_drivers)
+TEST_F(Setting_Answers_test, TheHostTellsItsTimeAndItsDrivers)
 {
     const Json::Value time = call("getServerTime");
     EXPECT_GT(time["seconds"].asInt64(), 1500000000);

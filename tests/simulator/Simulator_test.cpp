@@ -11,7 +11,7 @@ class Simulator_test : public Simulator_Fixture
 {
 };
 
-TEST_F(Simulator_test, records_every_call_with_its_request_in_order)
+TEST_F(Simulator_test, RecordsEveryCallWithItsRequestInOrder)
 {
     version();
     call("init_hba_lib", "{'appId': 2}");
@@ -27,14 +27,14 @@ TEST_F(Simulator_test, records_every_call_with_its_request_in_order)
     EXPECT_TRUE(simulator.calls().empty());
 }
 
-TEST_F(Simulator_test, records_a_call_that_throws)
+TEST_F(Simulator_test, RecordsACallThatThrows)
 {
     simulator.add_fault(R"({"call": "getHost", "do": "throw", "type": "int"})");
     EXPECT_ANY_THROW(call("getHost"));
     EXPECT_EQ(simulator.requests("getHost").size(), 1u);
 }
 
-TEST_F(Simulator_test, forgets_the_oldest_of_very_many_calls)
+TEST_F(Simulator_test, ForgetsTheOldestOfVeryManyCalls)
 {
     call("getServerTime");
     for (int number = 0; number < 65536; ++number)
@@ -43,7 +43,7 @@ TEST_F(Simulator_test, forgets_the_oldest_of_very_many_calls)
     EXPECT_TRUE(simulator.requests("getServerTime").empty());
 }
 
-TEST_F(Simulator_test, keeps_as_many_calls_as_it_is_told)
+TEST_F(Simulator_test, KeepsAsManyCallsAsItIsTold)
 {
     for (const unsigned most : {2U, 1U, 0U}) {
         call("getHost");
@@ -60,7 +60,7 @@ TEST_F(Simulator_test, keeps_as_many_calls_as_it_is_told)
     simulator.keep_calls(65536);
 }
 
-TEST_F(Simulator_test, a_call_that_is_held_lets_the_others_go_on)
+TEST_F(Simulator_test, ACallThatIsHeldLetsTheOthersGoOn)
 {
     simulator.add_fault(R"({"call": "getHost", "do": "hold"})");
     std::atomic<bool> answered = false;
@@ -77,7 +77,7 @@ TEST_F(Simulator_test, a_call_that_is_held_lets_the_others_go_on)
     EXPECT_TRUE(answered);
 }
 
-TEST_F(Simulator_test, clearing_the_faults_lets_go_whom_they_hold)
+TEST_F(Simulator_test, ClearingTheFaultsLetsGoWhomTheyHold)
 {
     simulator.add_fault(R"({"call": "getHost", "do": "hold"})");
     std::thread caller([&] { EXPECT_TRUE(call("getHost").isObject()); });
@@ -86,7 +86,7 @@ TEST_F(Simulator_test, clearing_the_faults_lets_go_whom_they_hold)
     caller.join();
 }
 
-TEST_F(Simulator_test, many_threads_may_call_at_once)
+TEST_F(Simulator_test, ManyThreadsMayCallAtOnce)
 {
     simulator.load_file(inventory("demo.json"));
     const char* wwn = "10:00:02:4b:4c:10:00:00";
@@ -113,14 +113,14 @@ TEST_F(Simulator_test, many_threads_may_call_at_once)
     EXPECT_EQ(simulator.calls().size(), 4u * 200 * 3);
 }
 
-TEST_F(Simulator_test, one_that_is_open_is_found_by_its_bare_name)
+TEST_F(Simulator_test, OneThatIsOpenIsFoundByItsBareName)
 {
     void* library = dlopen("libdzntj.so", RTLD_NOW | RTLD_NOLOAD);
     EXPECT_NE(library, nullptr);
     dlclose(library);
 }
 
-TEST_F(Simulator_test, a_library_or_a_function_that_is_not_there_is_told)
+TEST_F(Simulator_test, ALibraryOrAFunctionThatIsNotThereIsTold)
 {
     EXPECT_THROW(Simulator_Control("no/such/library.so"), std::runtime_error);
     EXPECT_THROW(simulator.symbol<void()>("getNothing"), std::runtime_error);

@@ -41,7 +41,7 @@ protected:
     const std::string port = "10:00:02:4b:4c:10:00:00";
 };
 
-TEST_F(Statistics_Answers_test, counters_come_in_their_authors_order_as_decimal_text)
+TEST_F(Statistics_Answers_test, CountersComeInTheirAuthorsOrderAsDecimalText)
 {
     EXPECT_EQ(written(", 'statistics': [[1626, 5], [1616, 18446744073709551615], [1, '-7'], [1626, 0]]"),
               json(R"([
@@ -49,7 +49,7 @@ TEST_F(Statistics_Answers_test, counters_come_in_their_authors_order_as_decimal_
         {'id': 1626, 'value': '0'}])"));
 }
 
-TEST_F(Statistics_Answers_test, by_default_a_port_counts_what_its_kind_counts_from_zero)
+TEST_F(Statistics_Answers_test, ByDefaultAPortCountsWhatItsKindCountsFromZero)
 {
     const auto ids = [](const Json::Value& answer) {
         std::vector<int> list;
@@ -65,13 +65,13 @@ TEST_F(Statistics_Answers_test, by_default_a_port_counts_what_its_kind_counts_fr
               (std::vector<int>{1601, 1602, 1614, 1615, 1616, 1624, 1625, 1626, 1627, 1628}));
 }
 
-TEST_F(Statistics_Answers_test, a_port_may_tell_nothing)
+TEST_F(Statistics_Answers_test, APortMayTellNothing)
 {
     EXPECT_EQ(written(", 'statistics': null"), json("[]"));
     EXPECT_EQ(written(", 'statistics': []"), json("[]"));
 }
 
-TEST_F(Statistics_Answers_test, figures_stand_still_unless_their_author_lets_them_grow)
+TEST_F(Statistics_Answers_test, FiguresStandStillUnlessTheirAuthorLetsThemGrow)
 {
     const auto before = Clock::now();
     written(", 'statistics': [[1402, 1000], [1403, 1000, 1000000]]");
@@ -87,7 +87,7 @@ TEST_F(Statistics_Answers_test, figures_stand_still_unless_their_author_lets_the
     EXPECT_EQ(value("1402"), "1000");
 }
 
-TEST_F(Statistics_Answers_test, resetting_sets_all_counters_of_the_port_to_zero)
+TEST_F(Statistics_Answers_test, ResettingSetsAllCountersOfThePortToZero)
 {
     simulator.load_file(inventory("rich.json"));
     const Json::Value other = counters("10:00:02:4b:4c:a2:00:00");
@@ -103,7 +103,7 @@ TEST_F(Statistics_Answers_test, resetting_sets_all_counters_of_the_port_to_zero)
     EXPECT_EQ(counters("10:00:02:4b:4c:a2:00:00"), other);
 }
 
-TEST_F(Statistics_Answers_test, what_grows_goes_on_growing_after_a_reset)
+TEST_F(Statistics_Answers_test, WhatGrowsGoesOnGrowingAfterAReset)
 {
     written(", 'statistics': [[1, 'many'], [2, 18446744073709551615, 4000000000]]");
     reset(port);
@@ -113,7 +113,7 @@ TEST_F(Statistics_Answers_test, what_grows_goes_on_growing_after_a_reset)
     EXPECT_EQ(value("1"), "0");
 }
 
-TEST_F(Statistics_Answers_test, only_fc_ports_have_them)
+TEST_F(Statistics_Answers_test, OnlyFcPortsHaveThem)
 {
     simulator.load_file(inventory("demo.json"));
     for (const char* address : {"02:4b:4c:20:00:00", "20:00:02:4b:4c:10:00:00", "nowhere"}) {

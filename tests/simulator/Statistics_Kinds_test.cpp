@@ -71,7 +71,7 @@ class Statistics_Kinds_test : public Agent_Fixture
 {
 };
 
-TEST_F(Statistics_Kinds_test, each_kind_counts_and_is_reset_for_one_thing_alone)
+TEST_F(Statistics_Kinds_test, EachKindCountsAndIsResetForOneThingAlone)
 {
     for (const Statistics_Row& row : table) {
         SCOPED_TRACE(row.get);
@@ -91,20 +91,20 @@ TEST_F(Statistics_Kinds_test, each_kind_counts_and_is_reset_for_one_thing_alone)
     }
 }
 
-TEST_F(Statistics_Kinds_test, a_reset_of_one_kind_leaves_the_others_alone)
+TEST_F(Statistics_Kinds_test, AResetOfOneKindLeavesTheOthersAlone)
 {
     const Json::Value ioc = call("getDynamicIocStatistics", "{'pwwn': '" FC "'}");
     done("resetStatisticsForQos", "{'pPortWwn': '" FC "'}");
     EXPECT_EQ(call("getDynamicIocStatistics", "{'pwwn': '" FC "'}"), ioc);
 }
 
-TEST_F(Statistics_Kinds_test, addresses_are_found_in_any_letter_case)
+TEST_F(Statistics_Kinds_test, AddressesAreFoundInAnyLetterCase)
 {
     const Json::Value counters = call("getDynamicQosStatistics", "{'pPortWwn': '" FC "'}");
     EXPECT_EQ(call("getDynamicQosStatistics", "{'pPortWwn': '10:00:02:4B:4C:10:00:00'}"), counters);
 }
 
-TEST_F(Statistics_Kinds_test, what_has_no_such_counters_is_refused)
+TEST_F(Statistics_Kinds_test, WhatHasNoSuchCountersIsRefused)
 {
     const std::pair<const char*, const char*> wrong[] = {
         {"getDynamicFcoeStatistics", "{'indexStr': '" FC "'}"},
@@ -125,13 +125,13 @@ TEST_F(Statistics_Kinds_test, what_has_no_such_counters_is_refused)
         EXPECT_EQ(refused(name, request), ADDRESS) << name << request;
 }
 
-TEST_F(Statistics_Kinds_test, an_fcoe_function_is_found_by_the_mac_that_it_shares)
+TEST_F(Statistics_Kinds_test, AnFcoeFunctionIsFoundByTheMacThatItShares)
 {
     EXPECT_EQ(call("getDynamicFcoeStatistics", "{'indexStr': '" ETH "'}"),
               call("getDynamicFcoeStatistics", "{'indexStr': '" FCOE "'}"));
 }
 
-TEST_F(Statistics_Kinds_test, what_is_new_counts_from_zero)
+TEST_F(Statistics_Kinds_test, WhatIsNewCountsFromZero)
 {
     const char* request = "{'pPortWwn': '" FC "', 'lPortWwn': '" VPORT "', 'vfId': 0}";
     done("createVport", new_vport());
@@ -168,7 +168,7 @@ protected:
         "{'indexStr': '" FC "', 'lPortWwn': '" FC "', 'rPortWwn': '" ARRAY "'";
 };
 
-TEST_F(Advanced_Io_Data_test, a_reset_takes_in_what_lies_below)
+TEST_F(Advanced_Io_Data_test, AResetTakesInWhatLiesBelow)
 {
     const std::string lun = at_lun;
     EXPECT_EQ(counting(), "plr012");
@@ -180,7 +180,7 @@ TEST_F(Advanced_Io_Data_test, a_reset_takes_in_what_lies_below)
     EXPECT_EQ(counting(), "------");
 }
 
-TEST_F(Advanced_Io_Data_test, a_range_of_luns_is_reset_with_both_its_ends)
+TEST_F(Advanced_Io_Data_test, ARangeOfLunsIsResetWithBothItsEnds)
 {
     const std::string lun = at_lun;
     done("resetDataForAdvIoProf", lun + ", 'lunId': '1', 'endLunRange': '2'}");
@@ -191,7 +191,7 @@ TEST_F(Advanced_Io_Data_test, a_range_of_luns_is_reset_with_both_its_ends)
     EXPECT_EQ(counting(), "plr0--");
 }
 
-TEST_F(Statistics_Kinds_test, threads_may_count_and_reset_at_once)
+TEST_F(Statistics_Kinds_test, ThreadsMayCountAndResetAtOnce)
 {
     std::atomic<int> bad = 0;
     std::vector<std::thread> threads;

@@ -22,7 +22,7 @@ protected:
     Json::Value on_port() { return call("getAllEthPortByEthMac", "{'mac': '02:4b:4c:20:00:00'}"); }
 };
 
-TEST_F(Virtual_Nic_Answers_test, an_adapter_tells_its_functions)
+TEST_F(Virtual_Nic_Answers_test, AnAdapterTellsItsFunctions)
 {
     const Json::Value fc = call("getAdapterPciFnData", "{'indexStr': '20:00:02:4b:4c:10:00:00'}");
     EXPECT_EQ(fc.size(), 2u);
@@ -35,7 +35,7 @@ TEST_F(Virtual_Nic_Answers_test, an_adapter_tells_its_functions)
     EXPECT_EQ(refused("getAdapterPciFnData", "{'indexStr': 'nowhere'}"), ADDRESS);
 }
 
-TEST_F(Virtual_Nic_Answers_test, what_is_created_gets_the_next_function_and_an_address)
+TEST_F(Virtual_Nic_Answers_test, WhatIsCreatedGetsTheNextFunctionAndAnAddress)
 {
     EXPECT_EQ(call("createvNIC", create(1000, 2000).c_str()), json("{'status': 0, 'pciFunctionIndex': 4}"));
     EXPECT_EQ(call("createvNIC", create(0, 10000).c_str())["pciFunctionIndex"].asUInt(), 5u);
@@ -49,7 +49,7 @@ TEST_F(Virtual_Nic_Answers_test, what_is_created_gets_the_next_function_and_an_a
     EXPECT_EQ(refused("getAllEthPortByEthMac", "{'mac': 'nowhere'}"), ADDRESS);
 }
 
-TEST_F(Virtual_Nic_Answers_test, it_counts_for_itself_from_zero)
+TEST_F(Virtual_Nic_Answers_test, ItCountsForItselfFromZero)
 {
     done("createvNIC", create(0, 100));
     const std::string mac = functions()[4]["mac"].asString();
@@ -61,7 +61,7 @@ TEST_F(Virtual_Nic_Answers_test, it_counts_for_itself_from_zero)
     EXPECT_EQ(error_code(call("getDynamicvNICStatistics", json("{'mac': '" + mac + "'}"))), ADDRESS);
 }
 
-TEST_F(Virtual_Nic_Answers_test, bandwidth_is_changed_as_a_whole_or_not_at_all)
+TEST_F(Virtual_Nic_Answers_test, BandwidthIsChangedAsAWholeOrNotAtAll)
 {
     done("createvNIC", create(1000, 2000));
     done("createvNIC", create(1000, 2000));
@@ -85,7 +85,7 @@ TEST_F(Virtual_Nic_Answers_test, bandwidth_is_changed_as_a_whole_or_not_at_all)
     EXPECT_EQ(functions(), before);
 }
 
-TEST_F(Virtual_Nic_Answers_test, a_link_has_so_much_to_promise_and_so_many_functions)
+TEST_F(Virtual_Nic_Answers_test, ALinkHasSoMuchToPromiseAndSoManyFunctions)
 {
     EXPECT_EQ(refused("createvNIC", create(2000, 1000)), CONFLICT);
     EXPECT_EQ(refused("createvNIC", create(0, 10001)), CONFLICT);
@@ -101,7 +101,7 @@ TEST_F(Virtual_Nic_Answers_test, a_link_has_so_much_to_promise_and_so_many_funct
     EXPECT_EQ(refused("createvNIC", create(0, 1)), CONFLICT);
 }
 
-TEST_F(Virtual_Nic_Answers_test, a_ports_own_function_cannot_be_deleted)
+TEST_F(Virtual_Nic_Answers_test, APortsOwnFunctionCannotBeDeleted)
 {
     done("createvNIC", create(0, 1));
     for (const char* doomed : {"[2]", "[4, 4]", "[4, 77]", "['4']"})

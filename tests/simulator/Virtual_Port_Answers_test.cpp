@@ -17,7 +17,7 @@ protected:
     }
 };
 
-TEST_F(Virtual_Port_Answers_test, what_is_created_is_listed_until_it_is_deleted)
+TEST_F(Virtual_Port_Answers_test, WhatIsCreatedIsListedUntilItIsDeleted)
 {
     EXPECT_EQ(list(), json("[]"));
     done("createVport", new_vport());
@@ -33,7 +33,7 @@ TEST_F(Virtual_Port_Answers_test, what_is_created_is_listed_until_it_is_deleted)
     EXPECT_EQ(refused("getVPort", one()), ADDRESS);
 }
 
-TEST_F(Virtual_Port_Answers_test, a_virtual_port_sees_what_its_port_sees)
+TEST_F(Virtual_Port_Answers_test, AVirtualPortSeesWhatItsPortSees)
 {
     EXPECT_EQ(refused("getAllRemotePorts", one()), ADDRESS);
     done("createVport", new_vport());
@@ -42,7 +42,7 @@ TEST_F(Virtual_Port_Answers_test, a_virtual_port_sees_what_its_port_sees)
               3u);
 }
 
-TEST_F(Virtual_Port_Answers_test, an_address_is_given_once_only)
+TEST_F(Virtual_Port_Answers_test, AnAddressIsGivenOnceOnly)
 {
     done("createVport", new_vport());
     for (const char* taken : {vport, "10:01:02:4B:4C:10:00:00", fc_port, fcoe_port, hba})
@@ -52,7 +52,7 @@ TEST_F(Virtual_Port_Answers_test, an_address_is_given_once_only)
     done("createVport", new_vport());
 }
 
-TEST_F(Virtual_Port_Answers_test, what_makes_no_sense_is_refused)
+TEST_F(Virtual_Port_Answers_test, WhatMakesNoSenseIsRefused)
 {
     for (const char* wrong : {"", "10:01", "02:4b:4c:20:00:00", "10:01:02:4b:4c:10:00:0g"})
         EXPECT_EQ(refused("createVport", new_vport(wrong)), REQUEST) << wrong;
@@ -65,7 +65,7 @@ TEST_F(Virtual_Port_Answers_test, what_makes_no_sense_is_refused)
     EXPECT_EQ(list(), json("[]"));
 }
 
-TEST_F(Virtual_Port_Answers_test, deleting_is_all_or_nothing)
+TEST_F(Virtual_Port_Answers_test, DeletingIsAllOrNothing)
 {
     done("createVport", new_vport());
     for (const char* doomed : {"['10:01:02:4b:4c:10:00:00', '10:01:02:4b:4c:10:00:01']",
@@ -77,7 +77,7 @@ TEST_F(Virtual_Port_Answers_test, deleting_is_all_or_nothing)
     EXPECT_EQ(list().size(), 1u);
 }
 
-TEST_F(Virtual_Port_Answers_test, a_port_has_255_of_them)
+TEST_F(Virtual_Port_Answers_test, APortHas255OfThem)
 {
     const auto address = [](int number) {
         char text[24];
@@ -89,7 +89,7 @@ TEST_F(Virtual_Port_Answers_test, a_port_has_255_of_them)
     EXPECT_EQ(refused("createVport", new_vport(address(255))), CONFLICT);
 }
 
-TEST_F(Virtual_Port_Answers_test, one_of_several_threads_gets_the_address)
+TEST_F(Virtual_Port_Answers_test, OneOfSeveralThreadsGetsTheAddress)
 {
     std::atomic<int> created = 0;
     std::vector<std::thread> threads;
@@ -101,7 +101,7 @@ TEST_F(Virtual_Port_Answers_test, one_of_several_threads_gets_the_address)
     EXPECT_EQ(list().size(), 1u);
 }
 
-TEST_F(Virtual_Port_Answers_test, a_new_inventory_has_none)
+TEST_F(Virtual_Port_Answers_test, ANewInventoryHasNone)
 {
     done("createVport", new_vport());
     simulator.load_file(inventory("demo.json"));

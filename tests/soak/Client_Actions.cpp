@@ -68,18 +68,19 @@ void call_agent(Soak_World& world, Random& random)
     const broker::Path_Value service = {
         .name_space = NAME_SPACE,
         .class_name = "KALDERA_AgentService",
-        .keys = {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
-    judge(world, world.server.invoke_method(service, "executeMethod",
-                                            {{"request", broker::Value::text(any_of(requests, random))}}));
+        .keys = {{"Name", broker::Plain_Value::text("Kaldera Agent Service Provider")}}};
+    judge(world,
+          world.server.invoke_method(service, "executeMethod",
+                                     {{"request", broker::Plain_Value::text(any_of(requests, random))}}));
 }
 
 void run_test(Soak_World& world, Random& random)
 {
     if (world.tests.empty() || world.elements.empty())
         return;
-    const broker::Result result =
-        world.server.invoke_method(any_of(world.tests, random), "RunDiagnostic",
-                                   {{"ManagedElement", broker::Value::path(any_of(world.elements, random))}});
+    const broker::Result result = world.server.invoke_method(
+        any_of(world.tests, random), "RunDiagnostic",
+        {{"ManagedElement", broker::Plain_Value::path(any_of(world.elements, random))}});
     judge(world, result);
     world.test_runs += result.ok() && result.return_value.as_uint() == 4096;
 }
@@ -89,9 +90,9 @@ void set_alarm(Soak_World& world, Random& random)
     for (const broker::Path_Value& path : world.paths)
         if (path.class_name == "KALDERA_AlarmDevice") {
             judge(world,
-                  world.server.invoke_method(
-                      path, "SetAlarmState",
-                      {{"RequestedState", broker::Value::unsigned_number(CMPI_uint16, 2 + random() % 2)}}));
+                  world.server.invoke_method(path, "SetAlarmState",
+                                             {{"RequestedState", broker::Plain_Value::unsigned_number(
+                                                                     CMPI_uint16, 2 + random() % 2)}}));
             return;
         }
 }

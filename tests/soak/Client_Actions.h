@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "simulator/Simulator_Control.h"
 
 #include <atomic>
@@ -12,7 +12,7 @@ namespace KPRV {
 /// What the clients of a soak share: the server, the adapter library, and what they have found so far.
 struct Soak_World
 {
-    broker::Host& server;
+    broker::Local_Server& server;
     simulator::Simulator_Control& simulator;
     std::vector<std::string> classes = {};
     std::vector<std::string> associations = {};

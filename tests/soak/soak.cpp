@@ -31,7 +31,7 @@ constexpr double HEAP_SLACK_KIB = 1024;
 /// What the allocator cannot give back between blocks that are still held.
 constexpr double RESIDENT_SLACK_KIB = 8192;
 
-std::string picture_text(broker::Host& server)
+std::string picture_text(broker::Local_Server& server)
 {
     std::string text;
     for (const std::string& name : enumerable_classes(server)) {
@@ -45,13 +45,13 @@ std::string picture_text(broker::Host& server)
     return text;
 }
 
-std::unique_ptr<broker::Host> open_module()
+std::unique_ptr<broker::Local_Server> open_module()
 {
     std::string error;
-    broker::Host_Options options;
+    broker::Server_Options options;
     // Remembered at once, whatever the speed: until they are all there they would be taken for growth.
     options.most_shells = 4096;
-    auto server = broker::Host::open(KLDR_MODULE, options, error);
+    auto server = broker::Local_Server::open(KLDR_MODULE, options, error);
     if (!server)
         std::fprintf(stderr, "soak: %s\n", error.c_str());
     return server;
@@ -74,7 +74,7 @@ std::string fresh_picture(const char* program)
 class Soak
 {
 public:
-    Soak(broker::Host& server, simulator::Simulator_Control& simulator, double seconds)
+    Soak(broker::Local_Server& server, simulator::Simulator_Control& simulator, double seconds)
         : _world{.server = server, .simulator = simulator}, _start(Clock::now()),
           _end(_start + std::chrono::milliseconds(static_cast<long>(seconds * 1000)))
     {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "broker/values/Value_Text.h"
 
 #include <map>
@@ -36,7 +36,7 @@ inline std::vector<std::string> lasting_texts(const broker::Result& result)
 
 /// The classes of a module that have instances or associations to give, but for the two that tell whether an
 /// agent runs on the machine: another test may start one at any moment.
-inline std::vector<std::string> enumerable_classes(broker::Host& server)
+inline std::vector<std::string> enumerable_classes(broker::Local_Server& server)
 {
     std::vector<std::string> names;
     for (const std::string& name : server.catalogue().class_names()) {

@@ -21,7 +21,7 @@ class Arrows(unittest.TestCase):
         self.assertEqual(complaints(lint.check_arrows, "module/model/a.cpp", '#include "module/runtime/b.h"\n#include <json/json.h>\n'), [])
 
     def test_and_nothing_else(self):
-        text = '#include "module/cmpi/b.h"\n#include <cmpidt.h>\n#  include <broker/Host.h>\n'
+        text = '#include "module/cmpi/b.h"\n#include <cmpidt.h>\n#  include <broker/Local_Server.h>\n'
         self.assertEqual(complaints(lint.check_arrows, "module/model/a.cpp", text),
                          [(1, "module/model/ may not include module/cmpi"), (2, "module/model/ may not include contracts/cmpi"),
                           (3, "module/model/ may not include broker")])
@@ -53,11 +53,21 @@ class Heads(unittest.TestCase):
             self.assertEqual(complaints(lint.check_head, "broker/Nobody.cpp", text), [], text)
 
     def test_a_header_speaks_for_its_source(self):
-        self.assertEqual(complaints(lint.check_head, "broker/Host.cpp", ""), [])
+        self.assertEqual(complaints(lint.check_head, "broker/Local_Server.cpp", ""), [])
 
     def test_tests_and_providers_bear_the_names_of_what_they_are_about(self):
         for path in ("tests/broker/Nobody_test.cpp", "module/providers/KALDERA_Nobody_Provider.cpp"):
             self.assertEqual(complaints(lint.check_head, path, ""), [], path)
+
+
+class Names(unittest.TestCase):
+    def test_tests_are_named_in_one_style(self):
+        self.assertEqual(complaints(lint.check_names, "tests/a_test.cpp", "TEST(String, IsEmpty)\nTEST_F(String, is_empty)\n"),
+                         [(2, "a test's name is ThatOfASentence")])
+
+    def test_members_have_their_underscore_in_front(self):
+        self.assertEqual(complaints(lint.check_names, "broker/a.h", "    int _count = 0;\n    std::map<int, int> places_;\n"),
+                         [(2, "places_ is a member: _places")])
 
 
 class Mutexes(unittest.TestCase):

@@ -15,9 +15,9 @@ TEST(Path_Parser, ReadsAllKindsOfKeys)
     EXPECT_EQ("root/kaldera", path->name_space);
     EXPECT_EQ("C_1", path->class_name);
     EXPECT_EQ("a \"b\" \\ A", path->key("text")->as_text());
-    EXPECT_EQ(Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)), *path->key("Big"));
-    EXPECT_EQ(Value::signed_number(CMPI_sint64, -3), *path->key("Low"));
-    EXPECT_EQ(Value::boolean(true), *path->key("Yes"));
+    EXPECT_EQ(Plain_Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)), *path->key("Big"));
+    EXPECT_EQ(Plain_Value::signed_number(CMPI_sint64, -3), *path->key("Low"));
+    EXPECT_EQ(Plain_Value::boolean(true), *path->key("Yes"));
 }
 
 TEST(Path_Parser, ReadsWhatIsWritten)

@@ -5,7 +5,7 @@
 namespace KPRV::broker {
 namespace {
 
-Value read_back(const Value& value)
+Plain_Value read_back(const Plain_Value& value)
 {
     Byte_Writer writer;
     writer.value(value);
@@ -14,44 +14,45 @@ Value read_back(const Value& value)
 
 Path_Value a_path()
 {
-    return {.host = "h",
-            .name_space = "root/x",
-            .class_name = "C",
-            .keys = {{"Id", Value::unsigned_number(CMPI_uint8, 7)},
-                     {"Other", Value::path({.class_name = "D", .keys = {{"K", Value::text("k")}}})}}};
+    return {
+        .host = "h",
+        .name_space = "root/x",
+        .class_name = "C",
+        .keys = {{"Id", Plain_Value::unsigned_number(CMPI_uint8, 7)},
+                 {"Other", Plain_Value::path({.class_name = "D", .keys = {{"K", Plain_Value::text("k")}}})}}};
 }
 
 TEST(Value_Bytes, EachKindOfValueComesBackAsItWas)
 {
-    const Value values[] = {
+    const Plain_Value values[] = {
         {},
-        Value::null_of(CMPI_stringA),
-        Value::boolean(true),
-        Value::boolean(false),
-        Value::text(""),
-        Value::text(std::string("a\0b", 3)),
-        Value::text(std::string(300, 'x')),
-        Value::datetime("20260102030405.000006+060"),
-        Value::unsigned_number(CMPI_char16, 0),
-        Value::unsigned_number(CMPI_uint64, 127),
-        Value::unsigned_number(CMPI_uint64, 128),
-        Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)),
-        Value::signed_number(CMPI_sint8, -1),
-        Value::signed_number(CMPI_sint64, std::int64_t(1) << 63),
-        Value::real(CMPI_real32, -0.5),
-        Value::real(CMPI_real64, 1e300),
-        Value::path(a_path()),
-        Value::instance({.path = a_path(), .properties = {{"P", Value::null_of(CMPI_uint16)}}}),
-        Value::array(CMPI_uint16, {}),
-        Value::array(CMPI_string, {Value::text("a"), Value::null_of(CMPI_string)}),
+        Plain_Value::null_of(CMPI_stringA),
+        Plain_Value::boolean(true),
+        Plain_Value::boolean(false),
+        Plain_Value::text(""),
+        Plain_Value::text(std::string("a\0b", 3)),
+        Plain_Value::text(std::string(300, 'x')),
+        Plain_Value::datetime("20260102030405.000006+060"),
+        Plain_Value::unsigned_number(CMPI_char16, 0),
+        Plain_Value::unsigned_number(CMPI_uint64, 127),
+        Plain_Value::unsigned_number(CMPI_uint64, 128),
+        Plain_Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0)),
+        Plain_Value::signed_number(CMPI_sint8, -1),
+        Plain_Value::signed_number(CMPI_sint64, std::int64_t(1) << 63),
+        Plain_Value::real(CMPI_real32, -0.5),
+        Plain_Value::real(CMPI_real64, 1e300),
+        Plain_Value::path(a_path()),
+        Plain_Value::instance({.path = a_path(), .properties = {{"P", Plain_Value::null_of(CMPI_uint16)}}}),
+        Plain_Value::array(CMPI_uint16, {}),
+        Plain_Value::array(CMPI_string, {Plain_Value::text("a"), Plain_Value::null_of(CMPI_string)}),
     };
-    for (const Value& value : values)
+    for (const Plain_Value& value : values)
         EXPECT_EQ(value, read_back(value)) << value.type << " " << value.data.index();
 }
 
 TEST(Value_Bytes, WhatStandsBehindEachOtherIsReadInThatOrder)
 {
-    const Instance_Value instance = {.path = a_path(), .properties = {{"Name", Value::text("n")}}};
+    const Instance_Value instance = {.path = a_path(), .properties = {{"Name", Plain_Value::text("n")}}};
     Byte_Writer writer;
     writer.number(300);
     writer.instance(instance);

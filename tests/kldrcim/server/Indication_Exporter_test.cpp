@@ -13,31 +13,31 @@ class Listener
 public:
     Delivery take(const std::string& message)
     {
-        const Auto_Lock lock(mutex_);
-        ++attempts_;
-        changed_.notify_all();
-        if (refusals_ > 0) {
-            --refusals_;
+        const Auto_Lock lock(_mutex);
+        ++_attempts;
+        _changed.notify_all();
+        if (_refusals > 0) {
+            --_refusals;
             return Delivery::AGAIN;
         }
-        messages_.push_back(message);
+        _messages.push_back(message);
         return Delivery::DONE;
     }
     void refuse(unsigned count)
     {
-        const Auto_Lock lock(mutex_);
-        refusals_ = count;
+        const Auto_Lock lock(_mutex);
+        _refusals = count;
     }
     void wait_for_attempts(unsigned count)
     {
-        const Auto_Lock lock(mutex_);
-        while (attempts_ < count)
-            changed_.wait(mutex_);
+        const Auto_Lock lock(_mutex);
+        while (_attempts < count)
+            _changed.wait(_mutex);
     }
     std::vector<std::string> messages()
     {
-        const Auto_Lock lock(mutex_);
-        return messages_;
+        const Auto_Lock lock(_mutex);
+        return _messages;
     }
 
     Delivery_Function function()
@@ -48,11 +48,11 @@ public:
     }
 
 private:
-    Standard_Mutex<> mutex_;
-    std::condition_variable_any changed_;
-    std::vector<std::string> messages_ GUARDED_BY(mutex_);
-    unsigned attempts_ GUARDED_BY(mutex_) = 0;
-    unsigned refusals_ GUARDED_BY(mutex_) = 0;
+    Standard_Mutex<> _mutex;
+    std::condition_variable_any _changed;
+    std::vector<std::string> _messages GUARDED_BY(_mutex);
+    unsigned _attempts GUARDED_BY(_mutex) = 0;
+    unsigned _refusals GUARDED_BY(_mutex) = 0;
 };
 
 constexpr Delivery_Patience short_patience{
@@ -107,12 +107,12 @@ TEST(Indication_Exporter, DropsTheOldestOfTooMany)
         "http://l/", "c",
         [&](const std::string& text) { lines += text.find("dropped") != text.npos ? 1 : 0; },
         listener.function(), short_patience);
-    const std::size_t count = Indication_Exporter::most_waiting + 10;
+    const std::size_t count = Indication_Exporter::MOST_WAITING + 10;
     for (std::size_t i = 0; i < count; ++i)
         exporter.put({{.class_name = "Alert"}, {}});
     EXPECT_EQ(1U, lines);
     listener.refuse(0);
-    while (listener.messages().size() < Indication_Exporter::most_waiting)
+    while (listener.messages().size() < Indication_Exporter::MOST_WAITING)
         std::this_thread::yield();
     EXPECT_TRUE(has_number(listener.messages()[0], 0)) << "on its way when it became too many";
     EXPECT_TRUE(has_number(listener.messages()[1], 11));

@@ -44,7 +44,7 @@ TEST(Pull_Contexts, ForgetsWhatNobodyAsksFor)
 TEST(Pull_Contexts, AreBounded)
 {
     Pull_Contexts contexts;
-    for (std::size_t i = 0; i < Pull_Contexts::most; ++i)
+    for (std::size_t i = 0; i < Pull_Contexts::MOST; ++i)
         EXPECT_NE("", contexts.put(context(), start));
     EXPECT_EQ("", contexts.put(context(), start));
     EXPECT_NE("", contexts.put(context(), start + std::chrono::seconds(10)));

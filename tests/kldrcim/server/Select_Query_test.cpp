@@ -10,34 +10,34 @@ protected:
     static Instance_Value alert()
     {
         Instance_Value port{{.class_name = "Port"},
-                            {{"OperationalStatus", Value::unsigned_number(CMPI_uint16, 2)}}};
+                            {{"OperationalStatus", Plain_Value::unsigned_number(CMPI_uint16, 2)}}};
         return {{.class_name = "Alert"},
-                {{"MessageID", Value::text("FC'1")},
-                 {"Severity", Value::unsigned_number(CMPI_uint16, 5)},
-                 {"Change", Value::signed_number(CMPI_sint32, -3)},
-                 {"Part", Value::real(CMPI_real64, 0.5)},
-                 {"Large", Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0))},
-                 {"Good", Value::boolean(true)},
-                 {"Nothing", Value::null_of(CMPI_string)},
-                 {"SequenceNumber", Value::signed_number(CMPI_sint64, 1)},
-                 {"SourceInstance", Value::instance(port)}}};
+                {{"MessageID", Plain_Value::text("FC'1")},
+                 {"Severity", Plain_Value::unsigned_number(CMPI_uint16, 5)},
+                 {"Change", Plain_Value::signed_number(CMPI_sint32, -3)},
+                 {"Part", Plain_Value::real(CMPI_real64, 0.5)},
+                 {"Large", Plain_Value::unsigned_number(CMPI_uint64, ~std::uint64_t(0))},
+                 {"Good", Plain_Value::boolean(true)},
+                 {"Nothing", Plain_Value::null_of(CMPI_string)},
+                 {"SequenceNumber", Plain_Value::signed_number(CMPI_sint64, 1)},
+                 {"SourceInstance", Plain_Value::instance(port)}}};
     }
 
     bool matches(const std::string& condition)
     {
-        const auto query = Select_Query::parse("SELECT * FROM Alert WHERE " + condition, "WQL", error_);
-        EXPECT_TRUE(query) << condition << ": " << error_.text;
-        return query && query->matches(alert(), classes_);
+        const auto query = Select_Query::parse("SELECT * FROM Alert WHERE " + condition, "WQL", _error);
+        EXPECT_TRUE(query) << condition << ": " << _error.text;
+        return query && query->matches(alert(), _classes);
     }
     std::string refusal(const std::string& text, const std::string& language = "WQL")
     {
-        error_ = {};
-        EXPECT_FALSE(Select_Query::parse(text, language, error_)) << text;
-        return std::to_string(error_.rc) + " " + error_.text;
+        _error = {};
+        EXPECT_FALSE(Select_Query::parse(text, language, _error)) << text;
+        return std::to_string(_error.rc) + " " + _error.text;
     }
 
-    const No_Catalogue classes_;
-    Query_Error error_;
+    const No_Catalogue _classes;
+    Query_Error _error;
 };
 
 TEST_F(Select_Query_Test, NamesWhatTheClassHasNot)
@@ -46,8 +46,8 @@ TEST_F(Select_Query_Test, NamesWhatTheClassHasNot)
     for (const char* name : {"MessageID", "SourceInstance"})
         info.properties.emplace_back().name = name;
     const auto unknown = [&](const char* text) {
-        const auto query = Select_Query::parse(text, "WQL", error_);
-        return query ? query->unknown_property(info) : error_.text;
+        const auto query = Select_Query::parse(text, "WQL", _error);
+        return query ? query->unknown_property(info) : _error.text;
     };
     EXPECT_EQ("", unknown("SELECT * FROM Alert"));
     EXPECT_EQ("",
@@ -140,14 +140,14 @@ TEST_F(Select_Query_Test, IsBounded)
 
 TEST_F(Select_Query_Test, ProjectsButKeepsTheSequence)
 {
-    const auto query = Select_Query::parse("select messageid, Good from Alert", "CIM:CQL", error_);
+    const auto query = Select_Query::parse("select messageid, Good from Alert", "CIM:CQL", _error);
     ASSERT_TRUE(query);
     Instance_Value instance = alert();
     query->project(instance);
     ASSERT_EQ(3U, instance.properties.size());
     EXPECT_TRUE(instance.property("SequenceNumber"));
     instance.path.class_name = "Other";
-    EXPECT_FALSE(query->matches(instance, classes_));
+    EXPECT_FALSE(query->matches(instance, _classes));
 }
 
 } // namespace KPRV::kldrcim

@@ -16,7 +16,7 @@ protected:
     {
         std::string out;
         Xml_Writer writer(out);
-        write_class(writer, classes_, *classes_.find(name), form);
+        write_class(writer, _classes, *_classes.find(name), form);
         return out;
     }
     static Class_Info read(const std::string& text)
@@ -35,13 +35,13 @@ protected:
                 << a[i].name;
     }
 
-    const Toy_Classes classes_;
+    const Toy_Classes _classes;
 };
 
 TEST_F(Class_Xml, ComesBackAsItWas)
 {
-    for (const std::string& name : classes_.class_names()) {
-        const Class_Info& info = *classes_.find(name);
+    for (const std::string& name : _classes.class_names()) {
+        const Class_Info& info = *_classes.find(name);
         const Class_Info again = read(written(name, {.local_only = false}));
         EXPECT_EQ(info.name, again.name);
         EXPECT_EQ(info.superclass, again.superclass);

@@ -11,7 +11,7 @@ protected:
             return reader.parameter(node, declared);
         });
     }
-    Value key(const std::string& class_name, const std::string& attributes, const std::string& text)
+    Plain_Value key(const std::string& class_name, const std::string& attributes, const std::string& text)
     {
         return path_of("<INSTANCENAME CLASSNAME='" + class_name + "'><KEYBINDING NAME='Size'><KEYVALUE " +
                        attributes + ">" + text + "</KEYVALUE></KEYBINDING></INSTANCENAME>")
@@ -51,7 +51,7 @@ TEST_F(Instance_Reading, TakesBothSpellingsOfEmbeddedObject)
 TEST_F(Instance_Reading, BoundsInstancesInInstances)
 {
     Instance_Value instance{{.class_name = "A"}, {}};
-    const auto wrap = [&] { instance = {{.class_name = "A"}, {{"E", Value::instance(instance)}}}; };
+    const auto wrap = [&] { instance = {{.class_name = "A"}, {{"E", Plain_Value::instance(instance)}}}; };
     const auto read_again = [&] { instance_of(instance_text(instance)); };
     // Each level escapes the text once more, so that it doubles.
     for (int i = 0; i < 16; ++i)
@@ -127,7 +127,7 @@ TEST_F(Instance_Reading, RefusesWhatLacksAPart)
 
 TEST_F(Instance_Reading, TypesParametersByTheirMethod)
 {
-    const Method_Info& grow = *classes_.find("Toy_Ball")->method("Grow");
+    const Method_Info& grow = *_classes.find("Toy_Ball")->method("Grow");
     const auto by = [&](const std::string& text) { return parameter_of(text, grow.parameter("By")).value; };
     EXPECT_EQ(CMPI_sint16, by("<PARAMVALUE NAME='by'><VALUE>-5</VALUE></PARAMVALUE>").type);
     EXPECT_EQ(-5, by("<PARAMVALUE NAME='By' PARAMTYPE='uint8'><VALUE>-5</VALUE></PARAMVALUE>").as_sint());

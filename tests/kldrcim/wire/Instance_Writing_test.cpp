@@ -18,10 +18,11 @@ TEST_F(Instance_Writing, IsReadAsItWas)
 
 TEST_F(Instance_Writing, IsForOldClients)
 {
-    const Instance_Value inner{{.class_name = "B"}, {{"t", Value::text("\"<")}}};
-    const Instance_Value instance{
-        {.class_name = "A"},
-        {{"N", Value::null_of(CMPI_uint8)}, {"E", Value::instance(inner)}, {"F", Value::null_of(CMPI_ref)}}};
+    const Instance_Value inner{{.class_name = "B"}, {{"t", Plain_Value::text("\"<")}}};
+    const Instance_Value instance{{.class_name = "A"},
+                                  {{"N", Plain_Value::null_of(CMPI_uint8)},
+                                   {"E", Plain_Value::instance(inner)},
+                                   {"F", Plain_Value::null_of(CMPI_ref)}}};
     EXPECT_EQ(
         "<INSTANCE CLASSNAME=\"A\"><PROPERTY NAME=\"N\" TYPE=\"uint8\"></PROPERTY>"
         "<PROPERTY NAME=\"E\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>"
@@ -35,7 +36,7 @@ TEST_F(Instance_Writing, HasTheWantedPropertiesOnly)
 {
     const Instance_Value instance{
         {.class_name = "Toy_Ball"},
-        {{"Name", Value::text("n")}, {"Size", Value::unsigned_number(CMPI_uint8, 1)}}};
+        {{"Name", Plain_Value::text("n")}, {"Size", Plain_Value::unsigned_number(CMPI_uint8, 1)}}};
     EXPECT_EQ("<INSTANCE CLASSNAME=\"Toy_Ball\"></INSTANCE>",
               instance_text(instance, {.properties = std::vector<std::string>()}));
     EXPECT_EQ(
@@ -45,7 +46,7 @@ TEST_F(Instance_Writing, HasTheWantedPropertiesOnly)
     EXPECT_EQ(
         "<INSTANCE CLASSNAME=\"Toy_Ball\"><PROPERTY NAME=\"Name\" TYPE=\"string\" CLASSORIGIN=\"Toy_Base\">"
         "<VALUE>n</VALUE></PROPERTY></INSTANCE>",
-        instance_text(instance, {.seen_as = classes_.find("Toy_Base"), .origins = &classes_}));
+        instance_text(instance, {.seen_as = _classes.find("Toy_Base"), .origins = &_classes}));
 }
 
 TEST_F(Instance_Writing, KeepsPaths)
@@ -84,7 +85,7 @@ TEST_F(Instance_Writing, KeepsParameters)
     }
     EXPECT_EQ("<RETURNVALUE PARAMTYPE=\"uint32\"><VALUE>0</VALUE></RETURNVALUE>",
               written([](Xml_Writer& writer) {
-                  write_return_value(writer, Value::unsigned_number(CMPI_uint32, 0));
+                  write_return_value(writer, Plain_Value::unsigned_number(CMPI_uint32, 0));
               }));
 }
 

@@ -20,14 +20,14 @@ public:
             info.type = static_cast<CMPIType>(type);
             info.key = key;
             info.target_class = target;
-            info.default_value = Value::null_of(info.type);
+            info.default_value = Plain_Value::null_of(info.type);
             return info;
         };
         const Feature_Info name = feature("Name", CMPI_string, true);
         const Feature_Info size = feature("Size", CMPI_uint8, true);
         const Feature_Info parts = feature("Parts", CMPI_instance | CMPI_ARRAY, false, "Toy_Base");
         Feature_Info color = feature("Color", CMPI_string);
-        color.default_value = Value::text("red & <blue>");
+        color.default_value = Plain_Value::text("red & <blue>");
         Method_Info grow;
         grow.name = "Grow";
         grow.is_static = true;
@@ -40,14 +40,14 @@ public:
         add("Toy_Ball", "Toy_Base", {name, size, color, parts}, {grow});
         add("Toy_Link", "",
             {feature("From", CMPI_ref, true, "Toy_Base"), feature("To", CMPI_ref, true, "Toy_Base")}, {});
-        classes_.back().is_association = true;
+        _classes.back().is_association = true;
         // What a class declares anew is another thing than what it inherits.
         add("Toy_Ball_Link", "Toy_Link",
             {feature("From", CMPI_ref, true, "Toy_Base"), feature("To", CMPI_ref, true, "Toy_Ball")}, {});
-        classes_.back().is_association = true;
+        _classes.back().is_association = true;
         Method_Info shrink = grow;
         shrink.parameters.pop_back();
-        color.default_value = Value::text("blue");
+        color.default_value = Plain_Value::text("blue");
         add("Toy_Small_Ball", "Toy_Ball", {name, size, color, parts}, {shrink});
         // Those have words, which the catalogue knows by class and name.
         add("CIM_EnabledLogicalElement", "", {feature("EnabledState", CMPI_uint16)}, {});
@@ -58,13 +58,13 @@ public:
     std::vector<std::string> class_names() const override
     {
         std::vector<std::string> names;
-        for (const Class_Info& info : classes_)
+        for (const Class_Info& info : _classes)
             names.push_back(info.name);
         return names;
     }
     const Class_Info* find(std::string_view name) const override
     {
-        for (const Class_Info& info : classes_)
+        for (const Class_Info& info : _classes)
             if (same_name(info.name, name))
                 return &info;
         return nullptr;
@@ -81,10 +81,10 @@ private:
         info.has_provider = true;
         info.properties = std::move(properties);
         info.methods = std::move(methods);
-        classes_.push_back(std::move(info));
+        _classes.push_back(std::move(info));
     }
 
-    std::deque<Class_Info> classes_;
+    std::deque<Class_Info> _classes;
 };
 
 } // namespace KPRV::kldrcim

@@ -8,7 +8,7 @@ namespace KPRV::kldrcim {
 
 namespace {
 
-Value read(std::string_view text, int type)
+Plain_Value read(std::string_view text, int type)
 {
     return value_of_wire_text(text, static_cast<CMPIType>(type));
 }
@@ -59,17 +59,17 @@ TEST(Wire_Text, ReadsBooleansInAnyCase)
     EXPECT_TRUE(read("TRUE", CMPI_boolean).as_bool());
     EXPECT_FALSE(read(" false ", CMPI_boolean).as_bool());
     expect_refused("1", CMPI_boolean);
-    EXPECT_EQ("FALSE", wire_text(Value::boolean(false)));
+    EXPECT_EQ("FALSE", wire_text(Plain_Value::boolean(false)));
 }
 
 TEST(Wire_Text, KeepsReals)
 {
     for (const double number : {0.0, 1.0, -1.5, 0.1, 1e300, 5e-324, 123456789.125})
-        EXPECT_EQ(number, read(wire_text(Value::real(CMPI_real64, number)), CMPI_real64).as_real());
-    EXPECT_EQ("0.1", wire_text(Value::real(CMPI_real32, 0.1F)));
-    EXPECT_EQ("1.0", wire_text(Value::real(CMPI_real64, 1)));
-    EXPECT_EQ("1.0e+300", wire_text(Value::real(CMPI_real64, 1e300)));
-    EXPECT_EQ("-INF", wire_text(Value::real(CMPI_real32, -INFINITY)));
+        EXPECT_EQ(number, read(wire_text(Plain_Value::real(CMPI_real64, number)), CMPI_real64).as_real());
+    EXPECT_EQ("0.1", wire_text(Plain_Value::real(CMPI_real32, 0.1F)));
+    EXPECT_EQ("1.0", wire_text(Plain_Value::real(CMPI_real64, 1)));
+    EXPECT_EQ("1.0e+300", wire_text(Plain_Value::real(CMPI_real64, 1e300)));
+    EXPECT_EQ("-INF", wire_text(Plain_Value::real(CMPI_real32, -INFINITY)));
     EXPECT_TRUE(std::isnan(read("NaN", CMPI_real32).as_real()));
     EXPECT_EQ(INFINITY, read("+INF", CMPI_real64).as_real());
     expect_refused("1e39", CMPI_real32);
@@ -80,7 +80,8 @@ TEST(Wire_Text, KeepsReals)
 TEST(Wire_Text, TakesOneUnitForChar16)
 {
     for (const unsigned unit : {0x61U, 0xE4U, 0x20ACU})
-        EXPECT_EQ(unit, read(wire_text(Value::unsigned_number(CMPI_char16, unit)), CMPI_char16).as_uint());
+        EXPECT_EQ(unit,
+                  read(wire_text(Plain_Value::unsigned_number(CMPI_char16, unit)), CMPI_char16).as_uint());
     for (const char* text : {"ab", "", "\xF0\x9F\x98\x80"})
         expect_refused(text, CMPI_char16);
 }

@@ -7,7 +7,7 @@
 
 using namespace KPRV;
 
-TEST(Adapter_List, is_asked_for_with_a_null_request)
+TEST(Adapter_List, IsAskedForWithANullRequest)
 {
     Fake_Library library;
     library.answers("getAllAdaptersIndexString", json("{'indexStrings': ['a', 'b']}"));
@@ -18,7 +18,7 @@ TEST(Adapter_List, is_asked_for_with_a_null_request)
     EXPECT_EQ(library.told(), Lines{"getAllAdaptersIndexString null"});
 }
 
-TEST(Adapter_List, a_bad_answer_is_told_as_the_callers_line)
+TEST(Adapter_List, ABadAnswerIsToldAsTheCallersLine)
 {
     Fake_Library library;
     Log_Capture log;
@@ -35,7 +35,7 @@ TEST(Adapter_List, a_bad_answer_is_told_as_the_callers_line)
     EXPECT_NE(query_adapter_list(LOG_HERE, response), nullptr);
 }
 
-TEST(Adapter_List, the_library_s_exceptions_pass)
+TEST(Adapter_List, TheLibrarySExceptionsPass)
 {
     Fake_Library library;
     library.throws("getAllAdaptersIndexString", HbaAgentError{1, "x"});
@@ -43,7 +43,7 @@ TEST(Adapter_List, the_library_s_exceptions_pass)
     EXPECT_THROW(query_adapter_list(LOG_HERE, response), HbaAgentError);
 }
 
-TEST(Adapter_List, an_address_that_is_no_text_is_empty)
+TEST(Adapter_List, AnAddressThatIsNoTextIsEmpty)
 {
     Log_Capture log;
     const Json::Value list = json("['a', 5]");

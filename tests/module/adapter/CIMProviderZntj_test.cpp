@@ -42,7 +42,7 @@ void expect_symbols(void* library)
 
 } // namespace
 
-TEST(CIMProviderZntj, without_a_library_every_variable_holds_its_stub)
+TEST(CIMProviderZntj, WithoutALibraryEveryVariableHoldsItsStub)
 {
     in_child([] {
         Log_Capture log;
@@ -59,7 +59,7 @@ TEST(CIMProviderZntj, without_a_library_every_variable_holds_its_stub)
     });
 }
 
-TEST(CIMProviderZntj, the_stubs_answer_as_a_failure)
+TEST(CIMProviderZntj, TheStubsAnswerAsAFailure)
 {
     EXPECT_TRUE(default_JsonReqFP(Json::Value(5)).isNull());
     default_JsonReqVoidFP(Json::Value());
@@ -71,7 +71,7 @@ TEST(CIMProviderZntj, the_stubs_answer_as_a_failure)
     EXPECT_FALSE(ProviderUtil::isValidJsonResponse(default_JsonReqFP(Json::Value())));
 }
 
-TEST(CIMProviderZntj, there_are_117_entry_points)
+TEST(CIMProviderZntj, ThereAre117EntryPoints)
 {
     int count = 0, json = 0;
 #define ENTRY_POINT(symbol, variable, signature)                                                             \
@@ -83,7 +83,7 @@ TEST(CIMProviderZntj, there_are_117_entry_points)
     EXPECT_EQ(json, 111);
 }
 
-TEST(CIMProviderZntj, a_library_is_found_by_its_bare_name_and_fills_every_variable)
+TEST(CIMProviderZntj, ALibraryIsFoundByItsBareNameAndFillsEveryVariable)
 {
     in_child([] {
         void* library = preload(WHOLE_LIBRARY);
@@ -99,7 +99,7 @@ TEST(CIMProviderZntj, a_library_is_found_by_its_bare_name_and_fills_every_variab
     });
 }
 
-TEST(CIMProviderZntj, a_missing_symbol_leaves_its_variable_null)
+TEST(CIMProviderZntj, AMissingSymbolLeavesItsVariableNull)
 {
     in_child([] {
         preload(LACKING_LIBRARY);

@@ -47,14 +47,14 @@ struct Child_Program : testing::Test
 
 } // namespace
 
-TEST_F(Child_Program, gets_its_words)
+TEST_F(Child_Program, GetsItsWords)
 {
     programs.program("program");
     EXPECT_EQ(run({"program", "a b", "", "$(c)"}), 0);
     EXPECT_EQ(programs.runs(), Lines{"program [a b] [] [$(c)]"});
 }
 
-TEST_F(Child_Program, tells_how_it_ended)
+TEST_F(Child_Program, TellsHowItEnded)
 {
     programs.program("program", "exit 3");
     EXPECT_EQ(run({"program"}), 3 << 8);
@@ -62,7 +62,7 @@ TEST_F(Child_Program, tells_how_it_ended)
     EXPECT_EQ(run({"program"}), SIGKILL);
 }
 
-TEST_F(Child_Program, that_is_not_there_or_no_program_ends_as_in_a_shell)
+TEST_F(Child_Program, ThatIsNotThereOrNoProgramEndsAsInAShell)
 {
     EXPECT_EQ(run({"program"}), 127 << 8);
     Temp_Folder one, two;
@@ -73,7 +73,7 @@ TEST_F(Child_Program, that_is_not_there_or_no_program_ends_as_in_a_shell)
     EXPECT_EQ(run({"program"}), 5 << 8) << "a later folder may have one";
 }
 
-TEST_F(Child_Program, is_looked_for_where_the_search_path_says)
+TEST_F(Child_Program, IsLookedForWhereTheSearchPathSays)
 {
     Temp_Folder here;
     here.write("program", "#!/bin/sh\nexit 7\n", true);
@@ -89,7 +89,7 @@ TEST_F(Child_Program, is_looked_for_where_the_search_path_says)
     });
 }
 
-TEST_F(Child_Program, of_a_server_that_ignores_its_children_tells_how_it_ended)
+TEST_F(Child_Program, OfAServerThatIgnoresItsChildrenTellsHowItEnded)
 {
     programs.program("good");
     programs.program("bad", "exit 9");
@@ -103,7 +103,7 @@ TEST_F(Child_Program, of_a_server_that_ignores_its_children_tells_how_it_ended)
     });
 }
 
-TEST_F(Child_Program, of_a_server_that_waits_for_all_children_tells_how_it_ended)
+TEST_F(Child_Program, OfAServerThatWaitsForAllChildrenTellsHowItEnded)
 {
     programs.program("good");
     programs.program("bad", "exit 9");
@@ -121,7 +121,7 @@ TEST_F(Child_Program, of_a_server_that_waits_for_all_children_tells_how_it_ended
     });
 }
 
-TEST_F(Child_Program, leaves_no_zombie)
+TEST_F(Child_Program, LeavesNoZombie)
 {
     programs.program("program");
     in_child([] {
@@ -131,7 +131,7 @@ TEST_F(Child_Program, leaves_no_zombie)
     });
 }
 
-TEST_F(Child_Program, finds_signals_as_at_the_start_of_a_process)
+TEST_F(Child_Program, FindsSignalsAsAtTheStartOfAProcess)
 {
     // The shell has no say in these two: it takes over what it finds.
     programs.program("program", into_seen(R"(while read name value; do
@@ -151,7 +151,7 @@ TEST_F(Child_Program, finds_signals_as_at_the_start_of_a_process)
     EXPECT_EQ(seen(), (Lines{"SigBlk: 0000000000000000", "SigIgn: 0000000000000000"}));
 }
 
-TEST_F(Child_Program, finds_no_descriptor_but_standard_ones_and_no_input)
+TEST_F(Child_Program, FindsNoDescriptorButStandardOnesAndNoInput)
 {
     // The shell itself holds its script and the folder open, and nothing else.
     programs.program("program", into_seen(R"({
@@ -172,7 +172,7 @@ TEST_F(Child_Program, finds_no_descriptor_but_standard_ones_and_no_input)
     EXPECT_EQ(seen(), (Lines{"0", "1", "2", "no input"}));
 }
 
-TEST_F(Child_Program, writes_where_the_server_writes)
+TEST_F(Child_Program, WritesWhereTheServerWrites)
 {
     programs.program("program", "echo output; echo errors >&2");
     in_child([&] {
@@ -188,7 +188,7 @@ TEST_F(Child_Program, writes_where_the_server_writes)
     EXPECT_EQ(seen(), (Lines{"output", "errors"}));
 }
 
-TEST_F(Child_Program, of_a_server_without_standard_descriptors_has_them)
+TEST_F(Child_Program, OfAServerWithoutStandardDescriptorsHasThem)
 {
     programs.program("program", "echo lost; echo lost >&2; { [ -e /proc/$$/fd/1 ] && [ -e /proc/$$/fd/2 ] && "
                                 "echo both; } > " +
@@ -208,7 +208,7 @@ TEST_F(Child_Program, of_a_server_without_standard_descriptors_has_them)
     EXPECT_EQ(seen(), Lines{"both"});
 }
 
-TEST_F(Child_Program, cannot_be_run_where_no_descriptor_is_free)
+TEST_F(Child_Program, CannotBeRunWhereNoDescriptorIsFree)
 {
     programs.program("program");
     in_child([] {

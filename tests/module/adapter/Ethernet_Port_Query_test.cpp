@@ -20,7 +20,7 @@ struct Ethernet_Port_Query : testing::Test
 
 } // namespace
 
-TEST_F(Ethernet_Port_Query, asks_by_mac_in_index_form)
+TEST_F(Ethernet_Port_Query, AsksByMacInIndexForm)
 {
     library.answers("getEthPortByEthMac", json("{'ethData': {'ethDev': 'eth0'}}"));
     EXPECT_EQ(query(), 0);
@@ -30,7 +30,7 @@ TEST_F(Ethernet_Port_Query, asks_by_mac_in_index_form)
     EXPECT_EQ(log.traces(), (Lines{"DBG Entering: getEthPortDetails", "DBG Returning: getEthPortDetails"}));
 }
 
-TEST_F(Ethernet_Port_Query, a_bad_answer_is_minus_1)
+TEST_F(Ethernet_Port_Query, ABadAnswerIsMinus1)
 {
     for (const char* answer : {"null", "{}", "[]", "{'ethData': 5}", "{'ethData': {}, 'error': 0}"}) {
         library.answers("getEthPortByEthMac", json(answer));
@@ -40,7 +40,7 @@ TEST_F(Ethernet_Port_Query, a_bad_answer_is_minus_1)
     EXPECT_EQ(log.lines()[0].file, "Ethernet_Port_Query_test.cpp");
 }
 
-TEST_F(Ethernet_Port_Query, an_exception_is_minus_1)
+TEST_F(Ethernet_Port_Query, AnExceptionIsMinus1)
 {
     library.throws("getEthPortByEthMac", HbaAgentError{7, "busy"});
     EXPECT_EQ(query(), -1);
@@ -54,7 +54,7 @@ TEST_F(Ethernet_Port_Query, an_exception_is_minus_1)
     EXPECT_EQ(library.calls.size(), 3u);
 }
 
-TEST_F(Ethernet_Port_Query, an_address_too_short_is_minus_1)
+TEST_F(Ethernet_Port_Query, AnAddressTooShortIsMinus1)
 {
     EXPECT_EQ(query("8"), -1);
     EXPECT_EQ(query(""), -1);

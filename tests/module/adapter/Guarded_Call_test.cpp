@@ -27,7 +27,7 @@ struct Guarded_Call : testing::Test
 
 } // namespace
 
-TEST_F(Guarded_Call, hands_over_request_and_answer)
+TEST_F(Guarded_Call, HandsOverRequestAndAnswer)
 {
     library.answers("getPortByWwn", json("{'a': 1}"));
     EXPECT_TRUE(call({"libGetPortByWwn"}));
@@ -36,7 +36,7 @@ TEST_F(Guarded_Call, hands_over_request_and_answer)
     EXPECT_EQ(log.said(), Lines{});
 }
 
-TEST_F(Guarded_Call, an_exception_leaves_null_and_a_line_of_the_caller)
+TEST_F(Guarded_Call, AnExceptionLeavesNullAndALineOfTheCaller)
 {
     library.throws("getPortByWwn", HbaAgentError{-7, "busy"});
     EXPECT_FALSE(call({"libGetPortByWwn"}));
@@ -51,7 +51,7 @@ TEST_F(Guarded_Call, an_exception_leaves_null_and_a_line_of_the_caller)
     EXPECT_EQ(log.lines().front().file, "Guarded_Call_test.cpp");
 }
 
-TEST_F(Guarded_Call, an_address_starts_each_text)
+TEST_F(Guarded_Call, AnAddressStartsEachText)
 {
     const Guarded_Entry entry = {"libGetHbaByWwn", "10:00"};
     library.throws("getPortByWwn", HbaAgentError{7, "busy"});
@@ -65,7 +65,7 @@ TEST_F(Guarded_Call, an_address_starts_each_text)
                                  "ERR 10:00 - libGetHbaByWwn got default exception"}));
 }
 
-TEST_F(Guarded_Call, the_third_text_can_end_in_its_address)
+TEST_F(Guarded_Call, TheThirdTextCanEndInItsAddress)
 {
     library.throws("getPortByWwn", 5);
     call({"libGetPortByWwn", "10:00", "10:00"});
@@ -79,7 +79,7 @@ TEST_F(Guarded_Call, the_third_text_can_end_in_its_address)
 
 // As hardware tests run: what the C library keeps of such a thread is not what it keeps of one that is
 // joined.
-TEST_F(Guarded_Call, does_not_hold_up_a_detached_thread_that_ends)
+TEST_F(Guarded_Call, DoesNotHoldUpADetachedThreadThatEnds)
 {
     static std::atomic<bool> is_unwound;
     is_unwound = false;
@@ -107,7 +107,7 @@ TEST_F(Guarded_Call, does_not_hold_up_a_detached_thread_that_ends)
     EXPECT_EQ(log.said(), Lines{});
 }
 
-TEST_F(Guarded_Call, does_not_hold_up_a_cancelled_thread)
+TEST_F(Guarded_Call, DoesNotHoldUpACancelledThread)
 {
     library.answers("getPortByWwn", [](const Json::Value&) -> Json::Value { pthread_exit(nullptr); });
     pthread_t thread;

@@ -21,7 +21,7 @@ std::string failure(Conversion conversion, const char* text)
 
 } // namespace
 
-TEST(Json_Access, null_counts_as_array_and_object)
+TEST(Json_Access, NullCountsAsArrayAndObject)
 {
     EXPECT_TRUE(isArrayOrNull(json("null")));
     EXPECT_TRUE(isArrayOrNull(json("[]")));
@@ -33,7 +33,7 @@ TEST(Json_Access, null_counts_as_array_and_object)
     EXPECT_FALSE(isObjectOrNull(json("'x'")));
 }
 
-TEST(Json_Access, null_converts_to_nothing)
+TEST(Json_Access, NullConvertsToNothing)
 {
     EXPECT_EQ(asString(json("null")), "");
     EXPECT_EQ(asInt(json("null")), 0);
@@ -41,7 +41,7 @@ TEST(Json_Access, null_converts_to_nothing)
     EXPECT_FALSE(asBool(json("null")));
 }
 
-TEST(Json_Access, texts_are_texts_and_numbers_are_numbers)
+TEST(Json_Access, TextsAreTextsAndNumbersAreNumbers)
 {
     EXPECT_EQ(asString(json("'gr\\u00fcn'")), "gr\xC3\xBCn");
     EXPECT_EQ(asString(json("true")), "true");
@@ -60,7 +60,7 @@ TEST(Json_Access, texts_are_texts_and_numbers_are_numbers)
         EXPECT_EQ(failure(asUInt, text), "Type is not convertible to uint") << text;
 }
 
-TEST(Json_Access, numbers_reach_to_the_limits_of_their_types)
+TEST(Json_Access, NumbersReachToTheLimitsOfTheirTypes)
 {
     // Each as an integer and as a real number.
     for (const char* end : {"", ".0"}) {
@@ -78,7 +78,7 @@ TEST(Json_Access, numbers_reach_to_the_limits_of_their_types)
     EXPECT_THROW(asInt(Json::Value(2147483648u)), Not_Convertible);
 }
 
-TEST(Json_Access, everything_is_true_or_false)
+TEST(Json_Access, EverythingIsTrueOrFalse)
 {
     for (const char* text : {"true", "1", "-1", "0.5", "'x'", "[0]", "{'a': 0}"})
         EXPECT_TRUE(asBool(json(text))) << text;
@@ -87,7 +87,7 @@ TEST(Json_Access, everything_is_true_or_false)
         EXPECT_FALSE(asBool(json(text))) << text;
 }
 
-TEST(Json_Access, reading_adds_nothing_and_never_throws)
+TEST(Json_Access, ReadingAddsNothingAndNeverThrows)
 {
     const Json::Value object = json("{'a': 1, 'n': null}");
     EXPECT_TRUE(hasMember(object, "n"));
@@ -104,7 +104,7 @@ TEST(Json_Access, reading_adds_nothing_and_never_throws)
     EXPECT_TRUE(element(json("{}"), 0).isNull());
 }
 
-TEST(Json_Access, members_in_one_pass)
+TEST(Json_Access, MembersInOnePass)
 {
     const Members<4>::Names names = {"B", "a", "aa", "c"};
     const Json::Value object = json("{'c': 3, 'B': 'x', 'aa': null, 'ab': 4, 'A': 5}");
@@ -123,7 +123,7 @@ TEST(Json_Access, members_in_one_pass)
     }
 }
 
-TEST(Json_Access, texts_where_they_stand)
+TEST(Json_Access, TextsWhereTheyStand)
 {
     EXPECT_EQ(asView(json("''")), "");
     EXPECT_EQ(asView(json("null")), "");

@@ -58,7 +58,7 @@ Dzntj_Script with_answer(const char* answer)
 
 } // namespace
 
-TEST(ProviderInit, starts_without_a_library)
+TEST(ProviderInit, StartsWithoutALibrary)
 {
     in_child([] {
         Log_Capture log;
@@ -78,7 +78,7 @@ TEST(ProviderInit, starts_without_a_library)
     });
 }
 
-TEST(ProviderInit, initialises_counts_and_says_goodbye)
+TEST(ProviderInit, InitialisesCountsAndSaysGoodbye)
 {
     start({}, [](const Start& result) {
         EXPECT_EQ(result.status, 0);
@@ -91,7 +91,7 @@ TEST(ProviderInit, initialises_counts_and_says_goodbye)
     });
 }
 
-TEST(ProviderInit, an_unknown_version_is_not_an_empty_one)
+TEST(ProviderInit, AnUnknownVersionIsNotAnEmptyOne)
 {
     start(with_version(nullptr), [](const Start& result) {
         EXPECT_EQ(result.said[2], "INFO ZNTJ Library version: Unknown");
@@ -104,7 +104,7 @@ TEST(ProviderInit, an_unknown_version_is_not_an_empty_one)
     });
 }
 
-TEST(ProviderInit, the_log_callback_goes_by_three_digits_each_on_its_own)
+TEST(ProviderInit, TheLogCallbackGoesByThreeDigitsEachOnItsOwn)
 {
     for (const char* version : {"3.2.1", "9.9.9", "3.2.1.4", "3x2x1"})
         start(with_version(version), [](const Start& result) {
@@ -117,7 +117,7 @@ TEST(ProviderInit, the_log_callback_goes_by_three_digits_each_on_its_own)
         });
 }
 
-TEST(ProviderInit, a_bad_answer_leaves_the_driver_uninitialised)
+TEST(ProviderInit, ABadAnswerLeavesTheDriverUninitialised)
 {
     for (const char* answer : {"null", "{\"result\": 0, \"error\": null}"})
         start(with_answer(answer), [](const Start& result) {
@@ -127,7 +127,7 @@ TEST(ProviderInit, a_bad_answer_leaves_the_driver_uninitialised)
         });
 }
 
-TEST(ProviderInit, a_result_other_than_0_is_a_failure)
+TEST(ProviderInit, AResultOtherThan0IsAFailure)
 {
     const auto failed_without_result = [](const Start& result) {
         EXPECT_EQ(result.status, 1);
@@ -143,7 +143,7 @@ TEST(ProviderInit, a_result_other_than_0_is_a_failure)
     start(with_answer("{\"result\": null}"), [](const Start& result) { EXPECT_EQ(result.status, 0); });
 }
 
-TEST(ProviderInit, a_result_of_the_wrong_type_does_not_escape_into_the_loader)
+TEST(ProviderInit, AResultOfTheWrongTypeDoesNotEscapeIntoTheLoader)
 {
     start(with_answer("{\"result\": \"0\"}"), [](const Start& result) {
         EXPECT_EQ(result.status, 1);
@@ -152,7 +152,7 @@ TEST(ProviderInit, a_result_of_the_wrong_type_does_not_escape_into_the_loader)
     });
 }
 
-TEST(ProviderInit, no_adapter_is_told_by_the_status_alone)
+TEST(ProviderInit, NoAdapterIsToldByTheStatusAlone)
 {
     Dzntj_Script script;
     script.adapters = 0;
@@ -164,7 +164,7 @@ TEST(ProviderInit, no_adapter_is_told_by_the_status_alone)
     });
 }
 
-TEST(ProviderInit, the_guard_refuses_the_two_reserved_values)
+TEST(ProviderInit, TheGuardRefusesTheTwoReservedValues)
 {
     for (const sint32 status : {0, 1, 4, -1}) {
         Driver_Status_Override driver(status);

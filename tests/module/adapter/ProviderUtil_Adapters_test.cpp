@@ -30,7 +30,7 @@ struct ProviderUtil_Adapters : testing::Test
 
 } // namespace
 
-TEST_F(ProviderUtil_Adapters, the_number_of_adapters)
+TEST_F(ProviderUtil_Adapters, TheNumberOfAdapters)
 {
     Json::Value out;
     list("['a', 'b']");
@@ -47,7 +47,7 @@ TEST_F(ProviderUtil_Adapters, the_number_of_adapters)
     EXPECT_EQ(log.lines()[0].file, "ProviderUtil.cpp");
 }
 
-TEST_F(ProviderUtil_Adapters, addresses_by_id_count_from_1)
+TEST_F(ProviderUtil_Adapters, AddressesByIdCountFrom1)
 {
     list("['a', 'b']");
     EXPECT_TRUE(ProviderUtil::getAddrByAdapterId(1) == "a");
@@ -61,7 +61,7 @@ TEST_F(ProviderUtil_Adapters, addresses_by_id_count_from_1)
     EXPECT_EQ(library.count("getAllAdaptersIndexString"), 5u);
 }
 
-TEST_F(ProviderUtil_Adapters, addresses_of_no_list)
+TEST_F(ProviderUtil_Adapters, AddressesOfNoList)
 {
     list("[]");
     EXPECT_TRUE(ProviderUtil::getAddrByAdapterId(1) == "");
@@ -71,7 +71,7 @@ TEST_F(ProviderUtil_Adapters, addresses_of_no_list)
     EXPECT_EQ(log.said(), Lines{"ERR libGetAllAdaptersIndexString returns NULL."});
 }
 
-TEST_F(ProviderUtil_Adapters, details_are_asked_for_by_mac_or_wwn)
+TEST_F(ProviderUtil_Adapters, DetailsAreAskedForByMacOrWwn)
 {
     adapter("{'model': 'x'}");
     Json::Value out;
@@ -89,7 +89,7 @@ TEST_F(ProviderUtil_Adapters, details_are_asked_for_by_mac_or_wwn)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(ProviderUtil_Adapters, details_need_both_members)
+TEST_F(ProviderUtil_Adapters, DetailsNeedBothMembers)
 {
     Json::Value out;
     const Lines bad = {
@@ -104,7 +104,7 @@ TEST_F(ProviderUtil_Adapters, details_need_both_members)
     EXPECT_EQ(ProviderUtil::getAdapterDetails(WWN, out), 0);
 }
 
-TEST_F(ProviderUtil_Adapters, details_that_throw_are_a_failure)
+TEST_F(ProviderUtil_Adapters, DetailsThatThrowAreAFailure)
 {
     Json::Value out = "left over";
     library.throws("getHbaByWwn", HbaAgentError{7, "busy"});
@@ -122,7 +122,7 @@ TEST_F(ProviderUtil_Adapters, details_that_throw_are_a_failure)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(ProviderUtil_Adapters, the_serial_number)
+TEST_F(ProviderUtil_Adapters, TheSerialNumber)
 {
     adapter("{'serialNumber': 'S1', 'oemSerialNum': 'ABC123', 'partNum': 'ABC'}");
     EXPECT_TRUE(ProviderUtil::getAdapterSerialNumber("AABB") == "123");
@@ -139,7 +139,7 @@ TEST_F(ProviderUtil_Adapters, the_serial_number)
               Lines{"ERR AABB - libGetHbaByWwn got std exception: Type is not convertible to string"});
 }
 
-TEST_F(ProviderUtil_Adapters, the_serial_number_of_an_unknown_adapter)
+TEST_F(ProviderUtil_Adapters, TheSerialNumberOfAnUnknownAdapter)
 {
     library.answers("getHbaByWwn", json("{'hbaData': {}}"));
     EXPECT_TRUE(ProviderUtil::getAdapterSerialNumber("AABB") == "");
@@ -151,7 +151,7 @@ TEST_F(ProviderUtil_Adapters, the_serial_number_of_an_unknown_adapter)
                      "ERR adapter info is NULL or has errors for AABB"}));
 }
 
-TEST_F(ProviderUtil_Adapters, whether_it_is_a_CNA)
+TEST_F(ProviderUtil_Adapters, WhetherItIsACNA)
 {
     adapter("{'isCNA': true}");
     EXPECT_TRUE(ProviderUtil::isCNA("AABB"));
@@ -166,7 +166,7 @@ TEST_F(ProviderUtil_Adapters, whether_it_is_a_CNA)
     EXPECT_EQ(log.said().back(), "ERR Unable to get adapater details for AABB");
 }
 
-TEST_F(ProviderUtil_Adapters, whether_it_has_an_Ethernet_port)
+TEST_F(ProviderUtil_Adapters, WhetherItHasAnEthernetPort)
 {
     adapter("{'hasEthPort': true}");
     EXPECT_TRUE(ProviderUtil::hasEthernetPort("AABB"));
@@ -181,7 +181,7 @@ TEST_F(ProviderUtil_Adapters, whether_it_has_an_Ethernet_port)
     EXPECT_EQ(log.said().back(), "ERR Unable to get adapater details for AABB");
 }
 
-TEST_F(ProviderUtil_Adapters, the_driver_version_is_the_first_adapter_s)
+TEST_F(ProviderUtil_Adapters, TheDriverVersionIsTheFirstAdapterS)
 {
     list("['AABB', 'CCDD']");
     adapter("{}", "{'storageDriverVersion': '  3.2.3 ', 'networkDriverVersion': '9'}");
@@ -194,7 +194,7 @@ TEST_F(ProviderUtil_Adapters, the_driver_version_is_the_first_adapter_s)
     EXPECT_TRUE(ProviderUtil::getDriverVersion() == std::string(63, 'v').c_str());
 }
 
-TEST_F(ProviderUtil_Adapters, no_driver_version)
+TEST_F(ProviderUtil_Adapters, NoDriverVersion)
 {
     list("['AABB']");
     adapter("{}");
@@ -210,7 +210,7 @@ TEST_F(ProviderUtil_Adapters, no_driver_version)
     EXPECT_TRUE(ProviderUtil::getDriverVersion() == "");
 }
 
-TEST_F(ProviderUtil_Adapters, a_model_is_a_prefix_in_any_case)
+TEST_F(ProviderUtil_Adapters, AModelIsAPrefixInAnyCase)
 {
     list("['AABB', 'CCDD']");
     library.answers("getHbaByWwn", [](const Json::Value& request) {
@@ -230,7 +230,7 @@ TEST_F(ProviderUtil_Adapters, a_model_is_a_prefix_in_any_case)
     EXPECT_EQ(ProviderUtil::checkIfThisAdapterModelPresent(""), 0);
 }
 
-TEST_F(ProviderUtil_Adapters, an_empty_model_matches_everything)
+TEST_F(ProviderUtil_Adapters, AnEmptyModelMatchesEverything)
 {
     list("['AABB']");
     adapter("{'model': ''}");
@@ -240,7 +240,7 @@ TEST_F(ProviderUtil_Adapters, an_empty_model_matches_everything)
     EXPECT_EQ(ProviderUtil::checkIfThisAdapterModelPresent("anything"), 1);
 }
 
-TEST_F(ProviderUtil_Adapters, a_model_among_failing_adapters)
+TEST_F(ProviderUtil_Adapters, AModelAmongFailingAdapters)
 {
     list("['AABB', 'CCDD', 'EEFF']");
     library.answers("getHbaByWwn", [](const Json::Value& request) {
@@ -261,7 +261,7 @@ TEST_F(ProviderUtil_Adapters, a_model_among_failing_adapters)
     EXPECT_EQ(log.said(), (Lines{"INFO Number of Adapters: 0", "WARN No adapters in the system!"}));
 }
 
-TEST_F(ProviderUtil_Adapters, adapter_ids)
+TEST_F(ProviderUtil_Adapters, AdapterIds)
 {
     library.answers("getAdapterId", json("{'adapterId': 3}"));
     EXPECT_EQ(ProviderUtil::getAdapterId("8c7cff000002"), 3);
@@ -285,7 +285,7 @@ TEST_F(ProviderUtil_Adapters, adapter_ids)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(ProviderUtil_Adapters, no_adapter_id)
+TEST_F(ProviderUtil_Adapters, NoAdapterId)
 {
     for (const char* answer :
          {"null", "{}", "{'adapterId': 'x'}", "{'adapterId': -4}", "{'adapterId': 3, 'error': 0}"}) {
@@ -297,7 +297,7 @@ TEST_F(ProviderUtil_Adapters, no_adapter_id)
     EXPECT_THROW(ProviderUtil::getAdapterId("8c7cff000002"), HbaAgentError);
 }
 
-TEST_F(ProviderUtil_Adapters, the_name_of_an_Ethernet_device)
+TEST_F(ProviderUtil_Adapters, TheNameOfAnEthernetDevice)
 {
     library.answers("getEthPortByEthMac", json("{'ethData': {'ethDev': 'eth0'}}"));
     EXPECT_TRUE(ProviderUtil::getEthDeviceNameByMAC("AABB") == "eth0");

@@ -31,7 +31,7 @@ std::string trim(const char* text)
 
 } // namespace
 
-TEST(ProviderUtil_Addresses, flat_form_has_no_colons)
+TEST(ProviderUtil_Addresses, FlatFormHasNoColons)
 {
     EXPECT_TRUE(ProviderUtil::eraseColonsFromIndex("10:00:8C:7C:FF:00:00:01") == "10008C7CFF000001");
     EXPECT_TRUE(ProviderUtil::eraseColonsFromIndex("::a:") == "a");
@@ -39,7 +39,7 @@ TEST(ProviderUtil_Addresses, flat_form_has_no_colons)
     EXPECT_TRUE(ProviderUtil::eraseColonsFromIndex("") == "");
 }
 
-TEST(ProviderUtil_Addresses, index_form_has_a_colon_after_each_pair)
+TEST(ProviderUtil_Addresses, IndexFormHasAColonAfterEachPair)
 {
     EXPECT_EQ(index_form("AABBCC"), "AA:BB:CC");
     EXPECT_EQ(index_form("AABB"), "AA:BB");
@@ -52,7 +52,7 @@ TEST(ProviderUtil_Addresses, index_form_has_a_colon_after_each_pair)
     EXPECT_THROW(index_form(""), std::out_of_range);
 }
 
-TEST(ProviderUtil_Addresses, index_form_stays)
+TEST(ProviderUtil_Addresses, IndexFormStays)
 {
     Log_Capture log;
     EXPECT_EQ(index_form("AA:BBCC"), "AA:BBCC");
@@ -62,7 +62,7 @@ TEST(ProviderUtil_Addresses, index_form_stays)
     EXPECT_EQ(log.lines()[0].file, "ProviderUtil.cpp");
 }
 
-TEST(ProviderUtil_Addresses, raw_forms)
+TEST(ProviderUtil_Addresses, RawForms)
 {
     using Mac = std::array<unsigned char, 6>;
     Mac mac;
@@ -81,7 +81,7 @@ TEST(ProviderUtil_Addresses, raw_forms)
     EXPECT_EQ(wwn, (Wwn{0x10}));
 }
 
-TEST(ProviderUtil_Addresses, a_tag_gives_the_address_back)
+TEST(ProviderUtil_Addresses, ATagGivesTheAddressBack)
 {
     EXPECT_EQ(from_tag("10000000-0000-0000-0000-8c7cff000001"), "8c7cff000001");
     EXPECT_EQ(from_tag("10000000-0000-0000-1000-8c7cff000001"), "10008c7cff000001");
@@ -90,7 +90,7 @@ TEST(ProviderUtil_Addresses, a_tag_gives_the_address_back)
     EXPECT_EQ(from_tag(""), "");
 }
 
-TEST(ProviderUtil_Addresses, trimming_takes_blanks_alone)
+TEST(ProviderUtil_Addresses, TrimmingTakesBlanksAlone)
 {
     EXPECT_EQ(trim("  a b  "), "a b");
     EXPECT_EQ(trim("\ta "), "\ta");
@@ -101,7 +101,7 @@ TEST(ProviderUtil_Addresses, trimming_takes_blanks_alone)
     EXPECT_STREQ(in_place, "ab");
 }
 
-TEST(ProviderUtil_Addresses, the_first_byte_decides_on_utf_8)
+TEST(ProviderUtil_Addresses, TheFirstByteDecidesOnUtf8)
 {
     for (const char* good : {"", "a", "\x7F", "\xC2", "\xF4\xFF"})
         EXPECT_TRUE(ProviderUtil::valid_UTF_string(good)) << good;

@@ -101,7 +101,7 @@ struct ProviderUtil_Host : testing::Test
 
 } // namespace
 
-TEST_F(ProviderUtil_Host, first_address_that_is_no_loopback)
+TEST_F(ProviderUtil_Host, FirstAddressThatIsNoLoopback)
 {
     has({"127.0.0.1", "10.1.2.3", "192.168.0.1"});
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 0);
@@ -110,7 +110,7 @@ TEST_F(ProviderUtil_Host, first_address_that_is_no_loopback)
     EXPECT_EQ(log.traces(), (Lines{"DBG Entering: getHostInfo", "DBG Returning: getHostInfo"}));
 }
 
-TEST_F(ProviderUtil_Host, without_a_name_it_is_localhost)
+TEST_F(ProviderUtil_Host, WithoutANameItIsLocalhost)
 {
     name = nullptr;
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 3);
@@ -118,7 +118,7 @@ TEST_F(ProviderUtil_Host, without_a_name_it_is_localhost)
     EXPECT_EQ(log.said(), Lines{"INFO gethostname() FAILED. hostString will be filled with localhost"});
 }
 
-TEST_F(ProviderUtil_Host, without_an_address_it_is_the_name)
+TEST_F(ProviderUtil_Host, WithoutAnAddressItIsTheName)
 {
     resolves = false;
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
@@ -129,7 +129,7 @@ TEST_F(ProviderUtil_Host, without_an_address_it_is_the_name)
     EXPECT_EQ(log.said(), Lines(2, BY_NAME));
 }
 
-TEST_F(ProviderUtil_Host, with_loopback_addresses_alone_it_is_the_bare_name)
+TEST_F(ProviderUtil_Host, WithLoopbackAddressesAloneItIsTheBareName)
 {
     has({"127.0.0.1", "127.0.1.1"});
     EXPECT_EQ(ProviderUtil::getHostInfo(buffer, sizeof buffer), 2);
@@ -143,7 +143,7 @@ TEST_F(ProviderUtil_Host, with_loopback_addresses_alone_it_is_the_bare_name)
     EXPECT_STREQ(buffer, "localhost");
 }
 
-TEST_F(ProviderUtil_Host, one_walk_asks_once_and_tells_each_time)
+TEST_F(ProviderUtil_Host, OneWalkAsksOnceAndTellsEachTime)
 {
     resolves = false;
     names_left = 1;
@@ -155,14 +155,14 @@ TEST_F(ProviderUtil_Host, one_walk_asks_once_and_tells_each_time)
     EXPECT_EQ(log.traces()[4], "DBG Entering: getHostInfo");
 }
 
-TEST_F(ProviderUtil_Host, a_walk_cuts_the_name_to_its_room)
+TEST_F(ProviderUtil_Host, AWalkCutsTheNameToItsRoom)
 {
     has({"10.1.2.3"});
     EXPECT_STREQ(Host_Name(5).get().c_str(), "10.1");
     EXPECT_STREQ(Host_Name(256).get().c_str(), "10.1.2.3");
 }
 
-TEST_F(ProviderUtil_Host, a_name_that_is_lost_in_between)
+TEST_F(ProviderUtil_Host, ANameThatIsLostInBetween)
 {
     has({"127.0.0.1"});
     names_left = 1;
@@ -170,7 +170,7 @@ TEST_F(ProviderUtil_Host, a_name_that_is_lost_in_between)
     EXPECT_EQ(log.said(), Lines{"INFO gethostname() failed"});
 }
 
-TEST_F(ProviderUtil_Host, without_a_domain_call_it_is_the_bare_name)
+TEST_F(ProviderUtil_Host, WithoutADomainCallItIsTheBareName)
 {
     has({"127.0.0.1"});
     domain = nullptr;
@@ -179,7 +179,7 @@ TEST_F(ProviderUtil_Host, without_a_domain_call_it_is_the_bare_name)
     EXPECT_EQ(log.said(), Lines{"INFO getdomainname() failed"});
 }
 
-TEST_F(ProviderUtil_Host, no_domain_counts_where_it_does_not_fit)
+TEST_F(ProviderUtil_Host, NoDomainCountsWhereItDoesNotFit)
 {
     has({"127.0.0.1"});
     name = "localhost";
@@ -189,7 +189,7 @@ TEST_F(ProviderUtil_Host, no_domain_counts_where_it_does_not_fit)
     EXPECT_EQ(log.said(), Lines{});
 }
 
-TEST_F(ProviderUtil_Host, nothing_is_written_beyond_the_buffer)
+TEST_F(ProviderUtil_Host, NothingIsWrittenBeyondTheBuffer)
 {
     has({"10.1.2.3"});
     memset(buffer, '#', sizeof buffer);
@@ -206,7 +206,7 @@ TEST_F(ProviderUtil_Host, nothing_is_written_beyond_the_buffer)
     EXPECT_EQ(buffer[0], '#');
 }
 
-TEST_F(ProviderUtil_Host, a_long_answer_gets_more_room)
+TEST_F(ProviderUtil_Host, ALongAnswerGetsMoreRoom)
 {
     has({"127.0.0.1", "10.1.2.3"});
     wanted_room = 40000;
@@ -223,7 +223,7 @@ TEST_F(ProviderUtil_Host, a_long_answer_gets_more_room)
 }
 
 // A slow name server holds up who asks it, and nobody else.
-TEST_F(ProviderUtil_Host, look_ups_do_not_wait_for_each_other)
+TEST_F(ProviderUtil_Host, LookUpsDoNotWaitForEachOther)
 {
     has({"10.1.2.3"});
     std::mutex mutex;
@@ -251,7 +251,7 @@ TEST_F(ProviderUtil_Host, look_ups_do_not_wait_for_each_other)
     EXPECT_EQ(names, std::vector<std::string>(THREADS, "10.1.2.3"));
 }
 
-TEST_F(ProviderUtil_Host, node_name)
+TEST_F(ProviderUtil_Host, NodeName)
 {
     EXPECT_TRUE(ProviderUtil::getHostName() == "node");
     EXPECT_EQ(log.said(), Lines{});
@@ -260,7 +260,7 @@ TEST_F(ProviderUtil_Host, node_name)
     EXPECT_EQ(log.said(), Lines{"ERR uname() returned error = -3"});
 }
 
-TEST_F(ProviderUtil_Host, a_path_as_a_client_sees_it)
+TEST_F(ProviderUtil_Host, APathAsAClientSeesIt)
 {
     has({"10.1.2.3"});
     EXPECT_TRUE(ProviderUtil::updateNamespacePath("KALDERA_FCPort.DeviceID=\"a\"") ==

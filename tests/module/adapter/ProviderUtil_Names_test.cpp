@@ -6,7 +6,7 @@
 
 using namespace KPRV;
 
-TEST(ProviderUtil_Names, classes_by_number)
+TEST(ProviderUtil_Names, ClassesByNumber)
 {
     // Written out, so that a change of the table shows.
     constexpr const char* names[] = {
@@ -55,7 +55,7 @@ TEST(ProviderUtil_Names, classes_by_number)
         EXPECT_STREQ(ProviderUtil::getClassName(classId_t(id)), names[id]) << id;
 }
 
-TEST(ProviderUtil_Names, classes_beyond_the_table)
+TEST(ProviderUtil_Names, ClassesBeyondTheTable)
 {
     Log_Capture log;
     EXPECT_STREQ(ProviderUtil::getClassName(classId_t(39)), "INVALID CLASS");
@@ -63,7 +63,7 @@ TEST(ProviderUtil_Names, classes_beyond_the_table)
     EXPECT_EQ(log.said(), (Lines(2, "INFO ClassId is greater than MAXCLASSID")));
 }
 
-TEST(ProviderUtil_Names, record_texts)
+TEST(ProviderUtil_Names, RecordTexts)
 {
     constexpr const char* texts[] = {
         "--",
@@ -112,7 +112,7 @@ TEST(ProviderUtil_Names, record_texts)
     EXPECT_EQ(log.said(), Lines{"ERR Record ID is greater than REC_MAX_ID"});
 }
 
-TEST(ProviderUtil_Names, test_names)
+TEST(ProviderUtil_Names, TestNames)
 {
     constexpr const char* names[] = {
         "Kaldera:--",

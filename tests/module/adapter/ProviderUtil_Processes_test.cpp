@@ -35,14 +35,14 @@ struct Tftp : testing::Test
 
 } // namespace
 
-TEST(ProviderUtil_Processes, the_agent_runs_while_a_process_of_its_name_does)
+TEST(ProviderUtil_Processes, TheAgentRunsWhileAProcessOfItsNameDoes)
 {
     EXPECT_EQ(ProviderUtil::getAgentPort(), 0);
     EXPECT_EQ(port_beside("qxmagent"), 34568);
     EXPECT_EQ(ProviderUtil::getAgentPort(), 0);
 }
 
-TEST(ProviderUtil_Processes, the_end_of_the_name_counts)
+TEST(ProviderUtil_Processes, TheEndOfTheNameCounts)
 {
     EXPECT_EQ(port_beside("qxmagentd"), 0);
     EXPECT_EQ(port_beside("qxmagen"), 0);
@@ -51,14 +51,14 @@ TEST(ProviderUtil_Processes, the_end_of_the_name_counts)
     EXPECT_EQ(port_beside("qxmagent) R 1"), 0);
 }
 
-TEST(ProviderUtil_Processes, a_zombie_is_no_agent)
+TEST(ProviderUtil_Processes, AZombieIsNoAgent)
 {
     Named_Process process("qxmagent");
     process.end();
     EXPECT_EQ(ProviderUtil::getAgentPort(), 0);
 }
 
-TEST_F(Tftp, removes_the_file_and_fetches_it)
+TEST_F(Tftp, RemovesTheFileAndFetchesIt)
 {
     program("rm", "exit 1");
     program("tftp", "exit 0");
@@ -66,7 +66,7 @@ TEST_F(Tftp, removes_the_file_and_fetches_it)
     EXPECT_EQ(folder.read("calls"), "rm [-f] [fw.bin]\ntftp [10.1.2.3] [-c] [get] [fw.bin]\n");
 }
 
-TEST_F(Tftp, hostile_names_find_no_shell)
+TEST_F(Tftp, HostileNamesFindNoShell)
 {
     program("rm", "exit 0");
     program("tftp", "exit 0");
@@ -75,7 +75,7 @@ TEST_F(Tftp, hostile_names_find_no_shell)
               "rm [-f] [$(id) `id` a b]\ntftp [h; touch x] [-c] [get] [$(id) `id` a b]\n");
 }
 
-TEST_F(Tftp, the_result_is_the_client_s_wait_status)
+TEST_F(Tftp, TheResultIsTheClientSWaitStatus)
 {
     program("rm", "exit 0");
     program("tftp", "exit 3");
@@ -84,7 +84,7 @@ TEST_F(Tftp, the_result_is_the_client_s_wait_status)
     EXPECT_EQ(ProviderUtil::TftpGetFile("h", "f"), SIGKILL);
 }
 
-TEST_F(Tftp, without_a_client_the_result_is_a_shell_s)
+TEST_F(Tftp, WithoutAClientTheResultIsAShellS)
 {
     program("rm", "exit 0");
     EXPECT_EQ(ProviderUtil::TftpGetFile("h", "f"), 127 << 8);
@@ -92,7 +92,7 @@ TEST_F(Tftp, without_a_client_the_result_is_a_shell_s)
     EXPECT_EQ(ProviderUtil::TftpGetFile("h", "f"), 126 << 8);
 }
 
-TEST_F(Tftp, whether_a_file_exists)
+TEST_F(Tftp, WhetherAFileExists)
 {
     folder.write("there", "");
     EXPECT_TRUE(ProviderUtil::IsFileExist(folder.path("there").c_str()));

@@ -7,13 +7,13 @@
 
 using namespace KPRV;
 
-TEST(ProviderUtil, is_one_object)
+TEST(ProviderUtil, IsOneObject)
 {
     EXPECT_NE(ProviderUtil::getProviderUtil(), nullptr);
     EXPECT_EQ(ProviderUtil::getProviderUtil(), ProviderUtil::getProviderUtil());
 }
 
-TEST(ProviderUtil, a_good_answer_is_neither_null_nor_an_error)
+TEST(ProviderUtil, AGoodAnswerIsNeitherNullNorAnError)
 {
     for (const char* text :
          {"[]", "[1]", "5", "0", "'error'", "false", "{}", "{'Error': 1}", "{'a': {'error': 1}}"})
@@ -22,7 +22,7 @@ TEST(ProviderUtil, a_good_answer_is_neither_null_nor_an_error)
         EXPECT_FALSE(ProviderUtil::isValidJsonResponse(json(text))) << text;
 }
 
-TEST(ProviderUtil, library_log_lines_keep_their_rank)
+TEST(ProviderUtil, LibraryLogLinesKeepTheirRank)
 {
     Log_Capture log;
     for (const int level : {1, 2, 3, 4, 5, 0, 6, -1})
@@ -33,7 +33,7 @@ TEST(ProviderUtil, library_log_lines_keep_their_rank)
     EXPECT_EQ(log.lines()[0].file, "ProviderUtil.cpp");
 }
 
-TEST(ProviderUtil, the_head_of_a_library_log_line_is_cut_at_31_characters)
+TEST(ProviderUtil, TheHeadOfALibraryLogLineIsCutAt31Characters)
 {
     Log_Capture log;
     ProviderUtil::logMsg(4, "a_name_of_27_characters_in.c", 12, "text");

@@ -7,7 +7,7 @@
 
 using namespace KPRV;
 
-TEST(Serial_Number, the_part_number_is_cut_from_the_front)
+TEST(Serial_Number, ThePartNumberIsCutFromTheFront)
 {
     EXPECT_EQ(oem_serial_number(json("{'oemSerialNum': 'ABC123', 'partNum': 'ABC'}")), "123");
     EXPECT_EQ(oem_serial_number(json("{'oemSerialNum': 'ABC123', 'partNum': 'XYZ'}")), "ABC123");
@@ -16,7 +16,7 @@ TEST(Serial_Number, the_part_number_is_cut_from_the_front)
     EXPECT_EQ(oem_serial_number(json("{'oemSerialNum': 'ABC', 'partNum': 'ABC'}")), "");
 }
 
-TEST(Serial_Number, a_card_of_no_oem_has_none)
+TEST(Serial_Number, ACardOfNoOemHasNone)
 {
     EXPECT_EQ(oem_serial_number(json("{'oemSerialNum': '', 'partNum': 'ABC'}")), std::nullopt);
     EXPECT_EQ(oem_serial_number(json("{}")), std::nullopt);

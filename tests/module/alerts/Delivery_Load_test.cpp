@@ -17,7 +17,7 @@ class Alert_Server : private broker::Up_Calls
 {
 public:
     explicit Alert_Server(std::function<void(const std::string&, const broker::Instance_Value&)> sink)
-        : core(std::make_shared<broker::Core>(broker::Host_Options{})), _sink(std::move(sink)),
+        : core(std::make_shared<broker::Core>(broker::Server_Options{})), _sink(std::move(sink)),
           _catalogue(_cimple_registration_head), _broker(core, *this)
     {
         core->catalogue = &_catalogue;

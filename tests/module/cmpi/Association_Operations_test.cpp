@@ -108,7 +108,7 @@ Result answer_get(const broker::Request& request)
 
 // --- associatorNames
 
-TEST_F(Association_Operations, names_of_far_ends_come_from_the_enumeration)
+TEST_F(Association_Operations, NamesOfFarEndsComeFromTheEnumeration)
 {
     script.enum_instances = three_links;
     const Result result = associator_names(a);
@@ -119,7 +119,7 @@ TEST_F(Association_Operations, names_of_far_ends_come_from_the_enumeration)
     EXPECT_EQ(result.done_count, 0u) << "the return of the entry is the end";
 }
 
-TEST_F(Association_Operations, names_make_their_calls_in_order)
+TEST_F(Association_Operations, NamesMakeTheirCallsInOrder)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(make_link(make_named("a"), make_port("b")));
@@ -133,7 +133,7 @@ TEST_F(Association_Operations, names_make_their_calls_in_order)
                                      "CMAddKey Number", "CMReturnObjectPath", "CMRelease object path"}));
 }
 
-TEST_F(Association_Operations, filters_reach_the_provider_and_null_ones_are_empty)
+TEST_F(Association_Operations, FiltersReachTheProviderAndNullOnesAreEmpty)
 {
     Texts seen;
     script.enum_associator_names = [&](const Instance*, const std::string& filters, const Script::Deliver&) {
@@ -145,7 +145,7 @@ TEST_F(Association_Operations, filters_reach_the_provider_and_null_ones_are_empt
     EXPECT_EQ(seen, (Texts{"||", "Sample_Port|Antecedent|Dependent"}));
 }
 
-TEST_F(Association_Operations, filters_work_in_the_fallback)
+TEST_F(Association_Operations, FiltersWorkInTheFallback)
 {
     script.enum_instances = three_links;
     EXPECT_EQ(associator_names(a, {.result_class = "Sample_Element"}).paths.size(), 2u);
@@ -156,7 +156,7 @@ TEST_F(Association_Operations, filters_work_in_the_fallback)
     EXPECT_EQ(associator_names(a, {.result_role = "Antecedent"}).paths.size(), 0u);
 }
 
-TEST_F(Association_Operations, statuses_of_names)
+TEST_F(Association_Operations, StatusesOfNames)
 {
     const struct
     {
@@ -173,7 +173,7 @@ TEST_F(Association_Operations, statuses_of_names)
     }
 }
 
-TEST_F(Association_Operations, a_far_end_keeps_its_own_name_space)
+TEST_F(Association_Operations, AFarEndKeepsItsOwnNameSpace)
 {
     script.enum_associator_names = [](const Instance*, const std::string&, const Script::Deliver& deliver) {
         Sample_Port* const port = make_port("b");
@@ -184,7 +184,7 @@ TEST_F(Association_Operations, a_far_end_keeps_its_own_name_space)
     EXPECT_EQ(associator_names(a).paths.at(0).name_space, "root/elsewhere");
 }
 
-TEST_F(Association_Operations, a_failed_name_drops_the_rest_and_keeps_the_status)
+TEST_F(Association_Operations, AFailedNameDropsTheRestAndKeepsTheStatus)
 {
     script.enum_instances = three_links;
     server.core->calls.fail("CMNewObjectPath", 1, CMPI_RC_ERR_FAILED);
@@ -195,7 +195,7 @@ TEST_F(Association_Operations, a_failed_name_drops_the_rest_and_keeps_the_status
 
 // --- associators
 
-TEST_F(Association_Operations, own_associators_are_returned_with_paths_built_on_the_way)
+TEST_F(Association_Operations, OwnAssociatorsAreReturnedWithPathsBuiltOnTheWay)
 {
     Log_Capture capture;
     script.enum_associators = [](const Instance* instance, const std::string& filters,
@@ -215,7 +215,7 @@ TEST_F(Association_Operations, own_associators_are_returned_with_paths_built_on_
     EXPECT_EQ(capture.said("WARN"), Texts{"WARN No ObjectPath built before call to make_CMPI_instance"});
 }
 
-TEST_F(Association_Operations, associators_by_name_are_asked_of_the_server)
+TEST_F(Association_Operations, AssociatorsByNameAreAskedOfTheServer)
 {
     script.enum_instances = three_links;
     server.on_up_call = answer_get;
@@ -233,7 +233,7 @@ TEST_F(Association_Operations, associators_by_name_are_asked_of_the_server)
                      "CBGetInstance Sample_Port", "CMReturnInstance", "CMRelease instance"}));
 }
 
-TEST_F(Association_Operations, a_far_end_that_the_server_lacks_ends_the_stream)
+TEST_F(Association_Operations, AFarEndThatTheServerLacksEndsTheStream)
 {
     script.enum_instances = three_links;
     server.on_up_call = [](const broker::Request& request) {
@@ -246,7 +246,7 @@ TEST_F(Association_Operations, a_far_end_that_the_server_lacks_ends_the_stream)
     EXPECT_TRUE(result.instances.empty());
 }
 
-TEST_F(Association_Operations, an_associator_that_does_not_convert_ends_the_stream)
+TEST_F(Association_Operations, AnAssociatorThatDoesNotConvertEndsTheStream)
 {
     script.enum_associators = [](const Instance*, const std::string&, const Script::Deliver& deliver) {
         EXPECT_FALSE(deliver(make_port("b")));
@@ -259,7 +259,7 @@ TEST_F(Association_Operations, an_associator_that_does_not_convert_ends_the_stre
     EXPECT_TRUE(result.instances.empty());
 }
 
-TEST_F(Association_Operations, statuses_of_associators)
+TEST_F(Association_Operations, StatusesOfAssociators)
 {
     const struct
     {
@@ -286,20 +286,20 @@ TEST_F(Association_Operations, statuses_of_associators)
     EXPECT_EQ(associators(a).rc, CMPI_RC_ERR_ACCESS_DENIED);
 }
 
-TEST_F(Association_Operations, ends_of_one_class_with_other_keys_give_the_other_end)
+TEST_F(Association_Operations, EndsOfOneClassWithOtherKeysGiveTheOtherEnd)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(make_link(make_port("p", 1), make_port("q", 2)));
         return 0;
     };
     broker::Path_Value p = path_of("Sample_Port", "p");
-    p.keys.push_back({"Number", broker::Value::unsigned_number(CMPI_uint64, 1)});
+    p.keys.push_back({"Number", broker::Plain_Value::unsigned_number(CMPI_uint64, 1)});
     EXPECT_EQ(names_of(associator_names(p).paths), Texts{"q"});
 }
 
 // --- references
 
-TEST_F(Association_Operations, references_come_from_the_enumeration)
+TEST_F(Association_Operations, ReferencesComeFromTheEnumeration)
 {
     const Instance* seen = nullptr;
     script.enum_instances = [&](const Instance* model, const Script::Deliver& deliver) {
@@ -319,7 +319,7 @@ TEST_F(Association_Operations, references_come_from_the_enumeration)
     EXPECT_EQ(references(a, "Dependent").instances.size(), 0u);
 }
 
-TEST_F(Association_Operations, references_are_answered_in_the_name_space_of_the_request)
+TEST_F(Association_Operations, ReferencesAreAnsweredInTheNameSpaceOfTheRequest)
 {
     script.enum_references = [](const Instance*, const Instance*, const std::string&,
                                 const Script::Deliver& deliver) {
@@ -332,7 +332,7 @@ TEST_F(Association_Operations, references_are_answered_in_the_name_space_of_the_
     EXPECT_EQ(reference_names(a).paths.at(0).name_space, NAME_SPACE);
 }
 
-TEST_F(Association_Operations, references_make_their_calls_in_order)
+TEST_F(Association_Operations, ReferencesMakeTheirCallsInOrder)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(make_link(make_named("a"), make_port("b")));
@@ -359,7 +359,7 @@ TEST_F(Association_Operations, references_make_their_calls_in_order)
     EXPECT_EQ(Texts(calls.end() - 2, calls.end()), (Texts{"CMReturnInstance", "CMRelease instance"}));
 }
 
-TEST_F(Association_Operations, statuses_of_references)
+TEST_F(Association_Operations, StatusesOfReferences)
 {
     const struct
     {
@@ -376,7 +376,7 @@ TEST_F(Association_Operations, statuses_of_references)
     }
 }
 
-TEST_F(Association_Operations, a_reference_that_does_not_convert_ends_the_stream)
+TEST_F(Association_Operations, AReferenceThatDoesNotConvertEndsTheStream)
 {
     script.enum_instances = three_links;
     for (const char* call : {"CMNewObjectPath", "CMNewInstance"}) {
@@ -389,7 +389,7 @@ TEST_F(Association_Operations, a_reference_that_does_not_convert_ends_the_stream
     EXPECT_TRUE(reference_names(a).paths.empty());
 }
 
-TEST_F(Association_Operations, reference_names_are_paths_of_both_ends)
+TEST_F(Association_Operations, ReferenceNamesArePathsOfBothEnds)
 {
     script.enum_instances = three_links;
     const Result result = reference_names(a);
@@ -400,7 +400,7 @@ TEST_F(Association_Operations, reference_names_are_paths_of_both_ends)
 
 // --- what all have in common
 
-TEST_F(Association_Operations, an_object_of_a_foreign_class_has_no_associations)
+TEST_F(Association_Operations, AnObjectOfAForeignClassHasNoAssociations)
 {
     Log_Capture capture;
     const broker::Path_Value foreign = class_path("Foreign");
@@ -417,7 +417,7 @@ TEST_F(Association_Operations, an_object_of_a_foreign_class_has_no_associations)
                "DBG enter: referenceNames()", "DBG return: referenceNames(): CMPI_RC_ERR_INVALID_CLASS"}));
 }
 
-TEST_F(Association_Operations, an_exception_leaves_no_context_and_no_lock)
+TEST_F(Association_Operations, AnExceptionLeavesNoContextAndNoLock)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) -> int {
         deliver(make_link(make_named("a"), make_port("b")));
@@ -435,7 +435,7 @@ TEST_F(Association_Operations, an_exception_leaves_no_context_and_no_lock)
     EXPECT_EQ(associator_names(a).paths.size(), 2u);
 }
 
-TEST_F(Association_Operations, a_throwing_server_leaves_no_instance_behind)
+TEST_F(Association_Operations, AThrowingServerLeavesNoInstanceBehind)
 {
     script.enum_instances = three_links;
     for (const char* call : {"CMNewObjectPath", "CMReturnObjectPath"}) {
@@ -447,7 +447,7 @@ TEST_F(Association_Operations, a_throwing_server_leaves_no_instance_behind)
     server.core->violations.clear();
 }
 
-TEST_F(No_Association, all_four_entries_fail)
+TEST_F(No_Association, AllFourEntriesFail)
 {
     EXPECT_EQ(associators(a).rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(associator_names(a).rc, CMPI_RC_ERR_FAILED);

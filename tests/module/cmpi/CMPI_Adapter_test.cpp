@@ -13,7 +13,7 @@ static Texts log_lines(const Log_Capture& capture)
     return texts;
 }
 
-TEST(CMPI_Adapter, starts_with_nothing_enabled)
+TEST(CMPI_Adapter, StartsWithNothingEnabled)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -28,7 +28,7 @@ TEST(CMPI_Adapter, starts_with_nothing_enabled)
     provider.cleanup('I');
 }
 
-TEST(CMPI_Adapter, finds_every_class_of_the_module)
+TEST(CMPI_Adapter, FindsEveryClassOfTheModule)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -49,7 +49,7 @@ TEST(CMPI_Adapter, finds_every_class_of_the_module)
     provider.cleanup('I');
 }
 
-TEST(CMPI_Adapter, traces_its_life)
+TEST(CMPI_Adapter, TracesItsLife)
 {
     Log_Capture capture;
     Test_Server server;
@@ -73,7 +73,7 @@ TEST(CMPI_Adapter, traces_its_life)
                "DBG enter: ~CMPI_Adapter()", "DBG return: ~CMPI_Adapter()"}));
 }
 
-TEST(CMPI_Adapter, indication_and_association_cleanups_trace_their_entry)
+TEST(CMPI_Adapter, IndicationAndAssociationCleanupsTraceTheirEntry)
 {
     Log_Capture capture;
     Test_Server server;
@@ -90,7 +90,7 @@ TEST(CMPI_Adapter, indication_and_association_cleanups_trace_their_entry)
     EXPECT_EQ(log_lines(capture)[1], "DBG enter: cleanup()");
 }
 
-TEST(CMPI_Adapter, trace_lines_are_byte_exact)
+TEST(CMPI_Adapter, TraceLinesAreByteExact)
 {
     Temp_Folder home;
     home.write(".cimplerc", "LOG_LEVEL=DBG\n");
@@ -110,7 +110,7 @@ TEST(CMPI_Adapter, trace_lines_are_byte_exact)
     EXPECT_TRUE(lines.Matches(home.read(".cimple/messages"))) << home.read(".cimple/messages");
 }
 
-TEST(CMPI_Adapter, nothing_is_traced_below_debug)
+TEST(CMPI_Adapter, NothingIsTracedBelowDebug)
 {
     Log_Capture capture("INFO");
     Test_Server server;

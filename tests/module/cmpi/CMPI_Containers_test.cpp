@@ -44,20 +44,21 @@ protected:
     Value value;
 };
 
-broker::Value unsigned_key(uint64 x)
+broker::Plain_Value unsigned_key(uint64 x)
 {
-    return broker::Value::unsigned_number(CMPI_uint64, x);
+    return broker::Plain_Value::unsigned_number(CMPI_uint64, x);
 }
-broker::Value signed_key(sint64 x)
+broker::Plain_Value signed_key(sint64 x)
 {
-    return broker::Value::signed_number(CMPI_sint64, x);
+    return broker::Plain_Value::signed_number(CMPI_sint64, x);
 }
 
 } // namespace
 
-TEST_F(CMPI_Containers, sizes_and_names)
+TEST_F(CMPI_Containers, SizesAndNames)
 {
-    const Entries entries = {{"One", broker::Value::text("1")}, {"Two", broker::Value::text("2")}};
+    const Entries entries = {{"One", broker::Plain_Value::text("1")},
+                             {"Two", broker::Plain_Value::text("2")}};
     const auto expect_names = [](CMPI_Container&& container) {
         String name;
         EXPECT_EQ(container.get_size(), 2u);
@@ -69,10 +70,10 @@ TEST_F(CMPI_Containers, sizes_and_names)
     expect_names(args(entries));
 }
 
-TEST_F(CMPI_Containers, bounds_are_tested)
+TEST_F(CMPI_Containers, BoundsAreTested)
 {
     Log_Capture capture;
-    const Entries entries = {{"One", broker::Value::text("1")}};
+    const Entries entries = {{"One", broker::Plain_Value::text("1")}};
     const auto expect_bounds = [&](CMPI_Container&& container) {
         String name;
         EXPECT_EQ(container.get_name(1, name), -1);
@@ -85,11 +86,12 @@ TEST_F(CMPI_Containers, bounds_are_tested)
     EXPECT_EQ(capture.said(), Texts(6, "WARN bounds error"));
 }
 
-TEST_F(CMPI_Containers, only_the_names_of_properties_are_guarded)
+TEST_F(CMPI_Containers, OnlyTheNamesOfPropertiesAreGuarded)
 {
     Log_Capture capture;
     String name;
-    const Entries entries = {{"One", broker::Value::text("1")}, {"Two", broker::Value::text("2")}};
+    const Entries entries = {{"One", broker::Plain_Value::text("1")},
+                             {"Two", broker::Plain_Value::text("2")}};
     server.core->calls.fail("CMGetPropertyAt", 1, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(instance(entries).get_name(0, name), -1);
     server.core->calls.throw_at("CMGetPropertyAt", 1);
@@ -105,35 +107,35 @@ TEST_F(CMPI_Containers, only_the_names_of_properties_are_guarded)
     EXPECT_THROW(args(entries).get_name(0, name), std::runtime_error);
 }
 
-TEST_F(CMPI_Containers, a_missing_name_is_a_failure)
+TEST_F(CMPI_Containers, AMissingNameIsAFailure)
 {
     String name;
     server.core->calls.fail("CMGetKeyAt", 1, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(path({{"One", broker::Value::text("1")}}).get_name(0, name), -1);
+    EXPECT_EQ(path({{"One", broker::Plain_Value::text("1")}}).get_name(0, name), -1);
 }
 
-TEST_F(CMPI_Containers, a_value_must_have_its_type)
+TEST_F(CMPI_Containers, AValueMustHaveItsType)
 {
     EXPECT_EQ(read(instance({{"Number", unsigned_key(5)}}), UINT64), 0);
     Log_Capture capture;
     EXPECT_EQ(read(instance({{"Number", unsigned_key(5)}}), UINT32), -1);
     EXPECT_EQ(read(args({{"Count", unsigned_key(5)}}), UINT32), -1);
-    EXPECT_EQ(read(instance({{"Number", broker::Value::null_of(CMPI_uint16A)}}), STRING), -1);
+    EXPECT_EQ(read(instance({{"Number", broker::Plain_Value::null_of(CMPI_uint16A)}}), STRING), -1);
     EXPECT_EQ(capture.said(), (Texts{"WARN type mismatch on Number: uint64/uint32",
                                      "WARN type mismatch on Count: uint64/uint32",
                                      "WARN type mismatch on Number: uint16_array/string"}));
 }
 
-TEST_F(CMPI_Containers, a_value_that_does_not_convert)
+TEST_F(CMPI_Containers, AValueThatDoesNotConvert)
 {
     Log_Capture capture;
-    EXPECT_EQ(read(args({{"Who", broker::Value::path(class_path("Foreign"))}}), Value::INSTANCE), -1);
+    EXPECT_EQ(read(args({{"Who", broker::Plain_Value::path(class_path("Foreign"))}}), Value::INSTANCE), -1);
     EXPECT_EQ(capture.said(),
               (Texts{"WARN failed to find meta class: Foreign", "WARN failed to create CIMPLE instance",
                      "WARN cmpi_to_cimple_value() failed"}));
 }
 
-TEST_F(CMPI_Containers, unsigned_keys_are_narrowed_to_every_integer)
+TEST_F(CMPI_Containers, UnsignedKeysAreNarrowedToEveryInteger)
 {
     const uint64 wide = 0x123456789ABCDEF0;
     const auto narrowed = [&]<class T>(int type) {
@@ -153,14 +155,14 @@ TEST_F(CMPI_Containers, unsigned_keys_are_narrowed_to_every_integer)
     EXPECT_EQ(narrowed.operator()<sint64>(SINT64), sint64(wide));
 }
 
-TEST_F(CMPI_Containers, a_narrowed_null_stays_null)
+TEST_F(CMPI_Containers, ANarrowedNullStaysNull)
 {
-    EXPECT_EQ(read(path({{"K", broker::Value::null_of(CMPI_uint64)}}), UINT16), 0);
+    EXPECT_EQ(read(path({{"K", broker::Plain_Value::null_of(CMPI_uint64)}}), UINT16), 0);
     EXPECT_EQ(value.type, int(UINT16));
     EXPECT_TRUE(value.null);
 }
 
-TEST_F(CMPI_Containers, signed_keys_fit_uint32_only)
+TEST_F(CMPI_Containers, SignedKeysFitUint32Only)
 {
     // Below zero the host sends what a server of either kind sends.
     EXPECT_EQ(read(path({{"K", signed_key(-1)}}), UINT32), 0);
@@ -172,23 +174,24 @@ TEST_F(CMPI_Containers, signed_keys_fit_uint32_only)
         EXPECT_EQ(read(path({{"K", signed_key(-1)}}), type), -1) << type;
 }
 
-TEST_F(CMPI_Containers, other_kinds_of_keys_are_not_narrowed)
+TEST_F(CMPI_Containers, OtherKindsOfKeysAreNotNarrowed)
 {
     for (const int type : {BOOLEAN, REAL32, REAL64, CHAR16, STRING, DATETIME})
         EXPECT_EQ(read(path({{"K", unsigned_key(1)}}), type), -1) << type;
-    EXPECT_EQ(read(path({{"K", broker::Value::text("1")}}), UINT32), -1);
+    EXPECT_EQ(read(path({{"K", broker::Plain_Value::text("1")}}), UINT32), -1);
 }
 
-TEST_F(CMPI_Containers, a_boolean_argument_passes_for_a_null_instance_array)
+TEST_F(CMPI_Containers, ABooleanArgumentPassesForANullInstanceArray)
 {
-    EXPECT_EQ(read(args({{"A", broker::Value::null_of(CMPI_boolean)}}), Value::INSTANCE_ARRAY), 0);
+    EXPECT_EQ(read(args({{"A", broker::Plain_Value::null_of(CMPI_boolean)}}), Value::INSTANCE_ARRAY), 0);
     EXPECT_EQ(value.type, Value::INSTANCE_ARRAY);
     EXPECT_TRUE(value.null);
-    EXPECT_EQ(read(args({{"A", broker::Value::null_of(CMPI_boolean)}}), int(UINT32) | Value::ARRAY_BIT), -1);
-    EXPECT_EQ(read(instance({{"A", broker::Value::null_of(CMPI_boolean)}}), Value::INSTANCE_ARRAY), -1);
+    EXPECT_EQ(read(args({{"A", broker::Plain_Value::null_of(CMPI_boolean)}}), int(UINT32) | Value::ARRAY_BIT),
+              -1);
+    EXPECT_EQ(read(instance({{"A", broker::Plain_Value::null_of(CMPI_boolean)}}), Value::INSTANCE_ARRAY), -1);
 }
 
-TEST_F(CMPI_Containers, values_are_set_in_the_servers_objects)
+TEST_F(CMPI_Containers, ValuesAreSetInTheServersObjects)
 {
     value.set_value(uint64(5));
     auto* const object = broker::make_object<broker::Instance_Object>(
@@ -207,7 +210,7 @@ TEST_F(CMPI_Containers, values_are_set_in_the_servers_objects)
     EXPECT_EQ(*broker::find_value(last_args->content, "Any"), unsigned_key(5));
 }
 
-TEST_F(CMPI_Containers, the_return_value_is_no_argument)
+TEST_F(CMPI_Containers, TheReturnValueIsNoArgument)
 {
     value.set_value(uint64(5));
     CMPIArgs_Container container = args({});
@@ -221,7 +224,7 @@ TEST_F(CMPI_Containers, the_return_value_is_no_argument)
     EXPECT_EQ(last_args->content.size(), 1u);
 }
 
-TEST_F(CMPI_Containers, failing_setters_have_their_words)
+TEST_F(CMPI_Containers, FailingSettersHaveTheirWords)
 {
     Log_Capture capture;
     value.set_value(uint64(5));

@@ -3,7 +3,7 @@
 
 using namespace KPRV;
 
-TEST(CMPI_Static_Data, layout_is_fixed)
+TEST(CMPI_Static_Data, LayoutIsFixed)
 {
     constexpr bool narrow = sizeof(void*) == 4;
     EXPECT_EQ(sizeof(CMPI_Static_Data), narrow ? 1200u : 1344u);
@@ -21,7 +21,7 @@ TEST(CMPI_Static_Data, layout_is_fixed)
     EXPECT_EQ(offsetof(CMPI_Static_Data, association_name), narrow ? 944u : 1088u);
 }
 
-TEST(CMPI_Static_Data, tables_are_of_version_100_and_have_no_empty_slot)
+TEST(CMPI_Static_Data, TablesAreOfVersion100AndHaveNoEmptySlot)
 {
     CMPI_Static_Data data = {};
     fill(&data, nullptr, "Sample_Provider");
@@ -46,7 +46,7 @@ TEST(CMPI_Static_Data, tables_are_of_version_100_and_have_no_empty_slot)
     EXPECT_TRUE(no_null_function(data.association_ft));
 }
 
-TEST(CMPI_Static_Data, the_instance_table_bears_the_name_of_the_association)
+TEST(CMPI_Static_Data, TheInstanceTableBearsTheNameOfTheAssociation)
 {
     CMPI_Static_Data data = {};
     fill(&data, nullptr, "Sample_Provider");
@@ -60,7 +60,7 @@ TEST(CMPI_Static_Data, the_instance_table_bears_the_name_of_the_association)
     EXPECT_STREQ(data.indication_name, "indicationSample_Provider");
 }
 
-TEST(CMPI_Static_Data, names_are_cut_at_255_characters)
+TEST(CMPI_Static_Data, NamesAreCutAt255Characters)
 {
     CMPI_Static_Data data = {};
     const std::string provider_name(300, 'p');
@@ -69,7 +69,7 @@ TEST(CMPI_Static_Data, names_are_cut_at_255_characters)
     EXPECT_EQ(std::string(data.association_name), ("association" + provider_name).substr(0, 255));
 }
 
-TEST(CMPI_Static_Data, magic_and_adapter_come_first)
+TEST(CMPI_Static_Data, MagicAndAdapterComeFirst)
 {
     CMPI_Static_Data data = {};
     auto* const adapter = reinterpret_cast<CMPI_Adapter*>(&data);

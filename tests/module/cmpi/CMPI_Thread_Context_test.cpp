@@ -37,7 +37,7 @@ protected:
             Result result;
             for (const std::string& name : names) {
                 result.instances.push_back(
-                    {path_of(class_name, name.c_str()), {{"Name", broker::Value::text(name)}}});
+                    {path_of(class_name, name.c_str()), {{"Name", broker::Plain_Value::text(name)}}});
             }
             return result;
         };
@@ -58,7 +58,7 @@ protected:
 
 } // namespace
 
-TEST_F(CMPI_Thread_Context_Test, get_instance)
+TEST_F(CMPI_Thread_Context_Test, GetInstance)
 {
     answer_with({"answer"});
     server.core->calls.record(true);
@@ -79,7 +79,7 @@ TEST_F(CMPI_Thread_Context_Test, get_instance)
     EXPECT_FALSE(requests[0].properties) << "all of them";
 }
 
-TEST_F(CMPI_Thread_Context_Test, get_instance_with_null_keys_asks_with_a_keyless_path)
+TEST_F(CMPI_Thread_Context_Test, GetInstanceWithNullKeysAsksWithAKeylessPath)
 {
     answer_with({"answer"});
     in_operation([&] {
@@ -89,7 +89,7 @@ TEST_F(CMPI_Thread_Context_Test, get_instance_with_null_keys_asks_with_a_keyless
     EXPECT_TRUE(requests.at(0).path.keys.empty());
 }
 
-TEST_F(CMPI_Thread_Context_Test, get_instance_fails_quietly)
+TEST_F(CMPI_Thread_Context_Test, GetInstanceFailsQuietly)
 {
     answer_with(CMPI_RC_ERR_NOT_FOUND);
     in_operation([&] {
@@ -104,7 +104,7 @@ TEST_F(CMPI_Thread_Context_Test, get_instance_fails_quietly)
     });
 }
 
-TEST_F(CMPI_Thread_Context_Test, enumeration_walks_the_servers_instances)
+TEST_F(CMPI_Thread_Context_Test, EnumerationWalksTheServersInstances)
 {
     answer_with({"a", "b", "c"});
     Texts names;
@@ -122,14 +122,15 @@ TEST_F(CMPI_Thread_Context_Test, enumeration_walks_the_servers_instances)
     EXPECT_EQ(requests[0].path.name_space, "root/up");
 }
 
-TEST_F(CMPI_Thread_Context_Test, elements_are_judged_by_code_and_type_not_by_state)
+TEST_F(CMPI_Thread_Context_Test, ElementsAreJudgedByCodeAndTypeNotByState)
 {
-    Test_Server odd(broker::Host_Options::pegasus_like());
+    Test_Server odd(broker::Server_Options::pegasus_like());
     Served_Provider odd_provider(odd, element_registration);
     odd_provider.factory('I');
     odd.on_up_call = [](const broker::Request&) {
         Result result;
-        result.instances.push_back({path_of("Sample_Element", "a"), {{"Name", broker::Value::text("a")}}});
+        result.instances.push_back(
+            {path_of("Sample_Element", "a"), {{"Name", broker::Plain_Value::text("a")}}});
         return result;
     };
     size_t count = 0;
@@ -149,7 +150,7 @@ TEST_F(CMPI_Thread_Context_Test, elements_are_judged_by_code_and_type_not_by_sta
     odd_provider.cleanup('I');
 }
 
-TEST_F(CMPI_Thread_Context_Test, a_failing_element_ends_the_walk)
+TEST_F(CMPI_Thread_Context_Test, AFailingElementEndsTheWalk)
 {
     answer_with({"a", "b", "c"});
     for (const char* call : {"CMGetNext", "CMGetObjectPath"}) {
@@ -165,7 +166,7 @@ TEST_F(CMPI_Thread_Context_Test, a_failing_element_ends_the_walk)
     }
 }
 
-TEST_F(CMPI_Thread_Context_Test, elements_that_are_no_instances_end_the_walk)
+TEST_F(CMPI_Thread_Context_Test, ElementsThatAreNoInstancesEndTheWalk)
 {
     server.on_up_call = [](const broker::Request&) {
         Result result;
@@ -179,7 +180,7 @@ TEST_F(CMPI_Thread_Context_Test, elements_that_are_no_instances_end_the_walk)
     });
 }
 
-TEST_F(CMPI_Thread_Context_Test, an_enumeration_that_cannot_be_made)
+TEST_F(CMPI_Thread_Context_Test, AnEnumerationThatCannotBeMade)
 {
     answer_with(CMPI_RC_ERR_INVALID_NAMESPACE);
     in_operation([&] {
@@ -192,7 +193,7 @@ TEST_F(CMPI_Thread_Context_Test, an_enumeration_that_cannot_be_made)
     EXPECT_EQ(requests.size(), 1u);
 }
 
-TEST_F(CMPI_Thread_Context_Test, changes_go_to_the_server)
+TEST_F(CMPI_Thread_Context_Test, ChangesGoToTheServer)
 {
     server.on_up_call = [this](const broker::Request& request) {
         requests.push_back(request);
@@ -208,15 +209,15 @@ TEST_F(CMPI_Thread_Context_Test, changes_go_to_the_server)
     });
     ASSERT_EQ(requests.size(), 3u);
     EXPECT_EQ(requests[0].operation, broker::Operation::CREATE_INSTANCE);
-    EXPECT_EQ(*requests[0].instance.property("Name"), broker::Value::text("m"));
+    EXPECT_EQ(*requests[0].instance.property("Name"), broker::Plain_Value::text("m"));
     EXPECT_EQ(requests[1].operation, broker::Operation::MODIFY_INSTANCE);
     EXPECT_FALSE(requests[1].properties);
-    EXPECT_EQ(*requests[1].instance.property("Name"), broker::Value::text("m"));
+    EXPECT_EQ(*requests[1].instance.property("Name"), broker::Plain_Value::text("m"));
     EXPECT_EQ(requests[2].operation, broker::Operation::DELETE_INSTANCE);
     EXPECT_EQ(text_of_key(requests[2].path, "Name"), "m");
 }
 
-TEST_F(CMPI_Thread_Context_Test, failing_changes_are_minus_one)
+TEST_F(CMPI_Thread_Context_Test, FailingChangesAreMinusOne)
 {
     answer_with(CMPI_RC_ERR_NOT_SUPPORTED);
     in_operation([&] {
@@ -240,15 +241,15 @@ TEST_F(CMPI_Thread_Context_Test, failing_changes_are_minus_one)
     });
 }
 
-TEST_F(CMPI_Thread_Context_Test, username_is_the_principal)
+TEST_F(CMPI_Thread_Context_Test, UsernameIsThePrincipal)
 {
-    server.context_entries = {{CMPIPrincipal, broker::Value::text("root")}};
+    server.context_entries = {{CMPIPrincipal, broker::Plain_Value::text("root")}};
     String name;
     in_operation([&] { EXPECT_TRUE(cimom::get_username(name)); });
     EXPECT_EQ(name, "root");
 }
 
-TEST_F(CMPI_Thread_Context_Test, username_without_a_principal)
+TEST_F(CMPI_Thread_Context_Test, UsernameWithoutAPrincipal)
 {
     Log_Capture capture;
     String name("kept");
@@ -257,7 +258,7 @@ TEST_F(CMPI_Thread_Context_Test, username_without_a_principal)
     EXPECT_EQ(capture.said("ERR"), Texts{"ERR username not OK cmpirc=12"});
 }
 
-TEST_F(CMPI_Thread_Context_Test, username_without_a_context_of_the_server)
+TEST_F(CMPI_Thread_Context_Test, UsernameWithoutAContextOfTheServer)
 {
     Log_Capture capture;
     String name;
@@ -266,17 +267,17 @@ TEST_F(CMPI_Thread_Context_Test, username_without_a_context_of_the_server)
     EXPECT_EQ(capture.said("ERR"), Texts{});
 }
 
-TEST_F(CMPI_Thread_Context_Test, a_principal_without_text_is_an_empty_name)
+TEST_F(CMPI_Thread_Context_Test, APrincipalWithoutTextIsAnEmptyName)
 {
-    Test_Server odd(broker::Host_Options::sfcb_like());
-    broker::Mi_Frame frame(odd.broker, {{CMPIPrincipal, broker::Value::text("")}});
+    Test_Server odd(broker::Server_Options::sfcb_like());
+    broker::Mi_Frame frame(odd.broker, {{CMPIPrincipal, broker::Plain_Value::text("")}});
     const Context_Scope scope(odd.broker.cmpi(), frame.context(), provider.adapter());
     String name("old");
     EXPECT_TRUE(cimom::get_username(name));
     EXPECT_EQ(name, "");
 }
 
-TEST_F(CMPI_Thread_Context_Test, allow_unload_is_kept_in_the_adapter)
+TEST_F(CMPI_Thread_Context_Test, AllowUnloadIsKeptInTheAdapter)
 {
     in_operation([&] {
         cimom::allow_unload(false);
@@ -306,7 +307,7 @@ struct Worker
 
 } // namespace
 
-TEST_F(CMPI_Thread_Context_Test, a_thread_has_a_context_of_its_own_and_may_call_the_server)
+TEST_F(CMPI_Thread_Context_Test, AThreadHasAContextOfItsOwnAndMayCallTheServer)
 {
     answer_with({"answer"});
     Worker worker;
@@ -326,7 +327,7 @@ TEST_F(CMPI_Thread_Context_Test, a_thread_has_a_context_of_its_own_and_may_call_
     EXPECT_EQ(server.core->calls.calls("CBDetachThread").size(), 1u);
 }
 
-TEST_F(CMPI_Thread_Context_Test, a_thread_of_a_thread_without_context_fails_quietly)
+TEST_F(CMPI_Thread_Context_Test, AThreadOfAThreadWithoutContextFailsQuietly)
 {
     Worker worker;
     ASSERT_EQ(Thread::create_joinable(worker.thread, Worker::run, &worker), 0);
@@ -336,12 +337,12 @@ TEST_F(CMPI_Thread_Context_Test, a_thread_of_a_thread_without_context_fails_quie
     EXPECT_FALSE(worker.found);
 }
 
-TEST_F(CMPI_Thread_Context_Test, every_operation_works_with_the_context_on_top)
+TEST_F(CMPI_Thread_Context_Test, EveryOperationWorksWithTheContextOnTop)
 {
     Test_Server upper;
     upper.on_up_call = [](const broker::Request& request) {
         Result result;
-        result.instances.push_back({request.path, {{"Name", broker::Value::text("from above")}}});
+        result.instances.push_back({request.path, {{"Name", broker::Plain_Value::text("from above")}}});
         return result;
     };
     broker::Mi_Frame frame(upper.broker, {});

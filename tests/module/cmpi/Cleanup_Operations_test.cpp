@@ -3,7 +3,7 @@
 
 using namespace KPRV;
 
-TEST(Cleanup_Operations, a_veto_holds_against_a_server_that_goes_on)
+TEST(Cleanup_Operations, AVetoHoldsAgainstAServerThatGoesOn)
 {
     Test_Server server;
     script.load = [] {
@@ -26,7 +26,7 @@ TEST(Cleanup_Operations, a_veto_holds_against_a_server_that_goes_on)
     EXPECT_EQ(script.calls, (Texts{"construct", "load", "unload", "destroy"}));
 }
 
-TEST(Cleanup_Operations, a_veto_can_be_taken_back)
+TEST(Cleanup_Operations, AVetoCanBeTakenBack)
 {
     Test_Server server;
     script.load = [] {
@@ -40,7 +40,7 @@ TEST(Cleanup_Operations, a_veto_can_be_taken_back)
     EXPECT_EQ(provider.adapter(), nullptr);
 }
 
-TEST(Cleanup_Operations, unload_has_a_context_but_not_through_the_association_table)
+TEST(Cleanup_Operations, UnloadHasAContextButNotThroughTheAssociationTable)
 {
     for (const char kind : {'I', 'M', 'N', 'A'}) {
         Test_Server server;
@@ -58,7 +58,7 @@ TEST(Cleanup_Operations, unload_has_a_context_but_not_through_the_association_ta
     }
 }
 
-TEST(Cleanup_Operations, an_exception_of_unload_passes_and_leaves_no_context)
+TEST(Cleanup_Operations, AnExceptionOfUnloadPassesAndLeavesNoContext)
 {
     Test_Server server;
     script.unload = []() -> int { throw std::runtime_error("unload"); };

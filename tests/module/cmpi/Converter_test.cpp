@@ -37,7 +37,7 @@ protected:
 
 // --- to the server
 
-TEST_F(Converter, object_path_has_every_key_with_a_value)
+TEST_F(Converter, ObjectPathHasEveryKeyWithAValue)
 {
     const Ref<Instance> port(make_port("p", 7));
     CMPIObjectPath* result = nullptr;
@@ -45,14 +45,14 @@ TEST_F(Converter, object_path_has_every_key_with_a_value)
     EXPECT_EQ(content(result).class_name, "Sample_Port");
     EXPECT_EQ(content(result).name_space, NAME_SPACE);
     EXPECT_EQ(content(result).keys.size(), 2u);
-    EXPECT_EQ(*content(result).key("Number"), broker::Value::unsigned_number(CMPI_uint64, 7));
+    EXPECT_EQ(*content(result).key("Number"), broker::Plain_Value::unsigned_number(CMPI_uint64, 7));
 
     static_cast<Sample_Port*>(port.ptr())->Name.null = 1;
     ASSERT_EQ(make_cmpi_object_path(broker(), port.ptr(), NAME_SPACE, result), CMPI_RC_OK);
     EXPECT_EQ(content(result).keys.size(), 1u);
 }
 
-TEST_F(Converter, a_failing_key_is_left_out_of_the_path)
+TEST_F(Converter, AFailingKeyIsLeftOutOfThePath)
 {
     const Ref<Instance> port(make_port("p", 7));
     server.core->calls.fail("CMAddKey", 1, CMPI_RC_ERR_FAILED);
@@ -61,7 +61,7 @@ TEST_F(Converter, a_failing_key_is_left_out_of_the_path)
     EXPECT_EQ(content(result).keys.size(), 1u);
 }
 
-TEST_F(Converter, a_path_that_the_server_does_not_make)
+TEST_F(Converter, APathThatTheServerDoesNotMake)
 {
     const Ref<Instance> port(make_port("p", 7));
     server.core->calls.fail("CMNewObjectPath", 1, CMPI_RC_ERR_NOT_FOUND);
@@ -70,7 +70,7 @@ TEST_F(Converter, a_path_that_the_server_does_not_make)
     EXPECT_EQ(result, nullptr);
 }
 
-TEST_F(Converter, every_type_goes_to_the_server_and_comes_back)
+TEST_F(Converter, EveryTypeGoesToTheServerAndComesBack)
 {
     const Ref<Instance> sample(create<Sample_Types>(false));
     auto* const types = static_cast<Sample_Types*>(sample.ptr());
@@ -105,7 +105,7 @@ TEST_F(Converter, every_type_goes_to_the_server_and_comes_back)
     EXPECT_TRUE(identical(types, back.ptr()));
 }
 
-TEST_F(Converter, instance_without_a_path_builds_one_and_says_so)
+TEST_F(Converter, InstanceWithoutAPathBuildsOneAndSaysSo)
 {
     Log_Capture capture;
     const Ref<Instance> port(make_port("p", 7));
@@ -119,7 +119,7 @@ TEST_F(Converter, instance_without_a_path_builds_one_and_says_so)
     EXPECT_EQ(ci, nullptr);
 }
 
-TEST_F(Converter, instance_takes_the_property_list)
+TEST_F(Converter, InstanceTakesThePropertyList)
 {
     const Ref<Instance> port(make_port("p", 7));
     CMPIInstance* ci = nullptr;
@@ -136,7 +136,7 @@ TEST_F(Converter, instance_takes_the_property_list)
     EXPECT_EQ(make_cmpi_instance(broker(), port.ptr(), NAME_SPACE, cop, nullptr, ci), CMPI_RC_ERR_FAILED);
 }
 
-TEST_F(Converter, a_failing_property_is_left_out_of_the_instance)
+TEST_F(Converter, AFailingPropertyIsLeftOutOfTheInstance)
 {
     Log_Capture capture;
     const Ref<Instance> other(create<Sample_Other>(false));
@@ -150,7 +150,7 @@ TEST_F(Converter, a_failing_property_is_left_out_of_the_instance)
               (Texts{"WARN CMSetProperty() failed: Size", "WARN conversion error: Sample_Other.Size"}));
 }
 
-TEST_F(Converter, references_go_by_name_unless_they_are_embedded)
+TEST_F(Converter, ReferencesGoByNameUnlessTheyAreEmbedded)
 {
     const Ref<Instance> thing(create<Thing>(true));
     static_cast<Thing*>(thing.ptr())->Friend = make_named("f");
@@ -171,7 +171,7 @@ TEST_F(Converter, references_go_by_name_unless_they_are_embedded)
     EXPECT_EQ(content(ci).property("Leader")->type, CMPI_instance);
 }
 
-TEST_F(Converter, method_gives_out_parameters_and_the_return_value_apart)
+TEST_F(Converter, MethodGivesOutParametersAndTheReturnValueApart)
 {
     const Ref<Instance> record(create(&Sample_Element_Reset_method::static_meta_class));
     auto* const reset = static_cast<Sample_Element_Reset_method*>(record.ptr());
@@ -195,13 +195,13 @@ TEST_F(Converter, method_gives_out_parameters_and_the_return_value_apart)
 
 // --- from the server
 
-TEST_F(Converter, reference_takes_the_keys_narrowed)
+TEST_F(Converter, ReferenceTakesTheKeysNarrowed)
 {
     broker::Path_Value cop = class_path("Thing");
-    cop.keys = {{"Small", broker::Value::unsigned_number(CMPI_uint16, 65535)},
-                {"Signed", broker::Value::unsigned_number(CMPI_uint32, 5)},
-                {"Word", broker::Value::unsigned_number(CMPI_uint32, 6)},
-                {"When", broker::Value::datetime("00000000000001.000000:000")}};
+    cop.keys = {{"Small", broker::Plain_Value::unsigned_number(CMPI_uint16, 65535)},
+                {"Signed", broker::Plain_Value::unsigned_number(CMPI_uint32, 5)},
+                {"Word", broker::Plain_Value::unsigned_number(CMPI_uint32, 6)},
+                {"When", broker::Plain_Value::datetime("00000000000001.000000:000")}};
     Ref<Instance> result;
     ASSERT_EQ(make_cimple_reference(nullptr, &Thing::static_meta_class, path(cop, true)->cmpi(), result),
               CMPI_RC_OK);
@@ -214,12 +214,12 @@ TEST_F(Converter, reference_takes_the_keys_narrowed)
     EXPECT_EQ(thing->Friends.null, 0) << "references have no part in the null flags";
 }
 
-TEST_F(Converter, reference_ignores_what_is_no_key)
+TEST_F(Converter, ReferenceIgnoresWhatIsNoKey)
 {
     Log_Capture capture;
     broker::Path_Value cop = path_of("Sample_Element", "e");
-    cop.keys.push_back({"Caption", broker::Value::text("no key")});
-    cop.keys.push_back({"Unknown", broker::Value::text("nothing")});
+    cop.keys.push_back({"Caption", broker::Plain_Value::text("no key")});
+    cop.keys.push_back({"Unknown", broker::Plain_Value::text("nothing")});
     Ref<Instance> result;
     ASSERT_EQ(make_cimple_reference(nullptr, &Sample_Element::static_meta_class, path(cop)->cmpi(), result),
               CMPI_RC_OK);
@@ -227,13 +227,13 @@ TEST_F(Converter, reference_ignores_what_is_no_key)
     EXPECT_EQ(capture.said(), Texts{"WARN unknown feature: Sample_Element.Unknown"});
 }
 
-TEST_F(Converter, integer_keys_of_a_server_that_signs_them_fit_uint32_only)
+TEST_F(Converter, IntegerKeysOfAServerThatSignsThemFitUint32Only)
 {
-    Test_Server signing(broker::Host_Options::pegasus_like());
+    Test_Server signing(broker::Server_Options::pegasus_like());
     broker::Mi_Frame signing_frame(signing.broker, {});
     broker::Path_Value cop = class_path("Thing");
-    cop.keys = {{"Small", broker::Value::unsigned_number(CMPI_uint16, 5)},
-                {"Word", broker::Value::unsigned_number(CMPI_uint32, 6)}};
+    cop.keys = {{"Small", broker::Plain_Value::unsigned_number(CMPI_uint16, 5)},
+                {"Word", broker::Plain_Value::unsigned_number(CMPI_uint32, 6)}};
     Ref<Instance> result;
     auto* const object = broker::make_object<broker::Path_Object>(*signing.core, "test", cop, true);
     ASSERT_EQ(make_cimple_reference(nullptr, &Thing::static_meta_class, object->cmpi(), result), CMPI_RC_OK);
@@ -242,7 +242,7 @@ TEST_F(Converter, integer_keys_of_a_server_that_signs_them_fit_uint32_only)
     EXPECT_EQ(static_cast<Thing*>(result.ptr())->Word.null, 0);
 }
 
-TEST_F(Converter, an_absent_path_or_name_space)
+TEST_F(Converter, AnAbsentPathOrNameSpace)
 {
     Ref<Instance> result(make_named("old"));
     EXPECT_EQ(make_cimple_reference(nullptr, &Sample_Element::static_meta_class, nullptr, result),
@@ -255,15 +255,16 @@ TEST_F(Converter, an_absent_path_or_name_space)
     EXPECT_EQ(result->__name_space, "");
 }
 
-TEST_F(Converter, nested_instances_keep_their_name_space_or_take_that_of_the_call)
+TEST_F(Converter, NestedInstancesKeepTheirNameSpaceOrTakeThatOfTheCall)
 {
     // What the name space of an embedded instance was is lost on the way in: it gets that of the path.
     Ref<Instance> result;
     ASSERT_EQ(make_cimple_instance(
                   broker(), &Sample_Group::static_meta_class, path(class_path("Sample_Group"))->cmpi(),
                   instance({class_path("Sample_Group"),
-                            {{"Leader", broker::Value::instance({path_of("Sample_Element", "l"),
-                                                                 {{"Name", broker::Value::text("l")}}})}}})
+                            {{"Leader",
+                              broker::Plain_Value::instance({path_of("Sample_Element", "l"),
+                                                             {{"Name", broker::Plain_Value::text("l")}}})}}})
                       ->cmpi(),
                   result),
               CMPI_RC_OK);
@@ -280,19 +281,19 @@ TEST_F(Converter, nested_instances_keep_their_name_space_or_take_that_of_the_cal
     EXPECT_EQ(content(ci).property("Friend")->as_path()->name_space, "root/own");
 }
 
-TEST_F(Converter, instance_leaves_out_what_does_not_fit)
+TEST_F(Converter, InstanceLeavesOutWhatDoesNotFit)
 {
     Log_Capture capture;
     Ref<Instance> result;
-    const std::vector<broker::Value> elements = {broker::Value::null_of(CMPI_uint32)};
+    const std::vector<broker::Plain_Value> elements = {broker::Plain_Value::null_of(CMPI_uint32)};
     ASSERT_EQ(make_cimple_instance(broker(), &Sample_Element::static_meta_class,
                                    path(class_path("Sample_Element"))->cmpi(),
                                    instance({class_path("Sample_Element"),
-                                             {{"Name", broker::Value::unsigned_number(CMPI_uint8, 1)},
-                                              {"EnabledState", broker::Value::null_of(CMPI_uint16)},
-                                              {"Codes", broker::Value::array(CMPI_uint32, elements)},
-                                              {"Caption", broker::Value::text("kept")},
-                                              {"Reset", broker::Value::text("a method")}}})
+                                             {{"Name", broker::Plain_Value::unsigned_number(CMPI_uint8, 1)},
+                                              {"EnabledState", broker::Plain_Value::null_of(CMPI_uint16)},
+                                              {"Codes", broker::Plain_Value::array(CMPI_uint32, elements)},
+                                              {"Caption", broker::Plain_Value::text("kept")},
+                                              {"Reset", broker::Plain_Value::text("a method")}}})
                                        ->cmpi(),
                                    result),
               CMPI_RC_OK);
@@ -308,13 +309,13 @@ TEST_F(Converter, instance_leaves_out_what_does_not_fit)
                "WARN conversion error: Sample_Element.Codes", "WARN unknown feature: Sample_Element.Reset"}));
 }
 
-TEST_F(Converter, method_takes_in_parameters_only)
+TEST_F(Converter, MethodTakesInParametersOnly)
 {
     Ref<Instance> record;
     auto* const in = broker::make_object<broker::Args_Object>(
         *server.core, "test",
-        std::vector<broker::Named_Value>{{"force", broker::Value::boolean(true)},
-                                         {"Message", broker::Value::text("out only")}});
+        std::vector<broker::Named_Value>{{"force", broker::Plain_Value::boolean(true)},
+                                         {"Message", broker::Plain_Value::text("out only")}});
     ASSERT_EQ(make_cimple_method(nullptr, &Sample_Element::static_meta_class,
                                  &Sample_Element_Reset_method::static_meta_class,
                                  path(class_path("Sample_Element"))->cmpi(), in->cmpi(), nullptr, record),
@@ -328,7 +329,7 @@ TEST_F(Converter, method_takes_in_parameters_only)
     EXPECT_EQ(reset->__name_space, NAME_SPACE);
 }
 
-TEST_F(Converter, method_shares_the_name_space_of_what_it_is_called_on_if_it_is_the_same)
+TEST_F(Converter, MethodSharesTheNameSpaceOfWhatItIsCalledOnIfItIsTheSame)
 {
     const Ref<Instance> element(make_named<Sample_Element>("x"));
     for (const char* name_space : {NAME_SPACE, "root/other", ""}) {

@@ -109,7 +109,7 @@ private:
 
 } // namespace
 
-TEST_F(Indication_Operations, filters_are_counted_by_name_space)
+TEST_F(Indication_Operations, FiltersAreCountedByNameSpace)
 {
     activate("root/one");
     activate("root/two");
@@ -123,14 +123,14 @@ TEST_F(Indication_Operations, filters_are_counted_by_name_space)
     EXPECT_EQ(name_spaces(), (Texts{"root/two 1", "root/one 1"}));
 }
 
-TEST_F(Indication_Operations, names_of_name_spaces_are_compared_exactly)
+TEST_F(Indication_Operations, NamesOfNameSpacesAreComparedExactly)
 {
     activate("root/one");
     activate("ROOT/one");
     EXPECT_EQ(name_spaces(), (Texts{"root/one 1", "ROOT/one 1"}));
 }
 
-TEST_F(Indication_Operations, an_unknown_name_space_is_ignored)
+TEST_F(Indication_Operations, AnUnknownNameSpaceIsIgnored)
 {
     EXPECT_EQ(deactivate("root/one"), CMPI_RC_OK);
     activate("root/one");
@@ -138,14 +138,14 @@ TEST_F(Indication_Operations, an_unknown_name_space_is_ignored)
     EXPECT_EQ(name_spaces(), Texts{"root/one 1"});
 }
 
-TEST_F(Indication_Operations, an_absent_name_space_is_empty)
+TEST_F(Indication_Operations, AnAbsentNameSpaceIsEmpty)
 {
     server.core->calls.fail("CMGetNameSpace", 1, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(activate("root/one"), CMPI_RC_OK);
     EXPECT_EQ(name_spaces(), Texts{" 1"});
 }
 
-TEST_F(Indication_Operations, authorize_and_poll_are_always_fine)
+TEST_F(Indication_Operations, AuthorizeAndPollAreAlwaysFine)
 {
     Log_Capture capture;
     broker::Mi_Frame frame(server.broker, {});
@@ -158,7 +158,7 @@ TEST_F(Indication_Operations, authorize_and_poll_are_always_fine)
                      "DBG enter: mustPoll()", "DBG return: mustPoll(): CMPI_RC_OK"}));
 }
 
-TEST_F(Indication_Operations, filters_have_no_context)
+TEST_F(Indication_Operations, FiltersHaveNoContext)
 {
     Thread_Context* seen = reinterpret_cast<Thread_Context*>(this);
     server.core->calls.record(true);
@@ -168,7 +168,7 @@ TEST_F(Indication_Operations, filters_have_no_context)
     EXPECT_EQ(server.calls(), Texts{"CMGetNameSpace"});
 }
 
-TEST_F(Indication_Operations, enabling_calls_the_provider_once)
+TEST_F(Indication_Operations, EnablingCallsTheProviderOnce)
 {
     EXPECT_EQ(enable(), CMPI_RC_OK);
     EXPECT_TRUE(provider.adapter()->indications_enabled);
@@ -180,7 +180,7 @@ TEST_F(Indication_Operations, enabling_calls_the_provider_once)
     EXPECT_EQ(script.calls, (Texts{"enable_indications", "disable_indications"}));
 }
 
-TEST_F(Indication_Operations, disabling_without_enabling_does_not_call_the_provider)
+TEST_F(Indication_Operations, DisablingWithoutEnablingDoesNotCallTheProvider)
 {
     Log_Capture capture;
     EXPECT_EQ(disable(), CMPI_RC_OK);
@@ -188,7 +188,7 @@ TEST_F(Indication_Operations, disabling_without_enabling_does_not_call_the_provi
     EXPECT_EQ(capture.said(), Texts{"DBG enter: disableIndications()"}) << "no trace of the return";
 }
 
-TEST_F(Indication_Operations, a_failed_enabling_stays_enabled)
+TEST_F(Indication_Operations, AFailedEnablingStaysEnabled)
 {
     script.enable_indications = [](const Script::Deliver&) { return 140; };
     EXPECT_EQ(enable(), CMPI_RC_ERR_FAILED);
@@ -199,7 +199,7 @@ TEST_F(Indication_Operations, a_failed_enabling_stays_enabled)
     EXPECT_EQ(enable(), CMPI_RC_ERR_FAILED);
 }
 
-TEST_F(Indication_Operations, statuses_outside_the_table_are_fine)
+TEST_F(Indication_Operations, StatusesOutsideTheTableAreFine)
 {
     script.enable_indications = [](const Script::Deliver&) { return 141; };
     EXPECT_EQ(enable(), CMPI_RC_OK);
@@ -211,7 +211,7 @@ TEST_F(Indication_Operations, statuses_outside_the_table_are_fine)
     EXPECT_EQ(disable(), CMPI_RC_OK);
 }
 
-TEST_F(Indication_Operations, an_indication_goes_once_into_each_name_space)
+TEST_F(Indication_Operations, AnIndicationGoesOnceIntoEachNameSpace)
 {
     enable();
     activate("root/one");
@@ -226,7 +226,7 @@ TEST_F(Indication_Operations, an_indication_goes_once_into_each_name_space)
               (Texts{"CBDeliverIndication root/one", "CBDeliverIndication root/two"}));
 }
 
-TEST_F(Indication_Operations, a_delivery_leaves_nothing_behind)
+TEST_F(Indication_Operations, ADeliveryLeavesNothingBehind)
 {
     // Servers free what is made on an attached thread only when the thread ends.
     enable();
@@ -242,7 +242,7 @@ TEST_F(Indication_Operations, a_delivery_leaves_nothing_behind)
     EXPECT_EQ(server.delivered.size(), 200u);
 }
 
-TEST_F(Indication_Operations, a_worker_passes_an_operation_that_waits_for_its_end)
+TEST_F(Indication_Operations, AWorkerPassesAnOperationThatWaitsForItsEnd)
 {
     Delivery_Worker worker;
     std::promise<void> stopping;
@@ -291,19 +291,19 @@ void Indication_Operations::expect_that_a_delivery_waits_for_an_operation()
     EXPECT_EQ(delivered_to(), Texts{"root/one"});
 }
 
-TEST_F(Indication_Operations, a_delivery_waits_for_any_other_operation)
+TEST_F(Indication_Operations, ADeliveryWaitsForAnyOtherOperation)
 {
     expect_that_a_delivery_waits_for_an_operation();
 }
 
-TEST_F(Indication_Operations, a_delivery_waits_also_after_a_disabling)
+TEST_F(Indication_Operations, ADeliveryWaitsAlsoAfterADisabling)
 {
     enable();
     disable();
     expect_that_a_delivery_waits_for_an_operation();
 }
 
-TEST_F(Indication_Operations, a_delivery_waits_also_after_a_disabling_that_threw)
+TEST_F(Indication_Operations, ADeliveryWaitsAlsoAfterADisablingThatThrew)
 {
     script.disable_indications = []() -> int { throw std::runtime_error("disable"); };
     enable();
@@ -314,7 +314,7 @@ TEST_F(Indication_Operations, a_delivery_waits_also_after_a_disabling_that_threw
     expect_that_a_delivery_waits_for_an_operation();
 }
 
-TEST_F(Indication_Operations, without_filters_an_indication_is_dropped)
+TEST_F(Indication_Operations, WithoutFiltersAnIndicationIsDropped)
 {
     enable();
     server.core->calls.record(true);
@@ -322,7 +322,7 @@ TEST_F(Indication_Operations, without_filters_an_indication_is_dropped)
     EXPECT_TRUE(server.calls().empty());
 }
 
-TEST_F(Indication_Operations, the_end_mark_is_nothing_to_deliver)
+TEST_F(Indication_Operations, TheEndMarkIsNothingToDeliver)
 {
     enable();
     activate("root/one");
@@ -330,7 +330,7 @@ TEST_F(Indication_Operations, the_end_mark_is_nothing_to_deliver)
     EXPECT_TRUE(server.delivered.empty());
 }
 
-TEST_F(Indication_Operations, a_failed_conversion_skips_one_name_space)
+TEST_F(Indication_Operations, AFailedConversionSkipsOneNameSpace)
 {
     enable();
     activate("root/one");
@@ -340,7 +340,7 @@ TEST_F(Indication_Operations, a_failed_conversion_skips_one_name_space)
     EXPECT_EQ(delivered_to(), Texts{"root/two"});
 }
 
-TEST_F(Indication_Operations, the_code_of_a_delivery_is_not_looked_at)
+TEST_F(Indication_Operations, TheCodeOfADeliveryIsNotLookedAt)
 {
     enable();
     activate("root/one");
@@ -350,7 +350,7 @@ TEST_F(Indication_Operations, the_code_of_a_delivery_is_not_looked_at)
     EXPECT_EQ(server.delivered.size(), 2u);
 }
 
-TEST_F(Indication_Operations, filters_may_change_during_a_delivery)
+TEST_F(Indication_Operations, FiltersMayChangeDuringADelivery)
 {
     enable();
     activate("root/one");
@@ -360,7 +360,7 @@ TEST_F(Indication_Operations, filters_may_change_during_a_delivery)
     EXPECT_EQ(delivered_to(), Texts{"root/one"});
 }
 
-TEST_F(Indication_Operations, a_worker_started_in_the_operation_is_attached_to_the_server)
+TEST_F(Indication_Operations, AWorkerStartedInTheOperationIsAttachedToTheServer)
 {
     Delivery_Worker worker;
     script.enable_indications = [&](const Script::Deliver& x) {
@@ -379,7 +379,7 @@ TEST_F(Indication_Operations, a_worker_started_in_the_operation_is_attached_to_t
     EXPECT_EQ(calls.back(), "CBDetachThread");
 }
 
-TEST_F(Indication_Operations, delivery_from_a_thread_without_context_is_fatal)
+TEST_F(Indication_Operations, DeliveryFromAThreadWithoutContextIsFatal)
 {
     testing::FLAGS_gtest_death_test_style = "threadsafe";
     enable();
@@ -392,7 +392,7 @@ TEST_F(Indication_Operations, delivery_from_a_thread_without_context_is_fatal)
         testing::KilledBySignal(SIGABRT), "assert: thread_context != 0\n\n$");
 }
 
-TEST_F(Indication_Operations, an_exception_of_the_provider_passes)
+TEST_F(Indication_Operations, AnExceptionOfTheProviderPasses)
 {
     script.enable_indications = [](const Script::Deliver&) -> int { throw std::runtime_error("enable"); };
     EXPECT_THROW(enable(), std::runtime_error);

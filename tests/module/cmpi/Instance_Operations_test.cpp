@@ -69,9 +69,10 @@ protected:
     Test_Server server;
     Served_Provider provider{server, element_registration};
     const broker::Path_Value a = path_of("Sample_Element", "a");
-    const broker::Instance_Value a_off{a,
-                                       {{"Name", broker::Value::text("a")},
-                                        {"EnabledState", broker::Value::unsigned_number(CMPI_uint16, 3)}}};
+    const broker::Instance_Value a_off{
+        a,
+        {{"Name", broker::Plain_Value::text("a")},
+         {"EnabledState", broker::Plain_Value::unsigned_number(CMPI_uint16, 3)}}};
 };
 
 /// "Name EnabledState Caption ...": 1 where the cell is null.
@@ -104,7 +105,7 @@ struct Row
 
 // --- enumerateInstances
 
-TEST_F(Instance_Operations, enumeration_returns_each_instance)
+TEST_F(Instance_Operations, EnumerationReturnsEachInstance)
 {
     script.enum_instances = deliver_a_and_b;
     const Result result = enumerate(class_path("Sample_Element"));
@@ -118,7 +119,7 @@ TEST_F(Instance_Operations, enumeration_returns_each_instance)
     EXPECT_EQ(script.calls, Texts{"enum_instances"});
 }
 
-TEST_F(Instance_Operations, enumeration_makes_its_calls_in_order)
+TEST_F(Instance_Operations, EnumerationMakesItsCallsInOrder)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(bare_element("a"));
@@ -133,7 +134,7 @@ TEST_F(Instance_Operations, enumeration_makes_its_calls_in_order)
                      "CMRelease instance", "CMReturnDone"}));
 }
 
-TEST_F(Instance_Operations, enumeration_model_has_the_keys_and_the_list)
+TEST_F(Instance_Operations, EnumerationModelHasTheKeysAndTheList)
 {
     std::string seen;
     script.enum_instances = [&](const Instance* model, const Script::Deliver&) {
@@ -151,7 +152,7 @@ TEST_F(Instance_Operations, enumeration_model_has_the_keys_and_the_list)
     EXPECT_EQ(seen, "1111111");
 }
 
-TEST_F(Instance_Operations, enumeration_serves_any_class_of_the_module)
+TEST_F(Instance_Operations, EnumerationServesAnyClassOfTheModule)
 {
     const Meta_Class* seen = nullptr;
     script.enum_instances = [&](const Instance* model, const Script::Deliver&) {
@@ -164,7 +165,7 @@ TEST_F(Instance_Operations, enumeration_serves_any_class_of_the_module)
     EXPECT_EQ(seen, &Sample_Other::static_meta_class);
 }
 
-TEST_F(Instance_Operations, statuses_of_enumerations)
+TEST_F(Instance_Operations, StatusesOfEnumerations)
 {
     const Row instances[] = {{0, 0, 1}, {70, 1, 0}, {71, 2, 0}, {72, 0, 1}, {-1, 0, 1}, {60, 0, 1}};
     const Row names[] = {{0, 0, 1}, {70, 1, 0}, {71, 2, 0}, {72, 0, 0}, {-1, 0, 0}, {60, 0, 0}};
@@ -184,7 +185,7 @@ TEST_F(Instance_Operations, statuses_of_enumerations)
     }
 }
 
-TEST_F(Instance_Operations, a_failed_conversion_cuts_the_enumeration_short_without_a_word)
+TEST_F(Instance_Operations, AFailedConversionCutsTheEnumerationShortWithoutAWord)
 {
     Texts answers;
     script.enum_instances = [&](const Instance*, const Script::Deliver& deliver) {
@@ -200,7 +201,7 @@ TEST_F(Instance_Operations, a_failed_conversion_cuts_the_enumeration_short_witho
     EXPECT_EQ(answers, (Texts{"taken", "dropped", "dropped"}));
 }
 
-TEST_F(Instance_Operations, an_object_path_that_fails_is_tried_once_more)
+TEST_F(Instance_Operations, AnObjectPathThatFailsIsTriedOnceMore)
 {
     script.enum_instances = deliver_a_and_b;
     server.core->calls.fail("CMNewObjectPath", 1, CMPI_RC_ERR_FAILED);
@@ -209,7 +210,7 @@ TEST_F(Instance_Operations, an_object_path_that_fails_is_tried_once_more)
 
 // --- enumerateInstanceNames
 
-TEST_F(Instance_Operations, names_are_returned_as_paths)
+TEST_F(Instance_Operations, NamesAreReturnedAsPaths)
 {
     script.enum_instances = deliver_a_and_b;
     server.core->calls.record(true);
@@ -225,7 +226,7 @@ TEST_F(Instance_Operations, names_are_returned_as_paths)
                      "CMAddKey Name", "CMReturnObjectPath", "CMRelease object path", "CMReturnDone"}));
 }
 
-TEST_F(Instance_Operations, names_model_has_null_non_keys)
+TEST_F(Instance_Operations, NamesModelHasNullNonKeys)
 {
     std::string seen;
     script.enum_instances = [&](const Instance* model, const Script::Deliver&) {
@@ -236,7 +237,7 @@ TEST_F(Instance_Operations, names_model_has_null_non_keys)
     EXPECT_EQ(seen, "0111111");
 }
 
-TEST_F(Instance_Operations, a_failed_name_cuts_the_names_short)
+TEST_F(Instance_Operations, AFailedNameCutsTheNamesShort)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         EXPECT_FALSE(deliver(bare_element("a")));
@@ -250,7 +251,7 @@ TEST_F(Instance_Operations, a_failed_name_cuts_the_names_short)
     EXPECT_TRUE(result.paths.empty());
 }
 
-TEST_F(Instance_Operations, a_null_key_is_left_out_of_the_path)
+TEST_F(Instance_Operations, ANullKeyIsLeftOutOfThePath)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         Sample_Element* const element = bare_element("a");
@@ -265,7 +266,7 @@ TEST_F(Instance_Operations, a_null_key_is_left_out_of_the_path)
 
 // --- getInstance
 
-TEST_F(Instance_Operations, get_returns_the_providers_instance)
+TEST_F(Instance_Operations, GetReturnsTheProvidersInstance)
 {
     script.get_instance = [](const Instance*, Instance*& instance) {
         instance = bare_element("a");
@@ -283,7 +284,7 @@ TEST_F(Instance_Operations, get_returns_the_providers_instance)
                      "CMSetProperty Name", "CMReturnInstance", "CMReturnDone"}));
 }
 
-TEST_F(Instance_Operations, get_model_marks_what_is_wanted)
+TEST_F(Instance_Operations, GetModelMarksWhatIsWanted)
 {
     std::string seen;
     script.get_instance = [&](const Instance* model, Instance*&) {
@@ -301,7 +302,7 @@ TEST_F(Instance_Operations, get_model_marks_what_is_wanted)
     EXPECT_EQ(seen, "0111111") << "a method's name ends the list";
 }
 
-TEST_F(Instance_Operations, statuses_of_get)
+TEST_F(Instance_Operations, StatusesOfGet)
 {
     const Row rows[] = {{60, 6, 0}, {62, 4, 0}, {63, 2, 0}, {64, 1, 0}, {0, 0, 1}, {65, 0, 1}, {-1, 0, 1}};
     for (const Row& row : rows) {
@@ -317,7 +318,7 @@ TEST_F(Instance_Operations, statuses_of_get)
     }
 }
 
-TEST_F(Instance_Operations, unsupported_get_finds_by_enumeration)
+TEST_F(Instance_Operations, UnsupportedGetFindsByEnumeration)
 {
     EXPECT_EQ(get(a).rc, CMPI_RC_ERR_NOT_FOUND);
     script.enum_instances = deliver_a_and_b;
@@ -330,7 +331,7 @@ TEST_F(Instance_Operations, unsupported_get_finds_by_enumeration)
     EXPECT_EQ(get(path_of("Sample_Element", "c")).rc, CMPI_RC_ERR_NOT_FOUND);
 }
 
-TEST_F(Instance_Operations, a_result_that_does_not_convert_is_gets_code)
+TEST_F(Instance_Operations, AResultThatDoesNotConvertIsGetsCode)
 {
     script.get_instance = [](const Instance*, Instance*& instance) {
         instance = bare_element("a");
@@ -347,7 +348,7 @@ TEST_F(Instance_Operations, a_result_that_does_not_convert_is_gets_code)
 
 // --- createInstance
 
-TEST_F(Instance_Operations, create_hands_the_instance_over_and_answers_its_path)
+TEST_F(Instance_Operations, CreateHandsTheInstanceOverAndAnswersItsPath)
 {
     script.create_instance = [](Instance* instance) {
         auto* const element = static_cast<Sample_Element*>(instance);
@@ -364,7 +365,7 @@ TEST_F(Instance_Operations, create_hands_the_instance_over_and_answers_its_path)
     EXPECT_EQ(result.paths[0].name_space, NAME_SPACE);
 }
 
-TEST_F(Instance_Operations, statuses_of_create)
+TEST_F(Instance_Operations, StatusesOfCreate)
 {
     const Row rows[] = {{0, 0, 1},  {80, 11, 0}, {81, 7, 0}, {82, 4, 0},
                         {83, 2, 0}, {84, 1, 0},  {85, 0, 0}, {-1, 0, 0}};
@@ -377,7 +378,7 @@ TEST_F(Instance_Operations, statuses_of_create)
     }
 }
 
-TEST_F(Instance_Operations, a_path_that_fails_is_creates_code)
+TEST_F(Instance_Operations, APathThatFailsIsCreatesCode)
 {
     script.create_instance = [](Instance*) { return 0; };
     server.core->calls.fail("CMNewObjectPath", 1, CMPI_RC_ERR_NOT_FOUND);
@@ -388,7 +389,7 @@ TEST_F(Instance_Operations, a_path_that_fails_is_creates_code)
 
 // --- modifyInstance
 
-TEST_F(Instance_Operations, modify_passes_model_and_instance)
+TEST_F(Instance_Operations, ModifyPassesModelAndInstance)
 {
     std::string model_nulls, instance_nulls;
     script.modify_instance = [&](const Instance* model, const Instance* instance) {
@@ -412,7 +413,7 @@ TEST_F(Instance_Operations, modify_passes_model_and_instance)
     EXPECT_EQ(model_nulls, "0111111");
 }
 
-TEST_F(Instance_Operations, statuses_of_modify)
+TEST_F(Instance_Operations, StatusesOfModify)
 {
     const Row rows[] = {{0, 0, 1},   {100, 6, 0}, {101, 7, 0}, {102, 4, 0},
                         {103, 2, 0}, {104, 1, 0}, {105, 0, 0}, {-1, 0, 0}};
@@ -427,7 +428,7 @@ TEST_F(Instance_Operations, statuses_of_modify)
 
 // --- deleteInstance
 
-TEST_F(Instance_Operations, statuses_of_delete)
+TEST_F(Instance_Operations, StatusesOfDelete)
 {
     const Row rows[] = {{0, 0, 1}, {90, 6, 0}, {91, 7, 0}, {92, 2, 0}, {93, 1, 0}, {94, 0, 1}, {-1, 0, 1}};
     for (const Row& row : rows) {
@@ -443,7 +444,7 @@ TEST_F(Instance_Operations, statuses_of_delete)
 
 // --- execQuery, and what all have in common
 
-TEST_F(Instance_Operations, queries_are_not_supported)
+TEST_F(Instance_Operations, QueriesAreNotSupported)
 {
     Thread_Context* context = nullptr;
     const Result result = provider.operate(a, [&](auto ctx, auto rslt, auto cop) {
@@ -455,7 +456,7 @@ TEST_F(Instance_Operations, queries_are_not_supported)
     EXPECT_TRUE(script.calls.empty());
 }
 
-TEST_F(Instance_Operations, an_unknown_class_fails_before_the_provider)
+TEST_F(Instance_Operations, AnUnknownClassFailsBeforeTheProvider)
 {
     for (const char* name : {"Unknown", ""}) {
         const broker::Path_Value path = class_path(name);
@@ -469,7 +470,7 @@ TEST_F(Instance_Operations, an_unknown_class_fails_before_the_provider)
     EXPECT_TRUE(script.calls.empty());
 }
 
-TEST_F(Instance_Operations, a_class_name_that_the_server_does_not_give_is_unknown)
+TEST_F(Instance_Operations, AClassNameThatTheServerDoesNotGiveIsUnknown)
 {
     server.core->calls.fail("CMGetClassName", 1, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(enumerate(a).rc, CMPI_RC_ERR_FAILED);
@@ -478,7 +479,7 @@ TEST_F(Instance_Operations, a_class_name_that_the_server_does_not_give_is_unknow
     EXPECT_TRUE(script.calls.empty());
 }
 
-TEST_F(Instance_Operations, a_name_space_that_the_server_does_not_give_is_empty)
+TEST_F(Instance_Operations, ANameSpaceThatTheServerDoesNotGiveIsEmpty)
 {
     script.enum_instances = deliver_a_and_b;
     server.core->calls.fail("CMGetNameSpace", 2, CMPI_RC_ERR_FAILED);

@@ -44,7 +44,7 @@ protected:
 
 } // namespace
 
-TEST_F(Method_Operations, parameters_go_in_and_out)
+TEST_F(Method_Operations, ParametersGoInAndOut)
 {
     script.invoke = [](const Instance* self, Instance* method) {
         EXPECT_EQ(name_of_sample(self), "a");
@@ -61,19 +61,19 @@ TEST_F(Method_Operations, parameters_go_in_and_out)
         return 0;
     };
     const Result result = invoke(a, "reset",
-                                 {{"Force", broker::Value::boolean(true)},
-                                  {"Target", broker::Value::path(path_of("Sample_Element", "t"))},
-                                  {"Count", broker::Value::unsigned_number(CMPI_uint32, 5)},
-                                  {"Message", broker::Value::text("ignored: an out parameter")}});
+                                 {{"Force", broker::Plain_Value::boolean(true)},
+                                  {"Target", broker::Plain_Value::path(path_of("Sample_Element", "t"))},
+                                  {"Count", broker::Plain_Value::unsigned_number(CMPI_uint32, 5)},
+                                  {"Message", broker::Plain_Value::text("ignored: an out parameter")}});
     EXPECT_EQ(result.rc, CMPI_RC_OK);
     EXPECT_EQ(result.done_count, 1u);
-    EXPECT_EQ(result.return_value, broker::Value::unsigned_number(CMPI_uint32, 7));
+    EXPECT_EQ(result.return_value, broker::Plain_Value::unsigned_number(CMPI_uint32, 7));
     ASSERT_EQ(result.out.size(), 2u) << "no in parameters, no return_value";
-    EXPECT_EQ(*broker::find_value(result.out, "Count"), broker::Value::unsigned_number(CMPI_uint32, 6));
-    EXPECT_EQ(*broker::find_value(result.out, "Message"), broker::Value::text("done"));
+    EXPECT_EQ(*broker::find_value(result.out, "Count"), broker::Plain_Value::unsigned_number(CMPI_uint32, 6));
+    EXPECT_EQ(*broker::find_value(result.out, "Message"), broker::Plain_Value::text("done"));
 }
 
-TEST_F(Method_Operations, calls_are_made_in_order)
+TEST_F(Method_Operations, CallsAreMadeInOrder)
 {
     script.invoke = [](const Instance*, Instance* method) {
         static_cast<Sample_Element_Reset_method*>(method)->return_value.set(0);
@@ -86,7 +86,7 @@ TEST_F(Method_Operations, calls_are_made_in_order)
                      "CMGetArgCount", "CMGetNameSpace", "CMReturnData", "CMReturnDone"}));
 }
 
-TEST_F(Method_Operations, statuses)
+TEST_F(Method_Operations, Statuses)
 {
     const struct
     {
@@ -106,7 +106,7 @@ TEST_F(Method_Operations, statuses)
     }
 }
 
-TEST_F(Method_Operations, a_null_return_value_is_data_of_type_0)
+TEST_F(Method_Operations, ANullReturnValueIsDataOfType0)
 {
     server.core->calls.record(true);
     const Result result = invoke(a, "Reset");
@@ -115,7 +115,7 @@ TEST_F(Method_Operations, a_null_return_value_is_data_of_type_0)
     EXPECT_EQ(server.core->calls.calls("CMReturnData").size(), 1u);
 }
 
-TEST_F(Method_Operations, refusals_have_their_codes_and_texts)
+TEST_F(Method_Operations, RefusalsHaveTheirCodesAndTexts)
 {
     Log_Capture capture;
     EXPECT_EQ(invoke(class_path("Unknown"), "Reset").rc, CMPI_RC_ERR_FAILED);
@@ -128,14 +128,14 @@ TEST_F(Method_Operations, refusals_have_their_codes_and_texts)
                      "DBG return: invokeMethod(): CMPI_RC_ERR_METHOD_NOT_FOUND Nothing"}));
 }
 
-TEST_F(Method_Operations, inherited_methods_are_found_in_the_class_of_the_path)
+TEST_F(Method_Operations, InheritedMethodsAreFoundInTheClassOfThePath)
 {
     script.invoke = [](const Instance*, Instance*) { return 0; };
     EXPECT_EQ(invoke(path_of("Sample_Port", "p"), "Reset").rc, CMPI_RC_OK);
     EXPECT_EQ(script.calls, Texts{"invoke"});
 }
 
-TEST_F(Thing_Methods, a_method_named_like_the_class_of_its_path_is_refused)
+TEST_F(Thing_Methods, AMethodNamedLikeTheClassOfItsPathIsRefused)
 {
     Log_Capture capture;
     EXPECT_EQ(invoke(class_path("thing"), "THING").rc, CMPI_RC_ERR_INVALID_CLASS);
@@ -144,7 +144,7 @@ TEST_F(Thing_Methods, a_method_named_like_the_class_of_its_path_is_refused)
     EXPECT_EQ(invoke(class_path("Thing"), "Count").rc, CMPI_RC_OK);
 }
 
-TEST_F(Thing_Methods, instances_go_in_by_value_and_by_name_and_out_by_name)
+TEST_F(Thing_Methods, InstancesGoInByValueAndByNameAndOutByName)
 {
     script.invoke = [](const Instance*, Instance* method) {
         auto* const record = static_cast<Thing_Choose_method*>(method);
@@ -163,18 +163,18 @@ TEST_F(Thing_Methods, instances_go_in_by_value_and_by_name_and_out_by_name)
         return 0;
     };
     const broker::Instance_Value first{path_of("Sample_Element", "first"),
-                                       {{"Name", broker::Value::text("first")}}};
+                                       {{"Name", broker::Plain_Value::text("first")}}};
     const broker::Instance_Value second{path_of("Sample_Port", "second"),
-                                        {{"Name", broker::Value::text("second")},
-                                         {"Number", broker::Value::unsigned_number(CMPI_uint64, 2)}}};
-    const Result result =
-        invoke(class_path("Thing"), "Choose",
-               {{"Candidates", broker::Value::array(CMPI_instance, {broker::Value::instance(first),
-                                                                    broker::Value::instance(second)})},
-                {"Who", broker::Value::path(path_of("Sample_Element", "w"))}});
+                                        {{"Name", broker::Plain_Value::text("second")},
+                                         {"Number", broker::Plain_Value::unsigned_number(CMPI_uint64, 2)}}};
+    const Result result = invoke(
+        class_path("Thing"), "Choose",
+        {{"Candidates", broker::Plain_Value::array(CMPI_instance, {broker::Plain_Value::instance(first),
+                                                                   broker::Plain_Value::instance(second)})},
+         {"Who", broker::Plain_Value::path(path_of("Sample_Element", "w"))}});
     EXPECT_EQ(result.rc, CMPI_RC_OK);
-    EXPECT_EQ(result.return_value, broker::Value::text("chosen"));
-    const broker::Value* const chosen = broker::find_value(result.out, "Chosen");
+    EXPECT_EQ(result.return_value, broker::Plain_Value::text("chosen"));
+    const broker::Plain_Value* const chosen = broker::find_value(result.out, "Chosen");
     ASSERT_NE(chosen, nullptr);
     EXPECT_EQ(chosen->type, CMPI_ref);
     EXPECT_EQ(chosen->as_path()->class_name, "Sample_Port");
@@ -182,7 +182,7 @@ TEST_F(Thing_Methods, instances_go_in_by_value_and_by_name_and_out_by_name)
     EXPECT_EQ(broker::find_value(result.out, "Reasons")->elements().size(), 2u);
 }
 
-TEST_F(Thing_Methods, a_null_array_sent_as_a_boolean_is_an_empty_array)
+TEST_F(Thing_Methods, ANullArraySentAsABooleanIsAnEmptyArray)
 {
     uint32 size = 99;
     script.invoke = [&](const Instance*, Instance* method) {
@@ -190,7 +190,8 @@ TEST_F(Thing_Methods, a_null_array_sent_as_a_boolean_is_an_empty_array)
         return 0;
     };
     EXPECT_EQ(
-        invoke(class_path("Thing"), "Choose", {{"Candidates", broker::Value::null_of(CMPI_boolean)}}).rc,
+        invoke(class_path("Thing"), "Choose", {{"Candidates", broker::Plain_Value::null_of(CMPI_boolean)}})
+            .rc,
         CMPI_RC_OK);
     EXPECT_EQ(size, 0u);
 }

@@ -73,7 +73,7 @@ const Texts TOO_DEEP = {"ERR references nested deeper than 64 levels"};
 
 /// Every level of the nested values, until a test ends: to take one apart at once needs more stack than a
 /// request has.
-std::vector<broker::Value> levels;
+std::vector<broker::Plain_Value> levels;
 
 /// A path with so many others in it, each in a key of the one around it.
 broker::Path_Value nested_path(unsigned depth, const char* class_name = "Box")
@@ -81,7 +81,7 @@ broker::Path_Value nested_path(unsigned depth, const char* class_name = "Box")
     broker::Path_Value path = path_of(class_name, "innermost");
     for (; depth > 0; depth--) {
         broker::Path_Value around = path_of(class_name, "around");
-        levels.push_back(broker::Value::path(std::move(path)));
+        levels.push_back(broker::Plain_Value::path(std::move(path)));
         around.keys.push_back({"Inside", levels.back()});
         path = std::move(around);
     }
@@ -94,9 +94,10 @@ broker::Instance_Value nested_instance(unsigned depth, bool in_arrays)
     broker::Instance_Value instance{path_of("Box", "i"), {}};
     for (; depth > 0; depth--) {
         broker::Instance_Value around{path_of("Box", "i"), {}};
-        levels.push_back(broker::Value::instance(std::move(instance)));
+        levels.push_back(broker::Plain_Value::instance(std::move(instance)));
         if (in_arrays)
-            around.properties.push_back({"Contents", broker::Value::array(CMPI_instance, {levels.back()})});
+            around.properties.push_back(
+                {"Contents", broker::Plain_Value::array(CMPI_instance, {levels.back()})});
         else
             around.properties.push_back({"Content", levels.back()});
         instance = std::move(around);
@@ -273,19 +274,19 @@ TEST_F(Nested_References, AreNotTakenApartForAFeatureThatHoldsNone)
 {
     const broker::Mi_Frame request(server.broker, {});
     broker::Path_Value path = path_of("Box", "b");
-    path.keys[0].value = broker::Value::path(nested_path(FAR_TOO_DEEP));
+    path.keys[0].value = broker::Plain_Value::path(nested_path(FAR_TOO_DEEP));
     imported(path);
     EXPECT_EQ((Texts{"WARN type mismatch on Name: instance/string", "WARN conversion error: Box.Name"}),
               log.said());
     log.clear();
     path = path_of("Box", "b");
-    path.keys.push_back({"Unknown", broker::Value::path(nested_path(FAR_TOO_DEEP))});
+    path.keys.push_back({"Unknown", broker::Plain_Value::path(nested_path(FAR_TOO_DEEP))});
     imported(path);
     EXPECT_EQ(Texts{"WARN unknown feature: Box.Unknown"}, log.said());
     log.clear();
     broker::Instance_Value instance{path_of("Box", "b"), {}};
     instance.properties.push_back(
-        {"Contents", broker::Value::instance(nested_instance(FAR_TOO_DEEP, false))});
+        {"Contents", broker::Plain_Value::instance(nested_instance(FAR_TOO_DEEP, false))});
     imported(instance, By::ARRAY);
     EXPECT_EQ((Texts{"WARN type mismatch on Contents: instance/instance_array",
                      "WARN conversion error: Box.Contents"}),
@@ -299,7 +300,7 @@ TEST_F(Nested_References, ToWhatDoesNotFitAreNotTakenApart)
     std::vector<std::string> calls[2];
     for (const unsigned depth : {0u, FAR_TOO_DEEP}) {
         path.keys.resize(1);
-        path.keys.push_back({"Inside", broker::Value::path(nested_path(depth, "Sack"))});
+        path.keys.push_back({"Inside", broker::Plain_Value::path(nested_path(depth, "Sack"))});
         server.calls();
         EXPECT_EQ(0u, imported(path));
         calls[depth > 0] = server.calls();

@@ -64,7 +64,7 @@ Texts trace_lines(const Log_Capture& capture)
 
 } // namespace
 
-TEST_F(Operation_Scope_Test, context_and_lock_are_held_for_the_call)
+TEST_F(Operation_Scope_Test, ContextAndLockAreHeldForTheCall)
 {
     Thread_Context* context = nullptr;
     int in_provider = -1, in_stream = -1;
@@ -84,7 +84,7 @@ TEST_F(Operation_Scope_Test, context_and_lock_are_held_for_the_call)
     EXPECT_EQ(Thread_Context::top(), nullptr);
 }
 
-TEST_F(Operation_Scope_Test, two_providers_run_at_once_and_one_does_not)
+TEST_F(Operation_Scope_Test, TwoProvidersRunAtOnceAndOneDoesNot)
 {
     Served_Provider other(server, port_registration);
     other.factory('I');
@@ -103,7 +103,7 @@ TEST_F(Operation_Scope_Test, two_providers_run_at_once_and_one_does_not)
     other.cleanup('I');
 }
 
-TEST_F(Operation_Scope_Test, an_exception_passes_and_leaves_no_lock_and_no_context)
+TEST_F(Operation_Scope_Test, AnExceptionPassesAndLeavesNoLockAndNoContext)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) -> int {
         deliver(make_named("a"));
@@ -121,7 +121,7 @@ TEST_F(Operation_Scope_Test, an_exception_passes_and_leaves_no_lock_and_no_conte
     EXPECT_EQ(enumerate().rc, CMPI_RC_OK);
 }
 
-TEST_F(Operation_Scope_Test, an_exception_of_the_server_passes_too)
+TEST_F(Operation_Scope_Test, AnExceptionOfTheServerPassesToo)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(make_named("a"));
@@ -138,7 +138,7 @@ TEST_F(Operation_Scope_Test, an_exception_of_the_server_passes_too)
     }
 }
 
-TEST_F(Operation_Scope_Test, an_up_call_may_come_back_on_the_same_thread)
+TEST_F(Operation_Scope_Test, AnUpCallMayComeBackOnTheSameThread)
 {
     Thread_Context* outer = nullptr;
     Thread_Context* inner = nullptr;
@@ -166,7 +166,7 @@ TEST_F(Operation_Scope_Test, an_up_call_may_come_back_on_the_same_thread)
     EXPECT_NE(inner, outer);
 }
 
-TEST_F(Operation_Scope_Test, threads_take_turns)
+TEST_F(Operation_Scope_Test, ThreadsTakeTurns)
 {
     int running = 0;
     int worst = 0;
@@ -188,7 +188,7 @@ TEST_F(Operation_Scope_Test, threads_take_turns)
     EXPECT_EQ(worst, 1);
 }
 
-TEST_F(Operation_Scope_Test, traces_entry_and_return)
+TEST_F(Operation_Scope_Test, TracesEntryAndReturn)
 {
     Log_Capture capture;
     enumerate();
@@ -201,7 +201,7 @@ TEST_F(Operation_Scope_Test, traces_entry_and_return)
                      "enter: enumInstances()", "return: enumInstances(): CMPI_RC_ERR_FAILED"}));
 }
 
-TEST_F(Operation_Scope_Test, an_exception_traces_no_return)
+TEST_F(Operation_Scope_Test, AnExceptionTracesNoReturn)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver&) -> int { throw 1; };
     Log_Capture capture;
@@ -210,7 +210,7 @@ TEST_F(Operation_Scope_Test, an_exception_traces_no_return)
     server.core->violations.clear();
 }
 
-TEST_F(Operation_Scope_Test, each_entry_has_its_trace_name)
+TEST_F(Operation_Scope_Test, EachEntryHasItsTraceName)
 {
     Log_Capture capture;
     CMPIInstanceMI* const mi = &provider.data().instance_mi;
@@ -234,7 +234,7 @@ TEST_F(Operation_Scope_Test, each_entry_has_its_trace_name)
     EXPECT_EQ(trace_lines(capture), expected);
 }
 
-TEST_F(Operation_Scope_Test, a_context_deleted_by_failing_thread_creation_lasts_to_the_end_of_the_frame)
+TEST_F(Operation_Scope_Test, AContextDeletedByFailingThreadCreationLastsToTheEndOfTheFrame)
 {
     script.enum_instances = [&](const Instance*, const Script::Deliver& deliver) {
         delete Thread_Context::top();

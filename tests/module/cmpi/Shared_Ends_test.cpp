@@ -74,7 +74,7 @@ struct Shared_Ends_Test : testing::Test
         for (const broker::Instance_Value& instance : result.instances) {
             links.push_back(link_of(instance.path));
             for (const char* role : {"Antecedent", "Dependent"}) {
-                const broker::Value* const end = instance.property(role);
+                const broker::Plain_Value* const end = instance.property(role);
                 EXPECT_TRUE(end && end->as_path() && *end == *instance.path.key(role)) << role;
             }
         }
@@ -100,18 +100,18 @@ struct Shared_Ends_Test : testing::Test
 
 } // namespace
 
-TEST_F(Shared_Ends_Test, an_end_becomes_a_path_once_for_all_in_a_row_that_have_it)
+TEST_F(Shared_Ends_Test, AnEndBecomesAPathOnceForAllInARowThatHaveIt)
 {
     expect_made(&Shared_Ends_Test::enumerate, all, {3, 5});
 }
 
-TEST_F(Shared_Ends_Test, references_share_too)
+TEST_F(Shared_Ends_Test, ReferencesShareToo)
 {
     // The fourth link is not delivered, so that all that is has one end.
     expect_made(&Shared_Ends_Test::refer, of_a, {1, 4});
 }
 
-TEST_F(Shared_Ends_Test, nothing_is_shared_between_requests)
+TEST_F(Shared_Ends_Test, NothingIsSharedBetweenRequests)
 {
     enumerate(false);
     server.calls();
@@ -119,7 +119,7 @@ TEST_F(Shared_Ends_Test, nothing_is_shared_between_requests)
     EXPECT_EQ((std::pair<long, long>{3, 5}), ends_made());
 }
 
-TEST_F(Shared_Ends_Test, a_path_that_the_server_refuses_is_not_shared)
+TEST_F(Shared_Ends_Test, APathThatTheServerRefusesIsNotShared)
 {
     // The first path is the link's own, the second its first end.
     server.core->calls.fail("CMNewObjectPath", 2, CMPI_RC_ERR_FAILED);
@@ -130,14 +130,14 @@ TEST_F(Shared_Ends_Test, a_path_that_the_server_refuses_is_not_shared)
     EXPECT_EQ("a5", link_of(result.paths[4]));
 }
 
-TEST_F(Shared_Ends_Test, an_exception_of_the_provider_leaves_no_end_behind)
+TEST_F(Shared_Ends_Test, AnExceptionOfTheProviderLeavesNoEndBehind)
 {
     on_end = [] { throw std::runtime_error("after the last"); };
     EXPECT_EQ("after the last", enumerate(false).exception.value_or(""));
     server.core->violations.clear();
 }
 
-TEST(Shared_Ends, know_the_last_end_of_each_of_three_roles)
+TEST(Shared_Ends, KnowTheLastEndOfEachOfThreeRoles)
 {
     const char* const roles[] = {"Initiator", "Target", "LogicalUnit", "Fourth"};
     const Ref<Instance> a(make_named<Sample_Element>("a")), b(make_named<Sample_Element>("b"));

@@ -17,7 +17,7 @@ inline constexpr const char* NAME_SPACE = "root/sample";
 class Test_Server : public broker::Up_Calls
 {
 public:
-    explicit Test_Server(broker::Host_Options options = {})
+    explicit Test_Server(broker::Server_Options options = {})
         : core(std::make_shared<broker::Core>(std::move(options))), catalogue(thing_registration),
           broker(core, *this)
     {
@@ -153,7 +153,7 @@ private:
 /// The path of an element, port or group by name.
 inline broker::Path_Value path_of(const char* class_name, const char* name)
 {
-    return {"", NAME_SPACE, class_name, {{"Name", broker::Value::text(name)}}};
+    return {"", NAME_SPACE, class_name, {{"Name", broker::Plain_Value::text(name)}}};
 }
 
 inline broker::Path_Value class_path(const char* class_name)
@@ -164,7 +164,7 @@ inline broker::Path_Value class_path(const char* class_name)
 /// "Name=value" for text comparisons of keys and properties.
 inline std::string text_of_key(const broker::Path_Value& path, const char* name)
 {
-    const broker::Value* const value = path.key(name);
+    const broker::Plain_Value* const value = path.key(name);
     return value ? value->as_text() : "(none)";
 }
 

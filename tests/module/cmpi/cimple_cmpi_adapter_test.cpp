@@ -3,7 +3,7 @@
 
 using namespace KPRV;
 
-TEST(cimple_cmpi_adapter, factories_of_all_kinds_share_one_adapter)
+TEST(cimple_cmpi_adapter, FactoriesOfAllKindsShareOneAdapter)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -25,7 +25,7 @@ TEST(cimple_cmpi_adapter, factories_of_all_kinds_share_one_adapter)
     EXPECT_EQ(provider.adapter(), nullptr);
 }
 
-TEST(cimple_cmpi_adapter, an_mi_is_joined_when_it_is_asked_for)
+TEST(cimple_cmpi_adapter, AnMiIsJoinedWhenItIsAskedFor)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -49,7 +49,7 @@ TEST(cimple_cmpi_adapter, an_mi_is_joined_when_it_is_asked_for)
         provider.cleanup(kind);
 }
 
-TEST(cimple_cmpi_adapter, an_unknown_kind_counts_but_gets_no_mi)
+TEST(cimple_cmpi_adapter, AnUnknownKindCountsButGetsNoMi)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -63,7 +63,7 @@ TEST(cimple_cmpi_adapter, an_unknown_kind_counts_but_gets_no_mi)
     EXPECT_EQ(provider.adapter(), nullptr);
 }
 
-TEST(cimple_cmpi_adapter, a_provider_comes_back_in_the_same_block)
+TEST(cimple_cmpi_adapter, AProviderComesBackInTheSameBlock)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -78,7 +78,7 @@ TEST(cimple_cmpi_adapter, a_provider_comes_back_in_the_same_block)
               (Texts{"construct", "load", "unload", "destroy", "construct", "load", "unload", "destroy"}));
 }
 
-TEST(cimple_cmpi_adapter, a_failing_load_is_ignored)
+TEST(cimple_cmpi_adapter, AFailingLoadIsIgnored)
 {
     Test_Server server;
     script.load = [] { return 99; };
@@ -89,7 +89,7 @@ TEST(cimple_cmpi_adapter, a_failing_load_is_ignored)
     EXPECT_EQ(provider.cleanup('I'), CMPI_RC_OK);
 }
 
-TEST(cimple_cmpi_adapter, the_broker_of_the_first_call_stays)
+TEST(cimple_cmpi_adapter, TheBrokerOfTheFirstCallStays)
 {
     Test_Server server;
     Served_Provider provider(server, element_registration);
@@ -104,7 +104,7 @@ TEST(cimple_cmpi_adapter, the_broker_of_the_first_call_stays)
     provider.cleanup('I');
 }
 
-TEST(cimple_cmpi_adapter, load_runs_with_a_context_and_the_constructor_without)
+TEST(cimple_cmpi_adapter, LoadRunsWithAContextAndTheConstructorWithout)
 {
     Test_Server server;
     Thread_Context* at_construction = nullptr;
@@ -125,7 +125,7 @@ TEST(cimple_cmpi_adapter, load_runs_with_a_context_and_the_constructor_without)
     provider.cleanup('I');
 }
 
-TEST(cimple_cmpi_adapter, an_exception_of_load_leaves_the_block_empty)
+TEST(cimple_cmpi_adapter, AnExceptionOfLoadLeavesTheBlockEmpty)
 {
     Test_Server server;
     script.load = []() -> int { throw std::runtime_error("load"); };
@@ -142,7 +142,7 @@ TEST(cimple_cmpi_adapter, an_exception_of_load_leaves_the_block_empty)
     provider.cleanup('I');
 }
 
-TEST(cimple_cmpi_adapter, an_exception_of_the_constructor_leaves_nothing)
+TEST(cimple_cmpi_adapter, AnExceptionOfTheConstructorLeavesNothing)
 {
     Test_Server server;
     script.construct = []() -> int { throw std::runtime_error("construct"); };

@@ -78,7 +78,7 @@ void expect_all_exchanged(const Table& inside, const Table& outside)
 
 } // namespace
 
-TEST_F(Contained_Exceptions, stand_behind_each_slot_that_is_filled)
+TEST_F(Contained_Exceptions, StandBehindEachSlotThatIsFilled)
 {
     CMPI_Static_Data inside = {};
     fill_instance_operations(inside.instance_ft);
@@ -93,7 +93,7 @@ TEST_F(Contained_Exceptions, stand_behind_each_slot_that_is_filled)
     expect_all_exchanged(inside.indication_ft, outside.indication_ft);
 }
 
-TEST_F(Contained_Exceptions, bear_the_name_of_their_entry)
+TEST_F(Contained_Exceptions, BearTheNameOfTheirEntry)
 {
     CMPI_Static_Data& data = provider.data();
     for (const char kind : {'M', 'A', 'N'})
@@ -154,7 +154,7 @@ TEST_F(Contained_Exceptions, bear_the_name_of_their_entry)
         provider.cleanup(kind);
 }
 
-TEST_F(Contained_Exceptions, of_enabling_and_disabling)
+TEST_F(Contained_Exceptions, OfEnablingAndDisabling)
 {
     Served_Provider alerts(server, alert_registration);
     alerts.factory('N');
@@ -172,7 +172,7 @@ TEST_F(Contained_Exceptions, of_enabling_and_disabling)
     alerts.cleanup('N');
 }
 
-TEST_F(Contained_Exceptions, of_a_cleanup_leave_the_provider_loaded)
+TEST_F(Contained_Exceptions, OfACleanupLeaveTheProviderLoaded)
 {
     script.unload = []() -> int { throw std::runtime_error("busy"); };
     CMPIInstanceMI* const mi = &provider.data().instance_mi;
@@ -183,7 +183,7 @@ TEST_F(Contained_Exceptions, of_a_cleanup_leave_the_provider_loaded)
     EXPECT_NE(provider.adapter(), nullptr);
 }
 
-TEST_F(Contained_Exceptions, leave_no_lock_no_context_and_no_instance)
+TEST_F(Contained_Exceptions, LeaveNoLockNoContextAndNoInstance)
 {
     expect_contained(enumerate_throwing(std::runtime_error("broken")), "enumerateInstances: broken");
     EXPECT_EQ(Thread_Context::top(), nullptr);
@@ -198,7 +198,7 @@ TEST_F(Contained_Exceptions, leave_no_lock_no_context_and_no_instance)
     EXPECT_EQ(enumerate().rc, CMPI_RC_OK);
 }
 
-TEST_F(Contained_Exceptions, of_every_kind_have_words)
+TEST_F(Contained_Exceptions, OfEveryKindHaveWords)
 {
     expect_contained(enumerate_throwing(HbaAgentError{7, "busy"}), "enumerateInstances: busy");
     expect_contained(enumerate_throwing(std::bad_alloc()), "enumerateInstances: std::bad_alloc");
@@ -207,7 +207,7 @@ TEST_F(Contained_Exceptions, of_every_kind_have_words)
     expect_contained(enumerate_throwing(std::runtime_error("")), "enumerateInstances: ");
 }
 
-TEST_F(Contained_Exceptions, are_cut_behind_a_whole_character)
+TEST_F(Contained_Exceptions, AreCutBehindAWholeCharacter)
 {
     const std::string head = "enumerateInstances: ";
     constexpr size_t MOST = 1023;
@@ -228,7 +228,7 @@ TEST_F(Contained_Exceptions, are_cut_behind_a_whole_character)
                      head + endless.substr(0, MOST - head.size()));
 }
 
-TEST_F(Contained_Exceptions, do_without_a_message_where_the_server_has_none)
+TEST_F(Contained_Exceptions, DoWithoutAMessageWhereTheServerHasNone)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver&) -> int { throw std::bad_alloc(); };
     server.core->calls.fail("CMNewString", 1, CMPI_RC_ERR_FAILED);
@@ -238,7 +238,7 @@ TEST_F(Contained_Exceptions, do_without_a_message_where_the_server_has_none)
     expect_contained(enumerate(), "");
 }
 
-TEST_F(Contained_Exceptions, do_not_include_the_end_of_a_thread)
+TEST_F(Contained_Exceptions, DoNotIncludeTheEndOfAThread)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) -> int {
         deliver(make_named("a"));
@@ -267,7 +267,7 @@ TEST_F(Contained_Exceptions, do_not_include_the_end_of_a_thread)
     EXPECT_EQ(enumerate().rc, CMPI_RC_OK) << "its lock is open";
 }
 
-TEST(Contained_Factories, tell_what_the_provider_threw)
+TEST(Contained_Factories, TellWhatTheProviderThrew)
 {
     Test_Server server;
     alignas(16) unsigned char area[STATIC_DATA_AREA] = {};

@@ -6,7 +6,7 @@
 
 using namespace KPRV;
 
-TEST(rc_to_str, names_its_codes_and_calls_all_others_failed)
+TEST(rc_to_str, NamesItsCodesAndCallsAllOthersFailed)
 {
     const std::map<int, std::string> names = {
         {0, "CMPI_RC_OK"},

@@ -5,7 +5,7 @@
 
 using namespace KPRV;
 
-TEST(status_translation, each_family_reads_its_own_statuses_and_no_others)
+TEST(status_translation, EachFamilyReadsItsOwnStatusesAndNoOthers)
 {
     using enum Status_Family;
     const std::map<Status_Family, std::map<int, int>> families = {

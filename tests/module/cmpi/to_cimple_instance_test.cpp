@@ -32,29 +32,30 @@ protected:
 
 } // namespace
 
-TEST_F(To_Cimple_Instance, a_path_gives_the_keys_only)
+TEST_F(To_Cimple_Instance, APathGivesTheKeysOnly)
 {
     broker::Path_Value with_more = element;
-    with_more.keys.push_back({"Caption", broker::Value::text("no key")});
+    with_more.keys.push_back({"Caption", broker::Plain_Value::text("no key")});
     const Ref<Instance> result = convert(path(with_more));
     ASSERT_TRUE(result);
     EXPECT_EQ(name_of_sample(result.ptr()), "e");
     EXPECT_EQ(static_cast<Sample_Element*>(result.ptr())->Caption.null, 1);
 }
 
-TEST_F(To_Cimple_Instance, an_instance_gives_everything)
+TEST_F(To_Cimple_Instance, AnInstanceGivesEverything)
 {
-    const Ref<Instance> result = convert(instance(
-        {path_of("Sample_Group", "g"),
-         {{"Name", broker::Value::text("g")},
-          {"Leader", broker::Value::instance({element, {{"Name", broker::Value::text("leader")}}})}}}));
+    const Ref<Instance> result =
+        convert(instance({path_of("Sample_Group", "g"),
+                          {{"Name", broker::Plain_Value::text("g")},
+                           {"Leader", broker::Plain_Value::instance(
+                                          {element, {{"Name", broker::Plain_Value::text("leader")}}})}}}));
     ASSERT_TRUE(result);
     auto* const group = static_cast<Sample_Group*>(result.ptr());
     EXPECT_EQ(group->Name.value, "g");
     EXPECT_EQ(name_of_sample(group->Leader), "leader");
 }
 
-TEST_F(To_Cimple_Instance, failures_have_their_words)
+TEST_F(To_Cimple_Instance, FailuresHaveTheirWords)
 {
     const auto words = [&](auto* object, const char* failing_call) {
         Log_Capture capture;

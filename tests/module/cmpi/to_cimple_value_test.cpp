@@ -56,7 +56,7 @@ void expect_plain(CMPIType type, T x)
 
 } // namespace
 
-TEST(to_cimple_value, type_words)
+TEST(to_cimple_value, TypeWords)
 {
     const struct
     {
@@ -72,12 +72,12 @@ TEST(to_cimple_value, type_words)
     }
 }
 
-TEST(to_cimple_value, numbers_are_copied)
+TEST(to_cimple_value, NumbersAreCopied)
 {
     for_each_plain_sample([](CMPIType type, auto x) { expect_plain(type, x); });
 }
 
-TEST(to_cimple_value, any_nonzero_byte_is_true)
+TEST(to_cimple_value, AnyNonzeroByteIsTrue)
 {
     CMPIData data = fake_data(CMPI_boolean);
     data.value.uint8 = 4;
@@ -88,7 +88,7 @@ TEST(to_cimple_value, any_nonzero_byte_is_true)
     EXPECT_TRUE(x);
 }
 
-TEST(to_cimple_value, other_state_bits_do_not_make_a_null)
+TEST(to_cimple_value, OtherStateBitsDoNotMakeANull)
 {
     CMPIData data = plain_data<uint32>(CMPI_uint32, 7);
     data.state = CMPI_keyValue | CMPI_badValue | CMPI_notFound;
@@ -97,7 +97,7 @@ TEST(to_cimple_value, other_state_bits_do_not_make_a_null)
     EXPECT_FALSE(value.null);
 }
 
-TEST(to_cimple_value, every_type_has_its_null)
+TEST(to_cimple_value, EveryTypeHasItsNull)
 {
     for (int type = 0; type < int(NUM_TYPES); type++) {
         for (const CMPIType array_bit : {0, CMPI_ARRAY}) {
@@ -122,7 +122,7 @@ TEST(to_cimple_value, every_type_has_its_null)
     }
 }
 
-TEST(to_cimple_value, typed_nulls_hold_zero_and_empty)
+TEST(to_cimple_value, TypedNullsHoldZeroAndEmpty)
 {
     Value value;
     uint32 number = 5;
@@ -139,7 +139,7 @@ TEST(to_cimple_value, typed_nulls_hold_zero_and_empty)
     EXPECT_EQ(datetime, Datetime());
 }
 
-TEST(to_cimple_value, unknown_words)
+TEST(to_cimple_value, UnknownWords)
 {
     EXPECT_EQ(words_of(fake_data(CMPI_chars, CMPI_nullValue)), Texts{"WARN unknown cmpi type 5888"});
     EXPECT_EQ(words_of(fake_data(0, CMPI_nullValue)), Texts{"WARN unknown cmpi type 0"});
@@ -147,7 +147,7 @@ TEST(to_cimple_value, unknown_words)
     EXPECT_EQ(words_of(fake_data(CMPI_charsA)), Texts{"WARN unreachable"});
 }
 
-TEST(to_cimple_value, strings)
+TEST(to_cimple_value, Strings)
 {
     const Fake_String string("text");
     Value value;
@@ -158,7 +158,7 @@ TEST(to_cimple_value, strings)
     EXPECT_FALSE(value.null);
 }
 
-TEST(to_cimple_value, missing_texts_are_empty_and_not_null)
+TEST(to_cimple_value, MissingTextsAreEmptyAndNotNull)
 {
     Log_Capture capture;
     const Fake_String without_text(nullptr);
@@ -173,7 +173,7 @@ TEST(to_cimple_value, missing_texts_are_empty_and_not_null)
     EXPECT_EQ(capture.said(), (Texts{"INFO ignored null CMPI string", "WARN CMGetCharsPtr() failed"}));
 }
 
-TEST(to_cimple_value, string_arrays_have_the_same_tolerance)
+TEST(to_cimple_value, StringArraysHaveTheSameTolerance)
 {
     Log_Capture capture;
     const Fake_String text("text"), without_text(nullptr);
@@ -189,7 +189,7 @@ TEST(to_cimple_value, string_arrays_have_the_same_tolerance)
     EXPECT_EQ(capture.said(), (Texts{"WARN CMGetCharsPtr() failed", "INFO ignored null CMPI string"}));
 }
 
-TEST(to_cimple_value, datetimes_go_through_their_text)
+TEST(to_cimple_value, DatetimesGoThroughTheirText)
 {
     const Fake_Datetime interval("00000000000500.000000:000");
     Value value;
@@ -205,7 +205,7 @@ TEST(to_cimple_value, datetimes_go_through_their_text)
     EXPECT_EQ(datetimes[0], datetime);
 }
 
-TEST(to_cimple_value, failing_datetimes)
+TEST(to_cimple_value, FailingDatetimes)
 {
     const Fake_Datetime missing(nullptr), failing("00000000000500.000000:000", CMPI_RC_ERR_FAILED),
         wrong("x");
@@ -217,7 +217,7 @@ TEST(to_cimple_value, failing_datetimes)
     EXPECT_EQ(words_of(fake_data(CMPI_dateTime, array)), Texts{"WARN conversion error"});
 }
 
-TEST(to_cimple_value, arrays)
+TEST(to_cimple_value, Arrays)
 {
     EXPECT_EQ(words_of(fake_data(CMPI_uint32A)), Texts{}) << "no array object: no word";
     EXPECT_EQ(words_of(fake_data(CMPI_instanceA)), Texts{});
@@ -236,7 +236,7 @@ TEST(to_cimple_value, arrays)
     EXPECT_EQ(words_of(fake_data(CMPI_string, null_text)), Texts{"WARN encountered null array element"});
 }
 
-TEST(to_cimple_value, a_missing_object_is_a_null_instance)
+TEST(to_cimple_value, AMissingObjectIsANullInstance)
 {
     for (const CMPIType word : {CMPI_instance, CMPI_ref}) {
         Value value;
@@ -271,7 +271,7 @@ struct Served_Objects
 
 } // namespace
 
-TEST(to_cimple_value, instances_and_references)
+TEST(to_cimple_value, InstancesAndReferences)
 {
     Served_Objects objects;
     Value value;
@@ -281,22 +281,22 @@ TEST(to_cimple_value, instances_and_references)
     EXPECT_EQ(instance->__meta_class, &Sample_Port::static_meta_class);
     EXPECT_EQ(name_of_sample(instance), "p");
 
-    ASSERT_EQ(convert(objects.instance(
-                          {path_of("Sample_Element", "e"), {{"Caption", broker::Value::text("caption")}}}),
+    ASSERT_EQ(convert(objects.instance({path_of("Sample_Element", "e"),
+                                        {{"Caption", broker::Plain_Value::text("caption")}}}),
                       value),
               0);
     EXPECT_EQ(value.get_value(instance), 0);
     EXPECT_EQ(static_cast<Sample_Element*>(instance)->Caption.value, "caption");
 }
 
-TEST(to_cimple_value, an_instance_that_does_not_convert)
+TEST(to_cimple_value, AnInstanceThatDoesNotConvert)
 {
     Served_Objects objects;
     EXPECT_EQ(words_of(objects.path(class_path("Foreign"))),
               (Texts{"WARN failed to find meta class: Foreign", "WARN failed to create CIMPLE instance"}));
 }
 
-TEST(to_cimple_value, instance_arrays_keep_null_elements)
+TEST(to_cimple_value, InstanceArraysKeepNullElements)
 {
     Served_Objects objects;
     const Fake_Array array({objects.path(path_of("Sample_Element", "e")), fake_data(CMPI_ref, CMPI_nullValue),
@@ -312,7 +312,7 @@ TEST(to_cimple_value, instance_arrays_keep_null_elements)
     EXPECT_EQ(elements[0]->__refs, 1) << "the value's own";
 }
 
-TEST(to_cimple_value, instance_arrays_refuse_what_is_no_instance)
+TEST(to_cimple_value, InstanceArraysRefuseWhatIsNoInstance)
 {
     Served_Objects objects;
     const CMPIData good = objects.path(path_of("Sample_Element", "e"));
@@ -326,7 +326,7 @@ TEST(to_cimple_value, instance_arrays_refuse_what_is_no_instance)
               (Texts{"WARN failed to find meta class: Foreign", "WARN failed to create CIMPLE instance"}));
 }
 
-TEST(to_cimple_value, words_vanish_when_logging_is_switched_off)
+TEST(to_cimple_value, WordsVanishWhenLoggingIsSwitchedOff)
 {
     log_enable(false);
     EXPECT_EQ(words_of(fake_data(CMPI_chars)), Texts{});

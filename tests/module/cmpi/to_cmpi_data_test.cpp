@@ -66,12 +66,12 @@ protected:
 
 } // namespace
 
-TEST_F(To_Cmpi_Data, numbers_are_copied)
+TEST_F(To_Cmpi_Data, NumbersAreCopied)
 {
     for_each_plain_sample([&](CMPIType type, auto x) { expect_plain(type, x); });
 }
 
-TEST_F(To_Cmpi_Data, strings_become_objects)
+TEST_F(To_Cmpi_Data, StringsBecomeObjects)
 {
     Value value;
     value.set_value("text");
@@ -87,7 +87,7 @@ TEST_F(To_Cmpi_Data, strings_become_objects)
     EXPECT_STREQ(CMGetCharPtr(CMGetArrayElementAt(array.value.array, 1, nullptr).value.string), "");
 }
 
-TEST_F(To_Cmpi_Data, datetimes_go_by_their_text)
+TEST_F(To_Cmpi_Data, DatetimesGoByTheirText)
 {
     Value value;
     value.set_value(Datetime(5 * Datetime::MIN));
@@ -104,7 +104,7 @@ TEST_F(To_Cmpi_Data, datetimes_go_by_their_text)
                  "00000000000001.000000:000");
 }
 
-TEST_F(To_Cmpi_Data, empty_arrays_are_arrays)
+TEST_F(To_Cmpi_Data, EmptyArraysAreArrays)
 {
     Value value;
     value.set_value(Array<uint32>());
@@ -115,7 +115,7 @@ TEST_F(To_Cmpi_Data, empty_arrays_are_arrays)
     EXPECT_EQ(convert(value).type, CMPI_refA);
 }
 
-TEST_F(To_Cmpi_Data, the_flags_tell_embedded_instances_from_references)
+TEST_F(To_Cmpi_Data, TheFlagsTellEmbeddedInstancesFromReferences)
 {
     const Value value = instance_value(make_port("p", 7));
     const CMPIData reference = convert(value);
@@ -131,7 +131,7 @@ TEST_F(To_Cmpi_Data, the_flags_tell_embedded_instances_from_references)
     EXPECT_EQ(convert(value, ~(FLAG_EMBEDDED_INSTANCE | FLAG_EMBEDDED_OBJECT)).type, CMPI_ref);
 }
 
-TEST_F(To_Cmpi_Data, instance_arrays)
+TEST_F(To_Cmpi_Data, InstanceArrays)
 {
     Array<Instance*> elements;
     elements.append(make_named("a"));
@@ -146,7 +146,7 @@ TEST_F(To_Cmpi_Data, instance_arrays)
     EXPECT_EQ(CMGetArrayElementAt(embedded.value.array, 0, nullptr).type, CMPI_instance);
 }
 
-TEST_F(To_Cmpi_Data, an_instance_keeps_its_name_space_or_takes_that_of_the_call)
+TEST_F(To_Cmpi_Data, AnInstanceKeepsItsNameSpaceOrTakesThatOfTheCall)
 {
     Sample_Element* const element = make_named("a");
     element->__name_space = "root/own";
@@ -156,7 +156,7 @@ TEST_F(To_Cmpi_Data, an_instance_keeps_its_name_space_or_takes_that_of_the_call)
     EXPECT_STREQ(CMGetCharPtr(CMGetNameSpace(data.value.ref, nullptr)), "root/own");
 }
 
-TEST_F(To_Cmpi_Data, failures_of_instances_have_their_words)
+TEST_F(To_Cmpi_Data, FailuresOfInstancesHaveTheirWords)
 {
     EXPECT_EQ(words(instance_value(nullptr)), Texts{"WARN null instance argument"});
     EXPECT_EQ(words(instance_value(make_named("a")), 0, nullptr), Texts{"WARN null namespace"});
@@ -181,7 +181,7 @@ TEST_F(To_Cmpi_Data, failures_of_instances_have_their_words)
     EXPECT_EQ(capture.said(), Texts{"WARN unexpected type"});
 }
 
-TEST_F(To_Cmpi_Data, failures_of_arrays_have_their_words)
+TEST_F(To_Cmpi_Data, FailuresOfArraysHaveTheirWords)
 {
     const uint32 numbers[] = {1, 2};
     Value value;
@@ -200,7 +200,7 @@ TEST_F(To_Cmpi_Data, failures_of_arrays_have_their_words)
     EXPECT_EQ(words(value), Texts{"WARN CMSetArrayElementAt() failed"});
 }
 
-TEST_F(To_Cmpi_Data, an_object_that_the_server_does_not_make_is_a_failure)
+TEST_F(To_Cmpi_Data, AnObjectThatTheServerDoesNotMakeIsAFailure)
 {
     Value value;
     value.set_value("text");
@@ -211,7 +211,7 @@ TEST_F(To_Cmpi_Data, an_object_that_the_server_does_not_make_is_a_failure)
     EXPECT_EQ(words(value), Texts{});
 }
 
-TEST_F(To_Cmpi_Data, missing_and_unlisted_types)
+TEST_F(To_Cmpi_Data, MissingAndUnlistedTypes)
 {
     EXPECT_EQ(words(Value()), Texts{"WARN missing type"});
 

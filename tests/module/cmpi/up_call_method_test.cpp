@@ -19,7 +19,7 @@ protected:
             requests.push_back(request);
             return answer;
         };
-        answer.return_value = broker::Value::unsigned_number(CMPI_uint32, 7);
+        answer.return_value = broker::Plain_Value::unsigned_number(CMPI_uint32, 7);
     }
     ~Up_Call_Method() override { provider.cleanup('I'); }
 
@@ -53,20 +53,21 @@ protected:
 
 } // namespace
 
-TEST_F(Up_Call_Method, parameters_go_out_and_come_back)
+TEST_F(Up_Call_Method, ParametersGoOutAndComeBack)
 {
     reset()->Count.set(1);
-    answer.out = {{"Count", broker::Value::unsigned_number(CMPI_uint32, 2)},
-                  {"Message", broker::Value::text("done")},
-                  {"Force", broker::Value::boolean(false)}};
+    answer.out = {{"Count", broker::Plain_Value::unsigned_number(CMPI_uint32, 2)},
+                  {"Message", broker::Plain_Value::text("done")},
+                  {"Force", broker::Plain_Value::boolean(false)}};
     ASSERT_EQ(invoke(), 0);
     ASSERT_EQ(requests.size(), 1u);
     EXPECT_EQ(requests[0].method, "Reset");
     EXPECT_EQ(requests[0].path.name_space, "root/up");
     EXPECT_EQ(text_of_key(requests[0].path, "Name"), "e");
     ASSERT_EQ(requests[0].in.size(), 2u);
-    EXPECT_EQ(*broker::find_value(requests[0].in, "Force"), broker::Value::boolean(true));
-    EXPECT_EQ(*broker::find_value(requests[0].in, "Count"), broker::Value::unsigned_number(CMPI_uint32, 1));
+    EXPECT_EQ(*broker::find_value(requests[0].in, "Force"), broker::Plain_Value::boolean(true));
+    EXPECT_EQ(*broker::find_value(requests[0].in, "Count"),
+              broker::Plain_Value::unsigned_number(CMPI_uint32, 1));
 
     EXPECT_EQ(reset()->Count.value, 2u);
     EXPECT_EQ(reset()->Message.value, "done");
@@ -76,7 +77,7 @@ TEST_F(Up_Call_Method, parameters_go_out_and_come_back)
     EXPECT_EQ(reset()->__name_space, "root/up");
 }
 
-TEST_F(Up_Call_Method, a_static_method_is_asked_of_the_class)
+TEST_F(Up_Call_Method, AStaticMethodIsAskedOfTheClass)
 {
     const Ref<Instance> thing(create<Thing>(false));
     const Ref<Instance> count(create(&Thing_plain_method::static_meta_class));
@@ -86,7 +87,7 @@ TEST_F(Up_Call_Method, a_static_method_is_asked_of_the_class)
     EXPECT_EQ(static_cast<Thing_plain_method*>(count.ptr())->return_value.value, 7u);
 }
 
-TEST_F(Up_Call_Method, calls_are_made_in_order)
+TEST_F(Up_Call_Method, CallsAreMadeInOrder)
 {
     server.core->calls.record(true);
     ASSERT_EQ(invoke(), 0);
@@ -95,7 +96,7 @@ TEST_F(Up_Call_Method, calls_are_made_in_order)
                                      "CBInvokeMethod Sample_Element", "CMGetNameSpace", "CMGetArgCount"}));
 }
 
-TEST_F(Up_Call_Method, missing_arguments_fail)
+TEST_F(Up_Call_Method, MissingArgumentsFail)
 {
     Log_Capture capture;
     EXPECT_EQ(invoke(nullptr, element.ptr(), record.ptr()), -1);
@@ -119,7 +120,7 @@ TEST_F(Up_Call_Method, missing_arguments_fail)
     EXPECT_TRUE(requests.empty());
 }
 
-TEST_F(Up_Call_Method, failing_steps_say_failed)
+TEST_F(Up_Call_Method, FailingStepsSayFailed)
 {
     EXPECT_EQ(words("CMNewObjectPath"), Texts{"WARN failed"});
     EXPECT_EQ(words("CMNewArgs"), Texts{"WARN failed"});
@@ -127,14 +128,14 @@ TEST_F(Up_Call_Method, failing_steps_say_failed)
     EXPECT_EQ(words(), Texts{"WARN failed"});
     EXPECT_TRUE(requests.empty());
 
-    answer.return_value = broker::Value::text("of another type");
+    answer.return_value = broker::Plain_Value::text("of another type");
     EXPECT_EQ(words(), (Texts{"WARN type mismatch: Reset.return_value", "WARN failed"}));
-    answer.return_value = broker::Value();
+    answer.return_value = broker::Plain_Value();
     const Texts without = words();
     EXPECT_EQ(without.back(), "WARN failed");
 }
 
-TEST_F(Up_Call_Method, a_failing_server_is_named_by_its_code)
+TEST_F(Up_Call_Method, AFailingServerIsNamedByItsCode)
 {
     answer.rc = CMPI_RC_ERR_METHOD_NOT_FOUND;
     EXPECT_EQ(words(), Texts{"WARN failed[17]"});

@@ -16,11 +16,11 @@ protected:
         {},
         "root/kaldera",
         "KALDERA_AgentService",
-        {{"Name", broker::Value::text("Kaldera Agent Service Provider")}}};
+        {{"Name", broker::Plain_Value::text("Kaldera Agent Service Provider")}}};
 
     broker::Result execute(const std::string& request, const std::string& method = "executeMethod")
     {
-        return server->invoke_method(SERVICE, method, {{"request", broker::Value::text(request)}});
+        return server->invoke_method(SERVICE, method, {{"request", broker::Plain_Value::text(request)}});
     }
     /// The text of `response`, of a call that must succeed: it does so whatever the text says.
     static std::string response_of(const broker::Result& result)
@@ -31,7 +31,7 @@ protected:
         EXPECT_FALSE(result.return_value.null);
         EXPECT_EQ(0u, result.return_value.as_uint());
         EXPECT_EQ(1u, result.out.size());
-        const broker::Value* const response = find_value(result.out, "response");
+        const broker::Plain_Value* const response = find_value(result.out, "response");
         if (!response || response->null || response->type != CMPI_string) {
             ADD_FAILURE() << "no response";
             return "";

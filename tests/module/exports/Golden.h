@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "broker/values/Value_Text.h"
 #include "module/adapter/ProviderUtil.h"
 

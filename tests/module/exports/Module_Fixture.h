@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "simulator/Simulator_Control.h"
 #include "tests/support/Log_Lines.h"
 #include "tests/support/Temp_Folder.h"
@@ -20,20 +20,20 @@ protected:
     static std::string inventory(const std::string& name) { return std::string(KLDR_INVENTORIES "/") + name; }
 
     /// Opens the module over an inventory of simulator/inventories, or over a JSON text.
-    void open(const std::string& inventory_name = "demo.json", broker::Host_Options options = {})
+    void open(const std::string& inventory_name = "demo.json", broker::Server_Options options = {})
     {
         simulator.load_file(inventory(inventory_name));
         open_module(std::move(options));
     }
-    void open_text(const std::string& text, broker::Host_Options options = {})
+    void open_text(const std::string& text, broker::Server_Options options = {})
     {
         simulator.load_text(text);
         open_module(std::move(options));
     }
-    void open_module(broker::Host_Options options = {})
+    void open_module(broker::Server_Options options = {})
     {
         std::string error;
-        server = broker::Host::open(module, std::move(options), error);
+        server = broker::Local_Server::open(module, std::move(options), error);
         ASSERT_TRUE(server) << error;
     }
     void close()
@@ -82,13 +82,13 @@ protected:
 
     static std::string text_of(const broker::Instance_Value& instance, const char* property)
     {
-        const broker::Value* value = instance.property(property);
+        const broker::Plain_Value* value = instance.property(property);
         return !value ? "(absent)" : value->null ? "(null)" : value->as_text();
     }
 
     const char* module = KLDR_MODULE;
     simulator::Simulator_Control simulator{KLDR_SIMULATOR};
-    std::unique_ptr<broker::Host> server;
+    std::unique_ptr<broker::Local_Server> server;
 
 private:
     std::string log_text() const { return _home.read(".cimple/messages"); }

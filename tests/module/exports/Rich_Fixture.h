@@ -6,18 +6,18 @@
 
 namespace KPRV {
 
-/// The module over rich.json, a host that has every kind of thing once.
+/// The module over rich.json, a server that has every kind of thing once.
 class Rich_Fixture : public Module_Fixture
 {
 protected:
-    void open_rich(const broker::Host_Options& options = {}) { open("rich.json", options); }
+    void open_rich(const broker::Server_Options& options = {}) { open("rich.json", options); }
 
     /// Runs a check as two servers with different habits.
     template <class Check>
     void under_both_servers(Check check)
     {
-        for (const broker::Host_Options& options :
-             {broker::Host_Options::sfcb_like(), broker::Host_Options::pegasus_like()}) {
+        for (const broker::Server_Options& options :
+             {broker::Server_Options::sfcb_like(), broker::Server_Options::pegasus_like()}) {
             open_rich(options);
             check();
             close();

@@ -32,17 +32,18 @@ protected:
         throw std::invalid_argument("no controller " + device_id);
     }
 
-    static broker::Value options(std::initializer_list<uint16> list)
+    static broker::Plain_Value options(std::initializer_list<uint16> list)
     {
-        std::vector<broker::Value> elements;
+        std::vector<broker::Plain_Value> elements;
         for (const uint16 each : list)
-            elements.push_back(broker::Value::unsigned_number(CMPI_uint16, each));
-        return broker::Value::array(CMPI_uint16, elements);
+            elements.push_back(broker::Plain_Value::unsigned_number(CMPI_uint16, each));
+        return broker::Plain_Value::array(CMPI_uint16, elements);
     }
-    std::vector<broker::Named_Value> arguments(const std::string& uri, const broker::Value& install_options)
+    std::vector<broker::Named_Value> arguments(const std::string& uri,
+                                               const broker::Plain_Value& install_options)
     {
-        return {{"URI", broker::Value::text(uri)},
-                {"Target", broker::Value::path(target)},
+        return {{"URI", broker::Plain_Value::text(uri)},
+                {"Target", broker::Plain_Value::path(target)},
                 {"InstallOptions", install_options}};
     }
 
@@ -123,7 +124,7 @@ protected:
     {
         for (const broker::Instance_Value& each : enumerate("KALDERA_AdapterSoftwareIdentity").instances) {
             const std::string id = text_of(each, "InstanceID");
-            const broker::Value* kinds = each.property("Classifications");
+            const broker::Plain_Value* kinds = each.property("Classifications");
             if (id.find(ADAPTER) != std::string::npos && kinds && kinds->elements().size() == 1 &&
                 kinds->elements()[0].as_uint() == 10)
                 return text_of(each, "VersionString");

@@ -23,10 +23,10 @@ using Texts = std::vector<std::string>;
 TEST_F(Adapters, OfTheDemoHostComeWholeAsTheClientSeesThem)
 {
     open();
-    const std::string host = This_Host::find().name;
+    const std::string server = This_Host::find().name;
     for (const char* name : {"KALDERA_PortController", "KALDERA_PhysicalPackage", "KALDERA_Product",
                              "KALDERA_AdapterSoftwareIdentity"})
-        expect_golden(std::string("demo_") + name, golden_text(enumerate(name), host));
+        expect_golden(std::string("demo_") + name, golden_text(enumerate(name), server));
 }
 
 TEST_F(Adapters, ControllersAndCardsCostOneExchangeAnAdapterAndOneForTheList)
@@ -124,7 +124,7 @@ TEST_F(Adapters, AreFoundByTheirKeys)
         EXPECT_EQ(path.key("Tag")->as_text(), text_of(found.instances[0], "Tag"));
     }
     broker::Path_Value unknown = names.paths[0];
-    broker::set_value(unknown.keys, "Tag", broker::Value::text("no such card"));
+    broker::set_value(unknown.keys, "Tag", broker::Plain_Value::text("no such card"));
     EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, server->get_instance(unknown).rc);
 }
 
@@ -140,8 +140,8 @@ TEST_F(Adapters, KeepToThePropertiesThatTheClientAsksFor)
 
 TEST_F(Adapters, AnswerAlikeUnderTheHabitsOfBothServers)
 {
-    for (const broker::Host_Options& options :
-         {broker::Host_Options::sfcb_like(), broker::Host_Options::pegasus_like()}) {
+    for (const broker::Server_Options& options :
+         {broker::Server_Options::sfcb_like(), broker::Server_Options::pegasus_like()}) {
         open("demo.json", options);
         const broker::Result names = server->enumerate_instance_names("KALDERA_PortController");
         EXPECT_EQ(3u, names.paths.size());

@@ -111,17 +111,17 @@ protected:
     /// A system of the hypervisor's own class.
     void add_system(const char* class_name, const std::vector<const char*>& info)
     {
-        std::vector<broker::Value> texts;
+        std::vector<broker::Plain_Value> texts;
         for (const char* text : info)
-            texts.push_back(broker::Value::text(text));
+            texts.push_back(broker::Plain_Value::text(text));
         broker::Instance_Value system;
         system.path = {{},
                        NAME_SPACE,
                        "CIM_ComputerSystem",
-                       {{"CreationClassName", broker::Value::text(class_name)},
-                        {"Name", broker::Value::text(std::string("system ") + info[0])}}};
+                       {{"CreationClassName", broker::Plain_Value::text(class_name)},
+                        {"Name", broker::Plain_Value::text(std::string("system ") + info[0])}}};
         system.properties = system.path.keys;
-        system.properties.push_back({"OtherIdentifyingInfo", broker::Value::array(CMPI_string, texts)});
+        system.properties.push_back({"OtherIdentifyingInfo", broker::Plain_Value::array(CMPI_string, texts)});
         server->store().add(NAME_SPACE, system);
     }
     void host_is(const char* inner)

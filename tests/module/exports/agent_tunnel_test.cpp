@@ -31,8 +31,8 @@ TEST_F(Agent_Tunnel, IsFoundByEnumeration)
     const broker::Result services = server->enumerate_instance_names("KALDERA_AgentService");
     ASSERT_EQ(1u, services.paths.size());
     EXPECT_TRUE(same_object(SERVICE, services.paths[0]));
-    const broker::Result result =
-        server->invoke_method(services.paths[0], "executeMethod", {{"request", broker::Value::text("{}")}});
+    const broker::Result result = server->invoke_method(services.paths[0], "executeMethod",
+                                                        {{"request", broker::Plain_Value::text("{}")}});
     EXPECT_EQ(105, json(response_of(result))["error"]["code"].asInt());
 }
 
@@ -43,8 +43,9 @@ TEST_F(Agent_Tunnel, TakesANullRequestForAnEmptyText)
         std::string(UNPARSED) + "* Line 1, Column 1\n  Syntax error: value, object or array expected.\n";
     EXPECT_EQ(empty, response_of(execute("")));
     EXPECT_EQ(empty, response_of(server->invoke_method(SERVICE, "executeMethod", {})));
-    EXPECT_EQ(empty, response_of(server->invoke_method(SERVICE, "executeMethod",
-                                                       {{"request", broker::Value::null_of(CMPI_string)}})));
+    EXPECT_EQ(empty,
+              response_of(server->invoke_method(SERVICE, "executeMethod",
+                                                {{"request", broker::Plain_Value::null_of(CMPI_string)}})));
 }
 
 TEST_F(Agent_Tunnel, IsTheOnlyMethodAndKnownInAnyCase)
@@ -62,12 +63,13 @@ TEST_F(Agent_Tunnel, IsTheOnlyMethodAndKnownInAnyCase)
 TEST_F(Agent_Tunnel, IsOpenUnderAnyNameAndInTheClassItself)
 {
     open("empty.json");
-    for (broker::Path_Value path :
-         {broker::Path_Value{{}, "root/kaldera", "KALDERA_AgentService", {}},
-          broker::Path_Value{
-              {}, "root/kaldera", "kaldera_agentservice", {{"Name", broker::Value::text("another")}}}}) {
+    for (broker::Path_Value path : {broker::Path_Value{{}, "root/kaldera", "KALDERA_AgentService", {}},
+                                    broker::Path_Value{{},
+                                                       "root/kaldera",
+                                                       "kaldera_agentservice",
+                                                       {{"Name", broker::Plain_Value::text("another")}}}}) {
         const broker::Result result =
-            server->invoke_method(path, "executeMethod", {{"request", broker::Value::text("{}")}});
+            server->invoke_method(path, "executeMethod", {{"request", broker::Plain_Value::text("{}")}});
         EXPECT_EQ(105, json(response_of(result))["error"]["code"].asInt());
     }
 }
@@ -164,8 +166,8 @@ TEST_F(Agent_Tunnel, ServesSixtyFourThreadsAtOnce)
 
 TEST_F(Agent_Tunnel, LooksAlikeInEveryServer)
 {
-    for (const broker::Host_Options& options :
-         {broker::Host_Options::sfcb_like(), broker::Host_Options::pegasus_like()}) {
+    for (const broker::Server_Options& options :
+         {broker::Server_Options::sfcb_like(), broker::Server_Options::pegasus_like()}) {
         open("empty.json", options);
         simulator.add_fault(NOW);
         EXPECT_EQ("now", reply(SERVER_TIME)["result"].asString());

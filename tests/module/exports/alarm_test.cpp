@@ -26,7 +26,7 @@ protected:
         mark();
         return server->invoke_method(
             alarm, "SetAlarmState",
-            {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, state)}});
+            {{"RequestedAlarmState", broker::Plain_Value::unsigned_number(CMPI_uint16, state)}});
     }
     /// What the method returns: 0 set, 1 not available, 2 any other failure.
     void expect_set(const broker::Path_Value& alarm, uint16 state, uint32 expected)
@@ -146,7 +146,7 @@ TEST_F(Alarm, OfAMezzanineCardIsNotAvailable)
     // Such a port has no alarm device, but a client may make the path of one.
     EXPECT_THROW(alarm_of("1000024b4c300000"), std::invalid_argument);
     broker::Path_Value alarm = alarm_of(PORT);
-    set_value(alarm.keys, "DeviceID", broker::Value::text("1000024b4c300000"));
+    set_value(alarm.keys, "DeviceID", broker::Plain_Value::text("1000024b4c300000"));
     for (const uint16 state : {uint16(3), uint16(1)}) {
         expect_set(alarm, state, 1);
         EXPECT_EQ(QUERY, simulator.call_names());
@@ -159,7 +159,7 @@ TEST_F(Alarm, TakesAnIdWithColonsToo)
 {
     open();
     broker::Path_Value alarm = alarm_of(PORT);
-    set_value(alarm.keys, "DeviceID", broker::Value::text("10:00:02:4b:4c:10:00:00"));
+    set_value(alarm.keys, "DeviceID", broker::Plain_Value::text("10:00:02:4b:4c:10:00:00"));
     expect_set(alarm, 3, 0);
     EXPECT_EQ("10:00:02:4b:4c:10:00:00", simulator.requests("getPortByWwn").at(0)["wwn"].asString());
     EXPECT_EQ("3", state_of(PORT));
@@ -204,7 +204,7 @@ TEST_F(Alarm, OfAPortThatIsNotThereIsAFailure)
 {
     open();
     broker::Path_Value alarm = alarm_of(PORT);
-    set_value(alarm.keys, "DeviceID", broker::Value::text("1000000000000000"));
+    set_value(alarm.keys, "DeviceID", broker::Plain_Value::text("1000000000000000"));
     expect_set(alarm, 3, 2);
     EXPECT_EQ(QUERY, simulator.call_names());
     EXPECT_EQ(Lines{"ERR Current ALARM STATE is not available"}, said("ERR"));
@@ -218,7 +218,7 @@ TEST_F(Alarm, OfAnotherClassThatHasTheMethodIsNoPort)
     request.operation = broker::Operation::INVOKE_METHOD;
     request.path = {{}, "root/kaldera", "CIM_AlarmDevice", {}};
     request.method = "SetAlarmState";
-    request.in = {{"RequestedAlarmState", broker::Value::unsigned_number(CMPI_uint16, 3)}};
+    request.in = {{"RequestedAlarmState", broker::Plain_Value::unsigned_number(CMPI_uint16, 3)}};
     const broker::Result result = server->run_at("KALDERA_AlarmDevice", request);
     EXPECT_EQ(CMPI_RC_OK, result.rc);
     EXPECT_EQ(2u, result.return_value.as_uint());

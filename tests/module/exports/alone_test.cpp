@@ -1,4 +1,4 @@
-#include "broker/Host.h"
+#include "broker/Local_Server.h"
 #include "tests/support/Log_Lines.h"
 #include "tests/support/Temp_Folder.h"
 
@@ -7,7 +7,7 @@
 namespace KPRV {
 namespace {
 
-/// The module on a host without the adapter library.
+/// The module on a server without the adapter library.
 class Alone : public ::testing::Test
 {
 protected:
@@ -15,7 +15,7 @@ protected:
     {
         _home.write(".cimplerc", "LOG_LEVEL=DBG\n");
         std::string error;
-        server = broker::Host::open(KLDR_MODULE, {}, error);
+        server = broker::Local_Server::open(KLDR_MODULE, {}, error);
         ASSERT_TRUE(server) << error;
     }
     Lines said_by(const char* file) const
@@ -24,7 +24,7 @@ protected:
                     [&](const Log_Line& line) { return line.file == file; });
     }
 
-    std::unique_ptr<broker::Host> server;
+    std::unique_ptr<broker::Local_Server> server;
     Temp_Folder _home;
 
 private:

@@ -39,14 +39,14 @@ protected:
     broker::Result start(const broker::Path_Value& test_path, const broker::Path_Value& element)
     {
         return server->invoke_method(test_path, "RunDiagnostic",
-                                     {{"ManagedElement", broker::Value::path(element)}});
+                                     {{"ManagedElement", broker::Plain_Value::path(element)}});
     }
     /// The return value of a start that must not fail as a method.
     std::uint64_t code(const broker::Path_Value& test_path, const broker::Path_Value& element)
     {
         const broker::Result result = start(test_path, element);
         EXPECT_EQ(CMPI_RC_OK, result.rc) << result.message;
-        const broker::Value* job = broker::find_value(result.out, "Job");
+        const broker::Plain_Value* job = broker::find_value(result.out, "Job");
         EXPECT_EQ(result.return_value.as_uint() == 4096, job && !job->null);
         return result.return_value.as_uint();
     }
@@ -139,7 +139,7 @@ TEST_F(Diagnostics, RefuseAnAddressOfTheWrongLength)
 {
     on_demo_host([&] {
         broker::Path_Value port = fc_port();
-        set_value(port.keys, "DeviceID", broker::Value::text("1000024b4c1000"));
+        set_value(port.keys, "DeviceID", broker::Plain_Value::text("1000024b4c1000"));
         EXPECT_EQ(5u, code(test("Loopback", "ExternalLoopbackTest"), port));
         EXPECT_EQ(5u, code(test("PCILoopback", "PCILoopbackTest"), port));
     });
@@ -190,7 +190,7 @@ TEST_F(Diagnostics, AreNotRunThroughAnotherClass)
             request.path = path;
             request.path.class_name = class_name;
             request.method = "RunDiagnostic";
-            request.in = {{"ManagedElement", broker::Value::path(port)}};
+            request.in = {{"ManagedElement", broker::Plain_Value::path(port)}};
             EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED,
                       server->run_at("KALDERA_PCILoopbackDiagnosticTest", request).rc)
                 << class_name;

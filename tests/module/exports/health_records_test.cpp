@@ -20,10 +20,10 @@ protected:
         broker::Path_Value test, element;
         ASSERT_TRUE(kldrcim::find_test(connection, name, test, error)) << error;
         ASSERT_TRUE(kldrcim::find_element(connection, test.class_name, address, element, error)) << error;
-        EXPECT_EQ(
-            4096u,
-            server->invoke_method(test, "RunDiagnostic", {{"ManagedElement", broker::Value::path(element)}})
-                .return_value.as_uint());
+        EXPECT_EQ(4096u, server
+                             ->invoke_method(test, "RunDiagnostic",
+                                             {{"ManagedElement", broker::Plain_Value::path(element)}})
+                             .return_value.as_uint());
         EXPECT_TRUE(eventually([&] { return server->ledger().live() == 0; }));
     }
     /// "FINDING KEY: DETAIL" of what tests have to say.

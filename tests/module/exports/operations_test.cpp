@@ -128,8 +128,8 @@ TEST_F(Module_Operations, RunOnTheSmallStacksOfARequestThread)
     pthread_attr_setstacksize(&attributes, 256 * 1024);
     pthread_t thread;
     const auto client = [](void* self) -> void* {
-        broker::Host* host = static_cast<broker::Host*>(self);
-        EXPECT_EQ(3u, host->enumerate_instances("KALDERA_PortController").instances.size());
+        broker::Local_Server* server = static_cast<broker::Local_Server*>(self);
+        EXPECT_EQ(3u, server->enumerate_instances("KALDERA_PortController").instances.size());
         return nullptr;
     };
     ASSERT_EQ(0, pthread_create(&thread, &attributes, client, server.get()));
@@ -154,17 +154,17 @@ TEST_F(Module_Operations, TakeNoReferenceApartThatFitsNowhere)
     broker::Path_Value nested = path_of("KALDERA_FCPortSystemDevice");
     for (int depth = 0; depth < 400; depth++) {
         broker::Path_Value around = path_of("KALDERA_FCPortSystemDevice");
-        around.keys.push_back({"GroupComponent", broker::Value::path(std::move(nested))});
+        around.keys.push_back({"GroupComponent", broker::Plain_Value::path(std::move(nested))});
         nested = std::move(around);
     }
     const broker::Path_Value service = {{},
                                         "root/kaldera",
                                         "KALDERA_HBASoftwareInstallationService",
-                                        {{"Name", broker::Value::path(nested)}}};
+                                        {{"Name", broker::Plain_Value::path(nested)}}};
     on_small_stack([&] {
         mark();
         server->get_instance(nested);
-        server->invoke_method(service, "InstallFromURI", {{"Target", broker::Value::path(nested)}});
+        server->invoke_method(service, "InstallFromURI", {{"Target", broker::Plain_Value::path(nested)}});
         server->associators("KALDERA_FCPortSystemDevice", nested, {});
     });
     const Lines warnings = said("WARN");

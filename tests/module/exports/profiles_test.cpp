@@ -8,8 +8,8 @@ namespace KPRV {
 namespace {
 
 using broker::Path_Value;
+using broker::Plain_Value;
 using broker::Result;
-using broker::Value;
 
 constexpr const char* INTEROP = "root/PG_InterOp";
 
@@ -33,13 +33,13 @@ protected:
 
     static std::string end_of(const broker::Instance_Value& link, const char* role)
     {
-        const Value* end = link.property(role);
+        const Plain_Value* end = link.property(role);
         const Path_Value* path = end ? end->as_path() : nullptr;
         if (!path)
             return "(none)";
         if (path->class_name == "KALDERA_ComputerSystem")
             return "(system)";
-        const Value* key = path->key("InstanceID");
+        const Plain_Value* key = path->key("InstanceID");
         return key ? key->as_text() : path->class_name.substr(sizeof "KALDERA_" - 1);
     }
 
@@ -167,10 +167,10 @@ TEST_F(Profiles, TheServerIsAskedForItsObjectManagerAndNothingElse)
 
 TEST_F(Profiles, TheObjectManagerTakesAfterTheServers)
 {
-    server_has({{"Name", Value::text("Pegasus:1")},
-                {"ElementName", Value::text("Pegasus")},
-                {"Description", Value::text("A CIM server")}});
-    server_has({{"Name", Value::text("second")}});
+    server_has({{"Name", Plain_Value::text("Pegasus:1")},
+                {"ElementName", Plain_Value::text("Pegasus")},
+                {"Description", Plain_Value::text("A CIM server")}});
+    server_has({{"Name", Plain_Value::text("second")}});
     const broker::Instance_Value manager = only("KALDERA_ObjectManager");
     EXPECT_EQ("Pegasus:1", text_of(manager, "Name"));
     EXPECT_EQ("Pegasus", text_of(manager, "Caption"));
@@ -182,7 +182,8 @@ TEST_F(Profiles, TheObjectManagerTakesAfterTheServers)
 // A null is not handed to the client at all.
 TEST_F(Profiles, WhatTheServerDoesNotTellIsNull)
 {
-    server_has({{"Name", Value::text("Pegasus:1")}, {"ElementName", Value::null_of(CMPI_string)}});
+    server_has(
+        {{"Name", Plain_Value::text("Pegasus:1")}, {"ElementName", Plain_Value::null_of(CMPI_string)}});
     const broker::Instance_Value manager = only("KALDERA_ObjectManager");
     EXPECT_EQ("Pegasus:1", text_of(manager, "Name"));
     EXPECT_EQ("(absent)", text_of(manager, "Caption"));

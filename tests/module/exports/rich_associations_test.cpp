@@ -120,13 +120,13 @@ class Rich_Associations : public Rich_Fixture
 {
 protected:
     /// Class and the one key that tells its instances apart.
-    static std::string end_text(const broker::Value* end, const std::string& host_name)
+    static std::string end_text(const broker::Plain_Value* end, const std::string& host_name)
     {
         const broker::Path_Value* path = end ? end->as_path() : nullptr;
         if (!path)
             return "(none)";
         for (const char* key : {"DeviceID", "InstanceID", "Tag", "IdentifyingNumber", "Name"}) {
-            if (const broker::Value* value = path->key(key)) {
+            if (const broker::Plain_Value* value = path->key(key)) {
                 const std::string& text = value->as_text();
                 return path->class_name.substr(std::string("KALDERA_").size()) + " " +
                        (text == host_name ? "@HOST@" : text);

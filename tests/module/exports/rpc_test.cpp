@@ -181,7 +181,7 @@ protected:
     }
 };
 
-TEST_F(rpc_test, the_demo_host_answers_every_method)
+TEST_F(rpc_test, TheDemoHostAnswersEveryMethod)
 {
     std::set<std::string> called;
     std::vector<std::string> words;
@@ -201,7 +201,7 @@ TEST_F(rpc_test, the_demo_host_answers_every_method)
         EXPECT_TRUE(called.contains(method.name)) << method.name;
 }
 
-TEST_F(rpc_test, a_result_is_written_in_lines)
+TEST_F(rpc_test, AResultIsWrittenInLines)
 {
     const Rpc_Outcome host = run_words("discovery.getHost");
     EXPECT_EQ(0, host.status);
@@ -212,7 +212,7 @@ TEST_F(rpc_test, a_result_is_written_in_lines)
     EXPECT_EQ("null\n", run_words("discovery.getAllPortsByHba 20:00:00:00:00:00:00:00").out);
 }
 
-TEST_F(rpc_test, an_error_is_told_with_its_code)
+TEST_F(rpc_test, AnErrorIsToldWithItsCode)
 {
     const std::pair<const char*, const char*> wrong[] = {
         {"discovery.getPortByWwn", "51 Mismatch in number of parameters."},
@@ -232,13 +232,13 @@ TEST_F(rpc_test, an_error_is_told_with_its_code)
     }
 }
 
-TEST_F(rpc_test, what_the_library_throws_is_an_error_too)
+TEST_F(rpc_test, WhatTheLibraryThrowsIsAnErrorToo)
 {
     simulator.add_fault(R"({"call": "getCee", "do": "throw", "code": 12, "message": "busy"})");
     EXPECT_EQ("kldrcim: 12 busy\n", run_words("discovery.getCee " ETH).error);
 }
 
-TEST_F(rpc_test, calls_of_one_line_are_made_in_order_up_to_the_first_error)
+TEST_F(rpc_test, CallsOfOneLineAreMadeInOrderUpToTheFirstError)
 {
     const Rpc_Outcome line = run_words("discovery.getVPort " FC " " FC " + discovery.getHost");
     EXPECT_EQ(1, line.status);
@@ -253,7 +253,7 @@ TEST_F(rpc_test, calls_of_one_line_are_made_in_order_up_to_the_first_error)
     EXPECT_EQ("kldrcim: 2 no such address: \"nowhere\"\n", kept.error);
 }
 
-TEST_F(rpc_test, a_request_carries_what_the_words_say)
+TEST_F(rpc_test, ARequestCarriesWhatTheWordsSay)
 {
     run_words("configuration.createVnic " ETH " 100 200");
     ASSERT_EQ(1u, simulator.requests("createvNIC").size());
@@ -263,7 +263,7 @@ TEST_F(rpc_test, a_request_carries_what_the_words_say)
     EXPECT_EQ(200, request["maxBandwidth"].asInt());
 }
 
-TEST_F(rpc_test, a_raw_text_is_sent_as_it_is_and_its_reply_written_as_it_is)
+TEST_F(rpc_test, ARawTextIsSentAsItIsAndItsReplyWrittenAsItIs)
 {
     const Rpc_Outcome broken = run({"--raw", "{"});
     EXPECT_EQ(0, broken.status);
@@ -278,7 +278,7 @@ TEST_F(rpc_test, a_raw_text_is_sent_as_it_is_and_its_reply_written_as_it_is)
     EXPECT_EQ(0u, run({"--raw="}).out.find("There was an error parsing"));
 }
 
-TEST_F(rpc_test, the_product_road_leaves_nothing_behind)
+TEST_F(rpc_test, TheProductRoadLeavesNothingBehind)
 {
     const Rpc_Outcome host = run({"--leaks", "discovery.getHost"});
     EXPECT_NE(std::string::npos, host.error.find("Objects lost: 0")) << host.error;

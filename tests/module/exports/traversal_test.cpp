@@ -18,7 +18,7 @@ protected:
     static std::string label(const Path_Value& path)
     {
         for (const char* key : {"DeviceID", "Tag", "InstanceID", "IdentifyingNumber", "Name"}) {
-            if (const broker::Value* value = path.key(key))
+            if (const broker::Plain_Value* value = path.key(key))
                 return path.class_name.substr(sizeof "KALDERA_" - 1) + " " + value->as_text();
         }
         ADD_FAILURE() << "no key tells the instances of " << path.class_name << " apart";
@@ -304,7 +304,7 @@ TEST_F(Traversal, OfWhatIsNotThereOrNotKnownIsEmptyAndASuccess)
 {
     open("demo.json");
     Path_Value port = find("FCPort", "1000024b4c100000");
-    set_value(port.keys, "DeviceID", broker::Value::text("1000000000000000"));
+    set_value(port.keys, "DeviceID", broker::Plain_Value::text("1000000000000000"));
     EXPECT_EQ(Lines{}, far_ends("FCPortSystemDevice", port));
     mark();
     port.class_name = "ACME_Unheard";

@@ -17,7 +17,7 @@ TEST_F(Update, IsOfferedByOneServiceWithItsCapabilities)
     EXPECT_EQ("Kaldera Adapter Software Update Service", text_of(capabilities.instances[0], "InstanceID"));
     const auto codes = [&](const char* property) {
         std::vector<uint64> result;
-        for (const broker::Value& each : capabilities.instances[0].property(property)->elements())
+        for (const broker::Plain_Value& each : capabilities.instances[0].property(property)->elements())
             result.push_back(each.as_uint());
         return result;
     };
@@ -52,7 +52,7 @@ TEST_F(Update, WantsAUriThenATargetThenOptions)
     const std::vector<broker::Named_Value> nothing;
     expect_refusal(nothing, {"ERR URI.value is empty"}, "empty input parameters");
     expect_refusal(arguments("", options({5})), {"ERR URI.value is empty"}, "empty input parameters");
-    expect_refusal({{"URI", broker::Value::text("no uri")}}, {"ERR Target is empty"},
+    expect_refusal({{"URI", broker::Plain_Value::text("no uri")}}, {"ERR Target is empty"},
                    "empty input parameters");
     auto without_options = arguments("no uri", options({5}));
     without_options.pop_back();
@@ -81,7 +81,8 @@ TEST_F(Update, DoesNotReadTheValuesOfOptions)
 {
     folder.write("fw.bin", GOOD_IMAGE);
     auto in = arguments("file://fw.bin", options({5}));
-    in.push_back({"InstallOptionsValues", broker::Value::array(CMPI_string, {broker::Value::text("x")})});
+    in.push_back(
+        {"InstallOptionsValues", broker::Plain_Value::array(CMPI_string, {broker::Plain_Value::text("x")})});
     EXPECT_EQ(0u, call(in));
 }
 
@@ -111,13 +112,13 @@ TEST_F(Update, WantsAControllerThatIsThere)
                        "Could not find target controller");
         EXPECT_EQ(calls, simulator.call_names());
     };
-    set_value(target.keys, "DeviceID", broker::Value::text("2000024b4c999999"));
+    set_value(target.keys, "DeviceID", broker::Plain_Value::text("2000024b4c999999"));
     expect_no_target();
     // The library's form of the address is not the key's.
-    set_value(target.keys, "DeviceID", broker::Value::text(INDEX));
+    set_value(target.keys, "DeviceID", broker::Plain_Value::text(INDEX));
     expect_no_target();
     target = good;
-    set_value(target.keys, "SystemName", broker::Value::text("elsewhere"));
+    set_value(target.keys, "SystemName", broker::Plain_Value::text("elsewhere"));
     expect_no_target();
     target = server->enumerate_instance_names("KALDERA_ComputerSystem").paths.at(0);
     expect_no_target();

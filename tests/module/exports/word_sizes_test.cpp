@@ -92,8 +92,8 @@ protected:
             server->enumerate_instance_names("KALDERA_AgentService").paths.at(0);
         const std::string request = R"({"method": ")" + method + R"(", "params": )" + params + "}";
         mark();
-        const broker::Result result =
-            server->invoke_method(service, "executeMethod", {{"request", broker::Value::text(request)}});
+        const broker::Result result = server->invoke_method(
+            service, "executeMethod", {{"request", broker::Plain_Value::text(request)}});
         Json::FastWriter writer;
         writer.omitEndingLineFeed();
         if (const auto calls = simulator.calls(); !calls.empty())

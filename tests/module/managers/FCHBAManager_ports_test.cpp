@@ -23,7 +23,7 @@ struct FCHBAManager_Ports : Port_Fixture
 
 } // namespace
 
-TEST_F(FCHBAManager_Ports, classes_and_their_helpers)
+TEST_F(FCHBAManager_Ports, ClassesAndTheirHelpers)
 {
     for (const classId_t id : {COMPUTERSYSTEM, FCPORT, SCSIPROTOCOLENDPOINT, FCPORTSTATISTICS, ETHERNETPORT,
                                LOGICALPORTGROUP, LANENDPOINT, PHYSICALCONNECTOR, ALARMDEVICE}) {
@@ -35,7 +35,7 @@ TEST_F(FCHBAManager_Ports, classes_and_their_helpers)
     }
 }
 
-TEST_F(FCHBAManager_Ports, of_one_adapter_whatever_the_driver)
+TEST_F(FCHBAManager_Ports, OfOneAdapterWhateverTheDriver)
 {
     Driver_Status_Override driver(3);
     EXPECT_EQ(taken(manager->getFCPortInstancesByAdapter("20008c7cff000000"), "DeviceID"),
@@ -44,14 +44,14 @@ TEST_F(FCHBAManager_Ports, of_one_adapter_whatever_the_driver)
     EXPECT_EQ(taken(manager->getInstances(FCPORT)).size(), 0u);
 }
 
-TEST_F(FCHBAManager_Ports, sets_an_alarm)
+TEST_F(FCHBAManager_Ports, SetsAnAlarm)
 {
     library.answers("setPortByWwn", json("{}"));
     EXPECT_EQ(manager->setAlarmState("10008c7cff000001", 3), 1);
     EXPECT_EQ(log.traces(), (Lines{"DBG Entering: setAlarmState", "DBG Returning: setAlarmState"}));
 }
 
-TEST_F(FCHBAManager_Ports, all_tests_in_order_without_a_look_at_the_driver)
+TEST_F(FCHBAManager_Ports, AllTestsInOrderWithoutALookAtTheDriver)
 {
     Driver_Status_Override driver(3);
     library.answers("getAllAdaptersIndexString", list_of({}));

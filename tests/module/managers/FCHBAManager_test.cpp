@@ -20,18 +20,18 @@ struct FCHBAManager_Classes : Manager_Fixture
 
 } // namespace
 
-TEST_F(FCHBAManager_Classes, is_one_object)
+TEST_F(FCHBAManager_Classes, IsOneObject)
 {
     EXPECT_EQ(FCHBAManager::getFCHBAManager(), manager);
 }
 
-TEST_F(FCHBAManager_Classes, which_it_serves)
+TEST_F(FCHBAManager_Classes, WhichItServes)
 {
     EXPECT_EQ(served(manager), (std::vector<uint32>{1,  2,  3,  4,  5,  6,  7,  8,  17, 18, 19, 20, 21, 22,
                                                     23, 24, 25, 26, 27, 28, 30, 31, 32, 33, 34, 35, 36}));
 }
 
-TEST_F(FCHBAManager_Classes, a_class_that_it_does_not_serve)
+TEST_F(FCHBAManager_Classes, AClassThatItDoesNotServe)
 {
     for (const uint32 id : {0, 9, 10, 29, 37, 38}) {
         log.clear();
@@ -45,7 +45,7 @@ TEST_F(FCHBAManager_Classes, a_class_that_it_does_not_serve)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(FCHBAManager_Classes, adapters_by_their_helper)
+TEST_F(FCHBAManager_Classes, AdaptersByTheirHelper)
 {
     one_adapter();
     EXPECT_EQ(classes(manager, 2), Lines{"KALDERA_PortController"});
@@ -59,13 +59,13 @@ TEST_F(FCHBAManager_Classes, adapters_by_their_helper)
     EXPECT_EQ(log.lines()[0].file, "FCHBAManager.cpp");
 }
 
-TEST_F(FCHBAManager_Classes, a_host_without_adapters_has_none)
+TEST_F(FCHBAManager_Classes, AHostWithoutAdaptersHasNone)
 {
     EXPECT_TRUE(classes(manager, 2).empty());
     EXPECT_EQ(log.said(), requested(2, "ERR libGetAllAdaptersIndexString returns NULL."));
 }
 
-TEST_F(FCHBAManager_Classes, a_missing_driver_refuses_all_but_two)
+TEST_F(FCHBAManager_Classes, AMissingDriverRefusesAllButTwo)
 {
     one_adapter();
     for (const sint32 status : {2, 3}) {
@@ -83,7 +83,7 @@ TEST_F(FCHBAManager_Classes, a_missing_driver_refuses_all_but_two)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(FCHBAManager_Classes, a_driver_without_adapters_refuses_nothing)
+TEST_F(FCHBAManager_Classes, ADriverWithoutAdaptersRefusesNothing)
 {
     one_adapter();
     for (const sint32 status : {0, 1}) {
@@ -92,14 +92,14 @@ TEST_F(FCHBAManager_Classes, a_driver_without_adapters_refuses_nothing)
     }
 }
 
-TEST_F(FCHBAManager_Classes, is_traced)
+TEST_F(FCHBAManager_Classes, IsTraced)
 {
     Log_Capture all;
     classes(manager, 0);
     EXPECT_EQ(all.traces(), (Lines{"DBG Entering: getInstances", "DBG Returning: getInstances"}));
 }
 
-TEST_F(FCHBAManager_Classes, tests_of_an_element_in_order)
+TEST_F(FCHBAManager_Classes, TestsOfAnElementInOrder)
 {
     EXPECT_EQ(manager->getDiagnosticServicesForAdapter().size(), 0u);
     EXPECT_EQ(log.said("INFO Requested classId"), Lines{"INFO Requested classId : 21"});
@@ -113,7 +113,7 @@ TEST_F(FCHBAManager_Classes, tests_of_an_element_in_order)
               (Lines{"INFO Requested classId : 24", "INFO Requested classId : 23"}));
 }
 
-TEST_F(FCHBAManager_Classes, tests_by_their_helper)
+TEST_F(FCHBAManager_Classes, TestsByTheirHelper)
 {
     one_adapter();
     // Without a model it would count as any model, also as one that withholds tests.

@@ -6,7 +6,7 @@ using namespace KPRV;
 
 using HDRManager_Classes = Manager_Fixture;
 
-TEST_F(HDRManager_Classes, serves_storage_alone)
+TEST_F(HDRManager_Classes, ServesStorageAlone)
 {
     const HDRManager* manager = HDRManager::getHDRManager();
     EXPECT_EQ(HDRManager::getHDRManager(), manager);
@@ -17,7 +17,7 @@ TEST_F(HDRManager_Classes, serves_storage_alone)
     EXPECT_EQ(log.lines()[0].file, "HDRManager.cpp");
 }
 
-TEST_F(HDRManager_Classes, a_missing_driver_refuses_all)
+TEST_F(HDRManager_Classes, AMissingDriverRefusesAll)
 {
     Driver_Status_Override driver(3);
     for (const uint32 id : {9, 16, 38}) {

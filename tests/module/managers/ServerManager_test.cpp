@@ -26,7 +26,7 @@ struct ServerManager_Classes : Manager_Fixture
 
 } // namespace
 
-TEST_F(ServerManager_Classes, serves_the_server_side_alone)
+TEST_F(ServerManager_Classes, ServesTheServerSideAlone)
 {
     EXPECT_EQ(ServerManager::getServerManager(), manager);
     EXPECT_EQ(served(manager), (std::vector<uint32>{10, 11, 12, 13, 14, 15, 37}));
@@ -36,7 +36,7 @@ TEST_F(ServerManager_Classes, serves_the_server_side_alone)
     EXPECT_EQ(log.lines()[0].file, "ServerManager.cpp");
 }
 
-TEST_F(ServerManager_Classes, needs_neither_driver_nor_adapters)
+TEST_F(ServerManager_Classes, NeedsNeitherDriverNorAdapters)
 {
     Driver_Status_Override driver(2);
     const std::vector<std::pair<uint32, Lines>> expected = {
@@ -56,7 +56,7 @@ TEST_F(ServerManager_Classes, needs_neither_driver_nor_adapters)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(ServerManager_Classes, is_traced)
+TEST_F(ServerManager_Classes, IsTraced)
 {
     const std::vector<std::pair<uint32, const char*>> operations = {
         {10, "getRegisteredProfileInstances"},
@@ -73,7 +73,7 @@ TEST_F(ServerManager_Classes, is_traced)
                          std::string("DBG Returning: ") + name, "DBG Returning: getInstances"}));
 }
 
-TEST_F(ServerManager_Classes, subprofiles_by_the_short_name_of_a_profile)
+TEST_F(ServerManager_Classes, SubprofilesByTheShortNameOfAProfile)
 {
     EXPECT_EQ(manager->getSubProfilesOfProfile("fc hba").size(), 8u);
     EXPECT_EQ(manager->getSubProfilesOfProfile("SMI-S").size(), 0u);

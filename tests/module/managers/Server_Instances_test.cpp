@@ -41,7 +41,7 @@ const Notes_List asked = {"enum root/PG_InterOp", "destroy"};
 
 } // namespace
 
-TEST_F(Server_Instances, the_object_manager_takes_after_that_of_the_server)
+TEST_F(Server_Instances, TheObjectManagerTakesAfterThatOfTheServer)
 {
     server_has("Pegasus:1", "Pegasus", "Pegasus CIM Server");
     server_has("second", "second", "second");
@@ -65,7 +65,7 @@ TEST_F(Server_Instances, the_object_manager_takes_after_that_of_the_server)
     EXPECT_EQ(notes.list(), asked);
 }
 
-TEST_F(Server_Instances, nulls_of_the_server_stay_null)
+TEST_F(Server_Instances, NullsOfTheServerStayNull)
 {
     server_has("Pegasus:1", nullptr, nullptr);
     const Set_Properties set = object_manager();
@@ -75,7 +75,7 @@ TEST_F(Server_Instances, nulls_of_the_server_stay_null)
     EXPECT_EQ(set.at("ElementName"), "CIM Server");
 }
 
-TEST_F(Server_Instances, a_server_without_an_object_manager_leaves_them_null)
+TEST_F(Server_Instances, AServerWithoutAnObjectManagerLeavesThemNull)
 {
     Set_Properties set = object_manager();
     for (const char* name : {"Name", "Caption", "Description"})
@@ -84,7 +84,7 @@ TEST_F(Server_Instances, a_server_without_an_object_manager_leaves_them_null)
     EXPECT_FALSE(name_space().contains("ObjectManagerName"));
 }
 
-TEST_F(Server_Instances, a_server_that_refuses_is_named_for_what_it_is)
+TEST_F(Server_Instances, AServerThatRefusesIsNamedForWhatItIs)
 {
     context.next_rep = nullptr;
     const Set_Properties set = object_manager();
@@ -94,13 +94,13 @@ TEST_F(Server_Instances, a_server_that_refuses_is_named_for_what_it_is)
     EXPECT_EQ(name_space().at("ObjectManagerName"), "CIM Server");
 }
 
-TEST_F(Server_Instances, an_instance_of_another_class_tells_nothing)
+TEST_F(Server_Instances, AnInstanceOfAnotherClassTellsNothing)
 {
     context.results.push_back(Ref<Instance>(create(&Instance::static_meta_class, true)));
     EXPECT_FALSE(object_manager().contains("Name"));
 }
 
-TEST_F(Server_Instances, the_name_space)
+TEST_F(Server_Instances, TheNameSpace)
 {
     server_has("Pegasus:1", "Pegasus", "Pegasus CIM Server");
     EXPECT_EQ(name_space(), (Set_Properties{
@@ -117,7 +117,7 @@ TEST_F(Server_Instances, the_name_space)
     EXPECT_EQ(notes.list(), asked);
 }
 
-TEST_F(Server_Instances, the_communication_mechanism)
+TEST_F(Server_Instances, TheCommunicationMechanism)
 {
     EXPECT_EQ(taken(manager->getCIMXMLCommunicationMechanismInstance()),
               (std::vector<Set_Properties>{{
@@ -141,7 +141,7 @@ TEST_F(Server_Instances, the_communication_mechanism)
     EXPECT_TRUE(notes.list().empty());
 }
 
-TEST_F(Server_Instances, the_software_that_implements_the_profiles)
+TEST_F(Server_Instances, TheSoftwareThatImplementsTheProfiles)
 {
     const char* title = "Kaldera Adapter CIM Provider";
     EXPECT_STREQ("3.2.3.0", prov_build_version);
@@ -165,7 +165,7 @@ TEST_F(Server_Instances, the_software_that_implements_the_profiles)
               }}));
 }
 
-TEST_F(Server_Instances, the_agent_service_has_a_name_and_nothing_else)
+TEST_F(Server_Instances, TheAgentServiceHasANameAndNothingElse)
 {
     EXPECT_EQ(taken(manager->getAgentServiceInstances()),
               (std::vector<Set_Properties>{{{"Name", "Kaldera Agent Service Provider"}}}));

@@ -30,7 +30,7 @@ struct Access_Point : testing::Test
 
 } // namespace
 
-TEST_F(Access_Point, comes_and_goes_with_the_agent)
+TEST_F(Access_Point, ComesAndGoesWithTheAgent)
 {
     EXPECT_TRUE(points().empty());
     EXPECT_EQ(
@@ -64,7 +64,7 @@ TEST_F(Access_Point, comes_and_goes_with_the_agent)
     EXPECT_TRUE(points().empty());
 }
 
-TEST_F(Access_Point, any_name_that_ends_so_will_do)
+TEST_F(Access_Point, AnyNameThatEndsSoWillDo)
 {
     const Named_Process agent("my_qxmagent");
     EXPECT_EQ(points().size(), 1u);
@@ -72,7 +72,7 @@ TEST_F(Access_Point, any_name_that_ends_so_will_do)
     EXPECT_EQ(points(FCPORT).size(), 1u);
 }
 
-TEST_F(Access_Point, a_host_without_a_name_has_none_even_with_an_agent)
+TEST_F(Access_Point, AHostWithoutANameHasNoneEvenWithAnAgent)
 {
     const Named_Process agent("qxmagent");
     host_calls.gethostname = [](char*, size_t) { return -1; };
@@ -82,7 +82,7 @@ TEST_F(Access_Point, a_host_without_a_name_has_none_even_with_an_agent)
                      "DBG Returning: getInstancesByClass"}));
 }
 
-TEST_F(Access_Point, a_name_takes_the_place_of_a_missing_address)
+TEST_F(Access_Point, ANameTakesThePlaceOfAMissingAddress)
 {
     const Named_Process agent("qxmagent");
     host_calls.gethostbyname_r = find_no_host;

@@ -4,7 +4,7 @@ using namespace KPRV;
 
 using AdapterHelper_Failures = Adapter_Fixture;
 
-TEST_F(AdapterHelper_Failures, no_list)
+TEST_F(AdapterHelper_Failures, NoList)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]", "{'indexStrings': {}}"}) {
         library.answers("getAllAdaptersIndexString", json(answer));
@@ -14,14 +14,14 @@ TEST_F(AdapterHelper_Failures, no_list)
     EXPECT_EQ(log.lines()[0].file, "AdapterHelper.cpp");
 }
 
-TEST_F(AdapterHelper_Failures, an_empty_list)
+TEST_F(AdapterHelper_Failures, AnEmptyList)
 {
     library.adapters({});
     EXPECT_TRUE(walk(PORTCONTROLLER).empty());
     EXPECT_EQ(log.said(), (Lines{"INFO Number of Adapters: 0", "WARN No adapters in the system!"}));
 }
 
-TEST_F(AdapterHelper_Failures, a_failing_adapter_is_lost_alone)
+TEST_F(AdapterHelper_Failures, AFailingAdapterIsLostAlone)
 {
     library.adapters({{"AABB", Json::Value()}, {"CCDD", hba()}});
     library.answers("getHbaByWwn", [](const Json::Value& request) -> Json::Value {
@@ -36,7 +36,7 @@ TEST_F(AdapterHelper_Failures, a_failing_adapter_is_lost_alone)
                      "INFO Number of instances: 1"}));
 }
 
-TEST_F(AdapterHelper_Failures, an_adapter_with_bad_details_is_lost_alone)
+TEST_F(AdapterHelper_Failures, AnAdapterWithBadDetailsIsLostAlone)
 {
     library.adapters({{"AABB", json("{'hbaData': {}}")}, {"CCDD", hba()}});
     library.answers("getHbaByWwn", [](const Json::Value& request) {
@@ -47,7 +47,7 @@ TEST_F(AdapterHelper_Failures, an_adapter_with_bad_details_is_lost_alone)
     EXPECT_TRUE(log.has("INFO Unable to get Adapter info 1 - AABB"));
 }
 
-TEST_F(AdapterHelper_Failures, an_adapter_without_ports_is_invisible)
+TEST_F(AdapterHelper_Failures, AnAdapterWithoutPortsIsInvisible)
 {
     const Json::Value no_ports[] = {
         with(hba(), "hbaData", "portCount", 0), with(hba(), "hbaData", "portCount", Json::Value()),
@@ -63,7 +63,7 @@ TEST_F(AdapterHelper_Failures, an_adapter_without_ports_is_invisible)
     EXPECT_EQ(library.count("getFlashInfo"), 0u);
 }
 
-TEST_F(AdapterHelper_Failures, wrong_types_lose_their_adapter_alone)
+TEST_F(AdapterHelper_Failures, WrongTypesLoseTheirAdapterAlone)
 {
     const std::pair<const char*, const char*> members[] = {
         {"hbaData", "portCount"},
@@ -89,7 +89,7 @@ TEST_F(AdapterHelper_Failures, wrong_types_lose_their_adapter_alone)
                              " - libGetHbaByWwn got std exception: Type is not convertible to string");
 }
 
-TEST_F(AdapterHelper_Failures, a_bios_text_of_the_wrong_type_loses_what_comes_after_it)
+TEST_F(AdapterHelper_Failures, ABiosTextOfTheWrongTypeLosesWhatComesAfterIt)
 {
     library.adapters({{WWN, with(hba(), "firmware", "biosVersion", 5)}, {MAC, cna()}});
     EXPECT_EQ(walk(ADAPTERSOFTWAREIDENTITY, "InstanceID"),
@@ -98,7 +98,7 @@ TEST_F(AdapterHelper_Failures, a_bios_text_of_the_wrong_type_loses_what_comes_af
     EXPECT_EQ(walk(PHYSICALPACKAGE).size(), 2u);
 }
 
-TEST_F(AdapterHelper_Failures, addresses_that_are_none)
+TEST_F(AdapterHelper_Failures, AddressesThatAreNone)
 {
     library.adapters({{"", hba()}, {"A", hba()}, {WWN, hba()}});
     Json::Value list = json("{'indexStrings': ['', 'A', 5]}");
@@ -111,7 +111,7 @@ TEST_F(AdapterHelper_Failures, addresses_that_are_none)
     EXPECT_TRUE(log.has("INFO Unable to get Adapter info 3 - "));
 }
 
-TEST_F(AdapterHelper_Failures, exceptions_of_two_calls_pass_and_leave_nothing_behind)
+TEST_F(AdapterHelper_Failures, ExceptionsOfTwoCallsPassAndLeaveNothingBehind)
 {
     // What was built before is freed; a leak here is a report of the address sanitizer.
     library.adapters({{WWN, hba()}});
@@ -124,7 +124,7 @@ TEST_F(AdapterHelper_Failures, exceptions_of_two_calls_pass_and_leave_nothing_be
     EXPECT_THROW(walk(PRODUCT), int);
 }
 
-TEST_F(AdapterHelper_Failures, without_a_library)
+TEST_F(AdapterHelper_Failures, WithoutALibrary)
 {
     library.answers("getAllAdaptersIndexString", default_JsonReqFP(Json::Value()));
     for (const classId_t id : {PORTCONTROLLER, PHYSICALPACKAGE, PRODUCT, ADAPTERSOFTWAREIDENTITY})

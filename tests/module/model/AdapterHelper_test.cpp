@@ -6,7 +6,7 @@ using namespace KPRV;
 
 using AdapterHelper_Walk = Adapter_Fixture;
 
-TEST_F(AdapterHelper_Walk, one_hba_as_a_controller)
+TEST_F(AdapterHelper_Walk, OneHbaAsAController)
 {
     library.adapters({{WWN, hba()}});
     const auto set = walk(PORTCONTROLLER);
@@ -22,7 +22,7 @@ TEST_F(AdapterHelper_Walk, one_hba_as_a_controller)
                                  "INFO Adapter Type : FC HBA", "INFO Number of instances: 1"}));
 }
 
-TEST_F(AdapterHelper_Walk, a_cna_goes_by_its_mac)
+TEST_F(AdapterHelper_Walk, ACnaGoesByItsMac)
 {
     library.adapters({{MAC, cna()}});
     const auto controllers = walk(PORTCONTROLLER);
@@ -33,7 +33,7 @@ TEST_F(AdapterHelper_Walk, a_cna_goes_by_its_mac)
     EXPECT_EQ(walk(PHYSICALPACKAGE)[0].at("Tag"), "10000000-0000-0000-0000-8c7cff000002");
 }
 
-TEST_F(AdapterHelper_Walk, packages_and_products)
+TEST_F(AdapterHelper_Walk, PackagesAndProducts)
 {
     library.adapters({{WWN, hba()}, {MAC, cna()}});
     EXPECT_EQ(walk(PHYSICALPACKAGE, "Name"),
@@ -44,7 +44,7 @@ TEST_F(AdapterHelper_Walk, packages_and_products)
     EXPECT_EQ(library.count("getFlashInfo"), 0u);
 }
 
-TEST_F(AdapterHelper_Walk, an_adapter_that_is_stopped)
+TEST_F(AdapterHelper_Walk, AnAdapterThatIsStopped)
 {
     library.adapters({{WWN, with(hba(), "hbaData", "hbaStatus", false)}});
     const auto set = walk(PORTCONTROLLER);
@@ -54,7 +54,7 @@ TEST_F(AdapterHelper_Walk, an_adapter_that_is_stopped)
     EXPECT_EQ(walk(PORTCONTROLLER, "OperationalStatus"), Lines{"{10}"});
 }
 
-TEST_F(AdapterHelper_Walk, an_oem_card)
+TEST_F(AdapterHelper_Walk, AnOemCard)
 {
     Json::Value answer = with(hba(), "hbaData", "oem", "DELL");
     answer = with(answer, "hbaData", "oemSerialNum", "P177");
@@ -66,7 +66,7 @@ TEST_F(AdapterHelper_Walk, an_oem_card)
     EXPECT_EQ(set[0].at("Tag"), "0123456789abcdef");
 }
 
-TEST_F(AdapterHelper_Walk, an_adapter_without_drivers_has_empty_fields)
+TEST_F(AdapterHelper_Walk, AnAdapterWithoutDriversHasEmptyFields)
 {
     Json::Value answer = cna();
     answer["driver"] = Json::objectValue;
@@ -82,7 +82,7 @@ TEST_F(AdapterHelper_Walk, an_adapter_without_drivers_has_empty_fields)
     EXPECT_EQ(walk(PORTCONTROLLER, "DeviceID"), Lines{""});
 }
 
-TEST_F(AdapterHelper_Walk, software_of_one_hba)
+TEST_F(AdapterHelper_Walk, SoftwareOfOneHba)
 {
     library.adapters({{WWN, hba()}});
     EXPECT_EQ(walk(ADAPTERSOFTWAREIDENTITY, "InstanceID"),
@@ -90,7 +90,7 @@ TEST_F(AdapterHelper_Walk, software_of_one_hba)
     EXPECT_EQ(walk(ADAPTERSOFTWAREIDENTITY, "VersionString"), (Lines{"3.2.3", "BIOS 2", "FW 1"}));
 }
 
-TEST_F(AdapterHelper_Walk, software_of_twins)
+TEST_F(AdapterHelper_Walk, SoftwareOfTwins)
 {
     library.adapters(
         {{MAC, cna()}, {"8c:7c:ff:00:00:03", with(cna(), "hbaData", "hbaMAC", "8c:7c:ff:00:00:03")}});
@@ -105,7 +105,7 @@ TEST_F(AdapterHelper_Walk, software_of_twins)
     EXPECT_TRUE(log.has("INFO Number of instances: 6"));
 }
 
-TEST_F(AdapterHelper_Walk, software_of_a_mixed_host)
+TEST_F(AdapterHelper_Walk, SoftwareOfAMixedHost)
 {
     // Each driver is listed once, from the first adapter that names it.
     library.adapters({{WWN, hba()},
@@ -117,7 +117,7 @@ TEST_F(AdapterHelper_Walk, software_of_a_mixed_host)
                "8c7cff000002_firmware", "20008c7cff000001_bios", "20008c7cff000001_firmware"}));
 }
 
-TEST_F(AdapterHelper_Walk, an_empty_driver_name_is_none)
+TEST_F(AdapterHelper_Walk, AnEmptyDriverNameIsNone)
 {
     library.adapters({{MAC, with(cna(), "driver", "networkDriverName", "")}, {MAC, cna()}});
     library.adapters({{MAC, with(cna(), "driver", "networkDriverName", "")}});
@@ -126,7 +126,7 @@ TEST_F(AdapterHelper_Walk, an_empty_driver_name_is_none)
                      "KLDR Ethernet Adapter S1 Firmware"}));
 }
 
-TEST_F(AdapterHelper_Walk, flash_that_cannot_be_read_has_no_bios)
+TEST_F(AdapterHelper_Walk, FlashThatCannotBeReadHasNoBios)
 {
     library.adapters({{WWN, hba()}});
     for (const char* answer : {"null", "{}", "[]", "{'flashStatus': false}", "{'flashStatus': null}",
@@ -137,7 +137,7 @@ TEST_F(AdapterHelper_Walk, flash_that_cannot_be_read_has_no_bios)
     }
 }
 
-TEST_F(AdapterHelper_Walk, a_bios_text_of_bad_bytes_is_cleared)
+TEST_F(AdapterHelper_Walk, ABiosTextOfBadBytesIsCleared)
 {
     for (const char* bad : {"\xF5x", "\x80x", " \xC1"}) {
         library.adapters({{WWN, with(hba(), "firmware", "biosVersion", bad)}});
@@ -152,7 +152,7 @@ TEST_F(AdapterHelper_Walk, a_bios_text_of_bad_bytes_is_cleared)
     EXPECT_EQ(walk(ADAPTERSOFTWAREIDENTITY)[1].at("VersionString"), "\xC3\xBC 1");
 }
 
-TEST_F(AdapterHelper_Walk, texts_are_cut_to_the_record)
+TEST_F(AdapterHelper_Walk, TextsAreCutToTheRecord)
 {
     const std::string text(100, 'x');
     Json::Value answer = cna();
@@ -181,7 +181,7 @@ TEST_F(AdapterHelper_Walk, texts_are_cut_to_the_record)
     EXPECT_EQ(walk(PORTCONTROLLER)[0]["DeviceID"], cut(24));
 }
 
-TEST_F(AdapterHelper_Walk, a_class_that_is_not_its_own)
+TEST_F(AdapterHelper_Walk, AClassThatIsNotItsOwn)
 {
     library.adapters({{WWN, hba()}});
     EXPECT_TRUE(walk(FCPORT).empty());
@@ -189,7 +189,7 @@ TEST_F(AdapterHelper_Walk, a_class_that_is_not_its_own)
     EXPECT_TRUE(log.has("INFO Number of instances: 0"));
 }
 
-TEST_F(AdapterHelper_Walk, nothing_is_remembered)
+TEST_F(AdapterHelper_Walk, NothingIsRemembered)
 {
     library.adapters({{WWN, hba()}});
     EXPECT_EQ(walk(ADAPTERSOFTWAREIDENTITY).size(), 3u);

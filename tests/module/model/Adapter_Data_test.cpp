@@ -22,7 +22,7 @@ _adapterData filled(const std::string& hba_data)
 
 } // namespace
 
-TEST(Adapter_Data, texts_are_cut_and_terminated)
+TEST(Adapter_Data, TextsAreCutAndTerminated)
 {
     char field[4] = {'#', '#', '#', '#'};
     copy_text(field, "abc");
@@ -33,7 +33,7 @@ TEST(Adapter_Data, texts_are_cut_and_terminated)
     EXPECT_STREQ(field, "");
 }
 
-TEST(Adapter_Data, widths)
+TEST(Adapter_Data, Widths)
 {
     EXPECT_EQ(sizeof _adapterData::nodeWWN, 24u);
     EXPECT_EQ(sizeof _adapterData::mac, 18u);
@@ -51,7 +51,7 @@ TEST(Adapter_Data, widths)
     EXPECT_EQ(sizeof _adapterData::uuid, 33u);
 }
 
-TEST(Adapter_Data, vital_product_data)
+TEST(Adapter_Data, VitalProductData)
 {
     Log_Capture log;
     const auto adapter = filled("{'oem': 'ACME', 'fruNum': 'F1', 'partNum': 'P1', 'uuid': 'U1'}");
@@ -63,7 +63,7 @@ TEST(Adapter_Data, vital_product_data)
     EXPECT_EQ(log.traces(), (Lines{"DBG Entering: fillVPDInfo", "DBG Returning: fillVPDInfo"}));
 }
 
-TEST(Adapter_Data, vital_product_data_of_nothing)
+TEST(Adapter_Data, VitalProductDataOfNothing)
 {
     const auto adapter = filled("{}");
     EXPECT_STREQ(adapter.fruNumber, "");
@@ -72,7 +72,7 @@ TEST(Adapter_Data, vital_product_data_of_nothing)
     EXPECT_STREQ(adapter.uuid, "");
 }
 
-TEST(Adapter_Data, two_vendors_have_no_fru)
+TEST(Adapter_Data, TwoVendorsHaveNoFru)
 {
     Log_Capture log("INFO");
     for (const char* vendor : {"HP", "hpq", "DELL", "Dell Inc."})
@@ -87,7 +87,7 @@ TEST(Adapter_Data, two_vendors_have_no_fru)
             << vendor;
 }
 
-TEST(Adapter_Data, an_oem_serial_number_replaces_the_card_s)
+TEST(Adapter_Data, AnOemSerialNumberReplacesTheCardS)
 {
     EXPECT_STREQ(filled("{'oemSerialNum': 'ABC123', 'partNum': 'ABC'}").serialNumber, "123");
     EXPECT_STREQ(filled("{'oemSerialNum': 'ABC123', 'partNum': 'XYZ'}").serialNumber, "ABC123");
@@ -100,7 +100,7 @@ TEST(Adapter_Data, an_oem_serial_number_replaces_the_card_s)
     EXPECT_EQ(adapter.partNumber, std::string(15, 'P'));
 }
 
-TEST(Adapter_Data, long_texts)
+TEST(Adapter_Data, LongTexts)
 {
     Log_Capture log;
     const std::string oem(200, 'V'), serial(80, 'S'), uuid(36, 'U'), fru(20, 'F');
@@ -113,7 +113,7 @@ TEST(Adapter_Data, long_texts)
     EXPECT_EQ(log.said(), Lines{"DBG " + line.substr(0, 127)});
 }
 
-TEST(Adapter_Data, a_text_ends_at_a_zero_character)
+TEST(Adapter_Data, ATextEndsAtAZeroCharacter)
 {
     Json::Value hba_data;
     hba_data["uuid"] = std::string("U\0V", 3);
@@ -122,7 +122,7 @@ TEST(Adapter_Data, a_text_ends_at_a_zero_character)
     EXPECT_STREQ(adapter.uuid, "U");
 }
 
-TEST(Adapter_Data, wrong_types)
+TEST(Adapter_Data, WrongTypes)
 {
     for (const char* name : {"oem", "fruNum", "partNum", "oemSerialNum", "uuid"})
         EXPECT_THROW(filled(std::string("{'") + name + "': 5}"), Not_Convertible) << name;

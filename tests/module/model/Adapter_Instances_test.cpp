@@ -69,7 +69,7 @@ Set_Properties software(const _adapterData& adapter, softwareType_t type, bool n
 
 } // namespace
 
-TEST(Adapter_Instances, controller_of_an_hba)
+TEST(Adapter_Instances, ControllerOfAnHba)
 {
     EXPECT_EQ(controller(an_hba()), (Set_Properties{
                                         {"CreationClassName", "KALDERA_PortController"},
@@ -87,7 +87,7 @@ TEST(Adapter_Instances, controller_of_an_hba)
                                     }));
 }
 
-TEST(Adapter_Instances, controller_of_a_cna)
+TEST(Adapter_Instances, ControllerOfACna)
 {
     Set_Properties expected = controller(an_hba());
     expected["DeviceID"] = "8c7cff000002";
@@ -97,7 +97,7 @@ TEST(Adapter_Instances, controller_of_a_cna)
     EXPECT_EQ(controller(a_cna()), expected);
 }
 
-TEST(Adapter_Instances, controller_that_is_stopped)
+TEST(Adapter_Instances, ControllerThatIsStopped)
 {
     _adapterData adapter = an_hba();
     adapter.status = 10;
@@ -111,7 +111,7 @@ TEST(Adapter_Instances, controller_that_is_stopped)
     EXPECT_EQ(set["EnabledState"], "2");
 }
 
-TEST(Adapter_Instances, package_of_an_hba)
+TEST(Adapter_Instances, PackageOfAnHba)
 {
     EXPECT_EQ(package(an_hba()), (Set_Properties{
                                      {"CreationClassName", "KALDERA_PhysicalPackage"},
@@ -129,7 +129,7 @@ TEST(Adapter_Instances, package_of_an_hba)
                                  }));
 }
 
-TEST(Adapter_Instances, package_of_a_cna)
+TEST(Adapter_Instances, PackageOfACna)
 {
     _adapterData adapter = a_cna();
     Set_Properties expected = package(an_hba());
@@ -142,7 +142,7 @@ TEST(Adapter_Instances, package_of_a_cna)
     EXPECT_EQ(package(adapter)["SerialNumber"], "");
 }
 
-TEST(Adapter_Instances, a_tag_gives_the_address_back_unless_it_is_a_uuid)
+TEST(Adapter_Instances, ATagGivesTheAddressBackUnlessItIsAUuid)
 {
     const auto address = [](const std::string& tag) {
         return std::string(ProviderUtil::getNodeMACOrWWNFromTag(tag.c_str(), "").c_str());
@@ -156,7 +156,7 @@ TEST(Adapter_Instances, a_tag_gives_the_address_back_unless_it_is_a_uuid)
     EXPECT_EQ(package({})["Tag"], "10000000-0000-0000--");
 }
 
-TEST(Adapter_Instances, product)
+TEST(Adapter_Instances, Product)
 {
     Set_Properties expected = {
         {"ElementName", "Kaldera FC HBA"}, {"Caption", "Kaldera FC HBA"},
@@ -169,7 +169,7 @@ TEST(Adapter_Instances, product)
     EXPECT_EQ(product(a_cna()), expected);
 }
 
-TEST(Adapter_Instances, firmware)
+TEST(Adapter_Instances, Firmware)
 {
     EXPECT_EQ(software(an_hba(), SOFTWARE_FIRMWARE), (Set_Properties{
                                                          {"InstanceID", "20008c7cff000001_firmware"},
@@ -191,7 +191,7 @@ TEST(Adapter_Instances, firmware)
     EXPECT_EQ(set["Name"], "KLDR Ethernet Adapter Firmware");
 }
 
-TEST(Adapter_Instances, bios)
+TEST(Adapter_Instances, Bios)
 {
     Set_Properties expected = software(a_cna(), SOFTWARE_FIRMWARE);
     expected["InstanceID"] = "8c7cff000002_bios";
@@ -202,7 +202,7 @@ TEST(Adapter_Instances, bios)
     EXPECT_EQ(software(a_cna(), SOFTWARE_BIOS), expected);
 }
 
-TEST(Adapter_Instances, drivers)
+TEST(Adapter_Instances, Drivers)
 {
     Set_Properties expected = {
         {"InstanceID", "ndrv"},
@@ -225,7 +225,7 @@ TEST(Adapter_Instances, drivers)
     EXPECT_EQ(software(a_cna(), SOFTWARE_DRIVER, false), expected);
 }
 
-TEST(Adapter_Instances, software_of_no_known_type_has_empty_texts)
+TEST(Adapter_Instances, SoftwareOfNoKnownTypeHasEmptyTexts)
 {
     Log_Capture log("INFO");
     EXPECT_EQ(software(an_hba(), softwareType_t(5)), (Set_Properties{
@@ -243,7 +243,7 @@ TEST(Adapter_Instances, software_of_no_known_type_has_empty_texts)
     EXPECT_EQ(log.said(), Lines{"INFO Default case . Other software types"});
 }
 
-TEST(Adapter_Instances, builders_are_traced)
+TEST(Adapter_Instances, BuildersAreTraced)
 {
     Log_Capture log;
     controller(an_hba());

@@ -23,7 +23,7 @@ struct Host_System : testing::Test
 
 } // namespace
 
-TEST_F(Host_System, is_one_instance_without_the_library)
+TEST_F(Host_System, IsOneInstanceWithoutTheLibrary)
 {
     const char* text = "The host with Kaldera's adapters installed.";
     const auto systems = taken(helper->getComputerSystemInstances(COMPUTERSYSTEM));
@@ -45,7 +45,7 @@ TEST_F(Host_System, is_one_instance_without_the_library)
     EXPECT_EQ(log.traces()[0], "DBG Entering: getComputerSystemInstances");
 }
 
-TEST_F(Host_System, whose_name_does_not_resolve)
+TEST_F(Host_System, WhoseNameDoesNotResolve)
 {
     host_calls.gethostbyname_r = find_no_host;
     Set_Properties set = system();
@@ -55,7 +55,7 @@ TEST_F(Host_System, whose_name_does_not_resolve)
     EXPECT_EQ(log.said("WARN"), Lines{});
 }
 
-TEST_F(Host_System, without_address_or_name)
+TEST_F(Host_System, WithoutAddressOrName)
 {
     host_calls.gethostname = [](char*, size_t) { return -1; };
     Set_Properties set = system();
@@ -65,7 +65,7 @@ TEST_F(Host_System, without_address_or_name)
                                       "localhost for host info."});
 }
 
-TEST_F(Host_System, results_of_the_look_up)
+TEST_F(Host_System, ResultsOfTheLookUp)
 {
     struct Row
     {
@@ -98,7 +98,7 @@ TEST_F(Host_System, results_of_the_look_up)
     }
 }
 
-TEST_F(Host_System, bears_the_class_that_was_asked_for)
+TEST_F(Host_System, BearsTheClassThatWasAskedFor)
 {
     const auto systems = taken(helper->getComputerSystemInstances(FCPORT));
     EXPECT_EQ(systems.at(0).at("CreationClassName"), "KALDERA_FCPort");

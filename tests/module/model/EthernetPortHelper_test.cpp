@@ -28,7 +28,7 @@ struct Ethernet_Ports : Port_Fixture
 
 } // namespace
 
-TEST_F(Ethernet_Ports, one_port)
+TEST_F(Ethernet_Ports, OnePort)
 {
     EXPECT_EQ(walk(ETHERNETPORT), (std::vector<Set_Properties>{{
                                       {"CreationClassName", "KALDERA_EthernetPort"},
@@ -53,7 +53,7 @@ TEST_F(Ethernet_Ports, one_port)
                      R"(getOpticsSFP {"indexStr":"8c:7c:ff:00:00:11"})"}));
 }
 
-TEST_F(Ethernet_Ports, one_endpoint_asks_no_transceiver)
+TEST_F(Ethernet_Ports, OneEndpointAsksNoTransceiver)
 {
     EXPECT_EQ(walk(LANENDPOINT), (std::vector<Set_Properties>{{
                                      {"CreationClassName", "KALDERA_LANEndpoint"},
@@ -73,7 +73,7 @@ TEST_F(Ethernet_Ports, one_endpoint_asks_no_transceiver)
     EXPECT_EQ(library.count("getOpticsSFP"), 0u);
 }
 
-TEST_F(Ethernet_Ports, states_of_an_endpoint)
+TEST_F(Ethernet_Ports, StatesOfAnEndpoint)
 {
     const std::tuple<uint32, const char*, const char*> rows[] = {
         {6, "15", "1"}, {8, "5", "9"},   {9, "10", "4"}, {10, "10", "3"},        {11, "5", "2"},
@@ -87,14 +87,14 @@ TEST_F(Ethernet_Ports, states_of_an_endpoint)
     }
 }
 
-TEST_F(Ethernet_Ports, port_types)
+TEST_F(Ethernet_Ports, PortTypes)
 {
     EXPECT_EQ(ports->getPortType("10G_BASE-SR"), 108);
     for (const char* other : {"10G_BASE-LR", "10G_BASE-LRM", "10g_base-sr", "10G_BASE-SR ", ""})
         EXPECT_EQ(ports->getPortType(other), 105) << other;
 }
 
-TEST_F(Ethernet_Ports, a_missing_transceiver_does_not_lose_the_port)
+TEST_F(Ethernet_Ports, AMissingTransceiverDoesNotLoseThePort)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]"}) {
         library.answers("getOpticsSFP", json(answer));
@@ -115,7 +115,7 @@ TEST_F(Ethernet_Ports, a_missing_transceiver_does_not_lose_the_port)
     EXPECT_EQ(walk(ETHERNETPORT, "PortType"), Lines{"105"});
 }
 
-TEST_F(Ethernet_Ports, missing_members_are_empty)
+TEST_F(Ethernet_Ports, MissingMembersAreEmpty)
 {
     library.answers("getEthPortByEthMac", json("{'ethData': {}}"));
     Set_Properties set = walk(LANENDPOINT).at(0);
@@ -127,7 +127,7 @@ TEST_F(Ethernet_Ports, missing_members_are_empty)
     EXPECT_EQ(walk(ETHERNETPORT, "OperationalStatus"), Lines{"{0}"});
 }
 
-TEST_F(Ethernet_Ports, texts_are_cut_to_the_record)
+TEST_F(Ethernet_Ports, TextsAreCutToTheRecord)
 {
     const std::string text(2000, 'x');
     library.answers("getEthPhyPortIndicesByAdapter", list_of({text}));
@@ -140,7 +140,7 @@ TEST_F(Ethernet_Ports, texts_are_cut_to_the_record)
     EXPECT_EQ(set["ElementName"], text.substr(0, 1027));
 }
 
-TEST_F(Ethernet_Ports, ports_are_numbered_by_their_place_and_lost_alone)
+TEST_F(Ethernet_Ports, PortsAreNumberedByTheirPlaceAndLostAlone)
 {
     library.answers("getEthPhyPortIndicesByAdapter", list_of({"AA:01", 5, "AA:02", "AA:03", "AA:04"}));
     library.answers("getEthPortByEthMac", [this](const Json::Value& request) {
@@ -163,7 +163,7 @@ TEST_F(Ethernet_Ports, ports_are_numbered_by_their_place_and_lost_alone)
     EXPECT_EQ(walk(ETHERNETPORT, "PortNumber"), Lines{"4"});
 }
 
-TEST_F(Ethernet_Ports, an_fc_hba_has_none)
+TEST_F(Ethernet_Ports, AnFcHbaHasNone)
 {
     library.adapters({{CNA, json("{'hbaData': {'hasEthPort': false}, 'driver': {}}")}});
     EXPECT_TRUE(walk(ETHERNETPORT).empty());
@@ -173,7 +173,7 @@ TEST_F(Ethernet_Ports, an_fc_hba_has_none)
                                  "INFO No Ethernet ports found for Adapter - " + cna}));
 }
 
-TEST_F(Ethernet_Ports, without_adapters)
+TEST_F(Ethernet_Ports, WithoutAdapters)
 {
     library.answers("getAllAdaptersIndexString", json("{'indexStrings': 1}"));
     EXPECT_TRUE(walk(ETHERNETPORT).empty());
@@ -184,7 +184,7 @@ TEST_F(Ethernet_Ports, without_adapters)
     EXPECT_EQ(log.lines()[1].file, "EthernetPortHelper.cpp");
 }
 
-TEST_F(Ethernet_Ports, without_a_port_list)
+TEST_F(Ethernet_Ports, WithoutAPortList)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]", "{'indexStrings': 'x'}"}) {
         library.answers("getEthPhyPortIndicesByAdapter", json(answer));
@@ -203,7 +203,7 @@ TEST_F(Ethernet_Ports, without_a_port_list)
                                       head + "default exception"}));
 }
 
-TEST_F(Ethernet_Ports, by_an_id_that_is_none)
+TEST_F(Ethernet_Ports, ByAnIdThatIsNone)
 {
     // The library is asked all the same, and refuses.
     library.answers("getEthPhyPortIndicesByAdapter", Json::Value());
@@ -211,7 +211,7 @@ TEST_F(Ethernet_Ports, by_an_id_that_is_none)
     EXPECT_EQ(library.told()[1], R"(getEthPhyPortIndicesByAdapter {"indexStr":""})");
 }
 
-TEST_F(Ethernet_Ports, by_a_mac)
+TEST_F(Ethernet_Ports, ByAMac)
 {
     library.answers("getAdapterIdByPort", json("{'adapterId': 1}"));
     EXPECT_EQ(taken(ports->getEthernetPortInstancesByAdapter("8c7cff000011"), "DeviceID"),
@@ -224,7 +224,7 @@ TEST_F(Ethernet_Ports, by_a_mac)
     EXPECT_EQ(library.count("getHbaByWwn"), 0u);
 }
 
-TEST_F(Ethernet_Ports, by_a_mac_that_no_adapter_has)
+TEST_F(Ethernet_Ports, ByAMacThatNoAdapterHas)
 {
     const auto by_mac = [&](const char* mac) {
         return taken(ports->getEthernetPortInstancesByAdapter(mac)).size();
@@ -250,7 +250,7 @@ TEST_F(Ethernet_Ports, by_a_mac_that_no_adapter_has)
     EXPECT_THROW(by_mac("AABB"), HbaAgentError);
 }
 
-TEST_F(Ethernet_Ports, a_class_that_is_not_its_own)
+TEST_F(Ethernet_Ports, AClassThatIsNotItsOwn)
 {
     EXPECT_TRUE(walk(FCPORT).empty());
     EXPECT_TRUE(log.has("INFO Unhandled class support"));

@@ -9,7 +9,7 @@
 
 using namespace KPRV;
 
-TEST(Fresh_Instances, owns_until_release)
+TEST(Fresh_Instances, OwnsUntilRelease)
 {
     Ref<Instance> kept(create_null<KALDERA_PortController>());
     {
@@ -29,7 +29,7 @@ TEST(Fresh_Instances, owns_until_release)
     dropped.append(create_null<KALDERA_PortController>());
 }
 
-TEST(Fresh_Instances, joins_lists_in_order)
+TEST(Fresh_Instances, JoinsListsInOrder)
 {
     Array<Instance*> two;
     two.append(create_null<KALDERA_PortController>());
@@ -47,7 +47,7 @@ TEST(Fresh_Instances, joins_lists_in_order)
         destroy(instance);
 }
 
-TEST(Instance_Building, a_fresh_instance_is_null_throughout)
+TEST(Instance_Building, AFreshInstanceIsNullThroughout)
 {
     const Ref<Instance> defaults(create<KALDERA_PortController>(true));
     EXPECT_EQ(set_properties(defaults.ptr()).size(), 5u);

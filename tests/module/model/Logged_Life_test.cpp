@@ -6,7 +6,7 @@
 
 using namespace KPRV;
 
-TEST(Logged_Life, tells_of_the_beginning_and_the_end)
+TEST(Logged_Life, TellsOfTheBeginningAndTheEnd)
 {
     Log_Capture log;
     {

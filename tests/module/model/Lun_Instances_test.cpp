@@ -45,7 +45,7 @@ constexpr Row rows[] = {
 
 } // namespace
 
-TEST_F(Lun_Instances, names_by_id_type)
+TEST_F(Lun_Instances, NamesByIdType)
 {
     for (const Row& row : rows) {
         lun.idType = row.id_type;
@@ -58,7 +58,7 @@ TEST_F(Lun_Instances, names_by_id_type)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(Lun_Instances, an_id_type_that_is_not_known)
+TEST_F(Lun_Instances, AnIdTypeThatIsNotKnown)
 {
     for (const uint32 id_type : {4u, 5u, 7u, 9u, 11u, 4294967295u}) {
         log.clear();
@@ -74,7 +74,7 @@ TEST_F(Lun_Instances, an_id_type_that_is_not_known)
     }
 }
 
-TEST_F(Lun_Instances, a_disk_goes_by_its_device_name_if_it_has_one)
+TEST_F(Lun_Instances, ADiskGoesByItsDeviceNameIfItHasOne)
 {
     lun.idType = 5;
     for (const char* name : {"", "   "}) {
@@ -92,7 +92,7 @@ TEST_F(Lun_Instances, a_disk_goes_by_its_device_name_if_it_has_one)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
+TEST_F(Lun_Instances, EveryNumberHasANameOfItsOwn)
 {
     for (const auto& [number, name] : std::map<uint32, std::string>{{0, "LUN_0"},
                                                                     {1, "LUN_1"},
@@ -108,7 +108,7 @@ TEST_F(Lun_Instances, every_number_has_a_name_of_its_own)
     }
 }
 
-TEST_F(Lun_Instances, long_names_are_whole)
+TEST_F(Lun_Instances, LongNamesAreWhole)
 {
     const std::string vendor(8, 'v'), product(16, 'p'), serial(64, 's'), description(64, 'd'),
         device(64, 'n');
@@ -122,7 +122,7 @@ TEST_F(Lun_Instances, long_names_are_whole)
     EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["Name"], device);
 }
 
-TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
+TEST_F(Lun_Instances, TheNameOfOneIsNotWrittenThroughAnother)
 {
     lun.number = 1;
     const Ref<KALDERA_LogicalDisk> first(helper->getLogicalDiskInstance(port, lun));
@@ -130,7 +130,7 @@ TEST_F(Lun_Instances, the_name_of_one_is_not_written_through_another)
     EXPECT_EQ(taken(helper->getLogicalDiskInstance(port, lun))["ElementName"], "LUN_1");
 }
 
-TEST_F(Lun_Instances, builders_are_traced)
+TEST_F(Lun_Instances, BuildersAreTraced)
 {
     taken(helper->getStorageExtentInstance(port, lun));
     taken(helper->getTapeDriveInstance(port, lun));

@@ -30,7 +30,7 @@ struct Connectors : Port_Fixture
 
 } // namespace
 
-TEST_F(Connectors, one)
+TEST_F(Connectors, One)
 {
     one_port();
     EXPECT_EQ(walk(), (std::vector<Set_Properties>{{
@@ -62,12 +62,12 @@ TEST_F(Connectors, one)
                      "INFO The string BB:01 is already in : format"}));
 }
 
-TEST_F(Connectors, equal_serial_numbers_stay_apart_by_position)
+TEST_F(Connectors, EqualSerialNumbersStayApartByPosition)
 {
     EXPECT_EQ(tags(), (Lines{"S1_1_0", "S1_1_1", "S1_2_0", "S1_2_1", "S1_3_0", "S1_3_1"}));
 }
 
-TEST_F(Connectors, the_first_failing_adapter_ends_the_walk)
+TEST_F(Connectors, TheFirstFailingAdapterEndsTheWalk)
 {
     library.answers("getHbaByWwn", [](const Json::Value& request) {
         return request["wwn"] == "AA:02" ? Json::Value() : json("{'hbaData': {}, 'driver': {}}");
@@ -77,7 +77,7 @@ TEST_F(Connectors, the_first_failing_adapter_ends_the_walk)
     EXPECT_EQ(library.count("getHbaByWwn"), 2u);
 }
 
-TEST_F(Connectors, an_adapter_without_ports_does_not_end_it)
+TEST_F(Connectors, AnAdapterWithoutPortsDoesNotEndIt)
 {
     library.answers("getFcPhyPortIndicesByAdapter", [](const Json::Value& request) {
         if (request["indexStr"] == "AA:01")
@@ -90,7 +90,7 @@ TEST_F(Connectors, an_adapter_without_ports_does_not_end_it)
     EXPECT_EQ(log.said("ERR"), Lines{"ERR libGetFcPhyPortIndicesByAdapter returns NULL for AA:02"});
 }
 
-TEST_F(Connectors, an_empty_slot_has_none)
+TEST_F(Connectors, AnEmptySlotHasNone)
 {
     library.adapters({{"AA:01", json("{'hbaData': {}, 'driver': {}}")}});
     library.answers("getOpticsSFP", [this](const Json::Value& request) {
@@ -101,7 +101,7 @@ TEST_F(Connectors, an_empty_slot_has_none)
     EXPECT_EQ(log.said("WARN"), Lines{"WARN getOpticsInfo failed for PortIndex =0 Ret = -1"});
 }
 
-TEST_F(Connectors, a_port_that_cannot_be_read_has_none)
+TEST_F(Connectors, APortThatCannotBeReadHasNone)
 {
     library.adapters({{"AA:01", json("{'hbaData': {}, 'driver': {}}")}});
     library.answers("getPortByWwn", [](const Json::Value& request) {
@@ -112,7 +112,7 @@ TEST_F(Connectors, a_port_that_cannot_be_read_has_none)
     EXPECT_EQ(log.said("WARN"), Lines{});
 }
 
-TEST_F(Connectors, without_adapters)
+TEST_F(Connectors, WithoutAdapters)
 {
     library.answers("getAllAdaptersIndexString", list_of({}));
     EXPECT_TRUE(walk().empty());
@@ -121,7 +121,7 @@ TEST_F(Connectors, without_adapters)
     EXPECT_EQ(log.said("WARN"), Lines(2, "WARN No adapters in the system. "));
 }
 
-TEST_F(Connectors, missing_members_are_empty)
+TEST_F(Connectors, MissingMembersAreEmpty)
 {
     one_port();
     for (const char* answer : {"{}", "[]", "5"}) {
@@ -132,7 +132,7 @@ TEST_F(Connectors, missing_members_are_empty)
     }
 }
 
-TEST_F(Connectors, texts_are_cut_to_the_record)
+TEST_F(Connectors, TextsAreCutToTheRecord)
 {
     one_port();
     const std::string text(100, 'x');
@@ -150,7 +150,7 @@ TEST_F(Connectors, texts_are_cut_to_the_record)
     EXPECT_EQ(set["Model"], text.substr(0, 7));
 }
 
-TEST_F(Connectors, wrong_types_lose_their_port_alone)
+TEST_F(Connectors, WrongTypesLoseTheirPortAlone)
 {
     library.adapters({{"AA:01", json("{'hbaData': {}, 'driver': {}}")}});
     for (const char* name : {"vendorName", "vendorPart", "serialNo", "revision", "speed", "extendedID"}) {
@@ -165,7 +165,7 @@ TEST_F(Connectors, wrong_types_lose_their_port_alone)
     EXPECT_EQ(tags(), Lines{"S1_1_1"});
 }
 
-TEST_F(Connectors, exceptions)
+TEST_F(Connectors, Exceptions)
 {
     library.throws("getOpticsSFP", HbaAgentError{7, "busy"});
     EXPECT_TRUE(walk().empty());
@@ -182,7 +182,7 @@ TEST_F(Connectors, exceptions)
     EXPECT_THROW(walk(), HbaAgentError);
 }
 
-TEST_F(Connectors, a_class_that_is_not_its_own)
+TEST_F(Connectors, AClassThatIsNotItsOwn)
 {
     one_port();
     EXPECT_TRUE(taken(assets->getInstancesByClass(FCPORT)).empty());

@@ -6,7 +6,7 @@ using namespace KPRV;
 
 using PortHelper_Walk = Port_Fixture;
 
-TEST_F(PortHelper_Walk, one_port)
+TEST_F(PortHelper_Walk, OnePort)
 {
     EXPECT_EQ(walk(FCPORT), (std::vector<Set_Properties>{{
                                 {"CreationClassName", "KALDERA_FCPort"},
@@ -36,7 +36,7 @@ TEST_F(PortHelper_Walk, one_port)
     EXPECT_EQ(log.traces()[1], "DBG Entering: getInstancesByAdapterId");
 }
 
-TEST_F(PortHelper_Walk, ports_are_numbered_by_their_place_and_joined_in_order)
+TEST_F(PortHelper_Walk, PortsAreNumberedByTheirPlaceAndJoinedInOrder)
 {
     library.answers("getAllAdaptersIndexString", list_of({"AA", "BB", "CC"}));
     library.answers("getFcPhyPortIndicesByAdapter", [](const Json::Value& request) {
@@ -53,7 +53,7 @@ TEST_F(PortHelper_Walk, ports_are_numbered_by_their_place_and_joined_in_order)
     EXPECT_EQ(log.said("ERR"), Lines(2, "ERR libGetFcPhyPortIndicesByAdapter returns NULL."));
 }
 
-TEST_F(PortHelper_Walk, speeds)
+TEST_F(PortHelper_Walk, Speeds)
 {
     const std::pair<Json::Value, const char*> operating[] = {
         {99999, "0"}, {8, "8000000000"}, {0, "0"}, {Json::Value(), "0"}, {100, "100000000000"}};
@@ -70,7 +70,7 @@ TEST_F(PortHelper_Walk, speeds)
     }
 }
 
-TEST_F(PortHelper_Walk, numbers_keep_their_sign_until_they_are_published)
+TEST_F(PortHelper_Walk, NumbersKeepTheirSignUntilTheyArePublished)
 {
     Json::Value answer = with(fc_port(), "maxFrameSize", -1);
     answer["portStatusValue"] = -1;
@@ -83,7 +83,7 @@ TEST_F(PortHelper_Walk, numbers_keep_their_sign_until_they_are_published)
     EXPECT_EQ(set["PortType"], "1");
 }
 
-TEST_F(PortHelper_Walk, an_empty_answer_is_a_port_without_data)
+TEST_F(PortHelper_Walk, AnEmptyAnswerIsAPortWithoutData)
 {
     for (const char* answer : {"{}", "[]", "5", "'x'"}) {
         library.answers("getPortByWwn", json(answer));
@@ -95,7 +95,7 @@ TEST_F(PortHelper_Walk, an_empty_answer_is_a_port_without_data)
     }
 }
 
-TEST_F(PortHelper_Walk, texts_are_cut_to_the_record)
+TEST_F(PortHelper_Walk, TextsAreCutToTheRecord)
 {
     const std::string text(2000, 'x');
     Json::Value answer = fc_port(text.c_str());
@@ -110,7 +110,7 @@ TEST_F(PortHelper_Walk, texts_are_cut_to_the_record)
     EXPECT_EQ(walk(FCPORT, "Caption"), Lines{"p\xC3\xB6rt \xFF"});
 }
 
-TEST_F(PortHelper_Walk, wrong_types_lose_their_port_alone)
+TEST_F(PortHelper_Walk, WrongTypesLoseTheirPortAlone)
 {
     library.answers("getFcPhyPortIndicesByAdapter", list_of({"1", "2"}));
     for (const char* name : {"wwn", "nodeWwn", "PortSymbolicName", "operatingSpeed", "supportedPortSpeeds",
@@ -129,7 +129,7 @@ TEST_F(PortHelper_Walk, wrong_types_lose_their_port_alone)
     EXPECT_TRUE(walk(FCPORT).empty());
 }
 
-TEST_F(PortHelper_Walk, port_addresses_that_are_none)
+TEST_F(PortHelper_Walk, PortAddressesThatAreNone)
 {
     library.answers("getFcPhyPortIndicesByAdapter", list_of({5, json("{}"), PORT}));
     EXPECT_EQ(walk(FCPORT, "PortNumber"), Lines{"2"});
@@ -138,7 +138,7 @@ TEST_F(PortHelper_Walk, port_addresses_that_are_none)
                                         "Type is not convertible to string"));
 }
 
-TEST_F(PortHelper_Walk, an_adapter_address_that_is_none)
+TEST_F(PortHelper_Walk, AnAdapterAddressThatIsNone)
 {
     library.answers("getAllAdaptersIndexString", list_of({5, ADAPTER}));
     library.answers("getFcPhyPortIndicesByAdapter", [](const Json::Value& request) {
@@ -150,7 +150,7 @@ TEST_F(PortHelper_Walk, an_adapter_address_that_is_none)
                                       "ERR libGetFcPhyPortIndicesByAdapter returns NULL."}));
 }
 
-TEST_F(PortHelper_Walk, no_adapter_list)
+TEST_F(PortHelper_Walk, NoAdapterList)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]", "{'indexStrings': {}}"}) {
         library.answers("getAllAdaptersIndexString", json(answer));
@@ -164,7 +164,7 @@ TEST_F(PortHelper_Walk, no_adapter_list)
     EXPECT_EQ(log.said(), Lines{"WARN No adapters in the system. "});
 }
 
-TEST_F(PortHelper_Walk, failures_of_the_calls)
+TEST_F(PortHelper_Walk, FailuresOfTheCalls)
 {
     library.throws("getFcPhyPortIndicesByAdapter", HbaAgentError{7, "busy"});
     EXPECT_TRUE(walk(FCPORT).empty());
@@ -187,7 +187,7 @@ TEST_F(PortHelper_Walk, failures_of_the_calls)
     EXPECT_THROW(walk(FCPORT), HbaAgentError);
 }
 
-TEST_F(PortHelper_Walk, by_id)
+TEST_F(PortHelper_Walk, ById)
 {
     const Json::Value adapters = list_of({"AA", "BB"});
     EXPECT_EQ(taken(helper->getInstancesByAdapterId(2, FCPORT, adapters), "DeviceID"),
@@ -201,7 +201,7 @@ TEST_F(PortHelper_Walk, by_id)
     EXPECT_EQ(log.said("ERR"), Lines(5, "ERR libGetFcPhyPortIndicesByAdapter returns NULL."));
 }
 
-TEST_F(PortHelper_Walk, by_address)
+TEST_F(PortHelper_Walk, ByAddress)
 {
     EXPECT_EQ(taken(helper->getFCPortInstancesByAdapter("20008c7cff000000"), "DeviceID"),
               Lines{"10008c7cff000001"});
@@ -224,7 +224,7 @@ TEST_F(PortHelper_Walk, by_address)
                      "ERR indexStrings is not member", "ERR indexString not Array"}));
 }
 
-TEST_F(PortHelper_Walk, by_address_a_bad_port_is_told)
+TEST_F(PortHelper_Walk, ByAddressABadPortIsTold)
 {
     library.answers("getFcPhyPortIndicesByAdapter", list_of({"1", "2"}));
     library.answers("getPortByWwn", [](const Json::Value& request) {
@@ -234,7 +234,7 @@ TEST_F(PortHelper_Walk, by_address_a_bad_port_is_told)
     EXPECT_EQ(log.said("ERR"), Lines{"ERR libGetPortByWwn response is null or has error"});
 }
 
-TEST_F(PortHelper_Walk, by_an_address_that_is_none)
+TEST_F(PortHelper_Walk, ByAnAddressThatIsNone)
 {
     // An FC HBA without a storage driver has no address.
     EXPECT_TRUE(helper->getFCPortInstancesByAdapter("").empty());
@@ -242,13 +242,13 @@ TEST_F(PortHelper_Walk, by_an_address_that_is_none)
     EXPECT_EQ(log.said("ERR").size(), 1u);
 }
 
-TEST_F(PortHelper_Walk, a_class_that_is_not_its_own)
+TEST_F(PortHelper_Walk, AClassThatIsNotItsOwn)
 {
     EXPECT_TRUE(walk(PORTCONTROLLER).empty());
     EXPECT_EQ(log.said(), (Lines{"DBG numOfPorts = 1", "INFO Unhandled class support"}));
 }
 
-TEST_F(PortHelper_Walk, nothing_is_remembered)
+TEST_F(PortHelper_Walk, NothingIsRemembered)
 {
     EXPECT_EQ(walk(FCPORT).size(), 1u);
     EXPECT_EQ(walk(FCPORT).size(), 1u);

@@ -12,7 +12,7 @@ struct Port_Alarm : Port_Fixture
 
 } // namespace
 
-TEST_F(Port_Alarm, a_beacon_is_an_alarm_device)
+TEST_F(Port_Alarm, ABeaconIsAnAlarmDevice)
 {
     Set_Properties expected = {
         {"CreationClassName", "KALDERA_AlarmDevice"},
@@ -32,14 +32,14 @@ TEST_F(Port_Alarm, a_beacon_is_an_alarm_device)
     EXPECT_EQ(walk(ALARMDEVICE), std::vector<Set_Properties>{expected});
 }
 
-TEST_F(Port_Alarm, a_mezzanine_card_has_none)
+TEST_F(Port_Alarm, AMezzanineCardHasNone)
 {
     library.answers("getPortByWwn", with(fc_port(), "isMezz", true));
     EXPECT_TRUE(walk(ALARMDEVICE).empty());
     EXPECT_EQ(log.said(), Lines{"DBG numOfPorts = 1"});
 }
 
-TEST_F(Port_Alarm, a_port_that_does_not_tell_has_none)
+TEST_F(Port_Alarm, APortThatDoesNotTellHasNone)
 {
     for (const char* name : {"isMezz", "beaconState"}) {
         log.clear();
@@ -49,7 +49,7 @@ TEST_F(Port_Alarm, a_port_that_does_not_tell_has_none)
     }
 }
 
-TEST_F(Port_Alarm, on)
+TEST_F(Port_Alarm, On)
 {
     EXPECT_EQ(helper->setAlarmState("10008c7cff000001", 3), 1);
     EXPECT_EQ(library.told(),
@@ -60,7 +60,7 @@ TEST_F(Port_Alarm, on)
     EXPECT_EQ(log.traces(), (Lines{"DBG Entering: setAlarmState", "DBG Returning: setAlarmState"}));
 }
 
-TEST_F(Port_Alarm, any_other_state_is_off)
+TEST_F(Port_Alarm, AnyOtherStateIsOff)
 {
     beacon(true);
     for (const int state : {0, 1, 2, 4, -3}) {
@@ -70,7 +70,7 @@ TEST_F(Port_Alarm, any_other_state_is_off)
     }
 }
 
-TEST_F(Port_Alarm, a_state_that_is_already_set)
+TEST_F(Port_Alarm, AStateThatIsAlreadySet)
 {
     EXPECT_EQ(helper->setAlarmState("10008c7cff000001", 1), 3);
     EXPECT_EQ(log.said(), Lines{"WARN setAlarmState : State already set"});
@@ -79,7 +79,7 @@ TEST_F(Port_Alarm, a_state_that_is_already_set)
     EXPECT_EQ(library.count("setPortByWwn"), 0u);
 }
 
-TEST_F(Port_Alarm, a_mezzanine_card_refuses)
+TEST_F(Port_Alarm, AMezzanineCardRefuses)
 {
     library.answers("getPortByWwn", with(fc_port(), "isMezz", true));
     EXPECT_EQ(helper->setAlarmState("10008c7cff000001", 3), 2);
@@ -87,7 +87,7 @@ TEST_F(Port_Alarm, a_mezzanine_card_refuses)
     EXPECT_EQ(library.count("setPortByWwn"), 0u);
 }
 
-TEST_F(Port_Alarm, a_port_that_cannot_be_read)
+TEST_F(Port_Alarm, APortThatCannotBeRead)
 {
     for (const Json::Value& answer :
          {Json::Value(), json("{'error': 1}"), json("[]"), without(fc_port(), "isMezz"),
@@ -98,7 +98,7 @@ TEST_F(Port_Alarm, a_port_that_cannot_be_read)
     EXPECT_EQ(log.said(), Lines(6, "ERR Current ALARM STATE is not available"));
 }
 
-TEST_F(Port_Alarm, a_port_that_cannot_be_set)
+TEST_F(Port_Alarm, APortThatCannotBeSet)
 {
     for (const char* answer : {"null", "{'error': 1}"}) {
         library.answers("setPortByWwn", json(answer));
@@ -107,7 +107,7 @@ TEST_F(Port_Alarm, a_port_that_cannot_be_set)
     EXPECT_EQ(log.said(), Lines(2, "ERR libSetPortByWwn response is null or has error"));
 }
 
-TEST_F(Port_Alarm, exceptions)
+TEST_F(Port_Alarm, Exceptions)
 {
     for (const auto& [symbol, name] :
          {std::pair("setPortByWwn", "libSetPortByWwn"), std::pair("getPortByWwn", "libGetPortByWwn")}) {

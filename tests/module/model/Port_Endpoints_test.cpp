@@ -17,7 +17,7 @@ constexpr const char* TARGET_2 = "10008c7cff000001_500601600000000b";
 
 } // namespace
 
-TEST_F(Port_Endpoints, the_port_and_its_target)
+TEST_F(Port_Endpoints, ThePortAndItsTarget)
 {
     remote_ports({REMOTE}, target);
     Set_Properties initiator = {
@@ -49,13 +49,13 @@ TEST_F(Port_Endpoints, the_port_and_its_target)
     EXPECT_EQ(log.said(), (Lines{"DBG numOfPorts = 1", "DBG Number of Rports = 1"}));
 }
 
-TEST_F(Port_Endpoints, each_target_goes_by_its_own_name)
+TEST_F(Port_Endpoints, EachTargetGoesByItsOwnName)
 {
     remote_ports({REMOTE, REMOTE_2}, target);
     EXPECT_EQ(names(), (Lines{INITIATOR, TARGET, TARGET_2}));
 }
 
-TEST_F(Port_Endpoints, an_initiator_of_the_zone_is_none)
+TEST_F(Port_Endpoints, AnInitiatorOfTheZoneIsNone)
 {
     for (const char* device : {"{'isTarget': false}", "{'x': 1}", "{'isTarget': null}", "{}", "[]", "'x'"}) {
         remote_ports({REMOTE}, with(Json::objectValue, "deviceData", json(device)));
@@ -64,7 +64,7 @@ TEST_F(Port_Endpoints, an_initiator_of_the_zone_is_none)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(Port_Endpoints, without_a_list_of_remote_ports)
+TEST_F(Port_Endpoints, WithoutAListOfRemotePorts)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "5"}) {
         library.answers("getAllRemotePorts", json(answer));
@@ -80,7 +80,7 @@ TEST_F(Port_Endpoints, without_a_list_of_remote_ports)
     EXPECT_EQ(library.count("getCompleteRemotePort"), 0u);
 }
 
-TEST_F(Port_Endpoints, a_bad_remote_port_is_lost_alone)
+TEST_F(Port_Endpoints, ABadRemotePortIsLostAlone)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "{'deviceData': null}", "[]"}) {
         remote_ports({REMOTE, REMOTE_2}, target);
@@ -93,14 +93,14 @@ TEST_F(Port_Endpoints, a_bad_remote_port_is_lost_alone)
               Lines(5, std::string("ERR libGetCompleteRemotePort returned NULL for ") + REMOTE));
 }
 
-TEST_F(Port_Endpoints, a_throwing_remote_port_is_lost_alone)
+TEST_F(Port_Endpoints, AThrowingRemotePortIsLostAlone)
 {
     remote_ports({REMOTE, REMOTE_2}, target, REMOTE);
     EXPECT_EQ(names(), (Lines{INITIATOR, TARGET_2}));
     EXPECT_EQ(log.said("ERR"), Lines{"ERR libGetCompleteRemotePort got User exception 7: busy"});
 }
 
-TEST_F(Port_Endpoints, wrong_types_lose_their_remote_port)
+TEST_F(Port_Endpoints, WrongTypesLoseTheirRemotePort)
 {
     remote_ports({5, REMOTE_2}, target);
     EXPECT_EQ(names(), (Lines{INITIATOR, TARGET_2}));
@@ -113,7 +113,7 @@ TEST_F(Port_Endpoints, wrong_types_lose_their_remote_port)
                      "ERR libGetCompleteRemotePort got std exception: Type is not convertible to int"}));
 }
 
-TEST_F(Port_Endpoints, over_long_names_are_cut)
+TEST_F(Port_Endpoints, OverLongNamesAreCut)
 {
     const std::string text(100, 'x');
     library.answers("getPortByWwn", fc_port(text.c_str()));
@@ -122,7 +122,7 @@ TEST_F(Port_Endpoints, over_long_names_are_cut)
     EXPECT_EQ(names(), (Lines{wwn, wwn + "_" + wwn}));
 }
 
-TEST_F(Port_Endpoints, a_port_without_a_wwn_has_no_remote_ports)
+TEST_F(Port_Endpoints, APortWithoutAWwnHasNoRemotePorts)
 {
     library.answers("getPortByWwn", without(fc_port(), "wwn"));
     EXPECT_EQ(names(), Lines{""});

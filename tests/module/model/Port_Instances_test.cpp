@@ -20,7 +20,7 @@ struct Port_Instances : Port_Fixture
 
 } // namespace
 
-TEST_F(Port_Instances, port_group)
+TEST_F(Port_Instances, PortGroup)
 {
     const Set_Properties expected = {
         {"InstanceID", "20008c7cff000001"},
@@ -33,7 +33,7 @@ TEST_F(Port_Instances, port_group)
     EXPECT_EQ(walk(LOGICALPORTGROUP), std::vector<Set_Properties>{expected});
 }
 
-TEST_F(Port_Instances, enabled_states)
+TEST_F(Port_Instances, EnabledStates)
 {
     const std::pair<sint32, const char*> states[] = {{6, "1"},  {7, "1"},  {8, "9"},  {9, "4"},  {10, "3"},
                                                      {11, "2"}, {12, "1"}, {13, "6"}, {14, "1"}, {0, "1"}};
@@ -44,7 +44,7 @@ TEST_F(Port_Instances, enabled_states)
     }
 }
 
-TEST_F(Port_Instances, builders_are_traced)
+TEST_F(Port_Instances, BuildersAreTraced)
 {
     taken(helper->getFCPortInstance(port));
     taken(helper->getFCPortStatisticsInstance(port, {}, false));

@@ -11,7 +11,7 @@ struct Port_Queries : Port_Fixture
 
 } // namespace
 
-TEST_F(Port_Queries, details_by_wwn_and_by_mac)
+TEST_F(Port_Queries, DetailsByWwnAndByMac)
 {
     EXPECT_EQ(helper->getPortDetails("10008c7cff000001", out), 0);
     EXPECT_EQ(out, fc_port());
@@ -24,7 +24,7 @@ TEST_F(Port_Queries, details_by_wwn_and_by_mac)
                                      R"(getPortByWwn {"wwn":"8c:7c:ff:00:00:02"})"}));
 }
 
-TEST_F(Port_Queries, details_that_fail)
+TEST_F(Port_Queries, DetailsThatFail)
 {
     for (const char* answer : {"null", "{'error': null}"}) {
         library.answers("getPortByWwn", json(answer));
@@ -44,7 +44,7 @@ TEST_F(Port_Queries, details_that_fail)
     EXPECT_EQ(helper->getPortDetails("A", out), -1);
 }
 
-TEST_F(Port_Queries, disabled)
+TEST_F(Port_Queries, Disabled)
 {
     EXPECT_FALSE(helper->isPortDisabled(PORT));
     library.answers("getPortByWwn", with(fc_port(), "portStatus", false));
@@ -62,7 +62,7 @@ TEST_F(Port_Queries, disabled)
     EXPECT_EQ(log.said().back(), "ERR Unable to get port status");
 }
 
-TEST_F(Port_Queries, number_of_ports)
+TEST_F(Port_Queries, NumberOfPorts)
 {
     library.answers("getFcPhyPortIndicesByAdapter", list_of({"1", "2"}));
     EXPECT_EQ(helper->getNumberOfPorts("AABB", out), 2);
@@ -80,7 +80,7 @@ TEST_F(Port_Queries, number_of_ports)
     EXPECT_THROW(helper->getNumberOfPorts("AABB", out), HbaAgentError);
 }
 
-TEST_F(Port_Queries, optics)
+TEST_F(Port_Queries, Optics)
 {
     library.answers("getOpticsSFP", json("{'speed': '8G'}"));
     EXPECT_EQ(helper->getOpticsInfo("AABB", out), 0);

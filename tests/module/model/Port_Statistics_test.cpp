@@ -59,7 +59,7 @@ Set_Properties zeros()
 
 } // namespace
 
-TEST_F(Port_Statistics, each_counter_of_an_fc_port)
+TEST_F(Port_Statistics, EachCounterOfAnFcPort)
 {
     for (const auto& [id, name] : fc_ids) {
         counters({{1, "5"}, {id, "12345678901"}, {1616, "7"}});
@@ -70,7 +70,7 @@ TEST_F(Port_Statistics, each_counter_of_an_fc_port)
     EXPECT_EQ(library.told()[3], R"(getDynamicPortStatistics {"indexStr":"10:00:8c:7c:ff:00:00:01"})");
 }
 
-TEST_F(Port_Statistics, an_fcoe_port_counts_errors_only)
+TEST_F(Port_Statistics, AnFcoePortCountsErrorsOnly)
 {
     is_fcoe();
     counters({{1615, "1"},
@@ -89,7 +89,7 @@ TEST_F(Port_Statistics, an_fcoe_port_counts_errors_only)
     EXPECT_EQ(read(), expected);
 }
 
-TEST_F(Port_Statistics, two_ids_write_one_counter_of_an_fcoe_port)
+TEST_F(Port_Statistics, TwoIdsWriteOneCounterOfAnFcoePort)
 {
     is_fcoe();
     counters({{1616, "2"}, {1626, "3"}});
@@ -99,7 +99,7 @@ TEST_F(Port_Statistics, two_ids_write_one_counter_of_an_fcoe_port)
     EXPECT_EQ(read()["ErrorFrames"], "2");
 }
 
-TEST_F(Port_Statistics, values_are_read_as_far_as_they_are_decimal)
+TEST_F(Port_Statistics, ValuesAreReadAsFarAsTheyAreDecimal)
 {
     const std::pair<const char*, const char*> values[] = {
         {"9223372036854775807", "9223372036854775807"},
@@ -115,14 +115,14 @@ TEST_F(Port_Statistics, values_are_read_as_far_as_they_are_decimal)
     }
 }
 
-TEST_F(Port_Statistics, elements_that_are_none_are_skipped)
+TEST_F(Port_Statistics, ElementsThatAreNoneAreSkipped)
 {
     library.answers("getDynamicPortStatistics",
                     json("[5, null, {}, {'id': null}, {'id': 1, 'value': 7}, {'id': 1411}]"));
     EXPECT_EQ(read(), zeros());
 }
 
-TEST_F(Port_Statistics, wrong_types_lose_the_port)
+TEST_F(Port_Statistics, WrongTypesLoseThePort)
 {
     library.answers("getDynamicPortStatistics", json("[{'id': 'x', 'value': '1'}]"));
     EXPECT_TRUE(walk(FCPORTSTATISTICS).empty());
@@ -134,7 +134,7 @@ TEST_F(Port_Statistics, wrong_types_lose_the_port)
                "ERR libGetDynamicPortStatisticsat got std exception: Type is not convertible to string"}));
 }
 
-TEST_F(Port_Statistics, bad_answers)
+TEST_F(Port_Statistics, BadAnswers)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}", "[]", "5"}) {
         library.answers("getDynamicPortStatistics", json(answer));
@@ -145,7 +145,7 @@ TEST_F(Port_Statistics, bad_answers)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(Port_Statistics, exceptions_are_told_under_a_misspelt_name)
+TEST_F(Port_Statistics, ExceptionsAreToldUnderAMisspeltName)
 {
     library.throws("getDynamicPortStatistics", HbaAgentError{7, "busy"});
     EXPECT_TRUE(walk(FCPORTSTATISTICS).empty());

@@ -34,7 +34,7 @@ Lines subprofiles(const char* name)
 } // namespace
 
 // clang-format off
-TEST(Registered_Profiles, five_profiles)
+TEST(Registered_Profiles, FiveProfiles)
 {
     EXPECT_EQ(taken(registered_profiles()), (std::vector<Set_Properties>{
         profile("SMI-S", "SMI-S", "This instance models the SMI-S standard as such", "11", "1.2.0"),
@@ -45,7 +45,7 @@ TEST(Registered_Profiles, five_profiles)
     }));
 }
 
-TEST(Registered_Profiles, ten_subprofiles)
+TEST(Registered_Profiles, TenSubprofiles)
 {
     EXPECT_EQ(taken(registered_subprofiles()), (std::vector<Set_Properties>{
         profile("FC Initiator Ports", "FC Initiator Ports subprofile", "The FC Initiator Ports subprofile models the ports present in the HBA device", "11", "1.2.0"),
@@ -62,7 +62,7 @@ TEST(Registered_Profiles, ten_subprofiles)
 }
 // clang-format on
 
-TEST(Registered_Profiles, subprofiles_of_a_profile_in_any_case)
+TEST(Registered_Profiles, SubprofilesOfAProfileInAnyCase)
 {
     const Lines of_fc_hba = {"FC Initiator Ports",  "Software Update",      "Software Inventory",
                              "Access Points",       "Physical Asset",       "Ethernet Port",
@@ -75,7 +75,7 @@ TEST(Registered_Profiles, subprofiles_of_a_profile_in_any_case)
         EXPECT_EQ(subprofiles(none), Lines{}) << none;
 }
 
-TEST(Registered_Profiles, each_subprofile_has_one_parent)
+TEST(Registered_Profiles, EachSubprofileHasOneParent)
 {
     std::map<std::string, int> parents;
     for (const std::string& profile : taken(registered_profiles(), "InstanceID")) {

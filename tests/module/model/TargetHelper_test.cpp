@@ -33,7 +33,7 @@ struct Targets : Port_Fixture
 
 } // namespace
 
-TEST_F(Targets, a_lun_as_an_extent)
+TEST_F(Targets, ALunAsAnExtent)
 {
     remote_ports({REMOTE}, target("Disk", {described}));
     const char* device_id = "10008c7cff000001_500601600000000a_ACME_DISK_LUN_1";
@@ -64,7 +64,7 @@ TEST_F(Targets, a_lun_as_an_extent)
                                  "DBG Returned instance of StorageExtent for port WWN= 10008c7cff000001"}));
 }
 
-TEST_F(Targets, which_class_a_device_type_feeds)
+TEST_F(Targets, WhichClassADeviceTypeFeeds)
 {
     for (const char* type : {"Tape", "Media Changer", "Disk", "tape", "Tape ", ""}) {
         const bool tape = std::string(type) == "Tape" || std::string(type) == "Media Changer";
@@ -76,7 +76,7 @@ TEST_F(Targets, which_class_a_device_type_feeds)
     EXPECT_EQ(log.said("INFO"), Lines(8, "INFO Continue with next rport. Looking for another device type "));
 }
 
-TEST_F(Targets, a_text_ends_at_its_first_zero_byte)
+TEST_F(Targets, ATextEndsAtItsFirstZeroByte)
 {
     for (const char* name : {"vendor", "productID", "lunDescription"}) {
         static constexpr char text[] = "A\0B";
@@ -88,7 +88,7 @@ TEST_F(Targets, a_text_ends_at_its_first_zero_byte)
     EXPECT_EQ(extent["Name"], "A");
 }
 
-TEST_F(Targets, disks_and_drives)
+TEST_F(Targets, DisksAndDrives)
 {
     remote_ports({REMOTE}, target("Disk", {described}));
     Set_Properties disk = walk(LOGICALDISK).at(0);
@@ -105,7 +105,7 @@ TEST_F(Targets, disks_and_drives)
     EXPECT_EQ(drive.size(), 9u);
 }
 
-TEST_F(Targets, an_initiator_has_no_luns)
+TEST_F(Targets, AnInitiatorHasNoLuns)
 {
     remote_ports({REMOTE}, json("{'deviceData': {'isTarget': false}}"));
     EXPECT_TRUE(walk(STORAGEEXTENT).empty());
@@ -115,7 +115,7 @@ TEST_F(Targets, an_initiator_has_no_luns)
     EXPECT_EQ(log.said("ERR"), Lines{});
 }
 
-TEST_F(Targets, a_lun_without_description)
+TEST_F(Targets, ALunWithoutDescription)
 {
     remote_ports({REMOTE}, target("Disk", {lun(1)}));
     Set_Properties set = walk(STORAGEEXTENT).at(0);
@@ -129,7 +129,7 @@ TEST_F(Targets, a_lun_without_description)
     EXPECT_EQ(set["NameNamespace"], "7");
 }
 
-TEST_F(Targets, one_lun_without_description_decides_for_all_that_follow)
+TEST_F(Targets, OneLunWithoutDescriptionDecidesForAllThatFollow)
 {
     const Json::Value with_serial = lun(3, "{'lunDescription': '600c', 'productSerialNumber': 'S3'}");
     remote_ports({REMOTE, REMOTE_2},
@@ -145,21 +145,21 @@ TEST_F(Targets, one_lun_without_description_decides_for_all_that_follow)
     EXPECT_EQ(walk(LOGICALDISK, "Name")[3], "600a");
 }
 
-TEST_F(Targets, a_serial_number_is_read_only_where_it_names_the_lun)
+TEST_F(Targets, ASerialNumberIsReadOnlyWhereItNamesTheLun)
 {
     remote_ports({REMOTE}, target("Disk", {lun(1, "{'lunDescription': 'd', 'lunDescIdType': 0,"
                                                   " 'productSerialNumber': 'S1'}")}));
     EXPECT_EQ(walk(STORAGEEXTENT, "Name"), Lines{"ACME+DISK+"});
 }
 
-TEST_F(Targets, a_null_description_is_one)
+TEST_F(Targets, ANullDescriptionIsOne)
 {
     remote_ports({REMOTE}, target("Disk", {lun(1, "{'lunDescription': null}")}));
     EXPECT_EQ(walk(STORAGEEXTENT, "Name"), Lines{""});
     EXPECT_EQ(walk(STORAGEEXTENT, "NameFormat"), Lines{"9"});
 }
 
-TEST_F(Targets, numbers_beyond_the_positive_range)
+TEST_F(Targets, NumbersBeyondThePositiveRange)
 {
     Json::Value large = described;
     large["number"] = 4294967295u;
@@ -168,7 +168,7 @@ TEST_F(Targets, numbers_beyond_the_positive_range)
     EXPECT_EQ(walk(LOGICALDISK, "DeviceID"), Lines{"10008c7cff000001_500601600000000a_ACME_DISK_LUN_-1"});
 }
 
-TEST_F(Targets, luns_that_lack_a_member)
+TEST_F(Targets, LunsThatLackAMember)
 {
     Json::Value answer = target("Disk", {without(described, "vendor"), without(described, "number"),
                                          without(described, "productID"), 5, Json::Value(), described});
@@ -177,7 +177,7 @@ TEST_F(Targets, luns_that_lack_a_member)
     EXPECT_EQ(log.said("ERR"), Lines(5, "ERR LUN info is NOT available"));
 }
 
-TEST_F(Targets, wrong_types_lose_their_lun_alone)
+TEST_F(Targets, WrongTypesLoseTheirLunAlone)
 {
     for (const char* name : {"vendor", "number", "productID", "lunDescIdType", "lunDescription"}) {
         remote_ports({REMOTE}, target("Disk", {with(described, name, Json::arrayValue), described}));
@@ -190,7 +190,7 @@ TEST_F(Targets, wrong_types_lose_their_lun_alone)
     EXPECT_EQ(walk(STORAGEEXTENT, "ElementName"), Lines{"LUN_2"});
 }
 
-TEST_F(Targets, a_device_type_of_the_wrong_type_loses_its_remote_port)
+TEST_F(Targets, ADeviceTypeOfTheWrongTypeLosesItsRemotePort)
 {
     remote_ports({REMOTE, REMOTE_2}, target("Disk", {described}));
     library.answers("getCompleteRemotePort", [this](const Json::Value& request) {
@@ -203,7 +203,7 @@ TEST_F(Targets, a_device_type_of_the_wrong_type_loses_its_remote_port)
     EXPECT_EQ(log.said("ERR").size(), 1u);
 }
 
-TEST_F(Targets, without_a_lun_list)
+TEST_F(Targets, WithoutALunList)
 {
     for (const char* list : {"{}", "'x'", "5"}) {
         remote_ports({REMOTE}, with(target("Disk", {}), "lunList", json(list)));
@@ -219,7 +219,7 @@ TEST_F(Targets, without_a_lun_list)
     EXPECT_EQ(log.said().back(), "DBG Number of Luns = 0.");
 }
 
-TEST_F(Targets, a_bad_remote_port_is_lost_alone)
+TEST_F(Targets, ABadRemotePortIsLostAlone)
 {
     for (const char* answer : {"null", "{'error': 1}"}) {
         library.answers("getCompleteRemotePort", json(answer));
@@ -237,7 +237,7 @@ TEST_F(Targets, a_bad_remote_port_is_lost_alone)
                                       "ERR libGetCompleteRemotePort response is null or has error"}));
 }
 
-TEST_F(Targets, without_a_list_of_remote_ports)
+TEST_F(Targets, WithoutAListOfRemotePorts)
 {
     for (const char* answer : {"null", "{'error': 1}", "{}"}) {
         library.answers("getAllRemotePorts", json(answer));
@@ -250,7 +250,7 @@ TEST_F(Targets, without_a_list_of_remote_ports)
     EXPECT_EQ(log.said("ERR"), expected);
 }
 
-TEST_F(Targets, texts_are_cut_to_the_record)
+TEST_F(Targets, TextsAreCutToTheRecord)
 {
     const std::string text(100, 'x');
     Json::Value long_lun = lun(1);
@@ -267,7 +267,7 @@ TEST_F(Targets, texts_are_cut_to_the_record)
     EXPECT_EQ(walk(STORAGEEXTENT, "Name"), Lines{"ACME+DISK+" + text.substr(0, 64)});
 }
 
-TEST_F(Targets, are_served_by_the_storage_manager)
+TEST_F(Targets, AreServedByTheStorageManager)
 {
     remote_ports({REMOTE}, target("Disk", {described}));
     EXPECT_EQ(taken(HDRManager::getHDRManager()->getInstances(STORAGEEXTENT)).size(), 1u);
@@ -275,7 +275,7 @@ TEST_F(Targets, are_served_by_the_storage_manager)
     EXPECT_EQ(taken(HDRManager::getHDRManager()->getInstances(TAPEDRIVE)).size(), 0u);
 }
 
-TEST_F(Targets, a_large_host)
+TEST_F(Targets, ALargeHost)
 {
     std::vector<Json::Value> luns(64, described), remotes;
     for (int i = 0; i < 64; i++)

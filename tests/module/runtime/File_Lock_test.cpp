@@ -29,7 +29,7 @@ static int try_in_child(const std::string& path)
     return WEXITSTATUS(status);
 }
 
-TEST(File_Lock, creates_the_file_with_mode_0600)
+TEST(File_Lock, CreatesTheFileWithMode0600)
 {
     Temp_Folder folder;
     const std::string path = folder.path("lock");
@@ -43,7 +43,7 @@ TEST(File_Lock, creates_the_file_with_mode_0600)
     EXPECT_EQ(info.st_size, 0);
 }
 
-TEST(File_Lock, keeps_other_processes_out)
+TEST(File_Lock, KeepsOtherProcessesOut)
 {
     Temp_Folder folder;
     const std::string path = folder.path("lock");
@@ -97,7 +97,7 @@ private:
     pid_t _child;
 };
 
-TEST(File_Lock, waits_for_another_process)
+TEST(File_Lock, WaitsForAnotherProcess)
 {
     Temp_Folder folder;
     Holder holder(folder);
@@ -111,7 +111,7 @@ TEST(File_Lock, waits_for_another_process)
     releasing.join();
 }
 
-TEST(File_Lock, goes_on_waiting_after_a_signal)
+TEST(File_Lock, GoesOnWaitingAfterASignal)
 {
     Temp_Folder folder;
     Holder holder(folder);
@@ -133,7 +133,7 @@ TEST(File_Lock, goes_on_waiting_after_a_signal)
     sigaction(SIGUSR1, &old, nullptr);
 }
 
-TEST(File_Lock, is_not_taken_for_what_is_no_regular_file)
+TEST(File_Lock, IsNotTakenForWhatIsNoRegularFile)
 {
     Temp_Folder folder;
     const std::string path = folder.path("lock");
@@ -146,7 +146,7 @@ TEST(File_Lock, is_not_taken_for_what_is_no_regular_file)
     close(reader);
 }
 
-TEST(File_Lock, a_path_that_cannot_be_opened_is_not_okay)
+TEST(File_Lock, APathThatCannotBeOpenedIsNotOkay)
 {
     File_Lock lock("/nonexistent/folder/lock");
     EXPECT_FALSE(lock.okay());

@@ -7,7 +7,7 @@
 
 using namespace KPRV;
 
-TEST(Instance_Enumerator, is_at_its_end_before_it_is_used)
+TEST(Instance_Enumerator, IsAtItsEndBeforeItIsUsed)
 {
     Notes notes;
     Recording_Context context(notes);
@@ -17,7 +17,7 @@ TEST(Instance_Enumerator, is_at_its_end_before_it_is_used)
     EXPECT_FALSE(enumerator());
 }
 
-TEST(Instance_Enumerator, walks_through_the_context_and_gives_the_rep_back)
+TEST(Instance_Enumerator, WalksThroughTheContextAndGivesTheRepBack)
 {
     const Ref<Instance> model(make_named("model"));
     Notes notes;
@@ -37,7 +37,7 @@ TEST(Instance_Enumerator, walks_through_the_context_and_gives_the_rep_back)
     EXPECT_EQ(notes.list(), (Notes_List{"enum ns", "destroy"}));
 }
 
-TEST(Instance_Enumerator, hands_out_instances_with_a_count_of_their_own)
+TEST(Instance_Enumerator, HandsOutInstancesWithACountOfTheirOwn)
 {
     const Ref<Instance> model(make_named("model"));
     Notes notes;
@@ -55,7 +55,7 @@ TEST(Instance_Enumerator, hands_out_instances_with_a_count_of_their_own)
     EXPECT_EQ(name_of_sample(kept.ptr()), "only");
 }
 
-TEST(Instance_Enumerator, without_a_context_it_does_nothing)
+TEST(Instance_Enumerator, WithoutAContextItDoesNothing)
 {
     const Ref<Instance> model(make_named("model"));
     Notes notes;

@@ -18,7 +18,7 @@ static int try_on_another_thread(Mutex& mutex)
     return result;
 }
 
-TEST(Mutex, recursive_one_is_taken_again_by_its_owner)
+TEST(Mutex, RecursiveOneIsTakenAgainByItsOwner)
 {
     Mutex mutex(true);
     mutex.lock();
@@ -29,7 +29,7 @@ TEST(Mutex, recursive_one_is_taken_again_by_its_owner)
     EXPECT_EQ(try_on_another_thread(mutex), 0);
 }
 
-TEST(Mutex, plain_one_is_busy_for_its_owner_too)
+TEST(Mutex, PlainOneIsBusyForItsOwnerToo)
 {
     static_assert(EBUSY == 16);
     Mutex mutex(false);
@@ -40,7 +40,7 @@ TEST(Mutex, plain_one_is_busy_for_its_owner_too)
     EXPECT_EQ(try_on_another_thread(mutex), 0);
 }
 
-TEST(Mutex, guard_holds_it_for_a_scope)
+TEST(Mutex, GuardHoldsItForAScope)
 {
     Mutex mutex;
     {
@@ -50,7 +50,7 @@ TEST(Mutex, guard_holds_it_for_a_scope)
     EXPECT_EQ(try_on_another_thread(mutex), 0);
 }
 
-TEST(Mutex, keeps_threads_apart)
+TEST(Mutex, KeepsThreadsApart)
 {
     Mutex mutex;
     int count = 0;
@@ -73,14 +73,14 @@ static void spoil(Mutex& mutex)
     reinterpret_cast<pthread_mutex_t*>(&mutex)->__data.__kind = 15;
 }
 
-TEST(Mutex, other_failures_of_try_lock_are_minus_one)
+TEST(Mutex, OtherFailuresOfTryLockAreMinusOne)
 {
     Mutex mutex;
     spoil(mutex);
     EXPECT_EQ(mutex.try_lock(), -1);
 }
 
-TEST(Mutex, failure_of_lock_is_fatal)
+TEST(Mutex, FailureOfLockIsFatal)
 {
     Mutex mutex;
     spoil(mutex);

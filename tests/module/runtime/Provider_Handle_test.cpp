@@ -62,7 +62,7 @@ std::function<int(const Instance*, const Script::Deliver&)> enumeration_status(i
 
 } // namespace
 
-TEST_F(Provider_Handle_Test, owns_the_provider_object)
+TEST_F(Provider_Handle_Test, OwnsTheProviderObject)
 {
     {
         Provider_Handle handle(element_registration);
@@ -72,7 +72,7 @@ TEST_F(Provider_Handle_Test, owns_the_provider_object)
     EXPECT_EQ(script.calls, (Calls{"construct", "load", "unload", "destroy"}));
 }
 
-TEST_F(Provider_Handle_Test, passes_statuses_of_life_cycle_through)
+TEST_F(Provider_Handle_Test, PassesStatusesOfLifeCycleThrough)
 {
     script.load = [] { return 5; };
     script.unload = [] { return 6; };
@@ -81,7 +81,7 @@ TEST_F(Provider_Handle_Test, passes_statuses_of_life_cycle_through)
     EXPECT_EQ(handle.unload(), 6);
 }
 
-TEST_F(Provider_Handle_Test, tells_class_and_repository)
+TEST_F(Provider_Handle_Test, TellsClassAndRepository)
 {
     const Provider_Handle handle(element_registration);
     const Meta_Class* meta_class = nullptr;
@@ -92,7 +92,7 @@ TEST_F(Provider_Handle_Test, tells_class_and_repository)
     EXPECT_EQ(repository, &sample_repository);
 }
 
-TEST_F(Provider_Handle_Test, get_instance_passes_the_providers_own_answers_through)
+TEST_F(Provider_Handle_Test, GetInstancePassesTheProvidersOwnAnswersThrough)
 {
     Provider_Handle handle(element_registration);
     for (const int status : {0, 60, 62, 63, 64, 99}) {
@@ -109,7 +109,7 @@ TEST_F(Provider_Handle_Test, get_instance_passes_the_providers_own_answers_throu
     EXPECT_EQ(std::count(script.calls.begin(), script.calls.end(), "enum_instances"), 0);
 }
 
-TEST_F(Provider_Handle_Test, unsupported_get_instance_enumerates)
+TEST_F(Provider_Handle_Test, UnsupportedGetInstanceEnumerates)
 {
     script.enum_instances = [&](const Instance* x, const Script::Deliver& deliver) {
         EXPECT_EQ(x, model.ptr());
@@ -126,7 +126,7 @@ TEST_F(Provider_Handle_Test, unsupported_get_instance_enumerates)
     EXPECT_EQ(script.calls, (Calls{"construct", "get_instance", "enum_instances"}));
 }
 
-TEST_F(Provider_Handle_Test, the_last_of_several_matches_is_kept)
+TEST_F(Provider_Handle_Test, TheLastOfSeveralMatchesIsKept)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         for (const uint16 state : {1, 2}) {
@@ -143,7 +143,7 @@ TEST_F(Provider_Handle_Test, the_last_of_several_matches_is_kept)
     unref(instance);
 }
 
-TEST_F(Provider_Handle_Test, enumeration_without_the_instance_is_not_found)
+TEST_F(Provider_Handle_Test, EnumerationWithoutTheInstanceIsNotFound)
 {
     Provider_Handle handle(element_registration);
     Instance* instance = nullptr;
@@ -159,7 +159,7 @@ TEST_F(Provider_Handle_Test, enumeration_without_the_instance_is_not_found)
     }
 }
 
-TEST_F(Provider_Handle_Test, enum_instances_ends_with_the_status)
+TEST_F(Provider_Handle_Test, EnumInstancesEndsWithTheStatus)
 {
     script.enum_instances = [](const Instance*, const Script::Deliver& deliver) {
         deliver(make_named("a"));
@@ -170,7 +170,7 @@ TEST_F(Provider_Handle_Test, enum_instances_ends_with_the_status)
     EXPECT_EQ(received.list, (Calls{"a", "end 70"}));
 }
 
-TEST_F(Provider_Handle_Test, changes_pass_their_arguments_and_statuses)
+TEST_F(Provider_Handle_Test, ChangesPassTheirArgumentsAndStatuses)
 {
     Provider_Handle handle(element_registration);
     EXPECT_EQ(handle.create_instance(model.ptr()), 81);
@@ -191,7 +191,7 @@ TEST_F(Provider_Handle_Test, changes_pass_their_arguments_and_statuses)
     EXPECT_EQ(handle.invoke_method(model.ptr(), port.ptr()), 130);
 }
 
-TEST_F(Provider_Handle_Test, indications_go_through_the_handler)
+TEST_F(Provider_Handle_Test, IndicationsGoThroughTheHandler)
 {
     std::vector<std::string> heard;
     Script::Deliver deliver;
@@ -214,7 +214,7 @@ TEST_F(Provider_Handle_Test, indications_go_through_the_handler)
     EXPECT_EQ(heard, (Calls{"alert", "end"}));
 }
 
-TEST_F(Provider_Handle_Test, operations_of_other_kinds_are_minus_one)
+TEST_F(Provider_Handle_Test, OperationsOfOtherKindsAreMinusOne)
 {
     Provider_Handle instances(element_registration);
     EXPECT_EQ(instances.enable_indications(nullptr, nullptr), -1);
@@ -232,7 +232,7 @@ TEST_F(Provider_Handle_Test, operations_of_other_kinds_are_minus_one)
     EXPECT_TRUE(received.list.empty());
 }
 
-TEST_F(Provider_Handle_Test, associations_are_refused_for_other_classes)
+TEST_F(Provider_Handle_Test, AssociationsAreRefusedForOtherClasses)
 {
     Provider_Handle handle(element_registration);
     EXPECT_EQ(handle.enum_associator_names(model.ptr(), "", "", "", Received::proc, &received), 110);
@@ -241,7 +241,7 @@ TEST_F(Provider_Handle_Test, associations_are_refused_for_other_classes)
     EXPECT_TRUE(received.list.empty());
 }
 
-TEST_F(Provider_Handle_Test, own_associator_names_end_the_call)
+TEST_F(Provider_Handle_Test, OwnAssociatorNamesEndTheCall)
 {
     const struct
     {
@@ -266,7 +266,7 @@ TEST_F(Provider_Handle_Test, own_associator_names_end_the_call)
     }
 }
 
-TEST_F(Provider_Handle_Test, associator_names_fall_back_on_enumeration)
+TEST_F(Provider_Handle_Test, AssociatorNamesFallBackOnEnumeration)
 {
     script.enum_instances = [](const Instance* link_model, const Script::Deliver& deliver) {
         EXPECT_EQ(link_model->__meta_class, &Sample_Link::static_meta_class);
@@ -282,7 +282,7 @@ TEST_F(Provider_Handle_Test, associator_names_fall_back_on_enumeration)
     EXPECT_EQ(received.list, Calls{"end 0"});
 }
 
-TEST_F(Provider_Handle_Test, any_other_own_status_falls_back_too)
+TEST_F(Provider_Handle_Test, AnyOtherOwnStatusFallsBackToo)
 {
     script.enum_associator_names = [](const Instance*, const std::string&, const Script::Deliver&) {
         return 99;
@@ -293,7 +293,7 @@ TEST_F(Provider_Handle_Test, any_other_own_status_falls_back_too)
     EXPECT_EQ(received.list, (Calls{"end 99", "b", "c", "end 0"})) << "only 111 suppresses the own end mark";
 }
 
-TEST_F(Provider_Handle_Test, statuses_of_the_associator_names_fallback)
+TEST_F(Provider_Handle_Test, StatusesOfTheAssociatorNamesFallback)
 {
     const struct
     {
@@ -310,7 +310,7 @@ TEST_F(Provider_Handle_Test, statuses_of_the_associator_names_fallback)
     }
 }
 
-TEST_F(Provider_Handle_Test, own_references_end_the_call)
+TEST_F(Provider_Handle_Test, OwnReferencesEndTheCall)
 {
     const Ref<Instance> link_model(create<Sample_Link>(false));
     Provider_Handle handle(link_registration);
@@ -332,7 +332,7 @@ TEST_F(Provider_Handle_Test, own_references_end_the_call)
     }
 }
 
-TEST_F(Provider_Handle_Test, references_fall_back_on_enumeration)
+TEST_F(Provider_Handle_Test, ReferencesFallBackOnEnumeration)
 {
     const Ref<Instance> link_model(create<Sample_Link>(false));
     script.enum_instances = [&](const Instance* x, const Script::Deliver& deliver) {
@@ -354,7 +354,7 @@ TEST_F(Provider_Handle_Test, references_fall_back_on_enumeration)
     EXPECT_EQ(received.list, (Calls{"a-b", "end 0"}));
 }
 
-TEST_F(Provider_Handle_Test, statuses_of_the_references_fallback)
+TEST_F(Provider_Handle_Test, StatusesOfTheReferencesFallback)
 {
     const struct
     {

@@ -31,7 +31,7 @@ private:
 
 } // namespace
 
-TEST(Standard_Mutex, keeps_others_out_for_a_scope)
+TEST(Standard_Mutex, KeepsOthersOutForAScope)
 {
     Standard_Mutex<> mutex;
     std::optional<Writer<std::mutex>> other;
@@ -43,7 +43,7 @@ TEST(Standard_Mutex, keeps_others_out_for_a_scope)
     other->finish();
 }
 
-TEST(Standard_Mutex, recursive_one_is_taken_again_by_its_owner)
+TEST(Standard_Mutex, RecursiveOneIsTakenAgainByItsOwner)
 {
     Standard_Mutex<std::recursive_mutex> mutex;
     std::optional<Writer<std::recursive_mutex>> other;
@@ -58,7 +58,7 @@ TEST(Standard_Mutex, recursive_one_is_taken_again_by_its_owner)
     other->finish();
 }
 
-TEST(Standard_Mutex, readers_share_it_and_keep_writers_out)
+TEST(Standard_Mutex, ReadersShareItAndKeepWritersOut)
 {
     Standard_Mutex<std::shared_mutex> mutex;
     std::optional<Writer<std::shared_mutex>> writer;

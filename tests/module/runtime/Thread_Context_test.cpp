@@ -6,7 +6,7 @@
 
 using namespace KPRV;
 
-TEST(Thread_Context, a_fresh_thread_has_none)
+TEST(Thread_Context, AFreshThreadHasNone)
 {
     Notes notes;
     Recording_Context context(notes);
@@ -17,7 +17,7 @@ TEST(Thread_Context, a_fresh_thread_has_none)
     EXPECT_EQ(Thread_Context::top(), &context);
 }
 
-TEST(Thread_Context, is_a_stack_that_clears_the_link_of_what_it_pops)
+TEST(Thread_Context, IsAStackThatClearsTheLinkOfWhatItPops)
 {
     Notes notes;
     Recording_Context first(notes), second(notes);
@@ -35,7 +35,7 @@ TEST(Thread_Context, is_a_stack_that_clears_the_link_of_what_it_pops)
     EXPECT_EQ(Thread_Context::top(), nullptr);
 }
 
-TEST(Thread_Context, does_not_own_what_is_on_the_stack)
+TEST(Thread_Context, DoesNotOwnWhatIsOnTheStack)
 {
     Notes notes;
     {

@@ -24,7 +24,7 @@ static void* note_body(void* argument)
     return nullptr;
 }
 
-TEST(Thread, join_gives_the_result)
+TEST(Thread, JoinGivesTheResult)
 {
     char place[2];
     Thread thread;
@@ -34,7 +34,7 @@ TEST(Thread, join_gives_the_result)
     EXPECT_EQ(result, place + 1);
 }
 
-TEST(Thread, join_clears_the_result_before_it_fails)
+TEST(Thread, JoinClearsTheResultBeforeItFails)
 {
     int place;
     void* result = &place;
@@ -42,7 +42,7 @@ TEST(Thread, join_clears_the_result_before_it_fails)
     EXPECT_EQ(result, nullptr);
 }
 
-TEST(Thread, copies_name_the_same_thread)
+TEST(Thread, CopiesNameTheSameThread)
 {
     const Thread self = Thread::self();
     Thread assigned;
@@ -52,7 +52,7 @@ TEST(Thread, copies_name_the_same_thread)
     EXPECT_TRUE(Thread::equal(Thread(assigned), Thread::self()));
 }
 
-TEST(Thread, keeps_the_handle_in_its_first_word)
+TEST(Thread, KeepsTheHandleInItsFirstWord)
 {
     const Thread self = Thread::self();
     const auto* const words = reinterpret_cast<const uint64*>(&self);
@@ -61,7 +61,7 @@ TEST(Thread, keeps_the_handle_in_its_first_word)
     EXPECT_EQ(words[3], 0u);
 }
 
-TEST(Thread, without_a_context_it_only_runs_the_function)
+TEST(Thread, WithoutAContextItOnlyRunsTheFunction)
 {
     Notes notes;
     body_notes = &notes;
@@ -74,7 +74,7 @@ TEST(Thread, without_a_context_it_only_runs_the_function)
     EXPECT_EQ(notes.list(), Notes_List{"body"});
 }
 
-TEST(Thread, with_a_context_it_gets_one_of_its_own_and_runs_the_hooks)
+TEST(Thread, WithAContextItGetsOneOfItsOwnAndRunsTheHooks)
 {
     Notes notes;
     body_notes = &notes;
@@ -97,7 +97,7 @@ static void* raise_flag(void* argument)
     return nullptr;
 }
 
-TEST(Thread, a_detached_one_runs_and_cannot_be_joined)
+TEST(Thread, ADetachedOneRunsAndCannotBeJoined)
 {
     std::atomic<bool> flag = false;
     Thread thread;
@@ -113,7 +113,7 @@ static void* leave_early(void*)
     Thread::exit(body_notes);
 }
 
-TEST(Thread, exit_runs_the_hook_but_keeps_the_context)
+TEST(Thread, ExitRunsTheHookButKeepsTheContext)
 {
     Notes notes;
     body_notes = &notes;
@@ -128,7 +128,7 @@ TEST(Thread, exit_runs_the_hook_but_keeps_the_context)
     delete parent.child;
 }
 
-TEST(Thread, exit_without_a_context_only_ends_the_thread)
+TEST(Thread, ExitWithoutAContextOnlyEndsTheThread)
 {
     Notes notes;
     body_notes = &notes;
@@ -166,7 +166,7 @@ private:
     pthread_attr_t _old;
 };
 
-TEST(Thread, failing_creation_deletes_the_context_of_the_parent)
+TEST(Thread, FailingCreationDeletesTheContextOfTheParent)
 {
     Notes notes;
     Recording_Context* child = nullptr;
@@ -186,7 +186,7 @@ TEST(Thread, failing_creation_deletes_the_context_of_the_parent)
     delete child;
 }
 
-TEST(Thread, failing_creation_without_a_context_gives_the_error)
+TEST(Thread, FailingCreationWithoutAContextGivesTheError)
 {
     const Huge_Stacks huge_stacks;
     Thread thread;
@@ -199,7 +199,7 @@ static void* push_and_leave(void* argument)
     return nullptr;
 }
 
-TEST(Thread, a_context_left_on_the_stack_is_fatal)
+TEST(Thread, AContextLeftOnTheStackIsFatal)
 {
     testing::FLAGS_gtest_death_test_style = "threadsafe";
     Notes notes;

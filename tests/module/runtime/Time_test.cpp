@@ -13,14 +13,14 @@ using namespace KPRV;
 /// One that nobody sets.
 using Clock = std::chrono::steady_clock;
 
-TEST(Time, units_are_microseconds)
+TEST(Time, UnitsAreMicroseconds)
 {
     EXPECT_EQ(Time::USEC, 1u);
     EXPECT_EQ(Time::MSEC, 1000u);
     EXPECT_EQ(Time::SEC, 1000000u);
 }
 
-TEST(Time, now_counts_from_the_epoch)
+TEST(Time, NowCountsFromTheEpoch)
 {
     // Two looks at clocks are apart by what the machine does in between, and clocks are set: a day shows the
     // epoch and the unit as well.
@@ -28,28 +28,28 @@ TEST(Time, now_counts_from_the_epoch)
     EXPECT_LT(std::abs(sint64(Time::now()) - sint64(time(nullptr)) * sint64(Time::SEC)), day);
 }
 
-TEST(Time, sleep_takes_at_least_its_time)
+TEST(Time, SleepTakesAtLeastItsTime)
 {
     const auto start = Clock::now();
     Time::sleep(20 * Time::MSEC);
     EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(20));
 }
 
-TEST(Time, sleep_splits_seconds_and_remainder)
+TEST(Time, SleepSplitsSecondsAndRemainder)
 {
     const auto start = Clock::now();
     Time::sleep(Time::SEC + 10 * Time::MSEC);
     EXPECT_GE(Clock::now() - start, std::chrono::milliseconds(1010));
 }
 
-TEST(Time, sleep_of_nothing_returns_at_once)
+TEST(Time, SleepOfNothingReturnsAtOnce)
 {
     const auto start = Clock::now();
     Time::sleep(0);
     EXPECT_LT(Clock::now() - start, PATIENCE);
 }
 
-TEST(Time, sleep_sleeps_on_after_a_signal)
+TEST(Time, SleepSleepsOnAfterASignal)
 {
     static volatile sig_atomic_t signals = 0;
     struct sigaction count = {}, before = {};

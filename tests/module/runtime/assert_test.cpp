@@ -4,20 +4,20 @@
 
 using namespace KPRV;
 
-TEST(assert, prints_place_and_text_and_aborts)
+TEST(assert, PrintsPlaceAndTextAndAborts)
 {
     EXPECT_EXIT(__cimple_assert("File.cpp", 12, "function", "a == b"), testing::KilledBySignal(SIGABRT),
                 "^File\\.cpp\\(12\\): function\\(\\): assert: a == b\n\n$");
 }
 
-TEST(assert, macro_passes_its_condition_as_text)
+TEST(assert, MacroPassesItsConditionAsText)
 {
     const int answer = 41;
     CIMPLE_ASSERT(answer == 41);
     EXPECT_EXIT(CIMPLE_ASSERT(answer == 42), testing::KilledBySignal(SIGABRT), "assert: answer == 42\n\n$");
 }
 
-TEST(assert, trace_goes_to_standard_error)
+TEST(assert, TraceGoesToStandardError)
 {
     testing::internal::CaptureStderr();
     __cimple_trace("File.cpp", 12, "here");

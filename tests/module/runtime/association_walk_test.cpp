@@ -33,14 +33,14 @@ std::string far_ends(const Ref<Instance>& instance, const Ref<Instance>& associa
 
 } // namespace
 
-TEST(association_walk, gives_the_other_end)
+TEST(association_walk, GivesTheOtherEnd)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     EXPECT_EQ(far_ends(Ref<Instance>(make_named("a")), link), "b;");
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("b")), link), "a;");
 }
 
-TEST(association_walk, an_association_that_does_not_touch_gives_minus_one)
+TEST(association_walk, AnAssociationThatDoesNotTouchGivesMinusOne)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     EXPECT_EQ(far_ends(Ref<Instance>(make_named("c")), link), "-1");
@@ -50,7 +50,7 @@ TEST(association_walk, an_association_that_does_not_touch_gives_minus_one)
     EXPECT_EQ(far_ends(other, link), "-1");
 }
 
-TEST(association_walk, ends_of_one_class_with_other_keys_are_far)
+TEST(association_walk, EndsOfOneClassWithOtherKeysAreFar)
 {
     const Ref<Instance> link(make_link(make_port("p", 1), make_port("q", 2)));
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("p", 1)), link), "q;");
@@ -58,13 +58,13 @@ TEST(association_walk, ends_of_one_class_with_other_keys_are_far)
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("q", 1)), link), "-1");
 }
 
-TEST(association_walk, a_link_of_one_object_with_itself_gives_nothing)
+TEST(association_walk, ALinkOfOneObjectWithItselfGivesNothing)
 {
     const Ref<Instance> link(make_link(make_port("p", 1), make_port("p", 1)));
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("p", 1)), link), "");
 }
 
-TEST(association_walk, role_is_the_name_of_the_near_end)
+TEST(association_walk, RoleIsTheNameOfTheNearEnd)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     const Ref<Instance> a(make_named("a"));
@@ -73,14 +73,14 @@ TEST(association_walk, role_is_the_name_of_the_near_end)
     EXPECT_EQ(far_ends(a, link, {.role = "Dependent"}), "-1");
 }
 
-TEST(association_walk, a_near_end_in_another_role_is_no_far_end_either)
+TEST(association_walk, ANearEndInAnotherRoleIsNoFarEndEither)
 {
     // Both ends are near; only one has the role, which is enough to be found.
     const Ref<Instance> link(make_link(make_port("p", 1), make_port("p", 1)));
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("p", 1)), link, {.role = "Dependent"}), "");
 }
 
-TEST(association_walk, result_role_is_the_name_of_the_far_end)
+TEST(association_walk, ResultRoleIsTheNameOfTheFarEnd)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     const Ref<Instance> a(make_named("a"));
@@ -88,7 +88,7 @@ TEST(association_walk, result_role_is_the_name_of_the_far_end)
     EXPECT_EQ(far_ends(a, link, {.result_role = "Antecedent"}), "");
 }
 
-TEST(association_walk, result_class_is_the_far_end_or_an_ancestor)
+TEST(association_walk, ResultClassIsTheFarEndOrAnAncestor)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     const Ref<Instance> a(make_named("a"));
@@ -99,7 +99,7 @@ TEST(association_walk, result_class_is_the_far_end_or_an_ancestor)
     EXPECT_EQ(far_ends(b, link, {.result_class = "Sample_Port"}), "") << "a subclass of the far end";
 }
 
-TEST(association_walk, what_fits_is_the_same_whenever_it_is_asked)
+TEST(association_walk, WhatFitsIsTheSameWheneverItIsAsked)
 {
     const Ref<Instance> port(make_port("p"));
     const Meta_Class* const classes[] = {&Sample_Other::static_meta_class, &Sample_Element::static_meta_class,
@@ -119,7 +119,7 @@ TEST(association_walk, what_fits_is_the_same_whenever_it_is_asked)
     }
 }
 
-TEST(association_walk, reference_arrays_take_no_part)
+TEST(association_walk, ReferenceArraysTakeNoPart)
 {
     const Ref<Instance> group(create<Sample_Group>(false));
     auto* const sample = static_cast<Sample_Group*>(group.ptr());
@@ -130,14 +130,14 @@ TEST(association_walk, reference_arrays_take_no_part)
     EXPECT_FALSE(is_reference_of(Ref<Instance>(make_port("m")).ptr(), group.ptr(), ""));
 }
 
-TEST(association_walk, a_missing_reference_is_passed_over)
+TEST(association_walk, AMissingReferenceIsPassedOver)
 {
     const Ref<Instance> link(make_link(make_named("a"), nullptr));
     EXPECT_EQ(far_ends(Ref<Instance>(make_named("a")), link), "");
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("b")), link), "-1");
 }
 
-TEST(association_walk, is_reference_of_tests_keys_and_role)
+TEST(association_walk, IsReferenceOfTestsKeysAndRole)
 {
     const Ref<Instance> link(make_link(make_named("a"), make_port("b", 7)));
     const auto is_reference = [&](Instance* instance, const char* role) {

@@ -7,7 +7,7 @@
 
 using namespace KPRV;
 
-TEST(cimom, everything_fails_quietly_without_a_context)
+TEST(cimom, EverythingFailsQuietlyWithoutAContext)
 {
     const Ref<Instance> model(make_named("a"));
     Instance_Enumerator enumerator;
@@ -23,7 +23,7 @@ TEST(cimom, everything_fails_quietly_without_a_context)
     EXPECT_EQ(name, "kept");
 }
 
-TEST(cimom, everything_goes_to_the_context_on_top)
+TEST(cimom, EverythingGoesToTheContextOnTop)
 {
     const Ref<Instance> model(make_named("a"));
     Notes notes;
@@ -48,7 +48,7 @@ TEST(cimom, everything_goes_to_the_context_on_top)
                                         "invoke", "refuse", "allow"}));
 }
 
-TEST(cimom, an_enumerator_is_used_again_after_its_rep_is_destroyed)
+TEST(cimom, AnEnumeratorIsUsedAgainAfterItsRepIsDestroyed)
 {
     const Ref<Instance> model(make_named("a"));
     Notes notes;
@@ -65,7 +65,7 @@ TEST(cimom, an_enumerator_is_used_again_after_its_rep_is_destroyed)
     EXPECT_EQ(notes.list(), (Notes_List{"enum one", "destroy", "enum two", "enum three"}));
 }
 
-TEST(cimom, enumeration_into_an_array_is_not_offered)
+TEST(cimom, EnumerationIntoAnArrayIsNotOffered)
 {
     Array<Instance*> instances;
     EXPECT_EXIT(

@@ -19,7 +19,7 @@ static std::optional<Log_Level> level_of(const std::string& rc_text)
     return configuration.level;
 }
 
-TEST(log_configuration, rules_of_the_rc_file)
+TEST(log_configuration, RulesOfTheRcFile)
 {
     using enum Log_Level;
     const std::string long_line(5000, 'x');
@@ -68,7 +68,7 @@ TEST(log_configuration, rules_of_the_rc_file)
         EXPECT_EQ(level_of(row.text), row.level) << row.text.substr(0, 80);
 }
 
-TEST(log_configuration, names_the_files_below_home)
+TEST(log_configuration, NamesTheFilesBelowHome)
 {
     Temp_Folder home;
     home.write(".cimplerc", "LOG_LEVEL=DBG\n");
@@ -82,7 +82,7 @@ TEST(log_configuration, names_the_files_below_home)
     EXPECT_EQ(configuration.lock, folder + "/.cimple/messages.lock");
 }
 
-TEST(log_configuration, nothing_without_home_or_file)
+TEST(log_configuration, NothingWithoutHomeOrFile)
 {
     Temp_Folder home;
     const Environment_Override override("HOME", home.path());
@@ -102,7 +102,7 @@ static std::string lengthened(std::string folder, size_t size)
     return folder;
 }
 
-TEST(log_configuration, a_path_that_does_not_fit_is_not_shortened)
+TEST(log_configuration, APathThatDoesNotFitIsNotShortened)
 {
     Temp_Folder home;
     home.write(".cimplerc", "LOG_LEVEL=DBG\n");

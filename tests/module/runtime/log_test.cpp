@@ -55,7 +55,7 @@ std::string text_of_line(const std::string& line)
 
 } // namespace
 
-TEST(log, a_line_is_time_level_place_and_text)
+TEST(log, ALineIsTimeLevelPlaceAndText)
 {
     Home home;
     home.level("DBG");
@@ -66,7 +66,7 @@ TEST(log, a_line_is_time_level_place_and_text)
     EXPECT_TRUE(line.Matches(home.messages())) << home.messages();
 }
 
-TEST(log, levels_up_to_the_configured_one_are_written)
+TEST(log, LevelsUpToTheConfiguredOneAreWritten)
 {
     const char* const names[] = {"FATAL", "ERR", "WARN", "INFO", "DBG"};
     for (int configured = 0; configured < 5; configured++) {
@@ -81,7 +81,7 @@ TEST(log, levels_up_to_the_configured_one_are_written)
     }
 }
 
-TEST(log, every_line_ends_in_exactly_one_newline)
+TEST(log, EveryLineEndsInExactlyOneNewline)
 {
     Home home;
     home.level("DBG");
@@ -97,7 +97,7 @@ TEST(log, every_line_ends_in_exactly_one_newline)
     EXPECT_EQ(all.back(), '\n');
 }
 
-TEST(log, long_texts_are_not_cut)
+TEST(log, LongTextsAreNotCut)
 {
     Home home;
     home.level("DBG");
@@ -106,7 +106,7 @@ TEST(log, long_texts_are_not_cut)
     EXPECT_EQ(text_of_line(split(home.messages())[0]), text);
 }
 
-TEST(log, nothing_happens_without_home)
+TEST(log, NothingHappensWithoutHome)
 {
     Home home;
     home.level("DBG");
@@ -115,7 +115,7 @@ TEST(log, nothing_happens_without_home)
     EXPECT_FALSE(fs::exists(home.path(".cimple")));
 }
 
-TEST(log, arguments_of_a_line_that_is_not_used_are_not_made)
+TEST(log, ArgumentsOfALineThatIsNotUsedAreNotMade)
 {
     const Home home;
     home.level("ERR");
@@ -131,7 +131,7 @@ TEST(log, arguments_of_a_line_that_is_not_used_are_not_made)
     EXPECT_EQ(1u, split(home.messages()).size());
 }
 
-TEST(log, configuration_is_tried_by_every_call)
+TEST(log, ConfigurationIsTriedByEveryCall)
 {
     Home home;
     const size_t before = open_files();
@@ -151,7 +151,7 @@ TEST(log, configuration_is_tried_by_every_call)
     EXPECT_EQ(text_of_line(lines[1]), "and on");
 }
 
-TEST(log, once_open_the_file_is_not_read_again)
+TEST(log, OnceOpenTheFileIsNotReadAgain)
 {
     Home home;
     home.level("ERR");
@@ -165,7 +165,7 @@ TEST(log, once_open_the_file_is_not_read_again)
     EXPECT_EQ(split(home.messages()).size(), 2u);
 }
 
-TEST(log, close_gives_the_descriptors_back)
+TEST(log, CloseGivesTheDescriptorsBack)
 {
     Home home;
     home.level("ERR");
@@ -177,7 +177,7 @@ TEST(log, close_gives_the_descriptors_back)
     EXPECT_EQ(open_files(), before);
 }
 
-TEST(log, folder_and_files_have_their_modes)
+TEST(log, FolderAndFilesHaveTheirModes)
 {
     Home home;
     home.level("ERR");
@@ -194,7 +194,7 @@ TEST(log, folder_and_files_have_their_modes)
     EXPECT_EQ(mode(".cimple/messages.lock"), 0600u);
 }
 
-TEST(log, an_existing_folder_and_log_are_used)
+TEST(log, AnExistingFolderAndLogAreUsed)
 {
     Home home;
     fs::create_directory(home.path(".cimple"));
@@ -206,7 +206,7 @@ TEST(log, an_existing_folder_and_log_are_used)
     EXPECT_EQ(lines[0], "old");
 }
 
-TEST(log, a_folder_that_cannot_be_used_is_tried_again)
+TEST(log, AFolderThatCannotBeUsedIsTriedAgain)
 {
     Home home;
     home.level("ERR");
@@ -250,7 +250,7 @@ const Odd_File odd_files[] = {
      }},
 };
 
-TEST(log, what_is_no_regular_file_neither_waits_nor_logs)
+TEST(log, WhatIsNoRegularFileNeitherWaitsNorLogs)
 {
     for (const Odd_File& odd : odd_files)
         for (const char* place : {".cimplerc", ".cimple/messages", ".cimple/messages.lock"}) {
@@ -273,7 +273,7 @@ TEST(log, what_is_no_regular_file_neither_waits_nor_logs)
         }
 }
 
-TEST(log, links_to_regular_files_are_followed)
+TEST(log, LinksToRegularFilesAreFollowed)
 {
     Home home;
     Temp_Folder elsewhere;
@@ -290,7 +290,7 @@ TEST(log, links_to_regular_files_are_followed)
 
 // Sanitizers take more room for themselves than they could be given, and end the process without memory.
 #if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__)
-TEST(log, a_line_without_memory_is_cut)
+TEST(log, ALineWithoutMemoryIsCut)
 {
     in_child([] {
         Home home;
@@ -316,7 +316,7 @@ TEST(log, a_line_without_memory_is_cut)
 
 // The sanitizer does not see the scopes that a cancelled thread leaves, and takes its stack for poisoned.
 #ifndef __SANITIZE_ADDRESS__
-TEST(log, is_no_place_to_be_cancelled_at)
+TEST(log, IsNoPlaceToBeCancelledAt)
 {
     Home home;
     home.level("DBG");
@@ -353,7 +353,7 @@ TEST(log, is_no_place_to_be_cancelled_at)
 }
 #endif
 
-TEST(log, a_failing_lock_does_not_stop_the_line)
+TEST(log, AFailingLockDoesNotStopTheLine)
 {
     Home home;
     home.level("ERR");
@@ -370,7 +370,7 @@ TEST(log, a_failing_lock_does_not_stop_the_line)
     EXPECT_EQ(split(home.messages()).size(), 2u);
 }
 
-TEST(log, set_level_is_in_memory_only)
+TEST(log, SetLevelIsInMemoryOnly)
 {
     Home home;
     home.level("ERR");
@@ -385,7 +385,7 @@ TEST(log, set_level_is_in_memory_only)
     EXPECT_EQ(split(home.messages()).size(), 2u);
 }
 
-TEST(log, level_names_are_found_whatever_their_case)
+TEST(log, LevelNamesAreFoundWhateverTheirCase)
 {
     Log_Level level = Log_Level::FATAL;
     EXPECT_EQ(_validate_log_level("info", level), 0);
@@ -395,7 +395,7 @@ TEST(log, level_names_are_found_whatever_their_case)
     EXPECT_EQ(level, Log_Level::INFO);
 }
 
-TEST(log, enable_switches_the_conversion_lines_only)
+TEST(log, EnableSwitchesTheConversionLinesOnly)
 {
     Home home;
     home.level("DBG");
@@ -413,7 +413,7 @@ TEST(log, enable_switches_the_conversion_lines_only)
     EXPECT_NE(lines[1].find(" WARN: log_test.cpp("), std::string::npos);
 }
 
-TEST(log, scope_traces_its_ends)
+TEST(log, ScopeTracesItsEnds)
 {
     Log_Capture capture;
     {
@@ -447,7 +447,7 @@ static void expect_whole_lines(const std::string& messages, size_t count)
     }
 }
 
-TEST(log, lines_of_threads_stay_whole)
+TEST(log, LinesOfThreadsStayWhole)
 {
     Home home;
     home.level("DBG");
@@ -459,7 +459,7 @@ TEST(log, lines_of_threads_stay_whole)
     expect_whole_lines(home.messages(), 400);
 }
 
-TEST(log, lines_of_processes_stay_whole)
+TEST(log, LinesOfProcessesStayWhole)
 {
     Home home;
     home.level("DBG");

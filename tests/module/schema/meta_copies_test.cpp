@@ -27,7 +27,7 @@ std::string shown(const Meta_Class* meta_class, bool local_only)
 
 } // namespace
 
-TEST(meta_copies, every_class_is_identical_to_its_copy_and_to_no_other_class)
+TEST(meta_copies, EveryClassIsIdenticalToItsCopyAndToNoOtherClass)
 {
     const Meta_Class* before = nullptr;
     for (const Meta_Class* each : classes()) {
@@ -42,7 +42,7 @@ TEST(meta_copies, every_class_is_identical_to_its_copy_and_to_no_other_class)
     }
 }
 
-TEST(meta_copies, every_class_shows_all_its_features)
+TEST(meta_copies, EveryClassShowsAllItsFeatures)
 {
     for (const Meta_Class* each : classes()) {
         SCOPED_TRACE(each->name);

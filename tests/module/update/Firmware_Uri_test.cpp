@@ -37,7 +37,7 @@ struct Firmware_Uri : testing::Test
 
 } // namespace
 
-TEST_F(Firmware_Uri, a_file_of_this_host)
+TEST_F(Firmware_Uri, AFileOfThisHost)
 {
     EXPECT_STREQ("/var/fw/a b.bin", fetch_firmware("file:///var/fw/a b.bin").c_str());
     EXPECT_STREQ("fw.bin", fetch_firmware("file://fw.bin").c_str());
@@ -46,13 +46,13 @@ TEST_F(Firmware_Uri, a_file_of_this_host)
     EXPECT_TRUE(programs.runs().empty());
 }
 
-TEST_F(Firmware_Uri, a_file_without_a_name)
+TEST_F(Firmware_Uri, AFileWithoutAName)
 {
     EXPECT_EQ("malformed file URI", refused("file://"));
     EXPECT_EQ(Lines{"INFO file="}, log.said());
 }
 
-TEST_F(Firmware_Uri, a_fetched_file_is_removed_first_and_has_its_remote_name)
+TEST_F(Firmware_Uri, AFetchedFileIsRemovedFirstAndHasItsRemoteName)
 {
     EXPECT_STREQ("fw.bin", fetch_firmware("tftp://10.1.2.3/fw.bin").c_str());
     EXPECT_STREQ("dir/fw.bin", fetch_firmware("tftp://ab/dir/fw.bin").c_str());
@@ -63,7 +63,7 @@ TEST_F(Firmware_Uri, a_fetched_file_is_removed_first_and_has_its_remote_name)
     EXPECT_TRUE(log.said().empty());
 }
 
-TEST_F(Firmware_Uri, a_host_has_two_characters_and_a_file_one)
+TEST_F(Firmware_Uri, AHostHasTwoCharactersAndAFileOne)
 {
     for (const char* uri : {"tftp://", "tftp:///", "tftp:///f", "tftp://h/f", "tftp://h", "tftp://host",
                             "tftp://host/", "tftp://h/", "tftp://h/a/b"}) {
@@ -74,7 +74,7 @@ TEST_F(Firmware_Uri, a_host_has_two_characters_and_a_file_one)
     EXPECT_EQ(std::nullopt, refused("tftp://hh/f"));
 }
 
-TEST_F(Firmware_Uri, no_other_scheme_and_no_capitals)
+TEST_F(Firmware_Uri, NoOtherSchemeAndNoCapitals)
 {
     for (const char* uri : {"FILE:///f", "TFTP://host/f", "File:///f", "http://host/f", "file:/f", "/f", "f",
                             "", "file:/", "tftp:/", " file:///f", "file"}) {
@@ -84,13 +84,13 @@ TEST_F(Firmware_Uri, no_other_scheme_and_no_capitals)
     EXPECT_TRUE(programs.runs().empty());
 }
 
-TEST_F(Firmware_Uri, what_the_remover_says_does_not_matter)
+TEST_F(Firmware_Uri, WhatTheRemoverSaysDoesNotMatter)
 {
     programs.program("rm", "exit 1");
     EXPECT_EQ(std::nullopt, refused("tftp://host/f"));
 }
 
-TEST_F(Firmware_Uri, any_status_of_the_client_but_0_is_a_failure)
+TEST_F(Firmware_Uri, AnyStatusOfTheClientBut0IsAFailure)
 {
     for (const char* end : {"exit 1", "exit 69", "exit 127", "kill -9 $$"}) {
         programs.program("tftp", end);
@@ -98,14 +98,14 @@ TEST_F(Firmware_Uri, any_status_of_the_client_but_0_is_a_failure)
     }
 }
 
-TEST_F(Firmware_Uri, hostile_names_stay_single_words)
+TEST_F(Firmware_Uri, HostileNamesStaySingleWords)
 {
     EXPECT_EQ(std::nullopt, refused("tftp://a;touch b`id`/$(touch c) | d > e"));
     EXPECT_EQ((Lines{"rm [-f] [$(touch c) | d > e]", "tftp [a;touch b`id`] [-c] [get] [$(touch c) | d > e]"}),
               programs.runs());
 }
 
-TEST(Firmware_Uri_Without_Client, cannot_be_fetched)
+TEST(Firmware_Uri_Without_Client, CannotBeFetched)
 {
     Scripted_Programs none;
     EXPECT_THROW(fetch_firmware("tftp://host/f"), Install_Failure);

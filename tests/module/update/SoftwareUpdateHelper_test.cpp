@@ -43,12 +43,12 @@ constexpr const char* SAYS =
 
 } // namespace
 
-TEST_F(Software_Update, is_one_object)
+TEST_F(Software_Update, IsOneObject)
 {
     EXPECT_EQ(helper, SoftwareUpdateHelper::getSoftwareUpdateHelperInstance());
 }
 
-TEST_F(Software_Update, the_service)
+TEST_F(Software_Update, TheService)
 {
     EXPECT_EQ((std::vector<Set_Properties>{{
                   {"SystemCreationClassName", "KALDERA_ComputerSystem"},
@@ -61,7 +61,7 @@ TEST_F(Software_Update, the_service)
     EXPECT_TRUE(library.calls.empty());
 }
 
-TEST_F(Software_Update, its_capabilities)
+TEST_F(Software_Update, ItsCapabilities)
 {
     EXPECT_EQ((std::vector<Set_Properties>{{
                   {"InstanceID", "Kaldera Adapter Software Update Service"},
@@ -73,13 +73,13 @@ TEST_F(Software_Update, its_capabilities)
     EXPECT_EQ(Lines{"INFO Number of instances: 1"}, log.said());
 }
 
-TEST_F(Software_Update, nothing_else)
+TEST_F(Software_Update, NothingElse)
 {
     EXPECT_TRUE(published(PORTCONTROLLER).empty());
     EXPECT_EQ((Lines{"INFO Default case . Other classes ", "INFO Number of instances: 0"}), log.said());
 }
 
-TEST_F(Software_Update, hands_address_and_file_to_the_library)
+TEST_F(Software_Update, HandsAddressAndFileToTheLibrary)
 {
     EXPECT_EQ(0u, update_answered("{'status': 0, 'message': 'done'}"));
     EXPECT_EQ(Lines{R"(adapterUpdateFlash {"file":"/fw/a.bin","indexStr":"20:00:02:4b:4c:10:00:00"})"},
@@ -93,7 +93,7 @@ TEST_F(Software_Update, hands_address_and_file_to_the_library)
     EXPECT_EQ(R"(adapterUpdateFlash {"file":"fw","indexStr":"00:02:4b:4c:20:00"})", library.told().back());
 }
 
-TEST_F(Software_Update, gives_the_library_s_status)
+TEST_F(Software_Update, GivesTheLibrarySStatus)
 {
     EXPECT_EQ(7u, update_answered("{'status': 7, 'message': 'locked'}"));
     EXPECT_EQ((Lines{SAYS, "DBG status=7 message = locked"}), log.said());
@@ -103,7 +103,7 @@ TEST_F(Software_Update, gives_the_library_s_status)
     EXPECT_EQ(0u, update_answered("{'status': null, 'message': null}"));
 }
 
-TEST_F(Software_Update, an_answer_without_one_of_the_two_is_a_failure)
+TEST_F(Software_Update, AnAnswerWithoutOneOfTheTwoIsAFailure)
 {
     for (const char* answer : {"null", "{}", "{'status': 0}", "{'message': 'done'}", "[0]", "0",
                                "{'status': 0, 'message': 'done', 'error': null}",
@@ -113,14 +113,14 @@ TEST_F(Software_Update, an_answer_without_one_of_the_two_is_a_failure)
     }
 }
 
-TEST_F(Software_Update, members_of_the_wrong_type_throw)
+TEST_F(Software_Update, MembersOfTheWrongTypeThrow)
 {
     EXPECT_THROW(update_answered("{'status': 'good', 'message': 'done'}"), Not_Convertible);
     EXPECT_THROW(update_answered("{'status': -1, 'message': 'done'}"), Not_Convertible);
     EXPECT_THROW(update_answered("{'status': 0, 'message': 1}"), Not_Convertible);
 }
 
-TEST_F(Software_Update, the_library_s_exceptions_pass)
+TEST_F(Software_Update, TheLibrarySExceptionsPass)
 {
     library.throws("adapterUpdateFlash", HbaAgentError{7, "busy"});
     EXPECT_THROW(update(), HbaAgentError);

@@ -8,7 +8,7 @@
 namespace KPRV::broker {
 
 /// Servers differ in what they do to a provider; each difference that matters is a switch.
-struct Host_Options
+struct Server_Options
 {
     /// How integer keys of a client's path arrive.
     enum class Key_Style
@@ -22,7 +22,7 @@ struct Host_Options
     /// What `CMSetPropertyFilter` does.
     enum class Filter_Style
     {
-        /// Accepts the list; the host filters the result. Keys stay in the path.
+        /// Accepts the list; the server filters the result. Keys stay in the path.
         LATE,
         /// Drops other properties at once, ignores later sets of other names, and loses the keys of the path
         /// that the list leaves out.
@@ -63,22 +63,22 @@ struct Host_Options
     std::size_t most_object_memory = 0;
 
     /// The two public servers whose behaviour was measured.
-    static Host_Options sfcb_like();
-    static Host_Options pegasus_like();
+    static Server_Options sfcb_like();
+    static Server_Options pegasus_like();
 };
 
-inline Host_Options Host_Options::sfcb_like()
+inline Server_Options Server_Options::sfcb_like()
 {
-    Host_Options options;
+    Server_Options options;
     options.filter_style = Filter_Style::EARLY;
     options.null_string_objects = true;
     options.user_without_text = true;
     return options;
 }
 
-inline Host_Options Host_Options::pegasus_like()
+inline Server_Options Server_Options::pegasus_like()
 {
-    Host_Options options;
+    Server_Options options;
     options.key_style = Key_Style::SINT64;
     options.argument_style = Argument_Style::NULL_BOOLEAN;
     options.null_bit_on_elements = true;

@@ -12,17 +12,18 @@ namespace KPRV::broker {
 /// at once. Destruction cleans all providers up (terminating) and closes the library.
 ///
 ///     std::string error;
-///     auto host = Host::open("./libkldrprovider_Module.so", {}, error);
+///     auto host = Local_Server::open("./libkldrprovider_Module.so", {}, error);
 ///     Result result = host->enumerate_instances("KALDERA_FCPort");
 ///     ASSERT_EQ("", host->violations().text());
-class Host final : public Cim_Operations, private Up_Calls
+class Local_Server final : public Cim_Operations, private Up_Calls
 {
 public:
     using Sink = std::function<CMPIrc(const std::string& name_space, const Instance_Value& indication)>;
 
     /// Null if the library cannot be opened; `error` then holds the loader's text.
-    static std::unique_ptr<Host> open(const std::string& library, Host_Options options, std::string& error);
-    ~Host() override;
+    static std::unique_ptr<Local_Server> open(const std::string& library, Server_Options options,
+                                              std::string& error);
+    ~Local_Server() override;
 
     /// A client's operation; its context gets the usual entries where it has none. A path without a name
     /// space gets that of the options. An enumeration of a superclass asks the providers of all its
@@ -61,21 +62,21 @@ public:
 
     /// Cleans providers up, all or one class's; see `Provider_Set::cleanup`. They come back with the next
     /// call.
-    CMPIrc unload(bool terminating) { return providers_->cleanup(terminating); }
+    CMPIrc unload(bool terminating) { return _providers->cleanup(terminating); }
     CMPIrc unload(const std::string& class_name, bool terminating);
 
-    const Host_Options& options() const { return core_->options; }
-    const Class_Catalogue& catalogue() const { return *catalogue_; }
-    const Module& module() const { return *module_; }
-    Provider_Set& providers() { return *providers_; }
-    Broker& broker() { return *broker_; }
-    Server_Store& store() { return store_; }
-    Violations& violations() { return core_->violations; }
-    Ledger& ledger() { return core_->ledger; }
-    Call_Log& calls() { return core_->calls; }
+    const Server_Options& options() const { return _core->options; }
+    const Class_Catalogue& catalogue() const { return *_catalogue; }
+    const Module& module() const { return *_module; }
+    Provider_Set& providers() { return *_providers; }
+    Broker& broker() { return *_broker; }
+    Server_Store& store() { return _store; }
+    Violations& violations() { return _core->violations; }
+    Ledger& ledger() { return _core->ledger; }
+    Call_Log& calls() { return _core->calls; }
 
 private:
-    Host(std::unique_ptr<Module> module, Host_Options options);
+    Local_Server(std::unique_ptr<Module> module, Server_Options options);
 
     Result up_call(const Request& request) override;
     CMPIrc deliver(const std::string& name_space, const Instance_Value& indication) override;
@@ -94,14 +95,14 @@ private:
     template <class Entry>
     CMPIrc switch_call(const std::string& provider_class, Entry entry);
 
-    std::shared_ptr<Core> core_;
-    std::unique_ptr<Module> module_;
-    std::unique_ptr<Class_Catalogue> catalogue_;
-    std::unique_ptr<Broker> broker_;
-    std::unique_ptr<Provider_Set> providers_;
-    Server_Store store_;
-    Standard_Mutex<> sink_mutex_;
-    Sink sink_ GUARDED_BY(sink_mutex_);
+    std::shared_ptr<Core> _core;
+    std::unique_ptr<Module> _module;
+    std::unique_ptr<Class_Catalogue> _catalogue;
+    std::unique_ptr<Broker> _broker;
+    std::unique_ptr<Provider_Set> _providers;
+    Server_Store _store;
+    Standard_Mutex<> _sink_mutex;
+    Sink _sink GUARDED_BY(_sink_mutex);
 };
 
 } // namespace KPRV::broker

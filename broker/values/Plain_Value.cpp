@@ -1,4 +1,4 @@
-#include "broker/values/Value.h"
+#include "broker/values/Plain_Value.h"
 
 #include "broker/values/Type_Words.h"
 
@@ -10,9 +10,9 @@ namespace KPRV::broker {
 namespace {
 
 template <class Held>
-Value make(CMPIType type, Held held)
+Plain_Value make(CMPIType type, Held held)
 {
-    Value value;
+    Plain_Value value;
     value.type = type;
     value.null = false;
     value.data = std::move(held);
@@ -20,7 +20,7 @@ Value make(CMPIType type, Held held)
 }
 
 template <class Held>
-const Held& held_or_empty(const Value::Data& data)
+const Held& held_or_empty(const Plain_Value::Data& data)
 {
     static const Held empty{};
     const Held* held = std::get_if<Held>(&data);
@@ -33,7 +33,7 @@ bool same_target(const std::shared_ptr<const Shared>& a, const std::shared_ptr<c
     return a == b || (a && b && *a == *b);
 }
 
-bool same_key(const Value& a, const Value& b)
+bool same_key(const Plain_Value& a, const Plain_Value& b)
 {
     if (is_integer(a.type) && is_integer(b.type))
         return a.as_sint() == b.as_sint();
@@ -44,67 +44,67 @@ bool same_key(const Value& a, const Value& b)
 
 } // namespace
 
-Value Value::null_of(CMPIType type)
+Plain_Value Plain_Value::null_of(CMPIType type)
 {
-    Value value;
+    Plain_Value value;
     value.type = type;
     return value;
 }
 
-Value Value::boolean(bool value)
+Plain_Value Plain_Value::boolean(bool value)
 {
     return make(CMPI_boolean, value);
 }
-Value Value::text(std::string value)
+Plain_Value Plain_Value::text(std::string value)
 {
     return make(CMPI_string, std::move(value));
 }
-Value Value::datetime(std::string value)
+Plain_Value Plain_Value::datetime(std::string value)
 {
     return make(CMPI_dateTime, std::move(value));
 }
-Value Value::unsigned_number(CMPIType type, std::uint64_t value)
+Plain_Value Plain_Value::unsigned_number(CMPIType type, std::uint64_t value)
 {
     return make(type, value);
 }
-Value Value::signed_number(CMPIType type, std::int64_t value)
+Plain_Value Plain_Value::signed_number(CMPIType type, std::int64_t value)
 {
     return make(type, value);
 }
-Value Value::real(CMPIType type, double value)
+Plain_Value Plain_Value::real(CMPIType type, double value)
 {
     return make(type, value);
 }
 
-Value Value::path(Path_Value value)
+Plain_Value Plain_Value::path(Path_Value value)
 {
     return make(CMPI_ref, std::shared_ptr<const Path_Value>(std::make_shared<Path_Value>(std::move(value))));
 }
 
-Value Value::instance(Instance_Value value)
+Plain_Value Plain_Value::instance(Instance_Value value)
 {
     return make(CMPI_instance,
                 std::shared_ptr<const Instance_Value>(std::make_shared<Instance_Value>(std::move(value))));
 }
 
-Value Value::array(CMPIType element_type, std::vector<Value> elements)
+Plain_Value Plain_Value::array(CMPIType element_type, std::vector<Plain_Value> elements)
 {
     return make(static_cast<CMPIType>(element_type | CMPI_ARRAY), std::move(elements));
 }
 
-bool Value::as_bool() const
+bool Plain_Value::as_bool() const
 {
     return held_or_empty<bool>(data);
 }
 
-std::uint64_t Value::as_uint() const
+std::uint64_t Plain_Value::as_uint() const
 {
     if (const auto* number = std::get_if<std::uint64_t>(&data))
         return *number;
     return static_cast<std::uint64_t>(as_sint());
 }
 
-std::int64_t Value::as_sint() const
+std::int64_t Plain_Value::as_sint() const
 {
     if (const auto* number = std::get_if<std::uint64_t>(&data))
         return static_cast<std::int64_t>(*number);
@@ -113,31 +113,31 @@ std::int64_t Value::as_sint() const
     return held_or_empty<std::int64_t>(data);
 }
 
-double Value::as_real() const
+double Plain_Value::as_real() const
 {
     return held_or_empty<double>(data);
 }
-const std::string& Value::as_text() const
+const std::string& Plain_Value::as_text() const
 {
     return held_or_empty<std::string>(data);
 }
 
-const Path_Value* Value::as_path() const
+const Path_Value* Plain_Value::as_path() const
 {
     return held_or_empty<std::shared_ptr<const Path_Value>>(data).get();
 }
 
-const Instance_Value* Value::as_instance() const
+const Instance_Value* Plain_Value::as_instance() const
 {
     return held_or_empty<std::shared_ptr<const Instance_Value>>(data).get();
 }
 
-const std::vector<Value>& Value::elements() const
+const std::vector<Plain_Value>& Plain_Value::elements() const
 {
-    return held_or_empty<std::vector<Value>>(data);
+    return held_or_empty<std::vector<Plain_Value>>(data);
 }
 
-bool operator==(const Value& a, const Value& b)
+bool operator==(const Plain_Value& a, const Plain_Value& b)
 {
     if (a.type != b.type || a.null != b.null || a.data.index() != b.data.index())
         return false;
@@ -153,17 +153,17 @@ bool operator==(const Named_Value& a, const Named_Value& b)
     return same_name(a.name, b.name) && a.value == b.value;
 }
 
-const Value* find_value(const std::vector<Named_Value>& values, std::string_view name)
+const Plain_Value* find_value(const std::vector<Named_Value>& values, std::string_view name)
 {
     auto at = std::find_if(values.begin(), values.end(),
                            [&](const Named_Value& entry) { return same_name(entry.name, name); });
     return at == values.end() ? nullptr : &at->value;
 }
 
-void set_value(std::vector<Named_Value>& values, std::string_view name, Value value)
+void set_value(std::vector<Named_Value>& values, std::string_view name, Plain_Value value)
 {
-    if (const Value* present = find_value(values, name))
-        *const_cast<Value*>(present) = std::move(value);
+    if (const Plain_Value* present = find_value(values, name))
+        *const_cast<Plain_Value*>(present) = std::move(value);
     else
         values.push_back({std::string(name), std::move(value)});
 }
@@ -172,7 +172,7 @@ bool same_object(const Path_Value& a, const Path_Value& b)
 {
     return same_name(a.class_name, b.class_name) && a.keys.size() == b.keys.size() &&
            std::all_of(a.keys.begin(), a.keys.end(), [&](const Named_Value& key) {
-               const Value* other = b.key(key.name);
+               const Plain_Value* other = b.key(key.name);
                return other && same_key(key.value, *other);
            });
 }
@@ -188,10 +188,10 @@ bool operator==(const Instance_Value& a, const Instance_Value& b)
     return a.path == b.path && a.properties == b.properties;
 }
 
-Value with_integer_type(const Value& value, CMPIType type)
+Plain_Value with_integer_type(const Plain_Value& value, CMPIType type)
 {
-    return is_signed(type) ? Value::signed_number(type, value.as_sint())
-                           : Value::unsigned_number(type, value.as_uint());
+    return is_signed(type) ? Plain_Value::signed_number(type, value.as_sint())
+                           : Plain_Value::unsigned_number(type, value.as_uint());
 }
 
 bool same_name(std::string_view a, std::string_view b)
