@@ -1,6 +1,6 @@
 #include "broker/Broker.h"
 
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <set>
 

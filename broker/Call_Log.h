@@ -1,7 +1,7 @@
 #pragma once
 
 #include "contracts/cmpi/cmpidt.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <atomic>
 #include <map>

@@ -8,7 +8,7 @@
 #include "broker/Violations.h"
 #include "broker/values/Class_Catalogue.h"
 #include "contracts/cmpi/cmpift.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <deque>
 #include <functional>

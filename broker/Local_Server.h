@@ -3,7 +3,7 @@
 #include "broker/Mi_Call.h"
 #include "broker/Server_Store.h"
 #include "broker/values/Cim_Operations.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 namespace KPRV::broker {
 

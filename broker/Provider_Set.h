@@ -2,7 +2,7 @@
 
 #include "broker/Broker.h"
 #include "broker/Module.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <map>
 

@@ -1,7 +1,7 @@
 #include "broker/Registration_Catalogue.h"
 
 #include "broker/values/Type_Words.h"
-#include "module/runtime/Meta_Value.h"
+#include "module/runtime/objects/Meta_Value.h"
 
 #include <algorithm>
 #include <cstring>

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "broker/values/Class_Catalogue.h"
-#include "module/runtime/Registration.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/dispatch/Registration.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <map>
 #include <memory>

@@ -1,7 +1,7 @@
 #include "simulator/Entry_Points.h"
 
 #include "contracts/adapter/Signatures.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 #include "simulator/Behaviours.h"
 #include "simulator/Simulator.h"
 

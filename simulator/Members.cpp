@@ -1,6 +1,6 @@
 #include "simulator/Members.h"
 
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <algorithm>
 #include <cctype>

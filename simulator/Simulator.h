@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 #include "simulator/Entry_Points.h"
 #include "simulator/Faults.h"
 #include "simulator/Recorder.h"

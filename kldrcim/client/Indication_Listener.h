@@ -1,7 +1,7 @@
 #pragma once
 
 #include "kldrcim/connection/Connection.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <cstdint>
 

@@ -2,7 +2,7 @@
 
 #include "broker/values/Class_Catalogue.h"
 #include "kldrcim/client/Http_Client.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <map>
 

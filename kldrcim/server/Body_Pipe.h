@@ -1,7 +1,7 @@
 #pragma once
 
 #include "kldrcim/server/Answer.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <condition_variable>
 #include <deque>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <chrono>
 #include <condition_variable>

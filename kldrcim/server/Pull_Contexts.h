@@ -1,7 +1,7 @@
 #pragma once
 
 #include "broker/values/Request.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <chrono>
 #include <deque>

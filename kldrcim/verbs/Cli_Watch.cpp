@@ -5,7 +5,7 @@
 #include "kldrcim/verbs/Cli_Output.h"
 #include "kldrcim/verbs/Interruption.h"
 #include "kldrcim/verbs/Result_Filter.h"
-#include "module/runtime/Standard_Mutex.h"
+#include "module/runtime/system/Standard_Mutex.h"
 
 #include <deque>
 

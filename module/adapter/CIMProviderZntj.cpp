@@ -1,6 +1,6 @@
 #include "module/adapter/CIMProviderZntj.h"
 
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <dlfcn.h>
 

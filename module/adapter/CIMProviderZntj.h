@@ -1,7 +1,7 @@
 #pragma once
 
 #include "contracts/adapter/Signatures.h"
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 
 #include <json/value.h>
 

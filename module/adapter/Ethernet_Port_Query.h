@@ -1,7 +1,7 @@
 #pragma once
 
-#include "module/runtime/String.h"
-#include "module/runtime/log.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/system/log.h"
 
 #include <json/value.h>
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "module/adapter/CIMProviderZntj.h"
-#include "module/runtime/forced_unwinding.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/forced_unwinding.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/adapter/classId_t.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/String.h"
 
 #include <json/value.h>
 

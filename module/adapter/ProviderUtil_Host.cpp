@@ -3,7 +3,7 @@
 #include "module/adapter/Host_Name.h"
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/ProviderUtil_Log.h"
-#include "module/runtime/Request_Scope.h"
+#include "module/runtime/dispatch/Request_Scope.h"
 
 #include <arpa/inet.h>
 

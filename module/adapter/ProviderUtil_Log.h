@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 // The toolbox is spread over several files, but to the reader of a log it is one unit: its lines carry one
 // name.

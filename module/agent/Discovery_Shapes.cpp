@@ -4,8 +4,8 @@
 
 #include "module/adapter/Json_Access.h"
 #include "module/agent/ProviderDiscoveryMethods.h"
-#include "module/runtime/log.h"
-#include "module/runtime/strutil.h"
+#include "module/runtime/ground/strutil.h"
+#include "module/runtime/system/log.h"
 
 #include <stdexcept>
 

@@ -2,8 +2,8 @@
 // by an up-call.
 #include "module/agent/ProviderDiscoveryMethods.h"
 
-#include "module/runtime/cimom.h"
-#include "module/runtime/log.h"
+#include "module/runtime/dispatch/cimom.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/CIM_ComputerSystem.h"
 
 namespace KPRV {

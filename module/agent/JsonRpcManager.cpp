@@ -4,8 +4,8 @@
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/Json_Reading.h"
 #include "module/agent/MethodRegistration.h"
-#include "module/runtime/Standard_Mutex.h"
-#include "module/runtime/forced_unwinding.h"
+#include "module/runtime/system/Standard_Mutex.h"
+#include "module/runtime/system/forced_unwinding.h"
 
 #include <algorithm>
 #include <atomic>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/agent/Json_Tools.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/String.h"
 
 #include <json/value.h>
 

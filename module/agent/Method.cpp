@@ -3,7 +3,7 @@
 #include "module/adapter/Json_Access.h"
 #include "module/agent/Agent_Errors.h"
 #include "module/agent/Method_Shapes.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -3,7 +3,7 @@
 #include "module/agent/JsonRpcManager.h"
 #include "module/agent/Method.h"
 #include "module/agent/Method_Shapes.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

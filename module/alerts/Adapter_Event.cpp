@@ -2,7 +2,7 @@
 
 #include "module/adapter/Json_Access.h"
 #include "module/adapter/Json_Reading.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

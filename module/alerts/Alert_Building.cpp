@@ -4,8 +4,8 @@
 #include "module/alerts/Element_Paths.h"
 #include "module/alerts/Event_Categories.h"
 #include "module/alerts/Perceived_Severity.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 #include <cstdio>
 

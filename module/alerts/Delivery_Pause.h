@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Time.h"
+#include "module/runtime/system/Time.h"
 
 namespace KPRV {
 

@@ -1,9 +1,9 @@
 #include "module/alerts/Element_Paths.h"
 
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/Model_Path.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Model_Path.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/KALDERA_AgentService.h"
 #include "module/schema/KALDERA_ComputerSystem.h"
 #include "module/schema/KALDERA_EthernetPort.h"

@@ -2,7 +2,7 @@
 
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -2,7 +2,7 @@
 
 #include "module/alerts/Adapter_Event.h"
 #include "module/alerts/Event_Catalogue.h"
-#include "module/runtime/Mutex.h"
+#include "module/runtime/system/Mutex.h"
 #include "module/schema/KALDERA_AlertIndication.h"
 
 #include <atomic>

@@ -2,8 +2,8 @@
 #include "module/alerts/Alert_Building.h"
 #include "module/alerts/Event_Categories.h"
 #include "module/alerts/IndicationHelper.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -1,6 +1,6 @@
 #include "module/alerts/Perceived_Severity.h"
 
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

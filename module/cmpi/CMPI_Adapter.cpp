@@ -1,7 +1,7 @@
 #include "module/cmpi/CMPI_Adapter.h"
 #include "module/cmpi/CMPI_Thread_Context.h"
 #include "module/cmpi/rc_to_str.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <cstring>
 

@@ -2,9 +2,9 @@
 
 #include "module/cmpi/CMPI_Static_Data.h"
 #include "module/cmpi/Name_Space_Entry.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Mutex.h"
-#include "module/runtime/Provider_Handle.h"
+#include "module/runtime/dispatch/Provider_Handle.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/system/Mutex.h"
 
 #include <atomic>
 

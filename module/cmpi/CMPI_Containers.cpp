@@ -4,9 +4,9 @@
 #include "module/cmpi/cmpi_types.h"
 #include "module/cmpi/to_cimple_value.h"
 #include "module/cmpi/to_cmpi_data.h"
-#include "module/runtime/forced_unwinding.h"
-#include "module/runtime/log.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
+#include "module/runtime/system/forced_unwinding.h"
+#include "module/runtime/system/log.h"
 
 #include <cstring>
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/cmpi/Shared_Ends.h"
-#include "module/runtime/Container.h"
+#include "module/runtime/objects/Container.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -1,7 +1,7 @@
 #include "module/cmpi/CMPI_Static_Data.h"
 #include "module/cmpi/entries.h"
 #include "module/cmpi/exception_containment.h"
-#include "module/runtime/strutil.h"
+#include "module/runtime/ground/strutil.h"
 
 namespace KPRV {
 

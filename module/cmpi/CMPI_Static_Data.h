@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

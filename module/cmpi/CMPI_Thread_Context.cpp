@@ -4,9 +4,9 @@
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/cmpi_text.h"
 #include "module/cmpi/to_cimple_value.h"
-#include "module/runtime/Instance_Enumerator.h"
-#include "module/runtime/forced_unwinding.h"
-#include "module/runtime/log.h"
+#include "module/runtime/dispatch/Instance_Enumerator.h"
+#include "module/runtime/system/forced_unwinding.h"
+#include "module/runtime/system/log.h"
 
 #include <memory>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Thread_Context.h"
+#include "module/runtime/dispatch/Thread_Context.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -2,7 +2,7 @@
 #include "module/cmpi/CMPI_Containers.h"
 #include "module/cmpi/Made_Objects.h"
 #include "module/cmpi/cmpi_text.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

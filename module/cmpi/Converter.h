@@ -1,7 +1,7 @@
 #pragma once
 
-#include "module/runtime/Meta_Class.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Meta_Class.h"
+#include "module/runtime/objects/Ref.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -5,8 +5,8 @@
 #include "module/cmpi/cmpi_text.h"
 #include "module/cmpi/entries.h"
 #include "module/cmpi/status_translation.h"
-#include "module/runtime/Time.h"
-#include "module/runtime/assert.h"
+#include "module/runtime/system/Time.h"
+#include "module/runtime/system/assert.h"
 
 #include <memory>
 

@@ -1,6 +1,6 @@
 #include "module/cmpi/Nesting.h"
 
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -2,8 +2,8 @@
 
 #include "module/cmpi/CMPI_Adapter.h"
 #include "module/cmpi/CMPI_Thread_Context.h"
-#include "module/runtime/Request_Scope.h"
-#include "module/runtime/log.h"
+#include "module/runtime/dispatch/Request_Scope.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 
 #include <array>
 #include <cmpidt.h>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/cmpi/Shared_Ends.h"
-#include "module/runtime/Instance.h"
+#include "module/runtime/objects/Instance.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
 
 #include <cmpidt.h>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Value.h"
+#include "module/runtime/objects/Value.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -5,7 +5,7 @@
 #include "contracts/adapter/HbaAgentError.h"
 #include "module/cmpi/CMPI_Adapter.h"
 #include "module/cmpi/entries.h"
-#include "module/runtime/forced_unwinding.h"
+#include "module/runtime/system/forced_unwinding.h"
 
 #include <algorithm>
 #include <cmpimacs.h>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/cmpi/CMPI_Static_Data.h"
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
 
 // What stands between a server and the entries of the module, chosen by the CMake option
 // KLDR_CONTAIN_EXCEPTIONS: nothing, so that an exception goes on into the server, or a catch around each

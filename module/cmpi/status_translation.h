@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/provider_status.h"
+#include "module/runtime/dispatch/provider_status.h"
 
 #include <cmpidt.h>
 

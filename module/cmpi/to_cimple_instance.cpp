@@ -1,7 +1,7 @@
 #include "module/cmpi/to_cimple_instance.h"
 #include "module/cmpi/CMPI_Containers.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 #include <cmpimacs.h>
 

@@ -1,9 +1,9 @@
 #include "module/cmpi/to_cimple_value.h"
 #include "module/cmpi/cmpi_types.h"
 #include "module/cmpi/to_cimple_instance.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 #include <cmpimacs.h>
 

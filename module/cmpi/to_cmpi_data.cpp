@@ -3,8 +3,8 @@
 #include "module/cmpi/Made_Objects.h"
 #include "module/cmpi/Nesting.h"
 #include "module/cmpi/cmpi_types.h"
-#include "module/runtime/log.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
+#include "module/runtime/system/log.h"
 
 #include <cmpimacs.h>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "module/runtime/Class_Plan.h"
-#include "module/runtime/Meta_Repository.h"
-#include "module/runtime/Value.h"
+#include "module/runtime/objects/Class_Plan.h"
+#include "module/runtime/objects/Meta_Repository.h"
+#include "module/runtime/objects/Value.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>

@@ -4,7 +4,7 @@
 #include "module/cmpi/Converter.h"
 #include "module/cmpi/cmpi_text.h"
 #include "module/cmpi/to_cimple_value.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -2,8 +2,8 @@
 
 #include "module/adapter/Adapter_List.h"
 #include "module/model/Fresh_Instances.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 #include <algorithm>
 #include <new>

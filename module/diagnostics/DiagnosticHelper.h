@@ -2,8 +2,8 @@
 
 #include "module/diagnostics/Diagnostic_Data.h"
 #include "module/diagnostics/Diagnostic_Tests.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Mutex.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/system/Mutex.h"
 #include "module/schema/KALDERA_ConcreteJob.h"
 #include "module/schema/KALDERA_DiagnosticSoftwareIdentity.h"
 #include "module/schema/KALDERA_EthLoopbackDiagnosticTest.h"

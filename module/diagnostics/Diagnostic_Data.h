@@ -2,7 +2,7 @@
 
 #include "module/adapter/ProviderUtil.h"
 #include "module/diagnostics/Tested_Element.h"
-#include "module/runtime/Datetime.h"
+#include "module/runtime/ground/Datetime.h"
 
 namespace KPRV {
 

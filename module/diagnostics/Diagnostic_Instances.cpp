@@ -1,8 +1,8 @@
 // Of `DiagnosticHelper`, what builds one instance: a test, a job, a record, the tests' software.
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/CIM_ManagedElement.h"
 #include "module/schema/KALDERA_DiagnosticCompletionRecord.h"
 #include "module/schema/KALDERA_DiagnosticServiceRecord.h"

@@ -1,8 +1,8 @@
 // Of `DiagnosticHelper`, what publishes the jobs and records of all runs, and the associations among them.
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/model/Fresh_Instances.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/CIM_Job.h"
 #include "module/schema/CIM_ManagedElement.h"
 #include "module/schema/CIM_RecordForLog.h"

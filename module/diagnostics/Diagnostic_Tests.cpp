@@ -1,7 +1,7 @@
 #include "module/diagnostics/Diagnostic_Tests.h"
 
 #include "module/diagnostics/DiagnosticHelper.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <algorithm>
 #include <iterator>

@@ -2,9 +2,9 @@
 
 #include "module/adapter/ProviderUtil.h"
 #include "module/adapter/classId_t.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/String.h"
-#include "module/runtime/Thread.h"
+#include "module/runtime/dispatch/Thread.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/String.h"
 
 #include <span>
 

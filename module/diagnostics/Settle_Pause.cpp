@@ -1,6 +1,6 @@
 #include "module/diagnostics/Settle_Pause.h"
 
-#include "module/runtime/Time.h"
+#include "module/runtime/system/Time.h"
 
 namespace KPRV {
 

@@ -8,7 +8,7 @@
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/Json_Access.h"
 #include "module/model/PortHelper.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <cstdio>
 #include <exception>

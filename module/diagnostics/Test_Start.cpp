@@ -14,10 +14,10 @@
 
 #include "module/adapter/Json_Access.h"
 #include "module/model/PortHelper.h"
-#include "module/runtime/Module_Pin.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/Thread.h"
-#include "module/runtime/log.h"
+#include "module/runtime/dispatch/Thread.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/Module_Pin.h"
+#include "module/runtime/system/log.h"
 
 #include <atomic>
 #include <exception>

@@ -3,7 +3,7 @@
 #include "module/model/AdapterHelper.h"
 #include "module/model/EthernetPortHelper.h"
 #include "module/model/PortHelper.h"
-#include "module/runtime/Array.h"
+#include "module/runtime/ground/Array.h"
 #include "module/schema/CIM_LogicalDevice.h"
 
 #include <utility>

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "module/adapter/classId_t.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Instance.h"
 
 namespace KPRV {
 

@@ -1,5 +1,5 @@
 // The one symbol by which a server that knows the module finds its list of providers.
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
 
 namespace KPRV {
 extern const Registration* _cimple_registration_head;

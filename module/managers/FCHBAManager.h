@@ -1,10 +1,10 @@
 #pragma once
 
 #include "module/adapter/classId_t.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/String.h"
-#include "module/runtime/Wanted.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Instance.h"
+#include "module/runtime/objects/Wanted.h"
 
 #include <initializer_list>
 

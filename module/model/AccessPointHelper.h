@@ -3,8 +3,8 @@
 #include "module/adapter/classId_t.h"
 #include "module/model/Adapter_Data.h"
 #include "module/model/Logged_Life.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/objects/Instance.h"
 #include "module/schema/KALDERA_RemoteServiceAccessPoint.h"
 
 namespace KPRV {

@@ -3,7 +3,7 @@
 #include "module/adapter/Serial_Number.h"
 #include "module/model/AdapterHelper.h"
 #include "module/model/Record_Filling.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <algorithm>
 #include <strings.h>

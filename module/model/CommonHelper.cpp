@@ -3,8 +3,8 @@
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 #include <algorithm>
 #include <iterator>

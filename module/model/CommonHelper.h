@@ -2,9 +2,9 @@
 
 #include "module/adapter/classId_t.h"
 #include "module/model/Logged_Life.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/Wanted.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/objects/Instance.h"
+#include "module/runtime/objects/Wanted.h"
 #include "module/schema/KALDERA_ComputerSystem.h"
 
 namespace KPRV {

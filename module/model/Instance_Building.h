@@ -2,12 +2,12 @@
 
 #include "module/adapter/Class_Names.h"
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/Lasting_Array.h"
-#include "module/runtime/Prototype.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/Wanted.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/Lasting_Array.h"
+#include "module/runtime/objects/Instance.h"
+#include "module/runtime/objects/Prototype.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/objects/Wanted.h"
 
 #include <initializer_list>
 #include <string_view>

@@ -7,7 +7,7 @@
 #include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
 #include "module/model/PortHelper.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 
 namespace KPRV {
 

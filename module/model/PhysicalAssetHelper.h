@@ -3,9 +3,9 @@
 #include "module/adapter/classId_t.h"
 #include "module/model/Connector_Data.h"
 #include "module/model/Logged_Life.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Instance.h"
 #include "module/schema/KALDERA_PhysicalConnector.h"
 
 #include <json/value.h>

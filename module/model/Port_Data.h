@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/adapter/Host_Name.h"
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 
 #include <json/value.h>
 

@@ -3,8 +3,8 @@
 #include "module/model/Instance_Building.h"
 #include "module/model/PortHelper.h"
 #include "module/model/Port_Status.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 #include "module/schema/KALDERA_FCPortStatistics.h"
 
 #include <json/value.h>

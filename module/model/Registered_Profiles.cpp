@@ -2,7 +2,7 @@
 
 #include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/schema/KALDERA_RegisteredProfile.h"
 #include "module/schema/KALDERA_RegisteredSubProfile.h"
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Instance.h"
 
 namespace KPRV {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 
 #include <json/value.h>
 

@@ -2,9 +2,9 @@
 #include "module/alerts/Delivery_Pause.h"
 #include "module/alerts/IndicationManager.h"
 #include "module/providers/proc.h"
-#include "module/runtime/Module_Pin.h"
-#include "module/runtime/Thread.h"
-#include "module/runtime/log.h"
+#include "module/runtime/dispatch/Thread.h"
+#include "module/runtime/system/Module_Pin.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/KALDERA_AlertIndication_Skeleton.h"
 
 #include <atomic>

@@ -2,7 +2,7 @@
 #include "module/providers/deliver.h"
 #include "module/providers/managers.h"
 #include "module/providers/proc.h"
-#include "module/runtime/forced_unwinding.h"
+#include "module/runtime/system/forced_unwinding.h"
 #include "module/schema/CIM_ManagedElement.h"
 #include "module/schema/KALDERA_HBASoftwareInstallationService_Skeleton.h"
 #include "module/schema/KALDERA_PortController.h"

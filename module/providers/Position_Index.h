@@ -1,7 +1,7 @@
 #pragma once
 
-#include "module/runtime/String.h"
-#include "module/runtime/strutil.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/ground/strutil.h"
 
 #include <cstring>
 #include <string_view>

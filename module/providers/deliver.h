@@ -1,10 +1,10 @@
 #pragma once
 
-#include "module/runtime/Array.h"
-#include "module/runtime/Handler.h"
-#include "module/runtime/Ref.h"
-#include "module/runtime/log.h"
-#include "module/runtime/provider_status.h"
+#include "module/runtime/dispatch/Handler.h"
+#include "module/runtime/dispatch/provider_status.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/log.h"
 
 namespace KPRV {
 

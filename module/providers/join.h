@@ -2,8 +2,8 @@
 
 #include "module/providers/Position_Index.h"
 #include "module/providers/deliver.h"
-#include "module/runtime/Property.h"
-#include "module/runtime/Prototype.h"
+#include "module/runtime/ground/Property.h"
+#include "module/runtime/objects/Prototype.h"
 
 namespace KPRV {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Provider_Dispatch.h"
+#include "module/runtime/dispatch/Provider_Dispatch.h"
 
 /// Defines the provider proc of a class: the one line by which a provider file enters the module's
 /// registration list, which is generated from the catalogue and refers to the proc by this name.

@@ -2,8 +2,8 @@
 
 #include "module/diagnostics/DiagnosticHelper.h"
 #include "module/providers/managers.h"
-#include "module/runtime/log.h"
-#include "module/runtime/provider_status.h"
+#include "module/runtime/dispatch/provider_status.h"
+#include "module/runtime/system/log.h"
 #include "module/schema/CIM_ConcreteJob.h"
 #include "module/schema/CIM_ManagedElement.h"
 

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "module/runtime/Array.h"
-#include "module/runtime/Datetime.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/Property.h"
-#include "module/runtime/String.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/Datetime.h"
+#include "module/runtime/ground/Property.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Instance.h"
 
 // What the cells of a generated record are made of: every generated header begins here.

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "module/runtime/Handler.h"
-#include "module/runtime/Operation.h"
-#include "module/runtime/Property.h"
-#include "module/runtime/provider_status.h"
+#include "module/runtime/dispatch/Handler.h"
+#include "module/runtime/dispatch/Operation.h"
+#include "module/runtime/dispatch/provider_status.h"
+#include "module/runtime/ground/Property.h"
 
 #include <strings.h>
 

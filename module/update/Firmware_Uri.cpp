@@ -1,7 +1,7 @@
 #include "module/update/Firmware_Uri.h"
 
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 #include "module/update/Install_Failure.h"
 
 #include <string_view>

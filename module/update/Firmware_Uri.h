@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/String.h"
+#include "module/runtime/ground/String.h"
 
 namespace KPRV {
 

@@ -5,7 +5,7 @@
 #include "module/adapter/ProviderUtil.h"
 #include "module/model/Fresh_Instances.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 
 namespace KPRV {
 

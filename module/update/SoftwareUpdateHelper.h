@@ -2,8 +2,8 @@
 
 #include "module/adapter/classId_t.h"
 #include "module/model/Logged_Life.h"
-#include "module/runtime/Array.h"
-#include "module/runtime/Instance.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/objects/Instance.h"
 #include "module/schema/KALDERA_HBASoftwareInstallationService.h"
 #include "module/schema/KALDERA_HBASoftwareInstallationServiceCapabilities.h"
 #include "module/schema/KALDERA_PortController.h"

@@ -1,4 +1,4 @@
-#include "module/runtime/log.h"
+#include "module/runtime/system/log.h"
 #include "tests/bench/Figures.h"
 #include "tests/bench/Stop_Watch.h"
 

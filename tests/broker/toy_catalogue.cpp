@@ -1,6 +1,6 @@
 // The toy's classes as metadata tables. Only one of the two toy libraries has them.
-#include "module/runtime/Meta_Value.h"
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
+#include "module/runtime/objects/Meta_Value.h"
 #include "tests/broker/toy.h"
 
 namespace {

@@ -1,6 +1,6 @@
 // The classes of the small host as metadata tables, made when they are first asked for.
-#include "module/runtime/Meta_Value.h"
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
+#include "module/runtime/objects/Meta_Value.h"
 #include "tests/broker/toy.h"
 #include "tests/broker/toy_fabric.h"
 

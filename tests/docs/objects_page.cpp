@@ -1,7 +1,7 @@
 // The example of docs/design/objects.md: what the page draws is what the compiler makes of it.
 
-#include "module/runtime/Class_Plan.h"
-#include "module/runtime/Property.h"
+#include "module/runtime/ground/Property.h"
+#include "module/runtime/objects/Class_Plan.h"
 
 // Other files of the program may have an example, too.
 namespace KPRV::objects_page {

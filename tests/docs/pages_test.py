@@ -72,7 +72,7 @@ class Objects(unittest.TestCase):
 
     @staticmethod
     def pins():
-        text = read(ROOT / "module/runtime/layout.cpp")
+        text = read(ROOT / "module/runtime/objects/layout.cpp")
         found = {}
         for record, field, *sizes in re.findall(r"^PIN\(([^,]+), *(\w+), *(\d+), *(\d+)\)", text, re.M):
             found.setdefault(record, {})[field] = tuple(map(int, sizes))

@@ -6,9 +6,9 @@
 #include "module/adapter/ProviderUtil.h"
 #include "module/cmpi/cmpi_text.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Handler.h"
-#include "module/runtime/Mutex.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/dispatch/Handler.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/system/Mutex.h"
 #include "module/schema/KALDERA_FCPort.h"
 
 #include <deque>

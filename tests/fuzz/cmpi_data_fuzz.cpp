@@ -3,7 +3,7 @@
 #include "broker/Mi_Call.h"
 #include "broker/Objects.h"
 #include "module/cmpi/to_cimple_instance.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/fuzz/Bytes.h"
 #include "tests/fuzz/Fuzz_Target.h"
 #include "tests/fuzz/Product_Classes.h"

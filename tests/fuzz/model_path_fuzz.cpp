@@ -1,6 +1,6 @@
 // Any text as the name of an object: what reads reads the same once it is written, if it is.
-#include "module/runtime/Model_Path.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Model_Path.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/fuzz/Bytes.h"
 #include "tests/fuzz/Fuzz_Target.h"
 #include "tests/fuzz/Product_Classes.h"

@@ -1,6 +1,6 @@
 // Any text as a number of each type: what reads is written back as a text that reads as the same number, and
 // what does not read leaves the value alone.
-#include "module/runtime/number_text.h"
+#include "module/runtime/text/number_text.h"
 #include "tests/fuzz/Fuzz_Target.h"
 
 #include <string>

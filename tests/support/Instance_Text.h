@@ -1,9 +1,9 @@
 #pragma once
 
-#include "module/runtime/Array.h"
-#include "module/runtime/Datetime.h"
-#include "module/runtime/Instance.h"
-#include "module/runtime/features.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/Datetime.h"
+#include "module/runtime/objects/Instance.h"
+#include "module/runtime/objects/features.h"
 
 #include <map>
 #include <stdexcept>

@@ -115,7 +115,7 @@ class Equivalents(unittest.TestCase):
 
 class Drawing(unittest.TestCase):
     def draw(self, seed, count=40):
-        drawing = mutate.drawn(mutate.mutants_of(mutate.ROOT, ("module/runtime/String.cpp", 0)), seed)
+        drawing = mutate.drawn(mutate.mutants_of(mutate.ROOT, ("module/runtime/ground/String.cpp", 0)), seed)
         return [str(next(drawing)) for _ in range(count)]
 
     def test_a_seed_says_all(self):

@@ -1,4 +1,4 @@
-"""The flag word: the bits of module/runtime/flags.h, by name."""
+"""The flag word: the bits of module/runtime/text/flags.h, by name."""
 
 NAMES = (
     "Property Reference Method Class Abstract Aggregate Aggregation Association Composition Counter Delete DN "

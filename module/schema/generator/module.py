@@ -51,7 +51,7 @@ static bool link_record(Registration& record, const char* name, Provider_Proc pr
 
 def registration(providers):
     names = [class_.name for class_, _ in providers]
-    includes = ["module/schema/module_registration.h", "module/runtime/version.h", *(f"module/schema/{name}.h" for name in names)]
+    includes = ["module/schema/module_registration.h", "module/runtime/dispatch/version.h", *(f"module/schema/{name}.h" for name in names)]
     body = [
         f'const char _cimple_module_name[] = "{MODULE}";',
         REGISTRATION,
@@ -65,8 +65,8 @@ def registration(providers):
 def factories(providers):
     includes = [
         "module/cmpi/exception_containment.h",
-        "module/runtime/Registration.h",
-        "module/runtime/version.h",
+        "module/runtime/dispatch/Registration.h",
+        "module/runtime/dispatch/version.h",
     ]
     names = [class_.name for class_, _ in providers]
     body = [f"extern Registration _cimple_registration_{name}_Provider;" for name in names]

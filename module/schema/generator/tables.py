@@ -128,7 +128,7 @@ def repository_symbol(classes):
 def emit(classes, output):
     repository = repository_symbol(classes)
     # The version's header makes a runtime of another version a link error.
-    includes = ["module/runtime/Meta_Class.h", "module/runtime/version.h"]
+    includes = ["module/runtime/objects/Meta_Class.h", "module/runtime/dispatch/version.h"]
     for class_ in classes:
         includes.append(f"module/schema/{class_.name}.h")
         if any(class_.owns(method) for method in class_.methods):

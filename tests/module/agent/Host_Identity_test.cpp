@@ -1,7 +1,7 @@
 #include "module/agent/ProviderDiscoveryMethods.h"
 #include "module/schema/CIM_ComputerSystem.h"
 #include "tests/module/agent/Agent_Fixture.h"
-#include "tests/module/runtime/Recording_Context.h"
+#include "tests/module/runtime/dispatch/Recording_Context.h"
 
 namespace KPRV {
 namespace {

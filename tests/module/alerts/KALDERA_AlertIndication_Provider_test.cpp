@@ -3,8 +3,8 @@
 #include "tests/module/alerts/Event_Fixture.h"
 #include "tests/support/Eventually.h"
 
-#include "module/runtime/Provider_Handle.h"
-#include "module/runtime/provider_status.h"
+#include "module/runtime/dispatch/Provider_Handle.h"
+#include "module/runtime/dispatch/provider_status.h"
 #include "tests/support/Driver_Status_Override.h"
 
 #include <algorithm>

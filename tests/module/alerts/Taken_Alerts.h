@@ -1,7 +1,7 @@
 #pragma once
 
 #include "module/alerts/IndicationHelper.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/support/Instance_Text.h"
 
 #include <vector>

@@ -1,6 +1,6 @@
 #include "module/cmpi/CMPI_Thread_Context.h"
-#include "module/runtime/Thread.h"
-#include "module/runtime/cimom.h"
+#include "module/runtime/dispatch/Thread.h"
+#include "module/runtime/dispatch/cimom.h"
 #include "tests/module/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
 

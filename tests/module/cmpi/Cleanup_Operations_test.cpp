@@ -1,4 +1,4 @@
-#include "module/runtime/cimom.h"
+#include "module/runtime/dispatch/cimom.h"
 #include "tests/module/cmpi/Test_Server.h"
 
 using namespace KPRV;

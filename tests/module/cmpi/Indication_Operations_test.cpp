@@ -1,5 +1,5 @@
-#include "module/runtime/Thread.h"
-#include "module/runtime/Time.h"
+#include "module/runtime/dispatch/Thread.h"
+#include "module/runtime/system/Time.h"
 #include "tests/module/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
 

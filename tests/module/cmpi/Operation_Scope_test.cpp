@@ -1,5 +1,5 @@
 #include "module/cmpi/Operation_Scope.h"
-#include "module/runtime/cimom.h"
+#include "module/runtime/dispatch/cimom.h"
 #include "tests/module/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
 

@@ -3,7 +3,7 @@
 // One more class by hand, with what only the server's side makes interesting: keys of several widths,
 // references that are not embedded, and methods of unusual shape. It is a provider's class of its own.
 
-#include "tests/module/runtime/Scripted_Provider.h"
+#include "tests/module/runtime/dispatch/Scripted_Provider.h"
 
 namespace KPRV {
 

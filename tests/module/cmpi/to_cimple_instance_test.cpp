@@ -1,5 +1,5 @@
 #include "module/cmpi/to_cimple_instance.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/module/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"
 

@@ -1,6 +1,6 @@
 #include "module/cmpi/cmpi_types.h"
 #include "module/cmpi/to_cimple_value.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
 #include "tests/module/cmpi/Fake_Objects.h"
 #include "tests/module/cmpi/Plain_Samples.h"
 #include "tests/module/cmpi/Test_Server.h"

@@ -1,6 +1,6 @@
 #include "module/cmpi/cmpi_types.h"
 #include "module/cmpi/to_cmpi_data.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
 #include "tests/module/cmpi/Plain_Samples.h"
 #include "tests/module/cmpi/Test_Server.h"
 #include "tests/support/Log_Capture.h"

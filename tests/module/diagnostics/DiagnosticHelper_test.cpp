@@ -1,5 +1,5 @@
 #include "module/diagnostics/DiagnosticHelper.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/schema/KALDERA_AffectedJobElement.h"
 #include "module/schema/KALDERA_CompletionRecordAppliesToElement.h"
 #include "module/schema/KALDERA_DiagnosticCompletionRecord.h"

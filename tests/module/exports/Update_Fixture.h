@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 #include "tests/module/exports/Module_Fixture.h"
 #include "tests/support/Working_Folder.h"
 

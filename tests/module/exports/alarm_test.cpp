@@ -1,5 +1,5 @@
 #include "broker/values/Value_Text.h"
-#include "module/runtime/Types.h"
+#include "module/runtime/ground/Types.h"
 #include "tests/module/exports/Module_Fixture.h"
 
 #include <sstream>

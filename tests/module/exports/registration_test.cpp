@@ -1,6 +1,6 @@
-#include "module/runtime/Handler.h"
-#include "module/runtime/Operation.h"
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Handler.h"
+#include "module/runtime/dispatch/Operation.h"
+#include "module/runtime/dispatch/Registration.h"
 #include "tests/module/exports/Module_Fixture.h"
 
 #include <algorithm>

@@ -1,4 +1,4 @@
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
 #include "tests/module/exports/Module_Fixture.h"
 
 #include <dlfcn.h>

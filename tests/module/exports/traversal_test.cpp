@@ -1,5 +1,5 @@
 #include "broker/values/Value_Text.h"
-#include "module/runtime/Registration.h"
+#include "module/runtime/dispatch/Registration.h"
 #include "tests/module/exports/Module_Fixture.h"
 
 #include <algorithm>

@@ -6,7 +6,7 @@
 #include "tests/support/Log_Capture.h"
 
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/Instance.h"
+#include "module/runtime/objects/Instance.h"
 
 #include <gtest/gtest.h>
 

@@ -2,7 +2,7 @@
 
 #include "module/schema/CIM_ObjectManager.h"
 #include "tests/module/model/Taken_Instances.h"
-#include "tests/module/runtime/Recording_Context.h"
+#include "tests/module/runtime/dispatch/Recording_Context.h"
 #include "tests/support/Fixed_Host.h"
 
 #include <gtest/gtest.h>

@@ -2,7 +2,7 @@
 
 #include "module/model/AdapterHelper.h"
 #include "module/model/Fresh_Instances.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Fixed_Host.h"
 #include "tests/support/Instance_Text.h"

@@ -2,7 +2,7 @@
 #include "module/model/Record_Filling.h"
 
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/support/Instance_Text.h"
 #include "tests/support/Log_Capture.h"
 

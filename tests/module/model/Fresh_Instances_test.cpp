@@ -1,7 +1,7 @@
 #include "module/model/Fresh_Instances.h"
 
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/schema/KALDERA_PortController.h"
 #include "tests/support/Instance_Text.h"
 

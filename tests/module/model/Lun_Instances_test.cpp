@@ -1,6 +1,6 @@
 #include "module/model/Record_Filling.h"
 #include "module/model/TargetHelper.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/module/model/Taken_Instances.h"
 #include "tests/support/Log_Capture.h"
 

@@ -3,7 +3,7 @@
 #include "tests/support/Instance_Text.h"
 #include "tests/support/Log_Lines.h"
 
-#include "module/runtime/Array.h"
+#include "module/runtime/ground/Array.h"
 
 #include <vector>
 

@@ -1,5 +1,5 @@
 #include "module/adapter/ProviderUtil.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/module/model/Port_Fixture.h"
 
 using namespace KPRV;

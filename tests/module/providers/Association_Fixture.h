@@ -6,10 +6,10 @@
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Log_Capture.h"
 
-#include "module/runtime/Handler.h"
-#include "module/runtime/Meta_Property.h"
-#include "module/runtime/Operation.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/dispatch/Handler.h"
+#include "module/runtime/dispatch/Operation.h"
+#include "module/runtime/objects/Meta_Property.h"
+#include "module/runtime/objects/Ref.h"
 
 #include <gtest/gtest.h>
 

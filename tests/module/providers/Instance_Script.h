@@ -1,10 +1,10 @@
 #pragma once
 
-#include "module/runtime/Array.h"
-#include "module/runtime/Meta_Repository.h"
-#include "module/runtime/Registration.h"
-#include "module/runtime/String.h"
-#include "module/runtime/features.h"
+#include "module/runtime/dispatch/Registration.h"
+#include "module/runtime/ground/Array.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/objects/Meta_Repository.h"
+#include "module/runtime/objects/features.h"
 
 #include <cstdlib>
 #include <sstream>

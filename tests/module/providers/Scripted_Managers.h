@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Instance.h"
+#include "module/runtime/objects/Instance.h"
 
 #include <map>
 #include <string>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "module/runtime/Meta_Class.h"
+#include "module/runtime/objects/Meta_Class.h"
 
 #include <string>
 #include <vector>

@@ -1,9 +1,9 @@
 // Names of the instances of every class of the catalogue, there and back.
-#include "module/runtime/Model_Path.h"
+#include "module/runtime/objects/Model_Path.h"
 
-#include "module/runtime/Ref.h"
-#include "module/runtime/features.h"
-#include "module/runtime/type_dispatch.h"
+#include "module/runtime/ground/type_dispatch.h"
+#include "module/runtime/objects/Ref.h"
+#include "module/runtime/objects/features.h"
 #include "tests/module/schema/Catalogue_View.h"
 
 #include <gtest/gtest.h>

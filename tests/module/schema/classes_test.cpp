@@ -1,6 +1,6 @@
 #include "tests/module/schema/Catalogue_View.h"
 
-#include "module/runtime/Instance.h"
+#include "module/runtime/objects/Instance.h"
 
 #include <gtest/gtest.h>
 #include <set>

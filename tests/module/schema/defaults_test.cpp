@@ -1,6 +1,6 @@
 #include "tests/module/schema/Catalogue_View.h"
 
-#include "module/runtime/Datetime.h"
+#include "module/runtime/ground/Datetime.h"
 #include "module/schema/KALDERA_LogicalDisk.h"
 #include "module/schema/KALDERA_StorageExtent.h"
 

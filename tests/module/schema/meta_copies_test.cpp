@@ -1,9 +1,9 @@
 // The catalogue's tables as data: every class can be copied, compared and shown.
 #include "tests/module/schema/Catalogue_View.h"
 
-#include "module/runtime/meta_clone.h"
-#include "module/runtime/meta_identical.h"
-#include "module/runtime/print_meta_class.h"
+#include "module/runtime/objects/meta_clone.h"
+#include "module/runtime/objects/meta_identical.h"
+#include "module/runtime/objects/print_meta_class.h"
 
 #include <cstdlib>
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
 #include "tests/module/schema/Catalogue_View.h"
 
-#include "module/runtime/Provider_Dispatch.h"
+#include "module/runtime/dispatch/Provider_Dispatch.h"
 #include "module/schema/KALDERA_AgentService_Skeleton.h"
 #include "module/schema/KALDERA_AlertIndication_Skeleton.h"
 #include "module/schema/KALDERA_ConcreteJob_Skeleton.h"

@@ -2,7 +2,7 @@
 
 #include "module/adapter/Json_Access.h"
 #include "module/model/Instance_Building.h"
-#include "module/runtime/Ref.h"
+#include "module/runtime/objects/Ref.h"
 #include "tests/module/model/Taken_Instances.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Fixed_Host.h"

@@ -1,3 +1,0 @@
-#include "module/runtime/version.h"
-
-extern "C" const int __cimple_version_2_0_16 = 0x02000010;

@@ -1,8 +1,0 @@
-#include "module/runtime/version.h"
-
-#include <gtest/gtest.h>
-
-TEST(version, EverySourceThatIncludesItRefersToTheSymbol)
-{
-    EXPECT_EQ(KPRV::__cimple_version_symbol, &__cimple_version_2_0_16);
-}
