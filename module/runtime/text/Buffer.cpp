@@ -48,7 +48,7 @@ const char* Buffer::data() const
 }
 
 /// A size as a buffer holds it. Beyond, `std::bad_alloc`, as for every size for which there is no memory.
-static uint32 checked(uint64 n)
+static uint32 buffer_size(uint64 n)
 {
     // The terminator must have its place too.
     if (n >= NPOS)
@@ -72,7 +72,7 @@ void Buffer::_reserve_aux(uint32 n)
 
 void Buffer::_append_aux()
 {
-    reserve(_cap == 0 ? LEAST_CAPACITY : checked(2 * uint64(_cap)));
+    reserve(_cap == 0 ? LEAST_CAPACITY : buffer_size(2 * uint64(_cap)));
 }
 
 void Buffer::insert(uint32 pos, const char* data, size_t n)
@@ -80,7 +80,7 @@ void Buffer::insert(uint32 pos, const char* data, size_t n)
     if (n == 0)
         return;
     pos = std::min(pos, _size);
-    const uint32 size = checked(uint64(_size) + n);
+    const uint32 size = buffer_size(uint64(_size) + n);
     if (size > _cap)
         _reserve_aux(size);
     memmove(_data + pos + n, _data + pos, _size - pos);
@@ -129,7 +129,7 @@ uint32 Buffer::vformat(const char* format, va_list arguments)
     // ends somewhere.
     constexpr uint32 GIVE_UP = 1u << 20;
     for (uint32 room = 128;;) {
-        _reserve_aux(checked(uint64(_size) + room));
+        _reserve_aux(buffer_size(uint64(_size) + room));
         va_list copy;
         va_copy(copy, arguments);
         const int n = vsnprintf(_data + _size, room, format, copy);
