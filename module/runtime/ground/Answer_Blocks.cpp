@@ -62,8 +62,13 @@ struct Answer_Blocks::Piece
         free(former);
     }
 
-    /// What stands in front of a block, where nobody else may look.
-    [[gnu::no_sanitize_address]] static Piece*& of(void* block) { return static_cast<Piece**>(block)[-1]; }
+    // What stands in front of a block, where nobody else may look.
+
+    [[gnu::no_sanitize_address]] static Piece* of(void* block) { return static_cast<Piece**>(block)[-1]; }
+    [[gnu::no_sanitize_address]] static void mark(void* block, Piece* piece)
+    {
+        static_cast<Piece**>(block)[-1] = piece;
+    }
 };
 
 Answer_Blocks::Answer_Blocks() : _outermost(!current)
@@ -109,7 +114,7 @@ void* Answer_Blocks::cut(size_t size)
     _left -= taken;
     _cut++;
     ASAN_UNPOISON_MEMORY_REGION(block, size);
-    Piece::of(block) = _piece;
+    Piece::mark(block, _piece);
     return block;
 }
 
@@ -135,7 +140,7 @@ void* take_block(size_t size)
     if (current && size <= MOST)
         return current->cut(size);
     void* const block = behind_word(allocate(nullptr, size));
-    Answer_Blocks::Piece::of(block) = nullptr;
+    Answer_Blocks::Piece::mark(block, nullptr);
     return block;
 }
 
