@@ -23,7 +23,7 @@ namespace {
 constexpr size_t WORD = sizeof(void*);
 constexpr size_t FIRST_PIECE = 4096, LAST_PIECE = 32768;
 /// Larger blocks are allocations of their own, so that little of a piece is left over.
-constexpr size_t MOST = 2048;
+constexpr size_t LARGEST_CUT = 2048;
 
 constinit thread_local Answer_Blocks* current = nullptr;
 
@@ -137,7 +137,7 @@ static void* before_word(void* block)
 
 void* take_block(size_t size)
 {
-    if (current && size <= MOST)
+    if (current && size <= LARGEST_CUT)
         return current->cut(size);
     void* const block = behind_word(allocate(nullptr, size));
     Answer_Blocks::Piece::mark(block, nullptr);
