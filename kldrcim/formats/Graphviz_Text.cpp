@@ -84,7 +84,7 @@ public:
         for (const Number root : _topology.roots)
             walk(root, 0);
         for (const Number node : _met)
-            put("  " + name_of(node) + " [" + _topology.nodes[node].text + "];\n");
+            put("  " + name_of(node) + " [" + std::string(_topology.nodes[node].text) + "];\n");
         for (const Edge& edge : _edges)
             put_edge(edge);
         for (const Topology::Step_Links& each : _topology.steps)

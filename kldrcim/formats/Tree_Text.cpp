@@ -64,7 +64,7 @@ private:
 };
 
 /// The lines behind the first moved to the right.
-std::string moved(const std::string& lines, unsigned indent)
+std::string moved(std::string_view lines, unsigned indent)
 {
     std::string text;
     for (const char c : lines) {

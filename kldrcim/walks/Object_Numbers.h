@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/values/Plain_Value.h"
+#include "broker/values/Path_Digest.h"
 
 #include <unordered_map>
 
@@ -8,7 +8,8 @@ namespace KPRV::kldrcim {
 
 using namespace broker;
 
-/// Numbers for objects, from 0 on: whoever holds many of them in many places holds each identity once.
+/// Numbers for objects, from 0 on: whoever holds many of them in many places holds each identity once, as a
+/// digest.
 class Object_Numbers
 {
 public:
@@ -24,7 +25,7 @@ public:
     const std::string& class_name(Number number) const { return _classes[_class_of[number]]; }
 
 private:
-    std::unordered_map<std::string, Number> _numbers;
+    std::unordered_map<Path_Digest, Number> _numbers;
     std::vector<std::uint16_t> _class_of;
     std::vector<std::string> _classes;
 };

@@ -114,7 +114,7 @@ public:
             [&](const Path_Value& path, const Instance_Value* system) {
                 const Number number = _numbers.of(path);
                 meet(number, Node_Kind::SYSTEM);
-                _topology.nodes[number].text = _options.text_of(Node_Kind::SYSTEM, *system);
+                say(number, *system);
                 _topology.roots.push_back(number);
             });
         for (const Topology_Step* step = topology_steps; step->association; ++step)
@@ -171,6 +171,12 @@ private:
         Topology::Node& node = _topology.nodes[number];
         if (!node.is_met)
             node = {kind, true, {}};
+    }
+
+    void say(Number number, const Instance_Value& instance)
+    {
+        Topology::Node& node = _topology.nodes[number];
+        node.text = _topology.texts.keep(_options.text_of(node.kind, instance));
     }
 
     /// False for an adapter or port that is not the one that was named.
@@ -263,7 +269,7 @@ private:
             meet(number, Node_Kind::UNITS);
             const Instance_Value units = {
                 .properties = {{"Count", Plain_Value::unsigned_number(CMPI_uint64, next - i)}}};
-            _topology.nodes[number].text = _options.text_of(Node_Kind::UNITS, units);
+            say(number, units);
             result.push_back({links[i].from, links[i].above, number});
         }
         return result;
@@ -307,7 +313,7 @@ private:
         if (number >= _topology.nodes.size() || !_topology.nodes[number].is_met ||
             !_topology.nodes[number].text.empty())
             return;
-        _topology.nodes[number].text = _options.text_of(_topology.nodes[number].kind, instance);
+        say(number, instance);
         if (_options.merge_units && _topology.nodes[number].kind == Node_Kind::UNIT)
             if (const std::string identifier = unit_identifier(instance); !identifier.empty())
                 _units[identifier].push_back(number);

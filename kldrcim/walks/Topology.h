@@ -1,6 +1,7 @@
 #pragma once
 
 #include "kldrcim/connection/Connection.h"
+#include "kldrcim/walks/Text_Pool.h"
 #include "kldrcim/walks/Topology_Plan.h"
 
 #include <functional>
@@ -21,7 +22,8 @@ struct Topology
     {
         Node_Kind kind = Node_Kind::SYSTEM;
         bool is_met = false;
-        std::string text = {};
+        /// Among `texts`.
+        std::string_view text = {};
     };
 
     /// From a node to one below it. Where the step looks at the node above the start, `above` is that node.
@@ -44,6 +46,7 @@ struct Topology
     std::vector<Number> below(const Step_Links& step, Number node, Number above) const;
 
     std::vector<Node> nodes;
+    Text_Pool texts;
     /// In the order of the plan.
     std::vector<Step_Links> steps;
     /// Computer systems: one, as long as the module is right.

@@ -78,7 +78,7 @@ TEST_F(Block_Memory_Test, WithoutABoundAllLieInMemory)
 TEST_F(Block_Memory_Test, BeyondTheBoundTheyLieInAFileAndFewOfThemAreHere)
 {
     Block_Memory memory(4 * size);
-    const std::size_t before = resident();
+    [[maybe_unused]] const std::size_t before = resident();
     take(memory, 80);
     EXPECT_EQ(76 * size, memory.in_file());
     EXPECT_EQ(8, std::ranges::count_if(blocks, [](const auto& block) { return block.is_here.load(); }));

@@ -1,15 +1,18 @@
 #include "broker/values/Path_Identity.h"
 
+#include "broker/values/Path_Digest.h"
+
 #include "tests/broker/Toy_Server.h"
 
 namespace KPRV::broker {
 namespace {
 
-/// The identity and `same_object` must always agree.
+/// The identity, its digest and `same_object` must always agree.
 void expect_same(bool same, const Path_Value& a, const Path_Value& b)
 {
     EXPECT_EQ(same, same_object(a, b));
     EXPECT_EQ(same, path_identity(a) == path_identity(b)) << path_identity(a) << "\n" << path_identity(b);
+    EXPECT_EQ(same, path_digest(a) == path_digest(b)) << path_identity(a) << "\n" << path_identity(b);
 }
 
 Path_Value keyed(Plain_Value value)
