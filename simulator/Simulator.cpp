@@ -4,6 +4,7 @@
 #include "simulator/Event_Reader.h"
 #include "simulator/Hardware_Tests.h"
 
+#include <charconv>
 #include <cstdio>
 #include <cstdlib>
 #include <thread>
@@ -14,6 +15,16 @@ namespace {
 
 constexpr const char* inventory_variable = "KLDR_SIMULATOR_INVENTORY";
 constexpr const char* events_variable = "KLDR_SIMULATOR_EVENTS";
+constexpr const char* calls_variable = "KLDR_SIMULATOR_CALLS";
+
+std::size_t number_of(const char* variable, const std::string& text)
+{
+    std::size_t number = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    if (error != std::errc() || end != text.data() + text.size())
+        throw Refused(std::string(variable) + ": \"" + text + "\" is no number");
+    return number;
+}
 
 } // namespace
 
@@ -89,6 +100,8 @@ void Simulator::load_from_environment()
     _faults.clear();
     events().set_script({});
     try {
+        if (const char* most = std::getenv(calls_variable))
+            _recorder.keep(number_of(calls_variable, most));
         if (const char* path = std::getenv(inventory_variable))
             put_in_place(Json_Text::of_file(path));
         if (const char* path = std::getenv(events_variable)) {

@@ -1,4 +1,5 @@
 #include "tests/simulator/Simulator_Fixture.h"
+#include "tests/support/Temp_Folder.h"
 
 #include <sstream>
 
@@ -55,6 +56,24 @@ TEST_F(Life_test, TheEnvironmentNamesTheInventoryAnewAfterEachGoodbye)
     EXPECT_EQ(adapters(), 1u);
     integer("free_hba_lib");
     EXPECT_EQ(adapters(), 2u);
+}
+
+TEST_F(Life_test, TheEnvironmentSaysHowManyCallsAreRemembered)
+{
+    {
+        const Environment_Override calls("KLDR_SIMULATOR_CALLS", "2");
+        integer("free_hba_lib");
+        for (int number = 0; number < 5; ++number)
+            integer("getRequestID");
+        EXPECT_EQ(simulator.calls().size(), 2u);
+    }
+    const Environment_Override calls("KLDR_SIMULATOR_CALLS", "2 or so");
+    integer("free_hba_lib");
+    testing::internal::CaptureStderr();
+    call("init_hba_lib", "{'appId': 2}");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(),
+              "simulator: KLDR_SIMULATOR_CALLS: \"2 or so\" is no number\n");
+    simulator.keep_calls(65536);
 }
 
 TEST_F(Life_test, AnInventoryThatATestGaveOutlivesTheGoodbye)
