@@ -127,8 +127,8 @@ TEST(Answer_Blocks, AnAnswerWithinAnAnswerIsPartOfIt)
         second = take_block(8);
     }
     void* const third = take_block(8);
-    EXPECT_EQ(2 * sizeof(void*), distance(first, second));
-    EXPECT_EQ(2 * sizeof(void*), distance(second, third));
+    EXPECT_EQ(sizeof(void*) + 8, distance(first, second));
+    EXPECT_EQ(sizeof(void*) + 8, distance(second, third));
     for (void* block : {first, second, third})
         give_block(block);
 }
