@@ -69,6 +69,16 @@ def kinds_of_requests(host):
     ]
 
 
+def processor_seconds(process):
+    with open(f"/proc/{process}/stat", encoding="utf-8") as file:
+        fields = file.read().rpartition(")")[2].split()
+    return (int(fields[11]) + int(fields[12])) / os.sysconf("SC_CLK_TCK")
+
+
+def in_milliseconds(seconds):
+    return ", ".join(f"{each * 1e3:.0f}" for each in seconds) + " ms"
+
+
 class Client(threading.Thread):
     """Has a connection of its own."""
 
@@ -125,16 +135,17 @@ class Memory(Serving_Case):
 
 class Start(unittest.TestCase):
     def test_the_first_answer(self):
-        seconds = []
+        """Its time is told; what counts is the processor's, since the machine may be at something else, too."""
+        waited, worked = [], []
         for _ in range(5):
             begin = time.monotonic()
             served = Served()
             served.call("EnumerateInstances", class_parameter("ClassName", "KALDERA_FCPort"))
-            seconds.append(time.monotonic() - begin)
+            waited.append(time.monotonic() - begin)
+            worked.append(processor_seconds(served.process.pid))
             self.assertEqual(served.stop(), 0)
-        print(f"first answer after {', '.join(f'{each * 1e3:.0f}' for each in seconds)} ms")
-        # The machine may be at something else, too.
-        self.assertLess(min(seconds), PATIENCE if SANITIZED else FIRST_ANSWER, seconds)
+        print(f"first answer after {in_milliseconds(waited)}, of the processor {in_milliseconds(worked)}")
+        self.assertLess(min(worked), PATIENCE if SANITIZED else FIRST_ANSWER, worked)
 
 
 if __name__ == "__main__":
