@@ -2,10 +2,10 @@
 """Scrapes a fleet of `kldrcim serve` processes on this machine, each with a generated host of its own, with a real Prometheus, and
 prints a table.
 
-usage: fleet.py BUILD OUTPUT [--hosts N] [--seconds N] [--small]
+usage: fleet.py BUILD OUTPUT [--hosts N] [--seconds N] [--interval N] [--small]
 
 BUILD is the folder with kldrcim and the simulator; the rows are also written to OUTPUT. What Prometheus says of its scrapes is its own
-`scrape_duration_seconds`, every five seconds; the first scrape of a host, by which the module looks at it for the first time, is
+`scrape_duration_seconds`, at each interval; the first scrape of a host, by which the module looks at it for the first time, is
 asked for before. Memory is that of the processes that serve, at its most, and of which no other process has a part.
 """
 
@@ -32,7 +32,6 @@ HOSTS = [
     ("4 adapters, 8 ports, 64 targets", ("--adapters", "4", "--ports", "2", "--targets", "8", "--luns", "32")),
     ("4 adapters, 16 ports, 512 targets", ("--adapters", "4", "--ports", "4", "--targets", "32", "--luns", "32")),
 ]
-INTERVAL = 5
 KILOBYTE, MEGABYTE = 1 << 10, 1 << 20
 
 
@@ -79,12 +78,12 @@ class Host:
 class Prometheus:
     """A real one, on loopback, that scrapes all hosts."""
 
-    def __init__(self, folder, targets):
+    def __init__(self, folder, targets, interval):
         with contextlib.closing(socket.socket()) as one:
             one.bind(("127.0.0.1", 0))
             port = one.getsockname()[1]
         (folder / "prometheus.yml").write_text(json.dumps({
-            "global": {"scrape_interval": f"{INTERVAL}s", "scrape_timeout": f"{INTERVAL}s"},
+            "global": {"scrape_interval": f"{interval}s", "scrape_timeout": f"{interval}s"},
             "scrape_configs": [{"job_name": "fleet", "static_configs": [{"targets": targets}]}],
         }), encoding="utf-8")
         self.log = open(folder / "prometheus.log", "wb")
@@ -109,14 +108,15 @@ class Prometheus:
 
 
 def wait_for(condition, what):
-    for _ in range(600):
+    for _ in range(1800):
         if condition():
             return
         time.sleep(0.1)
     sys.exit(f"fleet.py: {what}")
 
 
-def measure(build, arguments, hosts, seconds):
+def measure(build, arguments, options):
+    hosts = options.hosts
     with contextlib.ExitStack() as stack:
         folder = pathlib.Path(stack.enter_context(tempfile.TemporaryDirectory()))
         fleet = []
@@ -124,11 +124,11 @@ def measure(build, arguments, hosts, seconds):
             fleet.append(Host(build, folder / str(number), arguments, number))
             stack.callback(fleet[-1].stop)
         first = [host.scrape() for host in fleet]
-        prometheus = Prometheus(folder, [host.target for host in fleet])
+        prometheus = Prometheus(folder, [host.target for host in fleet], options.interval)
         stack.callback(prometheus.stop)
         wait_for(lambda: sum(prometheus.values("up")) == hosts, "Prometheus does not reach all hosts")
-        time.sleep(seconds)
-        times = prometheus.values(f"scrape_duration_seconds[{seconds + INTERVAL}s]")
+        time.sleep(options.seconds)
+        times = prometheus.values(f"scrape_duration_seconds[{options.seconds}s]")
         failed = prometheus.values("count_over_time(up[1h]) - sum_over_time(up[1h])")
         samples = prometheus.values("scrape_samples_scraped")
         memory = [host.memory() for host in fleet]
@@ -151,13 +151,14 @@ def main():
     parser.add_argument("build", type=pathlib.Path)
     parser.add_argument("output", type=pathlib.Path)
     parser.add_argument("--hosts", type=int, default=50)
-    parser.add_argument("--seconds", type=int, default=30)
+    parser.add_argument("--seconds", type=int, default=60)
+    parser.add_argument("--interval", type=int, default=15)
     parser.add_argument("--small", action="store_true", help="the smallest host only")
     options = parser.parse_args()
-    rows = [
-        {f"{options.hosts} hosts, each of": name} | measure(options.build.resolve(), arguments, options.hosts, options.seconds)
-        for name, arguments in HOSTS[:1 if options.small else None]
-    ]
+    rows = []
+    for name, arguments in HOSTS[:1 if options.small else None]:
+        rows.append({f"{options.hosts} hosts, each of": name} | measure(options.build.resolve(), arguments, options))
+        print(json.dumps(rows[-1]), file=sys.stderr, flush=True)
     print_table(rows)
     options.output.write_text(json.dumps({"rows": rows}, indent=2) + "\n", encoding="utf-8")
 
