@@ -1,10 +1,7 @@
 #include "module/runtime/ground/Answer_Blocks.h"
 
-#include "module/runtime/ground/allocated.h"
-
 #include <algorithm>
 #include <atomic>
-#include <cstdlib>
 #include <cstring>
 #include <limits>
 #include <new>
@@ -33,7 +30,7 @@ constinit std::atomic<void*> spare = nullptr;
 /// After whatever gives blocks back when the library goes.
 [[gnu::destructor(101)]] void free_spare()
 {
-    free(spare.exchange(nullptr));
+    ::operator delete(spare.exchange(nullptr));
 }
 
 } // namespace
@@ -49,7 +46,7 @@ struct Answer_Blocks::Piece
     static Piece* make(size_t size)
     {
         void* room = size == FIRST_PIECE ? spare.exchange(nullptr, std::memory_order_acquire) : nullptr;
-        return new (room ? room : allocated(malloc(size))) Piece{0, size};
+        return new (room ? room : ::operator new(size)) Piece{0, size};
     }
 
     /// That many more are out, or fewer; with the last one it goes.
@@ -59,7 +56,7 @@ struct Answer_Blocks::Piece
             return;
         ASAN_UNPOISON_MEMORY_REGION(begin(), size - sizeof *this);
         void* const former = size == FIRST_PIECE ? spare.exchange(this, std::memory_order_acq_rel) : this;
-        free(former);
+        ::operator delete(former);
     }
 
     // What stands in front of a block, where nobody else may look.
@@ -118,28 +115,19 @@ void* Answer_Blocks::cut(size_t size)
     return block;
 }
 
-/// An allocation with a word more than is asked for; `former` null for a new one.
-static void* allocate(void* former, size_t size)
+/// An allocation with a word more than is asked for, behind that word.
+static void* allocate(size_t size)
 {
-    const bool fits = size <= std::numeric_limits<size_t>::max() - WORD;
-    return allocated(fits ? realloc(former, WORD + size) : nullptr);
-}
-
-static void* behind_word(void* allocation)
-{
-    return static_cast<char*>(allocation) + WORD;
-}
-
-static void* before_word(void* block)
-{
-    return static_cast<char*>(block) - WORD;
+    if (size > std::numeric_limits<size_t>::max() - WORD)
+        throw std::bad_alloc();
+    return static_cast<char*>(::operator new(WORD + size)) + WORD;
 }
 
 void* take_block(size_t size)
 {
     if (current && size <= LARGEST_CUT)
         return current->cut(size);
-    void* const block = behind_word(allocate(nullptr, size));
+    void* const block = allocate(size);
     Answer_Blocks::Piece::mark(block, nullptr);
     return block;
 }
@@ -148,7 +136,7 @@ void give_block(void* block) noexcept
 {
     Answer_Blocks::Piece* const piece = Answer_Blocks::Piece::of(block);
     if (!piece) {
-        free(before_word(block));
+        ::operator delete(static_cast<char*>(block) - WORD);
         return;
     }
     ASAN_POISON_MEMORY_REGION(block, WORD);
@@ -157,8 +145,6 @@ void give_block(void* block) noexcept
 
 void* resize_block(void* block, size_t former_size, size_t size)
 {
-    if (!Answer_Blocks::Piece::of(block))
-        return behind_word(allocate(before_word(block), size));
     void* const other = take_block(size);
     memcpy(other, block, std::min(former_size, size));
     give_block(block);

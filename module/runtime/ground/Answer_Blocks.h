@@ -34,7 +34,6 @@ public:
 private:
     friend void* take_block(size_t size);
     friend void give_block(void* block) noexcept;
-    friend void* resize_block(void* block, size_t former_size, size_t size);
     struct Piece;
 
     void* cut(size_t size);

@@ -5,6 +5,7 @@
 #include "module/runtime/ground/empty_arrays.h"
 #include "module/runtime/ground/type_dispatch.h"
 #include "module/runtime/objects/Class_Plan.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/runtime/objects/features.h"
 
 #include <cstring>
@@ -96,6 +97,12 @@ struct Default_Giver
     }
 };
 
+void give_defaults(Instance* instance)
+{
+    for (const Meta_Feature* feature : features_of(instance->__meta_class))
+        visit_feature(feature, Default_Giver{instance});
+}
+
 /// True of what many cells hold and none releases; of most cells of an instance.
 bool is_shared_by_all(const void* held)
 {
@@ -131,8 +138,12 @@ void release(Instance* instance, const Cell& cell)
 Instance* create(const Meta_Class* meta_class, bool defaults)
 {
     Instance* instance = static_cast<Instance*>(take_block(meta_class->size));
-    __default_construct(meta_class, instance, true, defaults);
-    return instance;
+    __default_construct(meta_class, instance, true, false);
+    if (!defaults)
+        return instance;
+    Ref<Instance> owner(instance);
+    give_defaults(instance);
+    return owner.steal();
 }
 
 Instance* create(const Meta_Method* meta_method)
@@ -155,10 +166,8 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
         else
             construct(instance, cell);
     });
-    if (defaults) {
-        for (const Meta_Feature* feature : features_of(meta_class))
-            visit_feature(feature, Default_Giver{instance});
-    }
+    if (defaults)
+        give_defaults(instance);
 }
 
 void __destruct(Instance* instance)

@@ -4,30 +4,37 @@
 #include "module/runtime/ground/Answer_Blocks.h"
 #include "module/runtime/ground/empty_arrays.h"
 #include "module/runtime/ground/type_dispatch.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/runtime/objects/features.h"
 
 #include <algorithm>
 #include <cstring>
 #include <new>
+#include <utility>
 
 namespace KPRV {
 
 namespace {
-
-Array<Instance*> clones_of(const Array<Instance*>& targets)
-{
-    Array<Instance*> clones;
-    clones.reserve(targets.size());
-    for (const Instance* target : targets)
-        clones.append(clone(target));
-    return clones;
-}
 
 void release_all(Array<Instance*>& targets)
 {
     for (Instance* target : targets)
         unref(target);
     targets.clear();
+}
+
+Array<Instance*> clones_of(const Array<Instance*>& targets)
+{
+    Array<Instance*> clones;
+    clones.reserve(targets.size());
+    try {
+        for (const Instance* target : targets)
+            clones.append(clone(target));
+    } catch (...) {
+        release_all(clones);
+        throw;
+    }
+    return clones;
 }
 
 /// After all bytes of an instance were copied: gives the copy its own hold on what the bytes point to.
@@ -53,6 +60,22 @@ struct Unsharer
     {
         new (&f.targets(dest)) Array<Instance*>(clones_of(f.targets(src)));
     }
+    void operator()(Method_Feature) const {}
+};
+
+/// Makes a cell that holds the bytes of another instance hold nothing.
+struct Blanker
+{
+    Instance* dest;
+
+    void operator()(Scalar_Feature f) const
+    {
+        visit_storage(
+            f.type(), [&] { new (f.value(dest)) String(); }, [&] { new (f.value(dest)) Datetime(); }, [] {});
+    }
+    void operator()(Array_Feature f) const { __construct(f.array(dest), __cim_array_traits[f.type()]); }
+    void operator()(Reference_Feature f) const { f.target(dest) = nullptr; }
+    void operator()(Reference_Array_Feature f) const { new (&f.targets(dest)) Array<Instance*>(); }
     void operator()(Method_Feature) const {}
 };
 
@@ -95,7 +118,7 @@ struct Copier
     {
         Array<Instance*> clones = clones_of(f.targets(src));
         release_all(f.targets(dest));
-        f.targets(dest) = clones;
+        f.targets(dest) = std::move(clones);
         f.null(dest) = f.null(src);
     }
     void operator()(Method_Feature) const {}
@@ -190,11 +213,20 @@ Instance* clone(const Instance* instance)
 {
     if (!instance)
         return nullptr;
-    const Meta_Class* meta_class = instance->__meta_class;
     Instance* copy = copy_of_bytes(instance);
     new (&copy->__name_space) String(instance->__name_space);
-    for (const Meta_Feature* feature : features_of(meta_class))
-        visit_feature(feature, Unsharer{copy, instance});
+    const auto features = features_of(instance->__meta_class);
+    auto next = features.begin();
+    try {
+        for (; next != features.end(); ++next)
+            visit_feature(*next, Unsharer{copy, instance});
+    } catch (...) {
+        // What stands in the cells from here on is the other's.
+        for (; next != features.end(); ++next)
+            visit_feature(*next, Blanker{copy});
+        destroy(copy);
+        throw;
+    }
     return copy;
 }
 
@@ -202,10 +234,10 @@ Instance* key_clone(const Instance* instance)
 {
     if (!instance)
         return nullptr;
-    Instance* keys = create(instance->__meta_class, false);
-    __set_null_flags(keys, true, true, 1);
-    copy_keys(keys, instance);
-    return keys;
+    Ref<Instance> keys(create(instance->__meta_class, false));
+    __set_null_flags(keys.ptr(), true, true, 1);
+    copy_keys(keys.ptr(), instance);
+    return keys.steal();
 }
 
 void copy(Instance* dest, const Instance* src)
