@@ -116,7 +116,7 @@ void* Answer_Blocks::cut(size_t size)
 }
 
 /// An allocation with a word more than is asked for, behind that word.
-static void* allocate(size_t size)
+static void* separate_block(size_t size)
 {
     if (size > std::numeric_limits<size_t>::max() - WORD)
         throw std::bad_alloc();
@@ -127,7 +127,7 @@ void* take_block(size_t size)
 {
     if (current && size <= LARGEST_CUT)
         return current->cut(size);
-    void* const block = allocate(size);
+    void* const block = separate_block(size);
     Answer_Blocks::Piece::mark(block, nullptr);
     return block;
 }
