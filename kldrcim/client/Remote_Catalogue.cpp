@@ -16,9 +16,9 @@ std::vector<std::string> Remote_Catalogue::class_names() const
 {
     const Auto_Lock lock(_mutex);
     if (!_names) {
-        _names.emplace();
+        std::vector<std::string>& names = _names.emplace();
         Cim_Answer answer(_http, [&](Xml_Node node) {
-            _names->emplace_back(node.attribute(Xml_Attribute::NAME));
+            names.emplace_back(node.attribute(Xml_Attribute::NAME));
             return true;
         });
         // A server that does not tell has none that could be listed.

@@ -334,7 +334,7 @@ void Subscriptions::keep()
 {
     if (_options.state_file.empty())
         return;
-    const auto is_transient = [&](const Path_Value* listener) {
+    const auto is_transient = [&](const Path_Value* listener) REQUIRES(_mutex) {
         const Instance_Value* found = listener ? find(*listener) : nullptr;
         const Plain_Value* type = found ? found->property("PersistenceType") : nullptr;
         return type && type->as_uint() == TRANSIENT;

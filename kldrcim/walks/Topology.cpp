@@ -370,10 +370,12 @@ private:
 std::vector<Number> Topology::below(const Step_Links& step, Number node, Number above) const
 {
     std::vector<Number> found;
-    if (step.step->from == nodes[node].kind && step.step->taken != Topology_Step::CROSS_LINK)
-        for (const Link& link : std::ranges::equal_range(
-                 step.links, std::pair(node, step.step->above_role ? above : 0), {}, place))
-            found.push_back(link.to);
+    if (step.step->from != nodes[node].kind || step.step->taken == Topology_Step::CROSS_LINK)
+        return found;
+    const std::pair from(node, step.step->above_role ? above : 0);
+    for (auto link = std::ranges::lower_bound(step.links, from, {}, place);
+         link != step.links.end() && place(*link) == from; ++link)
+        found.push_back(link->to);
     return found;
 }
 
