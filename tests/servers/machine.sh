@@ -8,8 +8,9 @@ server=$1 source=$2 packages=$3
 shift 3
 
 if [ -z "${KLDR_INSIDE:-}" ]; then
-    # The command gets a clean environment: what it needs, it is given.
-    exec env -i KLDR_INSIDE=yes PATH=/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin HOME=/root LC_ALL=C.UTF-8 \
+    # The command gets a clean environment: what it needs, it is given. What a shell has in the background ignores SIGINT, and so
+    # would all that it starts.
+    exec env -i --default-signal KLDR_INSIDE=yes PATH=/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin HOME=/root LC_ALL=C.UTF-8 \
         KLDR_ROOM="${KLDR_ROOM:-}" KLDR_CLIENTS="${KLDR_CLIENTS:-}" \
         unshare --mount --net --ipc --uts --pid --fork --kill-child --mount-proc "$0" "$server" "$source" "$packages" "$@"
 fi

@@ -95,12 +95,15 @@ endif()
 set(KLDR_LONG_TESTS module_test faults_test bad_answers_test bad_answers_alone_test allocation_failures_test missing_symbols_test
     module_diagnostics_test broker_test alerts_test simulator_test)
 
-# What every test of an address-sanitized build is started with. How the leak checker learns where the thread-local storage of an
-# opened library lies is a guess that C libraries of today prove wrong: it reads wild memory at the end of the process.
-set(KLDR_LEAK_OPTIONS "")
+# What every test of a sanitized build is started with. How the leak checker learns where the thread-local storage of an opened
+# library lies is a guess that C libraries of today prove wrong: it reads wild memory at the end of the process. A child that
+# is forked where threads are starts threads of its own.
+set(KLDR_SANITIZER_OPTIONS "")
 if(KLDR_SANITIZE MATCHES "address")
-  set(KLDR_LEAK_OPTIONS
+  set(KLDR_SANITIZER_OPTIONS
     "LSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0:intercept_tls_get_addr=0")
+elseif(KLDR_SANITIZE MATCHES "thread")
+  set(KLDR_SANITIZER_OPTIONS "TSAN_OPTIONS=suppressions=${CMAKE_SOURCE_DIR}/tests/tsan.supp:die_after_fork=0")
 endif()
 
 # kldr_test(<name> SOURCES ... LIBS ... [ENV K=V ...] [DEPENDS target ...]): a GoogleTest program, run by CTest in its build
@@ -117,7 +120,7 @@ function(kldr_test name)
     add_dependencies(${name} ${ARG_DEPENDS})
   endif()
   add_test(NAME ${name} COMMAND ${KLDR_OWN_PROCESSES} $<TARGET_FILE:${name}>)
-  set_tests_properties(${name} PROPERTIES TIMEOUT 900 ENVIRONMENT "${ARG_ENV};${KLDR_LEAK_OPTIONS}")
+  set_tests_properties(${name} PROPERTIES TIMEOUT 900 ENVIRONMENT "${ARG_ENV};${KLDR_SANITIZER_OPTIONS}")
   if(name IN_LIST KLDR_LONG_TESTS)
     set_tests_properties(${name} PROPERTIES COST 10)
   endif()
