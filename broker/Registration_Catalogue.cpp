@@ -3,9 +3,7 @@
 #include "broker/values/Type_Words.h"
 #include "module/runtime/objects/Meta_Value.h"
 
-#include <algorithm>
 #include <cstring>
-#include <strings.h>
 
 namespace KPRV::broker {
 
@@ -138,10 +136,12 @@ std::unique_ptr<Class_Info> class_info(const Meta_Class* meta_class, bool has_pr
 
 } // namespace
 
-bool Registration_Catalogue::Name_Order::operator()(std::string_view a, std::string_view b) const
+std::size_t Registration_Catalogue::Name_Hash::operator()(std::string_view name) const
 {
-    const int order = strncasecmp(a.data(), b.data(), std::min(a.size(), b.size()));
-    return order != 0 ? order < 0 : a.size() < b.size();
+    std::size_t sum = 0;
+    for (const char c : name)
+        sum = sum * 31 + (static_cast<unsigned char>(c) | ('a' ^ 'A'));
+    return sum;
 }
 
 Registration_Catalogue::Registration_Catalogue(const Registration* head)
@@ -179,6 +179,25 @@ const Class_Info* Registration_Catalogue::find(std::string_view name) const
     if (!slot.info)
         slot.info = class_info(slot.meta_class, slot.has_provider);
     return slot.info.get();
+}
+
+const Meta_Class* Registration_Catalogue::meta_class(std::string_view name) const
+{
+    const Auto_Lock lock(_mutex);
+    auto at = _slots.find(name);
+    return at == _slots.end() ? nullptr : at->second.meta_class;
+}
+
+/// Asked of every class at every enumeration: by the module's own links, without a search for each name.
+bool Registration_Catalogue::is_a(std::string_view class_name, std::string_view ancestor) const
+{
+    const Meta_Class* wanted = meta_class(ancestor);
+    if (!wanted)
+        return same_name(class_name, ancestor);
+    const Meta_Class* each = meta_class(class_name);
+    while (each && each != wanted)
+        each = each->super_meta_class;
+    return each != nullptr;
 }
 
 } // namespace KPRV::broker

@@ -4,8 +4,8 @@
 #include "module/runtime/dispatch/Registration.h"
 #include "module/runtime/system/Standard_Mutex.h"
 
-#include <map>
 #include <memory>
+#include <unordered_map>
 
 namespace KPRV::broker {
 
@@ -20,6 +20,7 @@ public:
     std::vector<std::string> class_names() const override { return _names; }
     const Class_Info* find(std::string_view name) const override;
     std::string module_name() const override { return _module_name; }
+    bool is_a(std::string_view class_name, std::string_view ancestor) const override;
 
 private:
     struct Slot
@@ -30,18 +31,24 @@ private:
     };
 
     /// Whatever the letters' case.
-    struct Name_Order
+    struct Name_Hash
     {
         using is_transparent = void;
-        bool operator()(std::string_view a, std::string_view b) const;
+        std::size_t operator()(std::string_view name) const;
+    };
+    struct Same_Name
+    {
+        using is_transparent = void;
+        bool operator()(std::string_view a, std::string_view b) const { return same_name(a, b); }
     };
 
     void add(const Meta_Class* meta_class) REQUIRES(_mutex);
+    const Meta_Class* meta_class(std::string_view name) const;
 
     std::string _module_name;
     std::vector<std::string> _names;
     mutable Standard_Mutex<> _mutex;
-    mutable std::map<std::string, Slot, Name_Order> _slots GUARDED_BY(_mutex);
+    mutable std::unordered_map<std::string, Slot, Name_Hash, Same_Name> _slots GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

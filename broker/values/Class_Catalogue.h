@@ -59,7 +59,7 @@ public:
     virtual std::string module_name() const = 0;
 
     /// True if the class is the ancestor or below it. Without knowledge, true for equal names only.
-    bool is_a(std::string_view class_name, std::string_view ancestor) const;
+    virtual bool is_a(std::string_view class_name, std::string_view ancestor) const;
     bool is_known() const { return !class_names().empty(); }
 };
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -37,10 +38,22 @@ public:
         if (executable)
             std::filesystem::permissions(_path / name, std::filesystem::perms::owner_all);
     }
-    std::string read(const char* name) const
+    /// In bytes; 0 if there is no such file.
+    std::size_t size(const char* name) const
     {
+        std::error_code ignored;
+        const std::uintmax_t size = std::filesystem::file_size(_path / name, ignored);
+        return ignored ? 0 : size;
+    }
+    /// What a file holds behind its first bytes.
+    std::string read(const char* name, std::size_t from = 0) const
+    {
+        std::string text(std::max(size(name), from) - from, '\0');
         std::ifstream file(_path / name);
-        return {std::istreambuf_iterator<char>(file), {}};
+        file.seekg(static_cast<std::streamoff>(from));
+        file.read(text.data(), static_cast<std::streamsize>(text.size()));
+        text.resize(file.gcount());
+        return text;
     }
 
 private:

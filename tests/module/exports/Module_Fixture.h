@@ -65,10 +65,10 @@ protected:
     /// Forgets what has been logged and called so far.
     void mark()
     {
-        _mark = log_text().size();
+        _mark = _home.size(log_file);
         simulator.clear_calls();
     }
-    std::vector<Log_Line> log_lines() const { return parse_log(log_text().substr(_mark)); }
+    std::vector<Log_Line> log_lines() const { return parse_log(_home.read(log_file, _mark)); }
     /// Lines of one level since the mark, as "LEVEL text".
     Lines said(const std::string& level) const
     {
@@ -91,7 +91,7 @@ protected:
     std::unique_ptr<broker::Local_Server> server;
 
 private:
-    std::string log_text() const { return _home.read(".cimple/messages"); }
+    static constexpr const char* log_file = ".cimple/messages";
 
     Temp_Folder _home;
     Environment_Override _home_override{"HOME", _home.path()};
