@@ -12,7 +12,7 @@ namespace {
 constexpr const char* filter_class = "CIM_IndicationFilter";
 constexpr const char* listener_class = "CIM_ListenerDestination";
 constexpr const char* subscription_class = "CIM_IndicationSubscription";
-constexpr std::uint64_t TRANSIENT = 3;
+constexpr std::uint64_t TRANSIENT = 3, DISABLED = 4;
 /// Of all three kinds.
 constexpr std::size_t MOST_INSTANCES = 1000;
 constexpr std::size_t LONGEST_QUERY = std::size_t(16) << 10;
@@ -27,6 +27,20 @@ const Path_Value* end_of(const Instance_Value& subscription, std::string_view ro
 {
     const Plain_Value* value = subscription.property(role);
     return value && !value->null ? value->as_path() : nullptr;
+}
+
+std::uint64_t number_of(const Instance_Value& instance, std::string_view name)
+{
+    const Plain_Value* value = instance.property(name);
+    return value && !value->null ? value->as_uint() : 0;
+}
+
+/// True for a subscription with this filter or listener.
+bool uses(const Instance_Value& subscription, const Path_Value& path)
+{
+    const Path_Value* filter = end_of(subscription, "Filter");
+    const Path_Value* handler = end_of(subscription, "Handler");
+    return (filter && same_object(*filter, path)) || (handler && same_object(*handler, path));
 }
 
 bool is_url(const std::string& text)
@@ -178,6 +192,16 @@ Result Subscriptions::check_filter(const Instance_Value& filter) const
     return sources.empty() ? Result() : failed(CMPI_RC_ERR_INVALID_NAMESPACE, sources.front());
 }
 
+Result Subscriptions::check(const Instance_Value& instance) const
+{
+    const Kind kind = kind_of(instance.path.class_name);
+    if (kind == Kind::FILTER)
+        return check_filter(instance);
+    return kind == Kind::SUBSCRIPTION || is_url(text_of(instance, "Destination"))
+               ? Result()
+               : failed(CMPI_RC_ERR_INVALID_PARAMETER, "Destination is no URL of http or https");
+}
+
 Result Subscriptions::add(Instance_Value instance)
 {
     if (_instances.size() >= MOST_INSTANCES)
@@ -185,16 +209,13 @@ Result Subscriptions::add(Instance_Value instance)
     complete(instance);
     if (find(instance.path))
         return failed(CMPI_RC_ERR_ALREADY_EXISTS, "");
-    Result result;
-    const Kind kind = kind_of(instance.path.class_name);
-    if (kind == Kind::FILTER)
-        result = check_filter(instance);
-    else if (kind == Kind::SUBSCRIPTION)
-        result = activate(instance);
-    else if (!is_url(text_of(instance, "Destination")))
-        result = failed(CMPI_RC_ERR_INVALID_PARAMETER, "Destination is no URL of http or https");
+    Result result = check(instance);
+    std::shared_ptr<Active> active;
+    if (result.ok() && kind_of(instance.path.class_name) == Kind::SUBSCRIPTION)
+        result = prepare(instance, active);
     if (!result.ok())
         return result;
+    exchange(instance.path, std::move(active));
     result.paths.push_back(instance.path);
     _instances.push_back(std::move(instance));
     return result;
@@ -209,18 +230,71 @@ Result Subscriptions::create(Instance_Value instance)
     return result;
 }
 
-Result Subscriptions::modify(const Instance_Value&, const Property_List&)
+Result Subscriptions::merge(Instance_Value& into, const Instance_Value& changes,
+                            const Property_List& names) const
 {
-    return failed(CMPI_RC_ERR_NOT_SUPPORTED, "delete it and create another");
+    const Class_Info* info = _classes.find(into.path.class_name);
+    const auto has = [&](const std::string& name) { return info->property(name) != nullptr; };
+    std::vector<std::string> changed = names.value_or(std::vector<std::string>());
+    if (!names)
+        for (const Named_Value& each : changes.properties)
+            changed.push_back(each.name);
+    for (const std::string& name : changed) {
+        if (!has(name))
+            return failed(CMPI_RC_ERR_NO_SUCH_PROPERTY, name);
+        const Feature_Info& feature = *info->property(name);
+        const Plain_Value* value = changes.property(name);
+        set_value(into.properties, feature.name, value ? *value : Plain_Value::null_of(feature.type));
+    }
+    const Path_Value path = into.path;
+    complete(into);
+    return same_object(into.path, path) ? Result()
+                                        : failed(CMPI_RC_ERR_INVALID_PARAMETER, "keys cannot be changed");
+}
+
+/// The subscriptions that an object is, or that use it, go over to what has changed all at once, or not at
+/// all.
+Result Subscriptions::replace(Instance_Value& present, Instance_Value changed)
+{
+    std::swap(present, changed);
+    std::vector<std::pair<Path_Value, std::shared_ptr<Active>>> fresh;
+    Result result;
+    for (const Instance_Value& each : _instances)
+        if (result.ok() && kind_of(each.path.class_name) == Kind::SUBSCRIPTION &&
+            (&each == &present || uses(each, present.path))) {
+            auto& [path, active] = fresh.emplace_back(each.path, nullptr);
+            result = prepare(each, active);
+        }
+    if (!result.ok())
+        std::swap(present, changed);
+    for (auto& [path, active] : fresh)
+        if (result.ok())
+            exchange(path, std::move(active));
+        else
+            release(active);
+    return result;
+}
+
+Result Subscriptions::modify(const Instance_Value& instance, const Property_List& properties)
+{
+    const Auto_Lock lock(_mutex);
+    Instance_Value* const present = find(instance.path);
+    if (!present)
+        return failed(CMPI_RC_ERR_NOT_FOUND, "");
+    Instance_Value changed = *present;
+    Result result = merge(changed, instance, properties);
+    if (result.ok())
+        result = check(changed);
+    if (result.ok())
+        result = replace(*present, std::move(changed));
+    if (result.ok())
+        keep();
+    return result;
 }
 
 bool Subscriptions::is_in_use(const Path_Value& path) const
 {
-    return std::ranges::any_of(_instances, [&](const Instance_Value& each) {
-        const Path_Value* filter = end_of(each, "Filter");
-        const Path_Value* handler = end_of(each, "Handler");
-        return (filter && same_object(*filter, path)) || (handler && same_object(*handler, path));
-    });
+    return std::ranges::any_of(_instances, [&](const Instance_Value& each) { return uses(each, path); });
 }
 
 Result Subscriptions::remove(const Path_Value& path)
@@ -230,8 +304,7 @@ Result Subscriptions::remove(const Path_Value& path)
         return failed(CMPI_RC_ERR_NOT_FOUND, "");
     if (is_in_use(path))
         return failed(CMPI_RC_ERR_FAILED, "a subscription uses it");
-    if (kind_of(path.class_name) == Kind::SUBSCRIPTION)
-        deactivate(path);
+    exchange(path, nullptr);
     std::erase_if(_instances, [&](const Instance_Value& each) { return same_object(each.path, path); });
     keep();
     return {};
@@ -268,7 +341,7 @@ void Subscriptions::leave_provider_class(const std::string& provider_class)
         _providers.erase(found);
 }
 
-Result Subscriptions::activate(const Instance_Value& subscription)
+Result Subscriptions::prepare(const Instance_Value& subscription, std::shared_ptr<Active>& active)
 {
     const Path_Value* filter_path = end_of(subscription, "Filter");
     const Path_Value* handler_path = end_of(subscription, "Handler");
@@ -281,6 +354,8 @@ Result Subscriptions::activate(const Instance_Value& subscription)
     auto query = Select_Query::parse(text_of(*filter, "Query"), text_of(*filter, "QueryLanguage"), error);
     if (!query)
         return failed(error.rc, error.text);
+    if (number_of(subscription, "SubscriptionState") == DISABLED)
+        return {};
     std::vector<std::string> used;
     if (Result result = use_provider_classes(query->class_name(), used); !result.ok())
         return result;
@@ -291,26 +366,33 @@ Result Subscriptions::activate(const Instance_Value& subscription)
                                                          _options.deliver);
         _exporters[url] = exporter;
     }
-    const Auto_Lock lock(_delivery_mutex);
-    _active.push_back(
-        std::make_shared<Active>(Active{subscription.path, std::move(*query), std::move(used), exporter}));
+    active =
+        std::make_shared<Active>(Active{subscription.path, std::move(*query), std::move(used), exporter});
     return {};
 }
 
-void Subscriptions::deactivate(const Path_Value& path)
+void Subscriptions::exchange(const Path_Value& path, std::shared_ptr<Active> active)
 {
     std::shared_ptr<Active> gone;
     {
         const Auto_Lock lock(_delivery_mutex);
         const auto found =
             std::ranges::find_if(_active, [&](const auto& each) { return same_object(each->path, path); });
-        if (found == _active.end())
-            return;
-        gone = *found;
-        _active.erase(found);
+        if (found != _active.end()) {
+            gone = *found;
+            _active.erase(found);
+        }
+        if (active)
+            _active.push_back(std::move(active));
     }
-    for (const std::string& provider_class : gone->provider_classes)
-        leave_provider_class(provider_class);
+    release(gone);
+}
+
+void Subscriptions::release(const std::shared_ptr<Active>& active)
+{
+    if (active)
+        for (const std::string& provider_class : active->provider_classes)
+            leave_provider_class(provider_class);
 }
 
 CMPIrc Subscriptions::distribute(const Instance_Value& indication)
@@ -336,8 +418,7 @@ void Subscriptions::keep()
         return;
     const auto is_transient = [&](const Path_Value* listener) REQUIRES(_mutex) {
         const Instance_Value* found = listener ? find(*listener) : nullptr;
-        const Plain_Value* type = found ? found->property("PersistenceType") : nullptr;
-        return type && type->as_uint() == TRANSIENT;
+        return found && number_of(*found, "PersistenceType") == TRANSIENT;
     };
     std::vector<Instance_Value> kept;
     for (const Instance_Value& each : _instances)

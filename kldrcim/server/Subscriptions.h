@@ -49,9 +49,16 @@ private:
     Kind kind_of(std::string_view class_name) const;
     Instance_Value* find(const Path_Value& path) REQUIRES(_mutex);
     Result add(Instance_Value instance) REQUIRES(_mutex);
+    Result check(const Instance_Value& instance) const;
     Result check_filter(const Instance_Value& filter) const;
-    Result activate(const Instance_Value& subscription) REQUIRES(_mutex);
-    void deactivate(const Path_Value& path) REQUIRES(_mutex);
+    /// The named properties of `changes`, or all that it has, into another instance.
+    Result merge(Instance_Value& into, const Instance_Value& changes, const Property_List& names) const;
+    Result replace(Instance_Value& present, Instance_Value changed) REQUIRES(_mutex);
+    /// Tells the module, and what to look at for each indication; nothing for a disabled subscription.
+    Result prepare(const Instance_Value& subscription, std::shared_ptr<Active>& active) REQUIRES(_mutex);
+    /// In the place of what there was of that path, if there was any.
+    void exchange(const Path_Value& path, std::shared_ptr<Active> active) REQUIRES(_mutex);
+    void release(const std::shared_ptr<Active>& active) REQUIRES(_mutex);
     Result use_provider_classes(const std::string& class_name, std::vector<std::string>& used)
         REQUIRES(_mutex);
     void leave_provider_class(const std::string& provider_class) REQUIRES(_mutex);
