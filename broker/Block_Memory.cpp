@@ -1,11 +1,11 @@
 #include "broker/Block_Memory.h"
 
+#include "broker/Nameless_File.h"
+
 #include <algorithm>
 #include <cstdint>
-#include <cstdlib>
 #include <fcntl.h>
 #include <new>
-#include <string>
 #include <sys/mman.h>
 #include <unistd.h>
 
@@ -14,22 +14,6 @@ namespace KPRV::broker {
 namespace {
 
 constexpr std::size_t SIZE = Block_Memory::BLOCK_SIZE;
-
-/// Negative if the folder takes none.
-int nameless_file()
-{
-    const char* const named = std::getenv("TMPDIR");
-    const std::string folder = named && *named ? named : "/var/tmp";
-    const int file = open(folder.c_str(), O_TMPFILE | O_RDWR | O_CLOEXEC, 0600);
-    if (file >= 0)
-        return file;
-    // Not every file system can make one without a name.
-    std::string name = folder + "/kldrcim-XXXXXX";
-    const int named_file = mkostemp(name.data(), O_CLOEXEC);
-    if (named_file >= 0)
-        unlink(name.c_str());
-    return named_file;
-}
 
 /// Reserves more than is needed, and gives back what stands before and behind.
 char* map_aligned(int file, off_t offset)

@@ -94,6 +94,9 @@ Http_Page metrics_page(Local_Server& local, const std::string& accept)
     return {media_type(notation), metrics_text(readings, notation)};
 }
 
+/// Enumerations that their clients have left are looked for so often.
+constexpr auto SWEEP = std::chrono::seconds(5);
+
 /// Until a signal comes; what clients have asked for is then answered.
 int serve_until(Interruption& interruption, const Cli_Options& options, const Http_Options& http_options,
                 Local_Server& local)
@@ -122,8 +125,10 @@ int serve_until(Interruption& interruption, const Cli_Options& options, const Ht
         return complain(error, FAILURE);
     put("serving " + model.name() + " at " + http->url() + "\n");
     flush_output();
-    while (interruption.count() == 0)
-        interruption.wait();
+    while (interruption.count() == 0) {
+        interruption.wait(SWEEP);
+        server.pull_contexts().sweep();
+    }
     return 0;
 }
 

@@ -33,7 +33,7 @@ Result associate(const Operation_Call& call)
         request.filter.result_role = call.parameters.text("ResultRole");
     }
     call.answer.open_values();
-    Object_Answers receiver(call, form, Object_Answers::OBJECTS);
+    Object_Answers receiver(call, form, Object_Text::OBJECTS);
     return receiver.run(std::move(request));
 }
 

@@ -28,7 +28,7 @@ Result enumerate_instances(const Operation_Call& call)
     Request request = call.request(Operation::ENUMERATE_INSTANCES, {.class_name = class_name});
     request.properties = form.properties;
     call.answer.open_values();
-    Object_Answers receiver(call, form, Object_Answers::NAMED);
+    Object_Answers receiver(call, form, Object_Text::NAMED);
     return receiver.run(std::move(request));
 }
 
@@ -36,7 +36,7 @@ Result enumerate_instance_names(const Operation_Call& call)
 {
     call.answer.open_values();
     const std::string class_name = call.parameters.required_class_name("ClassName");
-    Object_Answers receiver(call, {}, Object_Answers::NAMED);
+    Object_Answers receiver(call, {}, Object_Text::NAMED);
     return receiver.run(call.request(Operation::ENUMERATE_INSTANCE_NAMES, {.class_name = class_name}));
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "kldrcim/server/Cim_Server.h"
+#include "kldrcim/server/Object_Text.h"
 
 namespace KPRV::kldrcim {
 
@@ -8,35 +9,27 @@ namespace KPRV::kldrcim {
 class Object_Answers final : public Receiver
 {
 public:
-    enum Form
-    {
-        /// Instance and its name; names alone.
-        NAMED,
-        /// With host and name space, as associations and the older queries give them.
-        OBJECTS,
-        /// The same for operations that are pulled.
-        PULLED,
-        /// Instances alone, as queries give them that are pulled.
-        BARE,
-    };
-
-    Object_Answers(const Operation_Call& call, Instance_Form form, Form kind)
-        : _call(call), _form(std::move(form)), _kind(kind)
+    Object_Answers(const Operation_Call& call, Instance_Form form, Object_Text::Kind kind)
+        : _call(call), _text{kind, std::move(form), call.space.name(), call.server.host_name()}
     {
     }
 
     /// What nobody reads any more is no failure: the connection is gone.
     Result run(Request request) { return _call.space.run(std::move(request), this); }
 
-    bool instance(Instance_Value&& instance) override;
-    bool path(Path_Value&& path) override;
+    bool instance(Instance_Value&& instance) override { return write(std::move(instance)); }
+    bool path(Path_Value&& path) override { return write(std::move(path)); }
 
 private:
-    void place(Path_Value& path) const;
+    template <class Object>
+    bool write(Object&& object)
+    {
+        _text.write(_call.answer.object(), std::forward<Object>(object));
+        return _call.answer.object_done();
+    }
 
     const Operation_Call& _call;
-    Instance_Form _form;
-    Form _kind;
+    const Object_Text _text;
 };
 
 } // namespace KPRV::kldrcim

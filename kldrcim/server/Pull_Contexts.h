@@ -1,41 +1,12 @@
 #pragma once
 
-#include "broker/values/Request.h"
-#include "module/runtime/system/Standard_Mutex.h"
+#include "kldrcim/server/Pull_Context.h"
 
-#include <chrono>
-#include <deque>
 #include <map>
 #include <memory>
+#include <vector>
 
 namespace KPRV::kldrcim {
-
-using namespace broker;
-
-/// What an opened enumeration has still to give.
-struct Pull_Context
-{
-    enum Kind
-    {
-        INSTANCES,
-        PATHS,
-        /// Instances without paths: what a query selects.
-        ROWS,
-    };
-
-    Kind kind = INSTANCES;
-    std::string name_space;
-    std::deque<Instance_Value> instances;
-    std::deque<Path_Value> paths;
-    bool with_origins = false;
-    Property_List properties;
-    /// A class that the instances are shown as; empty for their own.
-    std::string seen_as;
-    /// Between two pulls.
-    std::chrono::seconds lifetime{0};
-
-    std::size_t size() const { return instances.size() + paths.size(); }
-};
 
 /// The open enumerations of all clients. A context is taken out while it is used, so that nobody else has it
 /// meanwhile, and one that nobody has asked for in its lifetime is gone.
@@ -56,6 +27,9 @@ public:
     /// Null for one that there is not.
     std::unique_ptr<Pull_Context> take(const std::string& name, Clock::time_point now = Clock::now());
 
+    /// Drops those whose lifetime is over; to be called now and then, for clients that never come back.
+    void sweep(Clock::time_point now = Clock::now());
+
     std::size_t count() const;
 
 private:
@@ -65,7 +39,8 @@ private:
         Clock::time_point end;
     };
 
-    void sweep(Clock::time_point now) REQUIRES(_mutex);
+    /// Takes those out whose lifetime is over: their end may have to wait for a provider.
+    std::vector<Kept> take_old(Clock::time_point now) REQUIRES(_mutex);
 
     mutable Standard_Mutex<> _mutex;
     std::map<std::string, Kept> _kept GUARDED_BY(_mutex);

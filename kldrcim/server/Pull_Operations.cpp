@@ -1,6 +1,5 @@
-// Enumerations that a client opens and pulls. The provider is asked once, at the beginning: it may hold locks
-// while it hands objects over, and no client's pace may hold up the others.
-#include "kldrcim/server/Object_Answers.h"
+// Enumerations that a client opens and pulls. The provider is asked once, at the beginning.
+#include "kldrcim/server/Cim_Server.h"
 #include "kldrcim/server/Query_Results.h"
 #include "kldrcim/wire/Class_Xml.h"
 
@@ -44,24 +43,20 @@ void write_end(const Operation_Call& call, const std::string& name, const Select
     write_parameter(writer, {"EnumerationContext", Plain_Value::text(name)});
 }
 
-/// The next objects.
-void write_objects(const Operation_Call& call, Pull_Context& context, std::uint64_t count)
+/// The next objects; those that a failure comes after in the same answer are lost, as with other operations.
+Pull_Context::State write_objects(const Operation_Call& call, Pull_Context& context, std::uint64_t count)
 {
-    Instance_Form form;
-    form.properties = context.properties;
-    form.seen_as = context.seen_as.empty() ? nullptr : call.space.classes().find(context.seen_as);
-    form.origins = context.with_origins ? &call.space.classes() : nullptr;
-    const bool is_row = context.kind == Pull_Context::ROWS;
-    Object_Answers receiver(call, form, is_row ? Object_Answers::BARE : Object_Answers::PULLED);
+    const Pull_Context::State state = context.wait(count);
     call.answer.open_values();
-    for (; count != 0 && !context.instances.empty(); --count) {
-        receiver.instance(std::move(context.instances.front()));
-        context.instances.pop_front();
+    for (; state != Pull_Context::FAILED && count != 0; --count) {
+        const std::optional<std::string> object = context.take();
+        if (!object)
+            break;
+        call.answer.object().written(*object);
+        if (!call.answer.object_done())
+            break;
     }
-    for (; count != 0 && !context.paths.empty(); --count) {
-        receiver.path(std::move(context.paths.front()));
-        context.paths.pop_front();
-    }
+    return state;
 }
 
 std::chrono::seconds lifetime_of(const Parameters& parameters)
@@ -86,41 +81,27 @@ std::unique_ptr<Pull_Context> new_context(const Operation_Call& call, Pull_Conte
 {
     if (call.parameters.flag("ContinueOnError", false))
         throw Wire_Error::status(CONTINUING_UNSUPPORTED, "no continuing on errors");
-    auto context = std::make_unique<Pull_Context>();
-    context->kind = kind;
-    context->lifetime = lifetime_of(call.parameters);
-    return context;
+    return std::make_unique<Pull_Context>(kind, call.space.name(), lifetime_of(call.parameters));
 }
 
-/// `query` is null for what is no query.
-Result open_and_write(const Operation_Call& call, Request request, std::unique_ptr<Pull_Context> context,
-                      const Select_Query* query = nullptr)
+/// What has been started. `query` is null for what is no query.
+Result write_first(const Operation_Call& call, std::unique_ptr<Pull_Context> context,
+                   const Select_Query* query = nullptr)
 {
     const std::uint64_t count = std::min(call.parameters.number("MaxObjectCount").value_or(0), MOST_OBJECTS);
-    Collector collector;
-    std::optional<Query_Results> selected;
-    if (query)
-        selected.emplace(*query, call.space.classes(), collector);
-    Result result =
-        call.space.run(std::move(request), selected ? static_cast<Receiver*>(&*selected) : &collector);
-    if (!result.ok())
-        return result;
-    std::ranges::move(collector.instances, std::back_inserter(context->instances));
-    std::ranges::move(collector.paths, std::back_inserter(context->paths));
-    context->name_space = call.space.name();
-    if (context->size() <= count) {
-        write_objects(call, *context, count);
-        write_end(call, {}, query);
-        return {};
-    }
-    // The place is taken before anything is given: what is refused must not be lost.
     Pull_Contexts& contexts = call.server.pull_contexts();
-    const std::string name = contexts.put(std::move(context));
-    context = contexts.take(name);
-    if (!context)
-        return failed(LIMITS_EXCEEDED, "too many open enumerations");
-    write_objects(call, *context, count);
-    contexts.put_back(name, std::move(context));
+    std::string name;
+    if (context->wait(count) == Pull_Context::MORE) {
+        // The place is taken before anything is given: what is refused must not be lost.
+        name = contexts.put(std::move(context));
+        context = contexts.take(name);
+        if (!context)
+            return failed(LIMITS_EXCEEDED, "too many open enumerations");
+    }
+    if (write_objects(call, *context, count) == Pull_Context::FAILED)
+        return context->failure();
+    if (!name.empty())
+        contexts.put_back(name, std::move(context));
     write_end(call, name, query);
     return {};
 }
@@ -135,32 +116,44 @@ Result open(const Operation_Call& call)
                            Kind == Operation::ASSOCIATOR_NAMES || Kind == Operation::REFERENCE_NAMES;
     refuse_filters(call.parameters);
     auto context = new_context(call, paths ? Pull_Context::PATHS : Pull_Context::INSTANCES);
-    context->properties = call.parameters.names("PropertyList");
-    context->with_origins = call.parameters.flag("IncludeClassOrigin", false);
+    Instance_Form form;
+    form.properties = call.parameters.names("PropertyList");
+    if (call.parameters.flag("IncludeClassOrigin", false))
+        form.origins = &call.space.classes();
     Path_Value path;
     if (enumerates) {
         path.class_name = call.parameters.required_class_name("ClassName");
         if (!call.parameters.flag("DeepInheritance", true))
-            context->seen_as = path.class_name;
+            form.seen_as = call.space.classes().find(path.class_name);
     } else {
         path = call.path("InstanceName");
     }
     Request request = call.request(Kind, std::move(path));
-    request.properties = context->properties;
+    request.properties = form.properties;
     request.filter.result_class = call.parameters.class_name("ResultClass");
     request.filter.role = call.parameters.text("Role");
     if (!references) {
         request.filter.association_class = call.parameters.class_name("AssocClass");
         request.filter.result_role = call.parameters.text("ResultRole");
     }
-    return open_and_write(call, std::move(request), std::move(context));
+    context->start({Object_Text::PULLED, std::move(form), call.space.name(), call.server.host_name()},
+                   [&space = call.space, request = std::move(request)](Receiver& receiver) {
+                       return space.run(request, &receiver);
+                   });
+    return write_first(call, std::move(context));
 }
 
 Result open_query(const Operation_Call& call)
 {
     const Select_Query query = read_query(call, "FilterQueryLanguage", "FilterQuery");
     Request request = call.request(Operation::ENUMERATE_INSTANCES, {.class_name = query.class_name()});
-    return open_and_write(call, std::move(request), new_context(call, Pull_Context::ROWS), &query);
+    auto context = new_context(call, Pull_Context::ROWS);
+    context->start({Object_Text::BARE},
+                   [&space = call.space, request = std::move(request), query](Receiver& receiver) {
+                       Query_Results selected(query, space.classes(), receiver);
+                       return space.run(request, &selected);
+                   });
+    return write_first(call, std::move(context), &query);
 }
 
 std::unique_ptr<Pull_Context> taken(const Operation_Call& call, const std::string& name)
@@ -186,11 +179,12 @@ Result pull(const Operation_Call& call)
         call.server.pull_contexts().put_back(name, std::move(context));
         return failed(INVALID_CONTEXT, "the enumeration is of another kind");
     }
-    write_objects(call, *context, count);
-    const bool more = context->size() != 0;
-    if (more)
+    const Pull_Context::State state = write_objects(call, *context, count);
+    if (state == Pull_Context::FAILED)
+        return context->failure();
+    if (state == Pull_Context::MORE)
         call.server.pull_contexts().put_back(name, std::move(context));
-    write_end(call, more ? name : std::string());
+    write_end(call, state == Pull_Context::MORE ? name : std::string());
     return {};
 }
 

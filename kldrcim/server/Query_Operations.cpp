@@ -35,7 +35,7 @@ Result exec_query(const Operation_Call& call)
 {
     const Select_Query query = read_query(call, "QueryLanguage", "Query");
     call.answer.open_values();
-    Object_Answers receiver(call, {}, Object_Answers::OBJECTS);
+    Object_Answers receiver(call, {}, Object_Text::OBJECTS);
     Query_Results selected(query, call.space.classes(), receiver);
     return call.space.run(call.request(Operation::ENUMERATE_INSTANCES, {.class_name = query.class_name()}),
                           &selected);

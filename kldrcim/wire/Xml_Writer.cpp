@@ -122,6 +122,13 @@ Xml_Writer& Xml_Writer::text(std::string_view text)
     return *this;
 }
 
+Xml_Writer& Xml_Writer::written(std::string_view elements)
+{
+    end_tag();
+    _out += elements;
+    return *this;
+}
+
 Xml_Writer& Xml_Writer::close(Xml_Tag tag)
 {
     end_tag();

@@ -22,6 +22,8 @@ public:
     /// Characters that XML has no form for, and bytes that are no UTF-8, become U+FFFD: one such byte from
     /// an adapter must not make a whole answer unreadable.
     Xml_Writer& text(std::string_view text);
+    /// What another writer has written.
+    Xml_Writer& written(std::string_view elements);
     Xml_Writer& close(Xml_Tag tag);
     /// Ends the element that has just been opened, as `<TAG/>`.
     Xml_Writer& empty();

@@ -8,9 +8,7 @@ namespace {
 
 std::unique_ptr<Pull_Context> context()
 {
-    auto result = std::make_unique<Pull_Context>();
-    result->lifetime = std::chrono::seconds(10);
-    return result;
+    return std::make_unique<Pull_Context>(Pull_Context::PATHS, "root/toy", std::chrono::seconds(10));
 }
 
 const Pull_Contexts::Clock::time_point start;
@@ -39,6 +37,17 @@ TEST(Pull_Contexts, ForgetsWhatNobodyAsksFor)
     EXPECT_TRUE(contexts.take(name + "x", start + std::chrono::seconds(18)));
     const std::string other = contexts.put(context(), start);
     EXPECT_FALSE(contexts.take(other, start + std::chrono::seconds(10)));
+}
+
+TEST(Pull_Contexts, AreSweptOut)
+{
+    Pull_Contexts contexts;
+    contexts.put(context(), start);
+    contexts.put(context(), start + std::chrono::seconds(5));
+    contexts.sweep(start + std::chrono::seconds(9));
+    EXPECT_EQ(2U, contexts.count());
+    contexts.sweep(start + std::chrono::seconds(10));
+    EXPECT_EQ(1U, contexts.count());
 }
 
 TEST(Pull_Contexts, AreBounded)
