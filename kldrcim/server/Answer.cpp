@@ -65,7 +65,9 @@ bool Answer::object_done()
 {
     _writer.text("\n");
     _sent = _sent || _text.size() >= PIECE_SIZE;
-    return send_if_long();
+    const bool is_read = send_if_long();
+    _whole = _text.size();
+    return is_read;
 }
 
 bool Answer::send_if_long()
@@ -96,17 +98,22 @@ void Answer::succeed()
 
 bool Answer::fail(CMPIrc rc, const std::string& text)
 {
-    if (_sent)
-        return true;
-    // A tag that is not at its end would go on in the new text.
-    _writer.text({});
-    _text.erase(_from);
-    _in_values = false;
-    open_response();
     const CMPIrc status = wire_status(rc);
     std::string description = text.empty() ? status_name(rc) : text;
     if (status != rc && !text.empty())
         description = std::string(status_name(rc)) + ": " + text;
+    // A tag that is not at its end would go on in the new text.
+    _writer.text({});
+    if (_sent) {
+        if (_message.is_multiple || !_sink.take_status(status, description))
+            return true;
+        _text.erase(_whole);
+        succeed();
+        return false;
+    }
+    _text.erase(_from);
+    _in_values = false;
+    open_response();
     _writer.open(Tag::ERROR)
         .attribute(At::CODE, std::to_string(status))
         .attribute(At::DESCRIPTION, description)

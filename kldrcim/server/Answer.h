@@ -13,6 +13,9 @@ public:
     virtual ~Body_Sink() = default;
     /// Takes the text away. False if nobody reads any more.
     virtual bool send(std::string&& text) = 0;
+    /// Takes the status of an operation that failed when a part of its answer had been sent, for a place
+    /// behind the text. False if there is no such place.
+    virtual bool take_status(CMPIrc, const std::string&) { return false; }
 };
 
 /// The message that answers a message, written as its parts come, one call after the other. The text is sent
@@ -37,7 +40,8 @@ public:
 
     /// The end of what answers a call, without error.
     void succeed();
-    /// True if a part has been sent: then the text has no end, and the connection must be cut.
+    /// True if a part has been sent and nothing can be said behind it: then the text has no end, and the
+    /// connection must be cut.
     bool fail(CMPIrc rc, const std::string& text);
 
     /// The end of the message.
@@ -61,6 +65,8 @@ private:
     Xml_Writer _writer;
     /// Where in the text the answer to the call begins, unless a part of it has been sent.
     std::size_t _from = 0;
+    /// Where the last object ends.
+    std::size_t _whole = 0;
     bool _in_values = false;
     bool _sent = false;
     bool _unread = false;

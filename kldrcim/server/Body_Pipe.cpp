@@ -18,6 +18,26 @@ bool Body_Pipe::send(std::string&& text)
     return true;
 }
 
+void Body_Pipe::allow_status()
+{
+    const Auto_Lock lock(_mutex);
+    _takes_status = true;
+}
+
+bool Body_Pipe::take_status(CMPIrc rc, const std::string& text)
+{
+    const Auto_Lock lock(_mutex);
+    if (_takes_status)
+        _status = {rc, text};
+    return _takes_status;
+}
+
+Body_Pipe::Status Body_Pipe::status() const
+{
+    const Auto_Lock lock(_mutex);
+    return _status;
+}
+
 void Body_Pipe::finish(bool broken)
 {
     const Auto_Lock lock(_mutex);

@@ -15,7 +15,18 @@ class Body_Pipe final : public Body_Sink
 public:
     static constexpr std::size_t MOST_BYTES = std::size_t(4) << 20;
 
+    struct Status
+    {
+        CMPIrc rc = CMPI_RC_OK;
+        std::string text = {};
+    };
+
     bool send(std::string&& text) override;
+    /// Before anything is sent: who reads finds a status behind the text.
+    void allow_status();
+    bool take_status(CMPIrc rc, const std::string& text) override;
+    /// What was taken, at the end.
+    Status status() const;
     /// Nothing more comes. A broken answer has no end.
     void finish(bool broken);
 
@@ -40,6 +51,8 @@ private:
     bool _finished GUARDED_BY(_mutex) = false;
     bool _broken GUARDED_BY(_mutex) = false;
     bool _closed GUARDED_BY(_mutex) = false;
+    bool _takes_status GUARDED_BY(_mutex) = false;
+    Status _status GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::kldrcim

@@ -15,6 +15,8 @@ constexpr std::size_t MOST_HEADER_BYTES = std::size_t(16) << 10;
 constexpr unsigned MOST_HEADERS = 100;
 /// Of a client that sends on after it has been refused.
 constexpr std::size_t MOST_IGNORED = std::size_t(1) << 20;
+/// Of a text that stands in a trailer.
+constexpr std::size_t LONGEST_STATUS = 2000;
 constexpr std::chrono::seconds failed_login_pause{1};
 constexpr unsigned IDLE_SECONDS = 30;
 constexpr const char* metrics_path = "/metrics";
@@ -55,6 +57,19 @@ std::string host_of(std::string_view header)
     return std::string(header.substr(0, header.find(':')));
 }
 
+/// Of a list with commas; null is an empty one.
+bool has_word(const char* list, std::string_view wanted)
+{
+    for (std::string_view rest = list ? list : ""; !rest.empty();) {
+        std::string_view word = rest.substr(0, rest.find(','));
+        rest.remove_prefix(std::min(rest.size(), word.size() + 1));
+        word.remove_prefix(std::min(word.size(), word.find_first_not_of(" \t")));
+        if (same_name(word.substr(0, word.find_first_of(" \t;")), wanted))
+            return true;
+    }
+    return false;
+}
+
 bool is_xml_in_utf8(std::string_view type)
 {
     const std::string lower = lower_name(type);
@@ -79,7 +94,9 @@ struct Http_Connection::Callbacks
         const std::size_t rest = std::min(size, self._rest.size());
         std::memcpy(buffer, self._rest.data(), rest);
         self._rest.erase(0, rest);
-        return rest == 0 ? MHD_CONTENT_READER_END_OF_STREAM : static_cast<ssize_t>(rest);
+        if (rest != 0)
+            return static_cast<ssize_t>(rest);
+        return self.add_trailer() ? MHD_CONTENT_READER_END_OF_STREAM : MHD_CONTENT_READER_END_WITH_ERROR;
     }
 };
 
@@ -162,6 +179,7 @@ bool Http_Connection::authenticate()
 
 bool Http_Connection::begin(const Http_Line& line)
 {
+    _takes_trailers = line.version == MHD_HTTP_VERSION_1_1 && has_word(header("TE"), "trailers");
     _server._watch->limit(_peer.socket, Connection_Watch::body);
     const bool is_message = !has_page(line.path) || (line.method != "GET" && line.method != "HEAD");
     _allowed = has_page(line.path) ? "GET, HEAD, POST" : "POST";
@@ -238,17 +256,18 @@ void Http_Connection::answer_message()
 
 void Http_Connection::answer(const Cim_Message& message)
 {
+    if (_takes_trailers)
+        _pipe.allow_status();
     if (Cim_Server::may_be_long(message))
         return answer_in_pieces(message);
     Cim_Server::Reply reply = _server._server.answer(message, _user, _pipe);
     // A short operation that has become long after all.
     _pipe.finish(reply.broken);
     _rest = std::move(reply.body);
-    if (!_pipe.wait())
-        send(std::move(_rest));
+    if (_pipe.wait())
+        send_stream();
     else
-        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, STREAMED_PIECE, Callbacks::read,
-                                                        this, nullptr));
+        send(std::move(_rest));
 }
 
 void Http_Connection::answer_in_pieces(const Cim_Message& message)
@@ -265,8 +284,7 @@ void Http_Connection::answer_in_pieces(const Cim_Message& message)
         _pipe.finish(broken);
     });
     if (_pipe.wait()) {
-        queue_message(MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, STREAMED_PIECE, Callbacks::read,
-                                                        this, nullptr));
+        send_stream();
         return;
     }
     _maker.join();
@@ -296,6 +314,25 @@ bool Http_Connection::queue_message(MHD_Response* response)
 bool Http_Connection::send(std::string body)
 {
     return queue_message(MHD_create_response_from_buffer(body.size(), body.data(), MHD_RESPMEM_MUST_COPY));
+}
+
+bool Http_Connection::send_stream()
+{
+    _stream =
+        MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, STREAMED_PIECE, Callbacks::read, this, nullptr);
+    if (_stream && _takes_trailers)
+        MHD_add_response_header(_stream, "Trailer", "CIMStatusCode, CIMStatusCodeDescription");
+    return queue_message(_stream);
+}
+
+bool Http_Connection::add_trailer()
+{
+    const Body_Pipe::Status status = _pipe.status();
+    if (status.rc == CMPI_RC_OK)
+        return true;
+    return MHD_add_response_footer(_stream, "CIMStatusCode", std::to_string(status.rc).c_str()) == MHD_YES &&
+           MHD_add_response_footer(_stream, "CIMStatusCodeDescription",
+                                   percent_encoded(status.text.substr(0, LONGEST_STATUS)).c_str()) == MHD_YES;
 }
 
 bool Http_Connection::refuse(const Http_Refusal& refusal)

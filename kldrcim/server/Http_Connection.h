@@ -26,6 +26,8 @@ struct Http_Line
     std::string method;
     /// Without what follows a question mark.
     std::string path;
+    /// "HTTP/1.1".
+    std::string version;
 };
 
 /// One request on a connection: its headers, its body as it comes, and the answer. Lives until all of the
@@ -69,6 +71,10 @@ private:
     /// An answer to a message.
     bool queue_message(MHD_Response* response);
     bool send(std::string body);
+    /// What comes through the pipe, and what is left behind it.
+    bool send_stream();
+    /// The status behind a stream; false if memory has run out.
+    bool add_trailer();
 
     Http_Server& _server;
     Http_Peer& _peer;
@@ -79,6 +85,10 @@ private:
     /// The methods that the path takes.
     const char* _allowed = "POST";
     bool _queued = false;
+    /// The client reads fields behind a chunked answer.
+    bool _takes_trailers = false;
+    /// Of a stream, which the library owns.
+    MHD_Response* _stream = nullptr;
     std::optional<std::string> _user;
     Cim_Message _message;
     Body_Pipe _pipe;

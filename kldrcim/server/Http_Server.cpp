@@ -98,11 +98,12 @@ struct Http_Server::Callbacks
     }
 
     static MHD_Result request(void* data, MHD_Connection* connection, const char* path, const char* method,
-                              const char*, const char* upload, std::size_t* upload_size, void** request)
+                              const char* version, const char* upload, std::size_t* upload_size,
+                              void** request)
     {
         try {
-            return step(*static_cast<Http_Server*>(data), connection, {method, path}, upload, *upload_size,
-                        *request)
+            return step(*static_cast<Http_Server*>(data), connection, {method, path, version}, upload,
+                        *upload_size, *request)
                        ? (*upload_size = 0, MHD_YES)
                        : MHD_NO;
         } catch (const std::exception&) {

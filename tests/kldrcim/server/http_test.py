@@ -38,6 +38,16 @@ def post_bytes(body, *fields, version="1.1", method="POST"):
     return ("\r\n".join(head) + "\r\n\r\n" + body).encode()
 
 
+def chunks_of(body):
+    """What a chunked body holds, and what stands behind it."""
+    text = b""
+    while True:
+        size, _, body = body.partition(b"\r\n")
+        if int(size, 16) == 0:
+            return text, body
+        text, body = text + body[: int(size, 16)], body[int(size, 16) + 2 :]
+
+
 class Requests(Serving_Case):
     def status(self, body=NAMES, **headers):
         status, fields, text = self.served.post(body, **headers)
@@ -146,6 +156,13 @@ class Requests(Serving_Case):
         head = "POST /cimom HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: chunked\r\n"
         answer = self.served.raw((head + "Connection: close\r\n\r\n" + chunks).encode())
         self.assertEqual(answer.count(b"<INSTANCENAME"), 5)
+        # With an extension that nobody knows, and with fields behind it.
+        odd = chunks.replace("\r\n", ";a=b\r\n", 1)[:-2] + "CIMStatusCode: 0\r\nX-More: y\r\n\r\n"
+        both = self.served.raw(((head + "\r\n" + odd) + (head + "Connection: close\r\n\r\n" + chunks)).encode())
+        self.assertEqual(both.count(b"<INSTANCENAME"), 10)
+        endless = chunks[:-2] + "X-More: y\r\n" * 10000
+        answer = self.served.raw((head + "\r\n" + endless).encode())
+        self.assertNotIn(b"HTTP/1.1 200 ", answer)
         answer = self.served.raw((head + f"Content-Length: {len(chunks)}\r\n\r\n" + chunks).encode())
         self.assertTrue(answer.startswith(b"HTTP/1.1 400 "), answer)
 
@@ -377,6 +394,23 @@ class Broken_Streams(Serving_Case):
             answer = read_all(connection)
         self.assertNotIn(b"</CIM>", answer)
         self.assertFalse(answer.endswith(b"0\r\n\r\n"), "the end of a good answer")
+
+    def ask(self, *fields, version="1.1"):
+        body = intrinsic("EnumerateInstances", class_parameter("ClassName", "TOY_Many"), self.namespace)
+        return self.served.raw(post_bytes(body, "Connection: close, TE", *fields, version=version))
+
+    def test_failure_for_clients_that_read_trailers(self):
+        for asked in ("TE: trailers", "TE: chunked , Trailers;q=0.5"):
+            answer = self.ask(asked)
+            self.assertIn(b"\r\nTrailer: CIMStatusCode, CIMStatusCodeDescription\r\n", answer[:1000])
+            text, end = chunks_of(answer.partition(b"\r\n\r\n")[2])
+            self.assertEqual(text.count(b"</VALUE.NAMEDINSTANCE>\n"), 20000)
+            self.assertTrue(text.endswith(b"\n</IRETURNVALUE></IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>\n"), text[-100:])
+            self.assertEqual(end, b"CIMStatusCode: 1\r\nCIMStatusCodeDescription: no%20more%20of%20them\r\n\r\n")
+
+    def test_failure_for_others(self):
+        for fields, version in (("TE: gzip", "1.1"), ("TE: trailersx", "1.1"), ("TE: trailers", "1.0")):
+            self.assertNotIn(b"</CIM>", self.ask(fields, version=version))
 
 
 class Short_Failures(Serving_Case):
