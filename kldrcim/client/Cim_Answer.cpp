@@ -65,7 +65,7 @@ Plain_Value return_value(const Instance_Reader& reader, Xml_Node node, const Met
 
 } // namespace
 
-Cim_Answer::Cim_Answer(Http_Client& http, Take take)
+Cim_Answer::Cim_Answer(Http_Sender& http, Take take)
     : _http(http), _take(std::move(take)),
       _reader({.bytes = MOST_KEPT}, [this](Xml_Node node) { _has_enough = _has_enough || !_take(node); })
 {
@@ -242,7 +242,7 @@ Request with_keys(Request request, const Class_Catalogue& catalogue)
 
 } // namespace
 
-Result ask_for_objects(Http_Client& http, const Class_Catalogue& catalogue, const Request& request,
+Result ask_for_objects(Http_Sender& http, const Class_Catalogue& catalogue, const Request& request,
                        Receiver& receiver)
 {
     const Class_Info* const info =

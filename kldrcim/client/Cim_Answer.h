@@ -19,7 +19,7 @@ public:
     /// Gets each object; false for enough.
     using Take = std::function<bool(Xml_Node)>;
 
-    Cim_Answer(Http_Client& http, Take take);
+    Cim_Answer(Http_Sender& http, Take take);
 
     /// `method` is the declaration of the method that is called, null for none or an unknown one.
     Result ask(const Http_Message& message, const Class_Catalogue& catalogue,
@@ -31,14 +31,14 @@ private:
     [[noreturn]] void refuse(const std::string& why) const;
     Result result(const Http_Head& head, const Class_Catalogue& catalogue, const Method_Info* method) const;
 
-    Http_Client& _http;
+    Http_Sender& _http;
     Take _take;
     bool _has_enough = false;
     Xml_Reader _reader;
 };
 
 /// Asks for a request's objects; they go to the receiver as the module would hand them over.
-Result ask_for_objects(Http_Client& http, const Class_Catalogue& catalogue, const Request& request,
+Result ask_for_objects(Http_Sender& http, const Class_Catalogue& catalogue, const Request& request,
                        Receiver& receiver);
 
 } // namespace KPRV::kldrcim

@@ -44,22 +44,31 @@ struct Http_Message
     bool may_be_repeated = true;
 };
 
-/// One connection to a server, kept from one message to the next.
-class Http_Client
+/// Who takes messages to a server.
+class Http_Sender
 {
 public:
     /// Gets the body in pieces; false for enough. What it throws comes out of `post`.
     using Body = std::function<bool(const Http_Head& head, std::string_view piece)>;
 
+    virtual ~Http_Sender() = default;
+
+    /// The answer's head, whatever its status. Throws `Connection_Error` if there is no whole answer.
+    virtual Http_Head post(const Http_Message& message, const Body& body, std::chrono::seconds patience) = 0;
+    virtual const Http_Settings& settings() const = 0;
+};
+
+/// One connection to a server, kept from one message to the next.
+class Http_Client final : public Http_Sender
+{
+public:
     explicit Http_Client(Http_Settings settings);
-    ~Http_Client();
+    ~Http_Client() override;
     Http_Client(const Http_Client&) = delete;
     Http_Client& operator=(const Http_Client&) = delete;
 
-    /// The answer's head, whatever its status. Throws `Connection_Error` if there is no whole answer.
-    Http_Head post(const Http_Message& message, const Body& body, std::chrono::seconds patience);
-
-    const Http_Settings& settings() const { return _settings; }
+    Http_Head post(const Http_Message& message, const Body& body, std::chrono::seconds patience) override;
+    const Http_Settings& settings() const override { return _settings; }
     /// The address by which this machine speaks to the server; empty before the first message.
     std::string own_address() const;
 
