@@ -270,13 +270,13 @@ Property_List Parameters::names(std::string_view name) const
     if (!node.is(Tag::VALUE_ARRAY))
         throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER, std::string(name) + " is no list");
     std::vector<std::string> result;
+    std::size_t count = 0;
     for (const Xml_Node each : node.children()) {
-        if (std::ranges::any_of(result,
-                                [&](const std::string& have) { return same_name(have, each.text()); }))
-            continue;
-        if (result.size() == MOST_NAMES)
+        if (++count > MOST_NAMES)
             throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER, std::string(name) + " is too long");
-        result.emplace_back(each.text());
+        if (std::ranges::none_of(result,
+                                 [&](const std::string& have) { return same_name(have, each.text()); }))
+            result.emplace_back(each.text());
     }
     return result;
 }

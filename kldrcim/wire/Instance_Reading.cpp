@@ -14,6 +14,8 @@ using At = Xml_Attribute;
 
 /// Of instances in instances.
 constexpr unsigned DEEPEST = 16;
+/// Of one path; whoever compares paths looks at each key for each other one.
+constexpr std::size_t MOST_KEYS = 256;
 
 std::string required(Xml_Node node, At attribute)
 {
@@ -117,8 +119,12 @@ Path_Value Instance_Reader::path(Xml_Node node) const
     case Tag::INSTANCENAME: {
         path.class_name = required(node, At::CLASSNAME);
         const Class_Info* owner = _catalogue.find(path.class_name);
-        for (const Xml_Node each : node.children())
+        for (const Xml_Node each : node.children()) {
+            if (path.keys.size() == MOST_KEYS)
+                throw Wire_Error::status(CMPI_RC_ERR_INVALID_PARAMETER,
+                                         path.class_name.substr(0, 64) + " has not so many keys");
             path.keys.push_back(key(each, owner));
+        }
         return path;
     }
     default:

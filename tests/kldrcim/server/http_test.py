@@ -198,10 +198,25 @@ class Requests(Serving_Case):
                 pass
         self.assertLess(sent, 40)
 
+    def refused_at_once(self, operation, parameters):
+        begin = time.monotonic()
+        self.assertEqual(error_code(self.served.call(operation, parameters)), 4)
+        if not SANITIZED:
+            self.assertLess(time.monotonic() - begin, 3)
+
+    def test_lists_that_would_take_long(self):
+        """Each of them is looked at for each other one, or once for each association class."""
+        names = "".join(f"<VALUE>p{each}</VALUE>" for each in range(900)) + "<VALUE>p899</VALUE>" * 400000
+        self.refused_at_once("EnumerateInstances", FCPORT + parameter("PropertyList", f"<VALUE.ARRAY>{names}</VALUE.ARRAY>"))
+        keys = "".join(f'<KEYBINDING NAME="k{each}"><KEYVALUE>x</KEYVALUE></KEYBINDING>' for each in range(200000))
+        path = f'<INSTANCENAME CLASSNAME="KALDERA_FCPort">{keys}</INSTANCENAME>'
+        self.refused_at_once("Associators", parameter("ObjectName", path))
+        self.refused_at_once("GetInstance", parameter("InstanceName", path))
+
     def test_memory_of_a_request(self):
         before = self.served.resident()
         many = "<VALUE.ARRAY>" + "<VALUE/>" * 500000 + "</VALUE.ARRAY>"
-        body = intrinsic("EnumerateInstances", FCPORT + f'<IPARAMVALUE NAME="PropertyList">{many}</IPARAMVALUE>')
+        body = intrinsic("EnumerateInstances", FCPORT + parameter("PropertyList", many))
         self.assertEqual(self.status(body)[0], 200)
         if not SANITIZED:
             self.assertLess(self.served.resident("VmHWM") - before, 10 * len(body))
