@@ -121,7 +121,56 @@ std::string unit_json(const Logical_Unit& unit)
                        4);
 }
 
+constexpr const char* unit_members[] = {"identifier", "what",   "product", "redundancy", "path",
+                                        "port",       "target", "lun",     "state",      "paths"};
+
+/// An address may be looked for with colons and without.
+void add_address(std::vector<Plain_Value>& texts, const std::string& address)
+{
+    texts.push_back(Plain_Value::text(address));
+    texts.push_back(Plain_Value::text(colon_form(address)));
+}
+
 } // namespace
+
+std::span<const char* const> unit_value_names()
+{
+    return unit_members;
+}
+
+std::vector<Named_Value> unit_values(const Logical_Unit& unit)
+{
+    const Unit_Label label = label_of(unit);
+    const Mark* const mark = mark_of(unit);
+    const auto text = [](const std::string& each) {
+        return each.empty() ? Plain_Value::null_of(CMPI_string) : Plain_Value::text(each);
+    };
+    std::vector<Plain_Value> ports, targets, luns, states;
+    for (const Unit_Path& path : unit.paths) {
+        add_address(ports, path.port);
+        add_address(targets, path.target);
+        luns.push_back(Plain_Value::text(path.lun));
+        states.push_back(Plain_Value::text(state_words(path)));
+    }
+    return {{unit_members[0], text(unit.identifier)},
+            {unit_members[1], text(label.what)},
+            {unit_members[2], text(label.product)},
+            {unit_members[3], text(mark ? mark->member : "full")},
+            {unit_members[4], text(path_text(unit.unit.path))},
+            {unit_members[5], Plain_Value::array(CMPI_string, ports)},
+            {unit_members[6], Plain_Value::array(CMPI_string, targets)},
+            {unit_members[7], Plain_Value::array(CMPI_string, luns)},
+            {unit_members[8], Plain_Value::array(CMPI_string, states)},
+            {unit_members[9], Plain_Value::unsigned_number(CMPI_uint32, unit.paths.size())}};
+}
+
+std::string units_json_lines(const std::vector<Logical_Unit>& units)
+{
+    std::string text;
+    for (const Logical_Unit& unit : units)
+        text += json_line(unit_json(unit));
+    return text;
+}
 
 std::string units_text(const std::vector<Logical_Unit>& units)
 {

@@ -62,7 +62,7 @@ constexpr Cli_Verb verbs[] = {
      "the host with its adapters, ports, targets and logical units, as a tree", nullptr},
     {"graph",    0, 0,   "",                                        draw_graph,      Op{},                        "table",      "--adapter --port --depth --luns --software --connectors",
      "the same as Graphviz text: kldrcim graph | dot -Tsvg >host.svg", nullptr},
-    {"luns",     0, 0,   "",                                        list_units,      Op{},                        "table json", "",
+    {"luns",     0, 0,   "",                                        list_units,      Op{},                        "table json jsonl", names_options,
      "each logical unit once, by its identifier, with the paths that lead to it", nullptr},
     {"diff",     2, 2,   "OLD NEW",                                 nullptr,         Op{},                        "table json", "",
      "what came, went and changed between two files that \"tree --format json\" wrote; \"-\" is standard input",
@@ -92,7 +92,7 @@ constexpr Cli_Verb verbs[] = {
      "ADAPTER is its DeviceID, with or without colons, or a PATH", "1 the update failed, or was not wanted."},
     {"serve",    0, 0,   "",                                        nullptr,         Op{},                        "table",      "--listen --tls-cert --tls-key --users --state",
      "a CIM server on the module, for any WBEM client (CIM-XML), until interrupted", nullptr},
-    {"classes",  0, 1,   "[PATTERN]",                               list_classes,    Op{},                        all_formats,  "",
+    {"classes",  0, 1,   "[PATTERN]",                               list_classes,    Op{},                        "table json jsonl", names_options,
      "list the classes that have a provider; * and ? match as in file names", nullptr},
 };
 // clang-format on

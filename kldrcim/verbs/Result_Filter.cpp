@@ -20,17 +20,6 @@ std::string sort_name(const Cli_Options& options)
     return options.sort.substr(is_backward(options) ? 1 : 0);
 }
 
-/// What the options look at.
-std::vector<std::string> filter_names(const Cli_Options& options)
-{
-    std::vector<std::string> names;
-    for (const Where_Clause& condition : options.conditions)
-        names.push_back(condition.name);
-    if (!options.sort.empty())
-        names.push_back(sort_name(options));
-    return names;
-}
-
 const std::vector<Named_Value>& values_of(const Instance_Value& instance)
 {
     return instance.properties;
@@ -42,6 +31,26 @@ const std::vector<Named_Value>& values_of(const Path_Value& path)
 }
 
 } // namespace
+
+std::vector<std::string> filter_names(const Cli_Options& options)
+{
+    std::vector<std::string> names;
+    for (const Where_Clause& condition : options.conditions)
+        names.push_back(condition.name);
+    if (!options.sort.empty())
+        names.push_back(sort_name(options));
+    return names;
+}
+
+bool sorts_before(const Cli_Options& options, const std::vector<Named_Value>& a,
+                  const std::vector<Named_Value>& b)
+{
+    const std::string name = sort_name(options);
+    const Plain_Value *first = find_value(a, name), *second = find_value(b, name);
+    if (!first || first->null || !second || second->null)
+        return first && !first->null && (!second || second->null);
+    return is_backward(options) ? stands_before(*second, *first) : stands_before(*first, *second);
+}
 
 Result_Filter::Result_Filter(const Cli_Options& options, std::unique_ptr<Result_Writer> writer)
     : _options(options), _writer(std::move(writer)), _missed(filter_names(options))
@@ -105,13 +114,8 @@ bool Result_Filter::take(std::vector<Thing>& kept, const std::string& class_name
 template <class Thing>
 void Result_Filter::hand_on(std::vector<Thing>& kept)
 {
-    const std::string name = sort_name(_options);
-    // What has no such value stands last, either way.
     std::ranges::stable_sort(kept, [&](const Thing& a, const Thing& b) {
-        const Plain_Value *first = find_value(values_of(a), name), *second = find_value(values_of(b), name);
-        if (!first || first->null || !second || second->null)
-            return first && !first->null && (!second || second->null);
-        return is_backward(_options) ? stands_before(*second, *first) : stands_before(*first, *second);
+        return sorts_before(_options, values_of(a), values_of(b));
     });
     for (Thing& thing : kept)
         if (!give(std::move(thing)))

@@ -46,6 +46,13 @@ private:
     std::size_t _count = 0;
 };
 
+/// What --where and --sort look at.
+std::vector<std::string> filter_names(const Cli_Options& options);
+
+/// Whether the first is to stand before the second by --sort. What has no such value stands last, either way.
+bool sorts_before(const Cli_Options& options, const std::vector<Named_Value>& a,
+                  const std::vector<Named_Value>& b);
+
 /// Whether what has these values is as each --where wants it.
 bool meets_conditions(const Cli_Options& options, const std::string& class_name,
                       const std::vector<Named_Value>& values);

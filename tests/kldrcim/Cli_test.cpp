@@ -93,9 +93,32 @@ TEST(Cli, Classes)
               "TOY_Item  TOY_Base    instance, method  Id, Name\n",
               kldrcim("classes '*item'").out);
     EXPECT_EQ("[]\n", kldrcim("--format json classes X*").out);
+    EXPECT_EQ("{\"class\": \"TOY_Item\", \"superclass\": \"TOY_Base\", \"provider\": [\"instance\", "
+              "\"method\"], \"keys\": [\"Id\", \"Name\"]}\n",
+              kldrcim("classes *item --format jsonl").out);
     Outcome run = kldrcim("classes", TOY_PLAIN);
     EXPECT_EQ(0, run.status);
     EXPECT_NE(std::string::npos, run.error.find("does not publish its classes")) << run.error;
+}
+
+TEST(Cli, SomeOfTheClasses)
+{
+    const std::string item = kldrcim("classes TOY_Item").out;
+    EXPECT_EQ(item, kldrcim("classes --where superclass=TOY_Base --where keys=Name --where class~*item").out);
+    EXPECT_EQ("1\n", kldrcim("classes TOY_Item --where provider=method --count").out);
+    EXPECT_EQ("0\n", kldrcim("classes TOY_Item --where provider!=method --count").out);
+    const std::string all = kldrcim("classes --format jsonl --sort class").out;
+    const std::string last = kldrcim("classes --format jsonl --sort -class").out;
+    EXPECT_EQ(all.substr(0, all.find('\n')),
+              last.substr(last.rfind('\n', last.size() - 2) + 1, all.find('\n')));
+    const Outcome run = kldrcim("classes --where Superclas=x");
+    EXPECT_EQ(2, run.status);
+    EXPECT_EQ("", run.out);
+    EXPECT_EQ(
+        "kldrcim: classes has no \"Superclas\" (did you mean \"superclass\"?); it has class, superclass, "
+        "provider, keys\n",
+        run.error);
+    EXPECT_EQ(2, kldrcim("classes --format mof").status);
 }
 
 TEST(Cli, LeaksGoToStandardError)

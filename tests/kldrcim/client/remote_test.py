@@ -86,6 +86,7 @@ class Same_Answers(Serving_Case):
             self.same("tree", "--format", form, "--software", "--connectors")
             self.same("health", "--format", form)
             self.same("luns", "--format", form)
+            self.same("luns", "--format", form, "--where", "redundancy=one_path", "--sort", "-identifier")
         for form in ("table", "json", "mof"):
             self.same("conform", "--format", form)
         self.same("graph")

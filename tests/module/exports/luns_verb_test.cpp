@@ -50,6 +50,30 @@ protected:
     static constexpr const char* unit_one = R"({"lunDescription": "6024b4c0000000000000000000000001"})";
 };
 
+TEST_F(Luns_Verb, SomeOfTheUnits)
+{
+    const auto found = [&](const std::string& options) { return kldrcim("luns " + options).out; };
+    EXPECT_EQ("5\n", found("--count"));
+    EXPECT_EQ("2\n", found("--count --where redundancy=one_path"));
+    EXPECT_EQ("2\n", found("--count --where what=tape --where paths=1"));
+    // An address with colons or without; of several paths any.
+    EXPECT_EQ("3\n", found("--count --where port=1000024b4c300000"));
+    EXPECT_EQ("3\n", found("--count --where port=10:00:02:4b:4c:30:00:00"));
+    EXPECT_EQ("2\n", found("--count --where port!=1000024b4c300000"));
+    EXPECT_EQ("1\n", found("--count --where identifier~*0001 --where what=disk"));
+    EXPECT_NE(std::string::npos,
+              found("--where what=tape").find("\n2 logical units, 2 paths; no path: 0; one path: 2;"));
+    const std::string lines = found("--format jsonl --sort paths");
+    EXPECT_EQ(5, count(lines, "\n"));
+    EXPECT_EQ(0U, lines.find("{\"identifier\": \"5024b4c000500001\", \"what\": \"tape\", "));
+    const Outcome wrong = kldrcim("luns --where unit=x");
+    EXPECT_EQ(2, wrong.status);
+    EXPECT_EQ("kldrcim: luns has no \"unit\"; it has identifier, what, product, redundancy, path, port, "
+              "target, lun, "
+              "state, paths\n",
+              wrong.error);
+}
+
 TEST_F(Luns_Verb, EachUnitOnceWithItsPaths)
 {
     const Outcome run = kldrcim("luns");
