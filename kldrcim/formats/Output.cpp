@@ -1,9 +1,11 @@
 #include "kldrcim/formats/Output.h"
 
 #include <cerrno>
+#include <chrono>
 #include <csignal>
 #include <cstdio>
 #include <fcntl.h>
+#include <optional>
 #include <unistd.h>
 
 namespace KPRV::kldrcim {
@@ -21,6 +23,18 @@ void put(std::string_view text)
 {
     if (std::fwrite(text.data(), 1, text.size(), stdout) != text.size())
         throw Output_Error{errno};
+}
+
+void flush_in_time()
+{
+    using Clock = std::chrono::steady_clock;
+    constexpr std::chrono::milliseconds moment{50};
+    static std::optional<Clock::time_point> latest;
+    const auto now = Clock::now();
+    if (latest && now - *latest < moment)
+        return;
+    latest = now;
+    flush_output();
 }
 
 void flush_output()

@@ -18,6 +18,10 @@ void begin_output();
 /// All that the program writes on standard output. Throws `Output_Error`.
 void put(std::string_view text);
 
+/// To be called behind each result: the first goes out to the reader at once, the others before a moment has
+/// passed, where there are so many of them. Who makes one a second is seen at work.
+void flush_in_time();
+
 /// Out to the reader, now: before something that takes long, and at the end.
 void flush_output();
 

@@ -134,12 +134,16 @@ bool Result_Filter::give(Instance_Value&& instance)
     if (!_extra.empty())
         std::erase_if(instance.properties,
                       [&](const Named_Value& property) { return contains_name(_extra, property.name); });
-    return _writer->instance(std::move(instance));
+    const bool goes_on = _writer->instance(std::move(instance));
+    flush_in_time();
+    return goes_on;
 }
 
 bool Result_Filter::give(Path_Value&& path)
 {
-    return _writer->path(std::move(path));
+    const bool goes_on = _writer->path(std::move(path));
+    flush_in_time();
+    return goes_on;
 }
 
 bool meets_conditions(const Cli_Options& options, const std::string& class_name,

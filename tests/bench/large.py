@@ -8,14 +8,17 @@ a former kldrcim, which is measured by turns with this one; it uses the module b
 largest tree, --instances that of what is enumerated.
 
 An enumeration is that of a provider which makes each instance as it is returned and keeps none, so that what is measured is kldrcim
-alone: one releases what it made, the other leaves it all to the server, as it may. A tree is measured with the module and the
-simulated host in the process, and once more as a client of `kldrcim serve`, alone.
+alone: one releases what it made, the other leaves it all to the server, as it may. It notes when it hands over the first, and the
+first line is timed from there, through a pipe. What the module enumerates, and a tree, is measured with the module and the simulated
+host in the process, and once more as a client of `kldrcim serve`, alone.
 """
 
 import argparse
+import contextlib
 import json
 import os
 import pathlib
+import resource
 import subprocess
 import sys
 import tempfile
@@ -26,77 +29,115 @@ from markdown import print_table
 SOURCE = pathlib.Path(__file__).resolve().parents[2]
 # Adapters, ports, targets and LUNs, each of each.
 HOSTS = [(1, 2, 2, 4), (4, 4, 32, 32), (8, 4, 64, 64), (8, 8, 128, 64), (16, 8, 128, 128)]
+#: That of the enumerations.
+UNITS = (8, 4, 60, 64)
 MEGABYTE = 1 << 20
 
 
 class Run:
-    """One process: seconds, the processor's seconds, seconds to the first byte, bytes at most, lines."""
+    """One process: the processor's seconds, the moment of the first byte, bytes at most, lines."""
+
+    piece = bytearray(1 << 16)
 
     def __init__(self, *command, **environment):
         own = {"PATH": "/usr/bin:/bin", "HOME": "/nonexistent", "LC_ALL": "C.UTF-8"}
-        begin = time.monotonic()
         with subprocess.Popen(command, env=own | environment, stdout=subprocess.PIPE, bufsize=0) as process:
             self.first, self.lines = None, 0
-            while piece := process.stdout.read(1 << 20):
-                self.first = self.first or time.monotonic() - begin
-                self.lines += piece.count(b"\n")
+            while size := process.stdout.readinto(self.piece):
+                self.first = self.first or time.monotonic()
+                self.lines += self.piece.count(b"\n", 0, size)
             _, status, usage = os.wait4(process.pid, 0)
             process.returncode = os.waitstatus_to_exitcode(status)
         if process.returncode:
             sys.exit(f"large.py: {command} ended with {process.returncode}")
-        self.seconds = time.monotonic() - begin
         self.processor = usage.ru_utime + usage.ru_stime
         self.most = usage.ru_maxrss << 10
+        # A process begins with the memory of who starts it in this account.
+        self.is_peak_known = usage.ru_maxrss > resource.getrusage(resource.RUSAGE_SELF).ru_maxrss
+
+    def peak(self):
+        return ("" if self.is_peak_known else "< ") + f"{self.most / MEGABYTE:,.0f} MB"
 
 
 def figures(run, name=""):
-    return {f"{name}time": f"{run.processor:.2f} s", f"{name}peak": f"{run.most / MEGABYTE:,.0f} MB"}
+    return {f"{name}time": f"{run.processor:.2f} s", f"{name}peak": run.peak()}
 
 
-def enumerations(build, many):
-    toy = build / "tests/broker/libtoy_described.so"
+def size_of(counts):
+    return " x ".join(map(str, counts))
+
+
+@contextlib.contextmanager
+def served(build, *options, **environment):
+    """The address of a server over the module, or another one."""
+    process = subprocess.Popen(
+        [build / "kldrcim", "serve", "--listen", "127.0.0.1:0", *options],
+        env={"PATH": "/usr/bin:/bin", "HOME": "/nonexistent"} | environment, stdout=subprocess.PIPE, text=True)
+    try:
+        yield process.stdout.readline().split()[-1]
+    finally:
+        process.terminate()
+        process.wait()
+        process.stdout.close()
+
+
+def enumerations(build, many, folder):
+    """Of a provider that keeps nothing."""
+    space = ("--namespace", "root/toy")
+    own = ("--module", build / "tests/broker/libtoy_plain.so", *space)
+    notes = os.path.join(folder, "notes")
+    toy = {"TOY_MANY": str(many), "TOY_MANY_NOTES": notes}
+
+    def first_line(run):
+        with open(notes, encoding="ascii") as file:
+            return f"{(run.first - float(file.read())) * 1e3:.0f} ms"
+
     for form in ("table", "json", "jsonl", "mof"):
         row = {f"ei, {many:,} instances": form}
+        asked = ("--format", form, "ei", "TOY_Many")
         for name, left in (("released: ", {}), ("left: ", {"TOY_MANY_LEAVES": "1"})):
-            run = Run(build / "kldrcim", "--module", toy, "--namespace", "root/toy", "--format", form, "ei", "TOY_Many",
-                      TOY_MANY=str(many), **left)
-            row |= figures(run, name) | {f"{name}first line": f"{run.first * 1e3:.0f} ms"}
+            run = Run(build / "kldrcim", *own, *asked, **toy | left)
+            row |= figures(run, name) | {f"{name}first line": first_line(run)}
+        with served(build, *own, **toy) as url:
+            run = Run(build / "kldrcim", "--url", url, *space, *asked)
+            row |= figures(run, "as a client: ") | {"as a client: first line": first_line(run)}
         yield row
 
 
-def served(build, environment):
-    process = subprocess.Popen(
-        [build / "kldrcim", "serve", "--listen", "127.0.0.1:0"], env={"PATH": "/usr/bin:/bin"} | environment,
-        stdout=subprocess.PIPE, text=True)
-    return process, process.stdout.readline().split()[-1]
+@contextlib.contextmanager
+def simulated(build, counts):
+    """The environment in which the module finds a host of that size."""
+    with tempfile.NamedTemporaryFile("w", suffix=".json") as inventory:
+        options = [word for name, count in zip(("--adapters", "--ports", "--targets", "--luns"), counts) for word in (name, str(count))]
+        subprocess.run([sys.executable, "-B", SOURCE / "simulator/make_inventory.py", *options], stdout=inventory, check=True)
+        yield {"LD_LIBRARY_PATH": str(build / "simulator"), "KLDR_SIMULATOR_INVENTORY": inventory.name}
 
 
-def trees(build, before, most):
-    for verb in ("tree", "graph"):
-        for counts in HOSTS:
-            units = counts[0] * counts[1] * counts[2] * counts[3]
-            if units > most:
-                continue
-            with tempfile.NamedTemporaryFile("w", suffix=".json") as inventory:
-                options = [word for name, count in zip(("--adapters", "--ports", "--targets", "--luns"), counts) for word in (name, str(count))]
-                subprocess.run(
-                    [sys.executable, "-B", SOURCE / "simulator/make_inventory.py", *options], stdout=inventory, check=True)
-                host = {
-                    "HOME": "/nonexistent", "LD_LIBRARY_PATH": str(build / "simulator"),
-                    "KLDR_SIMULATOR_INVENTORY": inventory.name,
-                }
-                row = {"verb": verb, "host": " x ".join(map(str, counts))}
-                if before:
-                    row |= figures(Run(before, verb, **host), "before: ")
-                here = Run(build / "kldrcim", verb, **host)
-                row = {"verb": verb, "host": row["host"], "lines": f"{here.lines:,}"} | row | figures(here)
-                process, url = served(build, host)
-                row |= figures(Run(build / "kldrcim", "--url", url, verb), "as a client: ")
-                process.terminate()
-                process.wait()
-                process.stdout.close()
-            print(json.dumps(row), file=sys.stderr)
-            yield row
+def walked(build, before, counts, host, *words):
+    """One row: in the process, as it was before, and as a client."""
+    there = Run(before, *words, **host) if before else None
+    here = Run(build / "kldrcim", *words, **host)
+    row = {"host": size_of(counts), "verb": " ".join(words), "lines": f"{here.lines:,}"} | figures(here)
+    with served(build, **host) as url:
+        row |= figures(Run(build / "kldrcim", "--url", url, *words), "as a client: ")
+    if there:
+        row |= figures(there, "before: ")
+    print(json.dumps(row), file=sys.stderr)
+    return row
+
+
+def of_the_module(build, before, most):
+    for counts, verbs in ((UNITS, (("ei", "KALDERA_StorageExtent", "--format", "json"), ("ein", "KALDERA_StorageExtent"))),
+                          *((each, (("tree",), ("tree", "--format", "json"), ("graph",))) for each in HOSTS)):
+        units = counts[0] * counts[1] * counts[2] * counts[3]
+        if units > most:
+            continue
+        # What takes long is shown once: the lines of JSON are ten times as many.
+        verbs = verbs if units < 200_000 else [words for words in verbs if "json" not in words]
+        with simulated(build, counts) as host:
+            for words in verbs:
+                # What kept all of it would take tens of gigabytes of the largest.
+                yield walked(build, before if units < 200_000 else None, counts, host, *words)
 
 
 def main():
@@ -108,9 +149,13 @@ def main():
     parser.add_argument("--instances", type=int, default=100_000)
     options = parser.parse_args()
     build = options.build.resolve()
-    tables = [list(enumerations(build, options.instances)), list(trees(build, options.before, options.lines))]
+    print(f"load of the machine before: {os.getloadavg()[0]:.1f}")
+    with tempfile.TemporaryDirectory() as folder:
+        tables = [list(enumerations(build, options.instances, folder))]
+    tables.append(list(of_the_module(build, options.before, options.lines)))
     for table in tables:
         print_table(table)
+    print(f"\nload of the machine behind: {os.getloadavg()[0]:.1f}")
     options.output.write_text(json.dumps({"tables": tables}, indent=2) + "\n", encoding="utf-8")
 
 

@@ -2,10 +2,13 @@
 // returned. With TOY_MANY_FAILS the enumeration fails behind the last; in the middle it waits for a writer of
 // the FIFO that TOY_MANY_WAITS names. The 2000th is wider than others, and of the 3000th on there is more to
 // tell. With TOY_MANY_LEAVES nothing is released, and some of what is left is looked at before the end.
+// Before the first leaves, the time of the monotonic clock is written into the file that TOY_MANY_NOTES
+// names.
 #include "tests/broker/toy.h"
 
 #include <cstdio>
 #include <cstdlib>
+#include <ctime>
 #include <vector>
 
 namespace toy {
@@ -32,6 +35,20 @@ void wait_in_the_middle(CMPIUint32 id)
         return;
     if (std::FILE* file = std::fopen(fifo, "r"))
         std::fclose(file);
+}
+
+/// In seconds.
+void note_the_first(CMPIUint32 id)
+{
+    const char* notes = std::getenv("TOY_MANY_NOTES");
+    if (!notes || id != 1)
+        return;
+    timespec now = {};
+    clock_gettime(CLOCK_MONOTONIC, &now);
+    if (std::FILE* file = std::fopen(notes, "w")) {
+        std::fprintf(file, "%lld.%09ld\n", static_cast<long long>(now.tv_sec), now.tv_nsec);
+        std::fclose(file);
+    }
 }
 
 /// What an instance is made of, if it is left to the server.
@@ -88,6 +105,7 @@ CMPIStatus return_paths(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* r
 {
     for (CMPIUint32 id = 1; id <= wanted(); ++id) {
         CMPIObjectPath* path = many_path(id);
+        note_the_first(id);
         CMReturnObjectPath(result, path);
         wait_in_the_middle(id);
         if (!std::getenv("TOY_MANY_LEAVES"))
@@ -111,6 +129,7 @@ CMPIStatus return_instances(CMPIInstanceMI*, const CMPIContext*, const CMPIResul
         if (leaves)
             if (const Left left = leave(id, path, instance); id % 1000 == 1)
                 seldom.push_back(left);
+        note_the_first(id);
         const CMPIStatus status = CMReturnInstance(result, instance);
         if (!leaves) {
             CMRelease(instance);

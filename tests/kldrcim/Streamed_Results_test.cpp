@@ -102,6 +102,35 @@ TEST(Streamed_Results, TheFirstIsReadBeforeTheLastIsThere)
     unlink(fifo);
 }
 
+TEST(Streamed_Results, TheFirstIsReadBeforeTheSecondIsThere)
+{
+    const char* const fifo = "streamed.fifo";
+    unlink(fifo);
+    ASSERT_EQ(0, mkfifo(fifo, 0600));
+    setenv("TOY_MANY", "2", 1);
+    setenv("TOY_MANY_WAITS", fifo, 1);
+    for (const char* verb : {"ei", "ein"})
+        for (const char* format : formats) {
+            const bool has_widths = verb == std::string("ei") && format == std::string("table");
+            if (has_widths)
+                continue;
+            SCOPED_TRACE(std::string(verb) + " " + format);
+            Piped run(command(verb, format));
+            std::string text;
+            while (text.find('1') == text.npos)
+                text += run.read_some();
+            EXPECT_EQ(std::string::npos, text.find('2')) << "the provider waits until somebody has read";
+            const int writer = open(fifo, O_RDWR);
+            for (std::string more = text; !more.empty(); text += more)
+                more = run.read_some();
+            close(writer);
+            EXPECT_NE(std::string::npos, text.find('2'));
+        }
+    unsetenv("TOY_MANY");
+    unsetenv("TOY_MANY_WAITS");
+    unlink(fifo);
+}
+
 #if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__)
 TEST(Streamed_Results, TheirNumberTakesNoMemory)
 {
