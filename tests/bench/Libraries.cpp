@@ -1,10 +1,10 @@
 #include "tests/bench/Libraries.h"
 
 #include "tests/bench/Lean_Broker.h"
+#include "tests/bench/Open_Library.h"
 
 #include <cstdio>
 #include <cstdlib>
-#include <dlfcn.h>
 
 namespace KPRV::bench {
 
@@ -16,29 +16,7 @@ namespace {
     exit(1);
 }
 
-template <class Function>
-Function function(void* library, const char* name)
-{
-    return reinterpret_cast<Function>(find_symbol(library, name));
-}
-
 } // namespace
-
-void* open_library(const char* path)
-{
-    void* const library = dlopen(path, RTLD_NOW | RTLD_GLOBAL);
-    if (!library)
-        give_up(dlerror());
-    return library;
-}
-
-void* find_symbol(void* library, const std::string& name)
-{
-    void* const symbol = dlsym(library, name.c_str());
-    if (!symbol)
-        give_up(dlerror());
-    return symbol;
-}
 
 Fast_Library& Fast_Library::get()
 {
@@ -49,17 +27,9 @@ Fast_Library& Fast_Library::get()
 Fast_Library::Fast_Library() : Fast_Library(open_library(KLDR_FAST_LIBRARY)) {}
 
 Fast_Library::Fast_Library(void* library)
-    : prepare(function<Prepare_Storage>(library, "prepare_storage")),
-      record(function<Record_Calls>(library, "record_calls")),
-      get_adapters(function<JsonReqFP>(library, "getAllAdaptersIndexString")),
-      get_adapter(function<JsonReqFP>(library, "getHbaByWwn")),
-      get_fc_ports(function<JsonReqFP>(library, "getFcPhyPortIndicesByAdapter")),
-      get_port(function<JsonReqFP>(library, "getPortByWwn")),
-      get_remote_ports(function<JsonReqFP>(library, "getAllRemotePorts")),
-      get_remote_port(function<JsonReqFP>(library, "getCompleteRemotePort")),
-      get_server_time(function<JsonReqFP>(library, "getServerTime")),
-      get_fc(function<JsonReqFP>(library, "getFcByFcWwn")),
-      _send_event(function<evtProcessCB>(library, "send_event"))
+    : prepare(find_function<Prepare_Storage>(library, "prepare_storage")),
+      record(find_function<Record_Calls>(library, "record_calls")),
+      _send_event(find_function<evtProcessCB>(library, "send_event"))
 {
 }
 
@@ -80,8 +50,8 @@ template <class MI>
 MI* Module::create(const char* class_name, const char* kind) const
 {
     using Factory = MI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-    const auto factory =
-        function<Factory>(_handle, (std::string(class_name) + "_Provider_Create_" + kind + "MI").c_str());
+    const auto factory = find_function<Factory>(
+        _handle, (std::string(class_name) + "_Provider_Create_" + kind + "MI").c_str());
     const Lean_Broker& server = Lean_Broker::get();
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     MI* const mi = factory(server.broker(), server.context(), &status);

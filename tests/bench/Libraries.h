@@ -10,8 +10,8 @@
 
 namespace KPRV::bench {
 
-/// The prepared adapter library, opened by its path; the module, which asks for it by name, gets the same
-/// one.
+/// The prepared adapter library, opened by its path; whoever asks for it by name from then on, as the module
+/// and the plain twins do, gets the same one.
 class Fast_Library
 {
 public:
@@ -24,16 +24,6 @@ public:
     const Prepare_Storage prepare;
     /// Who takes note of them.
     const Record_Calls record;
-
-    // The entry points, for the plain twins.
-    const JsonReqFP get_adapters;
-    const JsonReqFP get_adapter;
-    const JsonReqFP get_fc_ports;
-    const JsonReqFP get_port;
-    const JsonReqFP get_remote_ports;
-    const JsonReqFP get_remote_port;
-    const JsonReqFP get_server_time;
-    const JsonReqFP get_fc;
 
 private:
     Fast_Library();
@@ -61,10 +51,5 @@ private:
 
     void* _handle;
 };
-
-/// Opens a library or ends the program.
-void* open_library(const char* path);
-/// Finds a symbol or ends the program.
-void* find_symbol(void* library, const std::string& name);
 
 } // namespace KPRV::bench

@@ -1,7 +1,5 @@
 #include "tests/bench/plain_support.h"
 
-#include "tests/bench/Lean_Broker.h"
-
 #include <arpa/inet.h>
 #include <netdb.h>
 #include <unistd.h>
@@ -82,7 +80,7 @@ const char* plain_key(const CMPIObjectPath* path, const char* name)
 CMPIObjectPath* plain_device_path(const CMPIBroker* broker, const char* class_name, const char* host,
                                   const char* own_key, const char* key)
 {
-    CMPIObjectPath* const path = CMNewObjectPath(broker, Lean_Broker::NAME_SPACE, class_name, nullptr);
+    CMPIObjectPath* const path = CMNewObjectPath(broker, "root/kaldera", class_name, nullptr);
     CMAddKey(path, "CreationClassName", plain_chars(class_name), CMPI_chars);
     CMAddKey(path, "SystemCreationClassName", plain_chars("KALDERA_ComputerSystem"), CMPI_chars);
     CMAddKey(path, "SystemName", plain_chars(host), CMPI_chars);

@@ -1,8 +1,7 @@
 #pragma once
 
-#include "tests/bench/Libraries.h"
-
 #include <cmpimacs.h>
+#include <json/value.h>
 
 #include <cstddef>
 #include <span>

@@ -1,6 +1,6 @@
 #include "tests/bench/plain_tunnel.h"
 
-#include "tests/bench/Libraries.h"
+#include "tests/bench/plain_library.h"
 #include "tests/bench/plain_support.h"
 
 #include <json/reader.h>
@@ -22,12 +22,12 @@ const std::map<std::string, procedure> procedures = [] {
 #include "contracts/agent/Methods.def"
     };
     all["discovery.getServerTime"] = [](const Json::Value& params) {
-        return Fast_Library::get().get_server_time(params);
+        return plain_library::get().get_server_time(params);
     };
     all["discovery.getFcByFcWwn"] = [](const Json::Value& params) {
         Json::Value query;
         query["wwn"] = params[0].asString();
-        return Fast_Library::get().get_fc(query);
+        return plain_library::get().get_fc(query);
     };
     return all;
 }();

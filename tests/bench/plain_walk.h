@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/bench/Libraries.h"
+#include "tests/bench/plain_library.h"
 #include "tests/bench/plain_support.h"
 
 #include <cstring>
@@ -14,7 +14,7 @@ namespace KPRV::bench {
 template <class Visit>
 void plain_for_each_adapter(Visit visit)
 {
-    const Fast_Library& library = Fast_Library::get();
+    const plain_library& library = plain_library::get();
     const Json::Value adapters = library.get_adapters(Json::Value());
     if (plain_is_bad(adapters))
         return;
@@ -32,7 +32,7 @@ void plain_for_each_adapter(Visit visit)
 template <class Visit>
 void plain_for_each_port_of(const Json::Value& adapter, Visit visit)
 {
-    const Fast_Library& library = Fast_Library::get();
+    const plain_library& library = plain_library::get();
     Json::Value request, port_request;
     request["indexStr"] = adapter;
     const Json::Value ports = library.get_fc_ports(request);
@@ -52,7 +52,7 @@ void plain_for_each_port_of(const Json::Value& adapter, Visit visit)
 template <class Visit>
 void plain_for_each_port(Visit visit)
 {
-    const Json::Value adapters = Fast_Library::get().get_adapters(Json::Value());
+    const Json::Value adapters = plain_library::get().get_adapters(Json::Value());
     if (plain_is_bad(adapters))
         return;
     for (const Json::Value& adapter : adapters["indexStrings"])
@@ -78,7 +78,7 @@ struct plain_target
 template <class Visit>
 void plain_for_each_target(const Json::Value& port, Visit visit)
 {
-    const Fast_Library& library = Fast_Library::get();
+    const plain_library& library = plain_library::get();
     Json::Value request;
     request["pPortWwn"] = port;
     request["lPortWwn"] = port;
