@@ -6,8 +6,6 @@ PATH is an archive, an unpacked server or a folder of them; FOLDER the build of 
 """
 
 import argparse
-import json
-import os
 import shutil
 import subprocess
 import sys
@@ -18,9 +16,9 @@ from dataclasses import dataclass
 from pathlib import Path
 
 import archives
+import machine
 
-HERE = Path(__file__).resolve().parent
-SOURCE = HERE.parent.parent
+HERE = machine.HERE
 #: In seconds, for one machine.
 QUICK, LONG = 300, 3600
 REMOTE = "remote_kldrcim"
@@ -101,22 +99,14 @@ def run(job, builds, long):
     """Status and output of a job, with the seconds that it took."""
     build = builds[job.server.word_size]
     packages = build / "servers"
-    room = {
-        "name": job.server.name,
-        "kind": job.server.kind,
-        "word_size": job.server.word_size,
-        "long": long,
-        "package": "/mnt/packages/kldrprovider.deb",
-        "adapter_library": "/mnt/packages/libdzntj.so",
-        "remote_kldrcim": f"/mnt/packages/{REMOTE}" if (packages / REMOTE).exists() else "",
-    }
-    inside = "cd /mnt/source/tests/servers && exec \"$@\""
+    remote = f"/mnt/packages/{REMOTE}" if (packages / REMOTE).exists() else ""
     begin = time.monotonic()
     try:
         done = subprocess.run(
-            [HERE / "machine.sh", job.server.path, SOURCE, packages, "bash", "-c", inside, "machine", *job.command],
-            env={**os.environ, "KLDR_ROOM": json.dumps(room)}, stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
-            stderr=subprocess.STDOUT, text=True, errors="replace", check=False, timeout=LONG if long else QUICK,
+            machine.command_in(job.server, packages, job.command),
+            env=machine.environment_for(job.server, long=long, remote_kldrcim=remote), stdin=subprocess.DEVNULL,
+            stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True, errors="replace", check=False,
+            timeout=LONG if long else QUICK,
         )  # fmt: skip
         status, output = done.returncode, done.stdout
     except subprocess.TimeoutExpired as late:
