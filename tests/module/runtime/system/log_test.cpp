@@ -151,6 +151,34 @@ TEST(log, ConfigurationIsTriedByEveryCall)
     EXPECT_EQ(text_of_line(lines[1]), "and on");
 }
 
+TEST(log, AFileThatHasJustComeIsFoundAtOnce)
+{
+    for (int turn = 0; turn < 200; turn++) {
+        Home home;
+        home.write("prepared", "LOG_LEVEL=ERR\n");
+        const std::string from = home.path("prepared"), to = home.path(".cimplerc");
+        LOG(ERR, "nobody listens");
+        // The quickest way to put one in place.
+        ASSERT_EQ(rename(from.c_str(), to.c_str()), 0);
+        LOG(ERR, "found");
+        EXPECT_EQ(split(home.messages()).size(), 1u) << turn;
+    }
+}
+
+TEST(log, AnotherHomeIsLookedAtAtOnce)
+{
+    Home other;
+    other.level("ERR");
+    for (int turn = 0; turn < 200; turn++) {
+        Home home;
+        LOG(ERR, "nobody listens");
+        const Environment_Override override("HOME", other.path());
+        LOG(ERR, "found");
+        close_log();
+        EXPECT_EQ(split(other.messages()).size(), size_t(turn) + 1);
+    }
+}
+
 TEST(log, OnceOpenTheFileIsNotReadAgain)
 {
     Home home;
