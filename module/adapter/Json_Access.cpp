@@ -127,13 +127,16 @@ const Json::Value& member(const Json::Value& object, const char* name)
 
 namespace {
 
-/// Of two texts of one size. Names are short: to compare them here takes less than a call.
-[[gnu::always_inline]] inline bool is_same(const char* a, const char* b, size_t size)
+/// Names are short: to compare them here takes less than a call.
+[[gnu::always_inline]] inline bool is_same(std::string_view a, std::string_view b)
 {
+    const size_t size = a.size();
+    if (size != b.size())
+        return false;
     const auto same = [=]<class Part>(Part, size_t at) {
         Part x, y;
-        memcpy(&x, a + at, sizeof x);
-        memcpy(&y, b + at, sizeof y);
+        memcpy(&x, a.data() + at, sizeof x);
+        memcpy(&y, b.data() + at, sizeof y);
         return x == y;
     };
     // The last part may overlap the one before.
@@ -142,7 +145,7 @@ namespace {
         return same(uint64_t(), 0) && same(uint64_t(), size - LONG);
     if (size >= SHORT && size < LONG)
         return same(uint32_t(), 0) && same(uint32_t(), size - SHORT);
-    return memcmp(a, b, size) == 0;
+    return a == b;
 }
 
 } // namespace
@@ -153,21 +156,24 @@ void find_members(const Json::Value& object, std::span<const std::string_view> n
     std::fill_n(found, names.size(), nullptr);
     if (!object.isObject())
         return;
-    // An object keeps its members in the same order. Counted, since comparing iterators is a call, too.
-    const std::string_view* wanted = names.data();
-    const std::string_view* const end = wanted + names.size();
+    // An object keeps its members in the same order: what comes before a name that was met is absent, and
+    // nothing is to be compared for more than equality. Counted, since comparing iterators is a call, too.
+    const std::string_view* next = names.data();
+    const std::string_view* const end = next + names.size();
     auto member = object.begin();
-    for (auto count = object.size(); count > 0 && wanted != end; --count, ++member) {
+    for (auto count = object.size(); count > 0; --count, ++member) {
         const char* name_end = nullptr;
-        const char* const name = member.memberName(&name_end);
-        const size_t size = size_t(name_end - name);
-        if (wanted->size() != size || !is_same(wanted->data(), name, size)) [[unlikely]] {
-            const std::string_view other(name, size);
-            wanted = std::find_if_not(wanted, end, [=](std::string_view each) { return each < other; });
-            if (wanted == end || *wanted != other)
-                continue;
-        }
-        found[wanted++ - names.data()] = &*member;
+        const char* const name_begin = member.memberName(&name_end);
+        const std::string_view name(name_begin, size_t(name_end - name_begin));
+        const std::string_view* met = next;
+        while (met != end && !is_same(*met, name))
+            ++met;
+        if (met == end)
+            continue;
+        found[met - names.data()] = &*member;
+        next = met + 1;
+        if (next == end)
+            return;
     }
 }
 

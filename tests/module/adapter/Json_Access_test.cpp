@@ -123,6 +123,26 @@ TEST(Json_Access, MembersInOnePass)
     }
 }
 
+/// One that is asked for is found behind others of its size that differ in any place.
+TEST(Json_Access, MembersAreToldFromThoseOfTheirSize)
+{
+    for (const size_t size : {1, 3, 4, 7, 8, 9, 16, 17, 40}) {
+        const std::string name(size, 'n');
+        Json::Value object;
+        for (size_t i = 0; i < size; i++) {
+            for (const char other : {'a', 'z'}) {
+                std::string neighbour = name;
+                neighbour[i] = other;
+                object[neighbour] = false;
+            }
+        }
+        const Members<1>::Names names = {name};
+        EXPECT_FALSE(Members<1>(object, names).has(0)) << size;
+        object[name] = true;
+        EXPECT_TRUE(asBool(Members<1>(object, names)[0])) << size;
+    }
+}
+
 TEST(Json_Access, TextsWhereTheyStand)
 {
     EXPECT_EQ(asView(json("''")), "");
