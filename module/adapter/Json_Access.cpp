@@ -42,6 +42,11 @@ T number(const Json::Value& value, const char* failure)
     throw Not_Convertible(failure);
 }
 
+Not_Convertible no_text()
+{
+    return Not_Convertible("Type is not convertible to string");
+}
+
 } // namespace
 
 bool isArrayOrNull(const Json::Value& value)
@@ -67,7 +72,14 @@ std::string_view asView(const Json::Value& value)
         return "";
     if (value.isBool())
         return value.asBool() ? "true" : "false";
-    throw Not_Convertible("Type is not convertible to string");
+    throw no_text();
+}
+
+void expectText(const Json::Value& value)
+{
+    const Json::ValueType type = value.type();
+    if (type != Json::stringValue && type != Json::nullValue && type != Json::booleanValue)
+        throw no_text();
 }
 
 std::string asString(const Json::Value& value)

@@ -34,6 +34,8 @@ std::string asString(const Json::Value& value);
 void take_text(Json::Value& value, Json::Value& to);
 /// The same text where it stands, as long as the value stands.
 std::string_view asView(const Json::Value& value);
+/// Throws where `asView` would.
+void expectText(const Json::Value& value);
 /// A fraction is cut off.
 int asInt(const Json::Value& value);
 /// A fraction is cut off.

@@ -1,7 +1,5 @@
 #include "module/model/Lun_Data.h"
 
-#include "module/model/Record_Filling.h"
-
 #include <algorithm>
 
 namespace KPRV {
@@ -34,19 +32,19 @@ bool fill_lun(const Json::Value& element, bool& no_description_seen, _hbaLunInfo
     if (!members.has(VENDOR) || !members.has(NUMBER) || !members.has(PRODUCT_ID))
         return false;
     lun.number = asUInt(members[NUMBER]);
-    lun.vendor = cut_text(members[VENDOR], VENDOR_SIZE);
-    lun.productID = cut_text(members[PRODUCT_ID], PRODUCT_SIZE);
+    lun.vendor = Cut_Text(members[VENDOR], VENDOR_SIZE);
+    lun.productID = Cut_Text(members[PRODUCT_ID], PRODUCT_SIZE);
     lun.idType = asUInt(members[ID_TYPE]);
 
     if (members.has(DESCRIPTION))
-        lun.description = cut_text(members[DESCRIPTION], TEXT_SIZE);
+        lun.description = Cut_Text(members[DESCRIPTION], TEXT_SIZE);
     else
         no_description_seen = true;
     // One LUN without a description puts all that follow in the same walk under these rules, those with a
     // description, too: the names of LUNs that clients already keep depend on it.
     if (no_description_seen) {
         if (members.has(PRODUCT_SERIAL_NUMBER))
-            lun.serialNumber = cut_text(members[PRODUCT_SERIAL_NUMBER], TEXT_SIZE);
+            lun.serialNumber = Cut_Text(members[PRODUCT_SERIAL_NUMBER], TEXT_SIZE);
         lun.idType = members.has(PRODUCT_SERIAL_NUMBER) ? BY_PRODUCT : UNKNOWN;
     }
     return true;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "module/model/Record_Filling.h"
 #include "module/runtime/ground/Types.h"
 
 #include <json/value.h>
@@ -9,17 +10,17 @@
 namespace KPRV {
 
 /// What the builders know of one LUN of a remote port. Texts are cut to their field and stand in the answer
-/// that they were read from; an unknown one is empty.
+/// that they are read from; an unknown one is empty.
 struct _hbaLunInfo
 {
     uint32 number;
     std::string_view
         path; ///< Where it is seen: the flat addresses of local and remote port, "_" behind each.
-    std::string_view vendor;
-    std::string_view productID;
-    std::string_view serialNumber; ///< Only where it names the LUN.
-    std::string_view deviceName;   ///< Nothing fills it yet.
-    std::string_view description;
+    Cut_Text vendor;
+    Cut_Text productID;
+    Cut_Text serialNumber; ///< Only where it names the LUN.
+    Cut_Text deviceName;   ///< Nothing fills it yet.
+    Cut_Text description;
     uint32 idType; ///< What identifies the LUN; decides on the form of its name.
 };
 

@@ -49,9 +49,9 @@ const Name_Row* name_row(const _hbaLunInfo& lun)
     return row == std::end(name_rows) ? nullptr : row;
 }
 
-std::string_view trimmed(std::string_view text)
+std::string_view trimmed(const Cut_Text& text)
 {
-    return ProviderUtil::trimmed(text);
+    return ProviderUtil::trimmed(text.view());
 }
 
 String name(Named_By source, const _hbaLunInfo& lun)
@@ -63,7 +63,7 @@ String name(Named_By source, const _hbaLunInfo& lun)
         return String::joined(parts);
     }
     case Named_By::DESCRIPTION:
-        return to_String(lun.description);
+        return to_String(lun.description.view());
     case Named_By::NOTHING:
         break;
     }
@@ -163,7 +163,7 @@ KALDERA_LogicalDisk* TargetHelper::getLogicalDiskInstance(const _hbaPortInfo& po
     if (disk && wanted.whole()) {
         const std::string_view device = trimmed(lun.deviceName);
         const bool by_device = !device.empty();
-        disk->Name.set(by_device ? to_String(device) : to_String(lun.description));
+        disk->Name.set(by_device ? to_String(device) : to_String(lun.description.view()));
         disk->NameFormat.set(by_device ? 12 : 1);
         disk->NameNamespace.set(by_device ? 8 : 1);
     }

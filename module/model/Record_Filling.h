@@ -29,12 +29,27 @@ inline std::string_view text_of(const Json::Value& value)
     return text.substr(0, text.find('\0'));
 }
 
-/// The same of its first `most` bytes.
-inline std::string_view cut_text(const Json::Value& value, size_t most)
+/// The same of its first `most` bytes, taken out of the answer by whoever reads it. Whether it is a text is
+/// seen at once: `Not_Convertible` comes from here.
+class Cut_Text
 {
-    const std::string_view text = asView(value).substr(0, most);
-    return text.substr(0, text.find('\0'));
-}
+public:
+    /// The empty text.
+    Cut_Text() = default;
+    Cut_Text(const Json::Value& value, size_t most) : _value(&value), _most(most) { expectText(value); }
+
+    std::string_view view() const
+    {
+        if (!_value)
+            return "";
+        const std::string_view text = asView(*_value).substr(0, _most);
+        return text.substr(0, text.find('\0'));
+    }
+
+private:
+    const Json::Value* _value = nullptr;
+    size_t _most = 0;
+};
 
 template <size_t N>
 void copy_member(char (&field)[N], const Json::Value& object, const char* name)

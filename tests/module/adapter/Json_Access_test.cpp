@@ -149,6 +149,10 @@ TEST(Json_Access, TextsWhereTheyStand)
     EXPECT_EQ(asView(json("null")), "");
     EXPECT_EQ(asView(json("true")), "true");
     EXPECT_THROW(asView(json("5")), Not_Convertible);
+    for (const char* text : {"''", "'x'", "null", "true"})
+        EXPECT_NO_THROW(expectText(json(text))) << text;
+    for (const char* text : {"5", "-5", "0.5", "[]", "{}"})
+        EXPECT_THROW(expectText(json(text)), Not_Convertible) << text;
     const auto taken = [](Json::Value value) {
         Json::Value to("former");
         take_text(value, to);

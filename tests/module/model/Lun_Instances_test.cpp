@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <list>
 #include <map>
 
 using namespace KPRV;
@@ -17,17 +18,20 @@ struct Lun_Instances : testing::Test
     const TargetHelper* helper = TargetHelper::getTargetHelperObject();
     Log_Capture log;
     _hbaPortInfo port = {};
+    std::list<Json::Value> answers;
     _hbaLunInfo lun = {};
 
     Lun_Instances()
     {
         copy_text(port.portWWN, "W");
         lun.path = "W__";
-        lun.vendor = " V ";
-        lun.productID = " P ";
-        lun.serialNumber = " S ";
-        lun.description = " D ";
+        lun.vendor = told(" V ");
+        lun.productID = told(" P ");
+        lun.serialNumber = told(" S ");
+        lun.description = told(" D ");
     }
+
+    Cut_Text told(const std::string& text) { return {answers.emplace_back(text), text.size()}; }
 };
 
 struct Row
@@ -78,13 +82,13 @@ TEST_F(Lun_Instances, ADiskGoesByItsDeviceNameIfItHasOne)
 {
     lun.idType = 5;
     for (const char* name : {"", "   "}) {
-        lun.deviceName = name;
+        lun.deviceName = told(name);
         Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
         EXPECT_EQ(disk["Name"], " D ");
         EXPECT_EQ(disk["NameFormat"], "1");
         EXPECT_EQ(disk["NameNamespace"], "1");
     }
-    lun.deviceName = " /dev/sdb ";
+    lun.deviceName = told(" /dev/sdb ");
     Set_Properties disk = taken(helper->getLogicalDiskInstance(port, lun));
     EXPECT_EQ(disk["Name"], "/dev/sdb");
     EXPECT_EQ(disk["NameFormat"], "12");
@@ -113,7 +117,7 @@ TEST_F(Lun_Instances, LongNamesAreWhole)
     const std::string vendor(8, 'v'), product(16, 'p'), serial(64, 's'), description(64, 'd'),
         device(64, 'n');
     const std::string path = std::string(47, 'l') + "_" + std::string(23, 'r') + "_";
-    lun = {2147483648, path, vendor, product, serial, device, description, 0};
+    lun = {2147483648, path, told(vendor), told(product), told(serial), told(device), told(description), 0};
     Set_Properties extent = taken(helper->getStorageExtentInstance(port, lun));
     EXPECT_EQ(extent["Name"], vendor + "+" + product + "+" + serial);
     EXPECT_EQ(extent["DeviceID"], path + vendor + "_" + product + "_LUN_-2147483648");
