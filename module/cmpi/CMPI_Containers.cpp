@@ -87,8 +87,34 @@ int CMPI_Container::_not_made(const char* name)
     return -1;
 }
 
+// Inline: each value of an export ends in one of the two.
+
+inline int CMPIInstance_Container::_set(const char* name, const CMPIData& data)
+{
+    if (CMSetProperty(_instance, name, &data.value, data.type).rc == CMPI_RC_OK) [[likely]]
+        return 0;
+    LOG_CONVERSION(WARN, "CMSetProperty() failed: %s", name);
+    return -1;
+}
+
+inline int CMPIObjectPath_Container::_set(const char* name, const CMPIData& data)
+{
+    if (CMAddKey(_path, name, &data.value, data.type).rc == CMPI_RC_OK)
+        return 0;
+    LOG_CONVERSION(WARN, "CMAddKey() failed");
+    return -1;
+}
+
 template <class Final>
-int CMPI_Container::_set_cell(Final& container, const Instance* instance, const Cell& cell)
+void CMPI_Container::_put_cells(Final& container, const Instance* instance, uint32 mask)
+{
+    put_each(instance, mask,
+             [=, this, &container](const Cell& cell) INLINE { return _put_cell(container, instance, cell); });
+}
+
+template <class Final>
+[[gnu::always_inline]] inline int CMPI_Container::_put_cell(Final& container, const Instance* instance,
+                                                            const Cell& cell)
 {
     CMPIData data = {};
     if (cell.kind == Cell_Kind::TEXT && !_gives_back) {
@@ -103,7 +129,7 @@ int CMPI_Container::_set_cell(Final& container, const Instance* instance, const 
         if (array_to_cmpi_data(_broker, instance, cell, data) != 0)
             return _not_made(cell.feature->name);
     } else if (cell.kind != Cell_Kind::REFERENCE || !_find_end(instance, cell, data)) {
-        return Container::set_cell(instance, cell);
+        return set_cell(instance, cell);
     }
     return container._set(cell.feature->name, data);
 }
@@ -149,9 +175,9 @@ const char* CMPIInstance_Container::peek_name(uint32 index, String&)
     }
 }
 
-int CMPIInstance_Container::set_cell(const Instance* instance, const Cell& cell)
+void CMPIInstance_Container::put_cells(const Instance* instance, uint32 mask)
 {
-    return _set_cell(*this, instance, cell);
+    _put_cells(*this, instance, mask);
 }
 
 CMPICount CMPIInstance_Container::_count()
@@ -164,17 +190,9 @@ CMPIData CMPIInstance_Container::_at(CMPICount index, CMPIString** name)
     return CMGetPropertyAt(_instance, index, name, nullptr);
 }
 
-int CMPIInstance_Container::_set(const char* name, const CMPIData& data)
+void CMPIObjectPath_Container::put_cells(const Instance* instance, uint32 mask)
 {
-    if (CMSetProperty(_instance, name, &data.value, data.type).rc == CMPI_RC_OK) [[likely]]
-        return 0;
-    LOG_CONVERSION(WARN, "CMSetProperty() failed: %s", name);
-    return -1;
-}
-
-int CMPIObjectPath_Container::set_cell(const Instance* instance, const Cell& cell)
-{
-    return _set_cell(*this, instance, cell);
+    _put_cells(*this, instance, mask);
 }
 
 CMPICount CMPIObjectPath_Container::_count()
@@ -185,14 +203,6 @@ CMPICount CMPIObjectPath_Container::_count()
 CMPIData CMPIObjectPath_Container::_at(CMPICount index, CMPIString** name)
 {
     return CMGetKeyAt(_path, index, name, nullptr);
-}
-
-int CMPIObjectPath_Container::_set(const char* name, const CMPIData& data)
-{
-    if (CMAddKey(_path, name, &data.value, data.type).rc == CMPI_RC_OK)
-        return 0;
-    LOG_CONVERSION(WARN, "CMAddKey() failed");
-    return -1;
 }
 
 /// Plain truncation, whatever the number; the null state stays.
@@ -219,9 +229,9 @@ void CMPIObjectPath_Container::_relax(Value::Type type, Value& value)
         narrow<sint64>(type, value);
 }
 
-int CMPIArgs_Container::set_cell(const Instance* instance, const Cell& cell)
+void CMPIArgs_Container::put_cells(const Instance* instance, uint32 mask)
 {
-    return _set_cell(*this, instance, cell);
+    _put_cells(*this, instance, mask);
 }
 
 CMPICount CMPIArgs_Container::_count()

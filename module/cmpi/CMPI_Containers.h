@@ -43,10 +43,12 @@ protected:
     /// Lets a value pass as one of another type where servers are known to send it so.
     virtual void _relax(Value::Type type, Value& value);
 
-    /// `set_cell` of the container, whose own type tells where its `_set` is. The short ways, which nearly
-    /// all properties go, are made here.
+    /// `put_cells` of the container, whose own type tells where its `_set` is.
     template <class Final>
-    int _set_cell(Final& container, const Instance* instance, const Cell& cell);
+    void _put_cells(Final& container, const Instance* instance, uint32 mask);
+    /// One cell. The short ways, which nearly all properties go, are made here.
+    template <class Final>
+    int _put_cell(Final& container, const Instance* instance, const Cell& cell);
     /// The path of a reference, if it is known.
     bool _find_end(const Instance* instance, const Cell& cell, CMPIData& data) const;
 
@@ -76,9 +78,9 @@ public:
     }
     /// The only reader that is guarded against a throwing server.
     const char* peek_name(uint32 index, String& hold) override;
-    int set_cell(const Instance* instance, const Cell& cell) override;
 
 protected:
+    void put_cells(const Instance* instance, uint32 mask) override;
     friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;
@@ -96,9 +98,9 @@ public:
         : CMPI_Container(repository, broker, name_space), _path(path)
     {
     }
-    int set_cell(const Instance* instance, const Cell& cell) override;
 
 protected:
+    void put_cells(const Instance* instance, uint32 mask) override;
     friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;
@@ -118,12 +120,11 @@ public:
         : CMPI_Container(repository, broker, name_space), _args(args)
     {
     }
-    int set_cell(const Instance* instance, const Cell& cell) override;
-
     /// Where a feature named exactly "return_value" goes, which is no argument. Type 0 until then.
     CMPIData return_value = {};
 
 protected:
+    void put_cells(const Instance* instance, uint32 mask) override;
     friend CMPI_Container;
     CMPICount _count() override;
     CMPIData _at(CMPICount index, CMPIString** name) override;

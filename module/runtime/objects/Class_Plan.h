@@ -137,21 +137,27 @@ void visit_cells(const Meta_Class* meta_class, Cells cells, Visitor visitor)
 
 /// Calls the visitor with each cell of the group that is not null. Most are.
 template <class Visitor>
-void visit_values(const Instance* instance, Cells cells, Visitor visitor)
+INLINE inline void visit_values(const Instance* instance, Cells cells, Visitor visitor)
 {
-    const Meta_Class* const meta_class = instance->__meta_class;
-    if (const Class_Plan* const plan = plan_of(meta_class); plan && !plan->refers) {
-        FOUR_AT_A_TIME
+    const Class_Plan* const plan = plan_of(instance->__meta_class);
+    if (plan && !plan->refers) {
         for (const Cell& cell : (*plan)[cells]) {
             if (!cell.null(instance)) [[unlikely]]
                 visitor(cell);
         }
         return;
     }
-    visit_cells(meta_class, cells, [&](const Cell& cell) {
+    // By value: what is in a register stays there.
+    const auto visit = [=](const Cell& cell) INLINE {
         if (!cell.is_null(instance))
             visitor(cell);
-    });
+    };
+    if (plan) {
+        for (const Cell& cell : (*plan)[cells])
+            visit(cell);
+    } else {
+        visit_cells(instance->__meta_class, cells, visit);
+    }
 }
 
 /// Whether the predicate holds for each cell of the group. The last cell is asked first: of the keys it is

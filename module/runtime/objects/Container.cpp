@@ -14,22 +14,23 @@ int Container::set_cell(const Instance* instance, const Cell& cell)
     return set_value(cell.feature->name, *value, cell.feature->flags);
 }
 
+void Container::put_cells(const Instance* instance, uint32 mask)
+{
+    put_each(instance, mask, [=, this](const Cell& cell) { return set_cell(instance, cell); });
+}
+
+void Container::tell_refused(const Instance* instance, const Cell& cell)
+{
+    LOG_CONVERSION(WARN, "conversion error: %s.%s", instance->__meta_class->name, cell.feature->name);
+}
+
 int Container::convert(const Instance* instance, uint32 mask)
 {
     if (!instance) {
         LOG_CONVERSION(WARN, "ignored null instance arg");
         return -1;
     }
-    const Meta_Class* meta_class = instance->__meta_class;
-    const bool keys = mask == FLAG_KEY;
-    const auto put = [&](const Cell& cell) {
-        if (!keys && mask && !(cell.feature->flags & mask))
-            return;
-        if (set_cell(instance, cell) != 0)
-            LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, cell.feature->name);
-    };
-    // Nulls never leave the instance.
-    visit_values(instance, keys ? Cells::KEYS : Cells::ALL, put);
+    put_cells(instance, mask);
     return 0;
 }
 

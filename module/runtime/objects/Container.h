@@ -31,9 +31,6 @@ public:
         return get_value(index, type, value);
     }
 
-    /// `set_value` of what the cell holds, which is not null; for containers that need no value to take it.
-    virtual int set_cell(const Instance* instance, const Cell& cell);
-
     /// Export: each feature with a flag of the mask (0: all) and a value goes to `set_value`. A feature that
     /// fails is logged and left out. -1 only for a null instance.
     int convert(const Instance* instance, uint32 mask);
@@ -42,7 +39,27 @@ public:
     int convert(const Meta_Class* meta_class, uint32 mask, Instance*& instance);
 
 protected:
+    /// The walk of the export. A container that takes a cell without a value in between has its own.
+    virtual void put_cells(const Instance* instance, uint32 mask);
+    /// `put(cell)`, 0 or -1, for each cell with a flag of the mask (0: all) that is not null.
+    template <class Put>
+    INLINE static void put_each(const Instance* instance, uint32 mask, Put put)
+    {
+        const bool keys = mask == FLAG_KEY;
+        visit_values(instance, keys ? Cells::KEYS : Cells::ALL, [=](const Cell& cell) INLINE {
+            if (!keys && mask && !(cell.feature->flags & mask))
+                return;
+            if (put(cell) != 0) [[unlikely]]
+                tell_refused(instance, cell);
+        });
+    }
+    /// `set_value` of what the cell holds, which is not null.
+    int set_cell(const Instance* instance, const Cell& cell);
+
     const Meta_Repository* _repository;
+
+private:
+    static void tell_refused(const Instance* instance, const Cell& cell);
 };
 
 } // namespace KPRV
