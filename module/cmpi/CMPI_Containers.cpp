@@ -87,7 +87,25 @@ int CMPI_Container::_not_made(const char* name)
     return -1;
 }
 
-// Inline: each value of an export ends in one of the two.
+inline bool CMPI_Container::_find_end(const Instance* instance, const Cell& cell, CMPIData& data) const
+{
+    if (!_ends)
+        return false;
+    data.type = CMPI_ref;
+    data.value.ref = _ends->find(cell.feature->name, cell.in<Instance*>(instance));
+    return data.value.ref;
+}
+
+int CMPI_Container::_make_end(const Instance* instance, const Cell& cell, CMPIData& data)
+{
+    if (reference_to_cmpi_data(_repository, _broker, _name_space, instance, cell, data, _depth) != 0)
+        return -1;
+    if (_ends && data.type == CMPI_ref)
+        _ends->note(cell.feature->name, cell.in<Instance*>(instance), data.value.ref);
+    return 0;
+}
+
+// Each value of an export ends in one of the two.
 
 inline int CMPIInstance_Container::_set(const char* name, const CMPIData& data)
 {
@@ -122,25 +140,19 @@ template <class Final>
         data.value.string = CMNewString(_broker, cell.in<String>(instance).c_str(), nullptr);
         if (!data.value.string)
             return _not_made(cell.feature->name);
+    } else if (cell.kind == Cell_Kind::REFERENCE) {
+        if (!_find_end(instance, cell, data) && _make_end(instance, cell, data) != 0)
+            return _not_made(cell.feature->name);
     } else if (cell.kind == Cell_Kind::PLAIN) {
         data.type = cmpi_type_words[cell.type];
         cell.copy_bytes(instance, &data.value);
     } else if (cell.kind == Cell_Kind::ARRAY && !_gives_back) {
         if (array_to_cmpi_data(_broker, instance, cell, data) != 0)
             return _not_made(cell.feature->name);
-    } else if (cell.kind != Cell_Kind::REFERENCE || !_find_end(instance, cell, data)) {
+    } else {
         return set_cell(instance, cell);
     }
     return container._set(cell.feature->name, data);
-}
-
-bool CMPI_Container::_find_end(const Instance* instance, const Cell& cell, CMPIData& data) const
-{
-    if (!_ends)
-        return false;
-    data.type = CMPI_ref;
-    data.value.ref = _ends->find(cell.feature->name, cell.in<Instance*>(instance));
-    return data.value.ref;
 }
 
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
@@ -150,8 +162,6 @@ int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags
     if (_to_cmpi_data(_repository, _broker, _name_space, value, flags, data, _gives_back ? &made : nullptr,
                       _depth) != 0)
         return _not_made(name);
-    if (Instance* end = nullptr; _ends && data.type == CMPI_ref && value.get_value(end) == 0)
-        _ends->note(name, end, data.value.ref);
     return _set(name, data);
 }
 

@@ -51,6 +51,8 @@ protected:
     int _put_cell(Final& container, const Instance* instance, const Cell& cell);
     /// The path of a reference, if it is known.
     bool _find_end(const Instance* instance, const Cell& cell, CMPIData& data) const;
+    /// The same made, and noted: 0 or -1.
+    int _make_end(const Instance* instance, const Cell& cell, CMPIData& data);
 
     bool _in_bounds(uint32 index);
     /// -1, with a log line.

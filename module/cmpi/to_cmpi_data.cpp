@@ -106,14 +106,17 @@ static int instance_array_to_data(const Meta_Repository* repository, const Maker
     return 0;
 }
 
+static CMPIType instance_word_of(uint32 flags)
+{
+    return flags & (FLAG_EMBEDDED_INSTANCE | FLAG_EMBEDDED_OBJECT) ? CMPI_instance : CMPI_ref;
+}
+
 int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                   const Value& value, uint32 flags, CMPIData& data, Made_Objects* made, unsigned depth)
 {
     const Maker maker = {broker, made};
     data = CMPIData();
-    const CMPIType instance_word =
-        flags & (FLAG_EMBEDDED_INSTANCE | FLAG_EMBEDDED_OBJECT) ? CMPI_instance : CMPI_ref;
-
+    const CMPIType instance_word = instance_word_of(flags);
     if (value.type == Value::NONE) {
         LOG_CONVERSION(WARN, "missing type");
         return -1;
@@ -149,6 +152,15 @@ int array_to_cmpi_data(const CMPIBroker* broker, const Instance* instance, const
         return array_to_data(Maker{broker, nullptr}, cell.in<Array<T>>(instance), cmpi_type_words[tag.code],
                              data);
     });
+}
+
+int reference_to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker,
+                           const char* name_space, const Instance* instance, const Cell& cell, CMPIData& data,
+                           unsigned depth)
+{
+    data = CMPIData();
+    return to_cmpi_scalar<Instance*>::func(repository, broker, name_space, cell.in<Instance*>(instance),
+                                           instance_word_of(cell.feature->flags), data, depth);
 }
 
 int to_cmpi_scalar<Instance*>::func(const Meta_Repository* repository, const CMPIBroker* broker,

@@ -22,6 +22,11 @@ int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, c
 /// noted.
 int array_to_cmpi_data(const CMPIBroker* broker, const Instance* instance, const Cell& cell, CMPIData& data);
 
+/// The same of a cell that holds a reference.
+int reference_to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker,
+                           const char* name_space, const Instance* instance, const Cell& cell, CMPIData& data,
+                           unsigned depth);
+
 template <class T>
 struct to_cmpi_scalar;
 
