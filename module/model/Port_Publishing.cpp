@@ -48,18 +48,19 @@ void PortHelper::publish_endpoints(const Wanted& wanted, _hbaPortInfo& port, Fre
     LOG(DBG, "Number of Rports = %u", remotes.size());
     for (unsigned i = 0; i < remotes.size(); i++) {
         Json::Value answer;
-        if (!remotes.ask(LOG_HERE, i, answer))
+        if (!remotes.ask_next(LOG_HERE, answer))
             continue;
-        const Json::Value& device = member(answer, "deviceData");
-        if (!ProviderUtil::isValidJsonResponse(answer) || device.isNull()) {
+        const Remote_Port remote(answer);
+        if (!remote.is_valid() || remote.device().isNull()) {
             LOG(ERR, "libGetCompleteRemotePort returned NULL for %s", remotes.wwn());
             continue;
         }
-        if (!asBool(member(device, "isTarget")))
+        const Remote_Device device(remote.device());
+        if (!device.is_target())
             continue;
         guarded(LOG_HERE, {"libGetCompleteRemotePort"}, [&] {
             name_remote_port(remotes.wwn(), port);
-            port.status = asInt(member(device, "stateMofValue"));
+            port.status = asInt(device.state());
             instances.append(getSCSIProtocolEndpointInstance(port, false, wanted));
         });
     }

@@ -1,9 +1,7 @@
 #include "module/model/Remote_Ports.h"
 
 #include "module/adapter/Guarded_Call.h"
-#include "module/adapter/Json_Access.h"
 #include "module/adapter/ProviderUtil.h"
-
 namespace KPRV {
 
 Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json::objectValue)
@@ -14,20 +12,24 @@ Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json
         _request["pPortWwn"] = index.c_str();
         _request["lPortWwn"] = index.c_str();
         _list = libGetAllRemotePorts(_request);
+        _next = _list.begin();
     });
     if (answered && !listed())
         LOG_LINE(ERR, site.file, site.line, "libGetAllRemotePorts returns NULL.");
 }
 
-bool Remote_Ports::ask(Call_Site site, unsigned index, Json::Value& answer)
+bool Remote_Ports::ask_next(Call_Site site, Json::Value& answer)
 {
-    const Json::Value& remote_wwn = member(element(_list, index), "remotePortWwn");
+    Json::Value none;
+    Json::Value* const listed_wwn = find_member(*_next++, "remotePortWwn");
+    Json::Value& remote_wwn = listed_wwn ? *listed_wwn : none;
     _wwn.clear();
-    if (!guarded(site, {"libGetAllRemotePorts"}, [&] { _wwn = asString(remote_wwn); }))
+    if (!guarded(site, {"libGetAllRemotePorts"}, [&] { _wwn = asView(remote_wwn); }))
         return false;
     if (!_asked)
         _asked = &_request["rPortWwn"];
-    *_asked = remote_wwn;
+    // The request takes it out of the list.
+    _asked->swap(remote_wwn);
     return guarded_call(site, {"libGetCompleteRemotePort"}, libGetCompleteRemotePort, _request, answer);
 }
 

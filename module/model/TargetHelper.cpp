@@ -2,7 +2,6 @@
 
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/Json_Access.h"
-#include "module/adapter/ProviderUtil.h"
 #include "module/model/Fresh_Instances.h"
 #include "module/model/Record_Filling.h"
 #include "module/model/Remote_Ports.h"
@@ -51,31 +50,33 @@ void TargetHelper::getTargetInstances(const _hbaPortInfo& port, classId_t id, co
     Walk walk = {.port = port, .id = id, .wanted = wanted, .instances = instances};
     for (unsigned i = 0; i < remotes.size(); i++) {
         Json::Value answer;
-        if (!remotes.ask(LOG_HERE, i, answer) || !ProviderUtil::isValidJsonResponse(answer)) {
+        const bool answered = remotes.ask_next(LOG_HERE, answer);
+        const Remote_Port remote(answer);
+        if (!answered || !remote.is_valid()) {
             LOG(ERR, "libGetCompleteRemotePort response is null or has error");
             continue;
         }
         LOG(DBG, "Loop for the rport index =   %d", static_cast<int>(i));
-        guarded(LOG_HERE, entry, [&] { publish_target(walk, i, remotes.wwn(), answer); });
+        guarded(LOG_HERE, entry, [&] { publish_target(walk, i, remotes.wwn(), remote); });
     }
 }
 
 void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
-                                  const Json::Value& answer) const
+                                  const Remote_Port& remote) const
 {
-    const Json::Value& device = member(answer, "deviceData");
-    if (!asBool(member(device, "isTarget"))) {
+    const Remote_Device device(remote.device());
+    if (!device.is_target()) {
         LOG(DBG, "Nothing to do since the its not a Target Rport.");
         return;
     }
-    const std::string type = asString(member(device, "type"));
+    const std::string type = asString(device.type());
     LOG(DBG, "Device type = %s", type.c_str());
     if (is_tape(type) != (walk.id == TAPEDRIVE)) {
         LOG(INFO, "Continue with next rport. Looking for another device type ");
         return;
     }
     LOG(DBG, "rPortWwns[%d]=%s", static_cast<int>(index), wwn);
-    const Json::Value* const luns = find_member(answer, "lunList");
+    const Json::Value* const luns = remote.luns();
     if (!luns || !isArrayOrNull(*luns)) {
         LOG(ERR, "No LUN Info is available for Rport %s.", wwn);
         return;
@@ -83,7 +84,8 @@ void TargetHelper::publish_target(Walk& walk, unsigned index, const char* wwn,
     LOG(DBG, "Number of Luns = %d.", static_cast<int>(luns->size()));
     char address[24];
     copy_flat(address, wwn);
-    const std::string path = std::string(walk.port.portWWN) + "_" + address + "_";
+    std::string path;
+    path.append(walk.port.portWWN).append("_").append(address).append("_");
     for (const Json::Value& element : *luns)
         guarded(LOG_HERE, entry, [&] { publish_lun(walk, path, element); });
 }

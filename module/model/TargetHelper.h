@@ -16,6 +16,7 @@
 namespace KPRV {
 
 class Fresh_Instances;
+class Remote_Port;
 
 /// Publishes what a local FC port sees through the fabric: each LUN of each target, as an extent, a disk or a
 /// tape drive. Nothing is kept between calls. Instances belong to the caller; what the tables of the builders
@@ -44,7 +45,7 @@ private:
     TargetHelper();
 
     struct Walk;
-    void publish_target(Walk& walk, unsigned index, const char* wwn, const Json::Value& answer) const;
+    void publish_target(Walk& walk, unsigned index, const char* wwn, const Remote_Port& remote) const;
     void publish_lun(Walk& walk, const std::string& path, const Json::Value& element) const;
 
     const Logged_Life _life;
