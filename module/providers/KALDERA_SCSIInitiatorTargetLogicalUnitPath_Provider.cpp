@@ -4,7 +4,6 @@
 #include "module/schema/CIM_LogicalDevice.h"
 #include "module/schema/CIM_SCSIProtocolEndpoint.h"
 #include "module/schema/KALDERA_SCSIInitiatorTargetLogicalUnitPath_Skeleton.h"
-#include "module/schema/KALDERA_SCSIProtocolEndpoint.h"
 #include "module/schema/KALDERA_StorageExtent.h"
 #include "module/schema/KALDERA_TapeDrive.h"
 
@@ -13,6 +12,7 @@ namespace KPRV {
 namespace {
 
 using Path = KALDERA_SCSIInitiatorTargetLogicalUnitPath;
+using Endpoint = CIM_SCSIProtocolEndpoint;
 
 /// Any other role counts as a target.
 constexpr uint16 ROLE_INITIATOR = 2;
@@ -78,24 +78,24 @@ public:
             hdr_instances(TAPEDRIVE, wanted.end<KALDERA_TapeDrive>(&Path::LogicalUnit)));
         if (extents.empty() && drives.empty())
             return invalid.answer(ENUM_INSTANCES_OK);
-        List<KALDERA_SCSIProtocolEndpoint> endpoints(fc_hba_instances(SCSIPROTOCOLENDPOINT, Wanted::names()));
+        List<Endpoint> endpoints(fc_hba_instances(SCSIPROTOCOLENDPOINT, Wanted::names()));
         if (endpoints.empty())
             return invalid.answer(ENUM_INSTANCES_OK);
         LOG(DBG, "Number of SCSIPROTOCOLENDPOINT(Initiator and Target)= %d", int(endpoints.size()));
 
         // A target's name begins with the address of the initiator through which it was seen.
-        std::vector<const KALDERA_SCSIProtocolEndpoint*> initiators, targets;
+        std::vector<const Endpoint*> initiators, targets;
         Position_Index targets_of;
         for (uint32 i = 0; i < endpoints.size(); i++) {
-            if (endpoints[i]->Role.value == ROLE_INITIATOR) {
-                initiators.push_back(endpoints[i]);
+            const Endpoint* const endpoint = endpoints[i];
+            if (endpoint->Role.value == ROLE_INITIATOR) {
+                initiators.push_back(endpoint);
                 continue;
             }
-            const std::string_view seen_through =
-                up_to_separator(view_of(endpoints[i]->ElementName.value), 1);
+            const std::string_view seen_through = up_to_separator(view_of(endpoint->ElementName.value), 1);
             if (!seen_through.empty())
                 targets_of.add(seen_through, uint32(targets.size()));
-            targets.push_back(endpoints[i]);
+            targets.push_back(endpoint);
         }
         TRACE_BUILDING();
         LOG(DBG,
@@ -106,10 +106,10 @@ public:
 
         const Units<KALDERA_StorageExtent> extents_behind(extents);
         const Units<KALDERA_TapeDrive> drives_behind(drives);
-        for (const auto* initiator : initiators) {
+        for (const Endpoint* initiator : initiators) {
             const auto* found = targets_of.find(view_of(initiator->ElementName.value));
             for (size_t n = 0; found && n < found->size(); n++) {
-                const auto* target = targets[(*found)[n]];
+                const Endpoint* const target = targets[(*found)[n]];
                 const auto path_to = [&](const Instance* unit) {
                     deliver(*handler, initiator, target, unit);
                 };
@@ -121,8 +121,8 @@ public:
     }
 
 private:
-    static void deliver(Enum_Instances_Handler<Path>& handler, const Instance* initiator,
-                        const Instance* target, const Instance* unit)
+    static void deliver(Enum_Instances_Handler<Path>& handler, const Endpoint* initiator,
+                        const Endpoint* target, const Instance* unit)
     {
         Ref<Path> path(create_association<Path>());
         set_end(path.ptr(), &Path::Initiator, initiator);

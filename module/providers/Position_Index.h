@@ -34,7 +34,8 @@ public:
     void add(std::string_view key, uint32 position)
     {
         // Lists are grouped: the units of a target stand together.
-        if (!_last || _last_key != key) {
+        const bool is_same_view = _last_key.data() == key.data() && _last_key.size() == key.size();
+        if (!_last || (!is_same_view && _last_key != key)) {
             _last = &_positions[key];
             _last_key = key;
         }

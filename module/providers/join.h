@@ -17,12 +17,17 @@ namespace KPRV {
 /// Puts an end, whole, into a role, as the class that the role declares. All associations of an end share it,
 /// by its count: who receives an association reads its ends and does not write to them.
 template <class A, class Target>
+void set_end(A* association, Target* A::*role, const Target* end)
+{
+    if (end) {
+        ref(end);
+        association->*role = const_cast<Target*>(end);
+    }
+}
+template <class A, class Target>
 void set_end(A* association, Target* A::*role, const Instance* end)
 {
-    if (Target* target = cast<Target>(const_cast<Instance*>(end))) {
-        ref(target);
-        association->*role = target;
-    }
+    set_end(association, role, cast<Target>(end));
 }
 
 /// An association without ends, its other properties as `create` with defaults leaves them.

@@ -15,7 +15,11 @@ public:
     explicit Ref(T* ptr) : _ptr(ptr) {}
     Ref(const Ref& x) : _ptr(x._ptr) { ref(_ptr); }
     Ref(Ref&& x) noexcept : _ptr(std::exchange(x._ptr, nullptr)) {}
-    ~Ref() { unref(_ptr); }
+    ~Ref()
+    {
+        if (_ptr)
+            unref(_ptr);
+    }
 
     Ref& operator=(const Ref& x)
     {
