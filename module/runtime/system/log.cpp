@@ -17,10 +17,10 @@
 #include <unistd.h>
 
 // How it works. A line is written if the user's file asks for its level. Until the log is open each call
-// looks for that file, since it may be put in place while the server runs, unless it was missing so shortly
-// before that it cannot have come; from then on the threshold, an atomic, drops what is too talkative before
-// any lock is taken. What is to be written takes the mutex among the threads, then the lock file among the
-// processes that share the log, and appends the whole line before either is let go.
+// looks for that file, since it may be put in place while the server runs; from then on the threshold, an
+// atomic, drops what is too talkative before any lock is taken. What is to be written takes the mutex among
+// the threads, then the lock file among the processes that share the log, and appends the whole line before
+// either is let go.
 //
 // It must not fail whoever calls it: destructors log, and so does code that has just run out of memory. So
 // nothing throws out of it; a line for which there is no memory is put together on the stack and cut; a
@@ -40,7 +40,6 @@ static Log_Level _level GUARDED_BY(_mutex);
 constinit std::atomic<Log_Level> _log_threshold = Log_Level::DBG;
 static FILE* _log_file_handle GUARDED_BY(_mutex);
 static File_Lock* _lock GUARDED_BY(_mutex);
-static constinit Rc_File_Absence _absence GUARDED_BY(_mutex);
 
 namespace {
 
@@ -158,7 +157,7 @@ void vlog(Log_Level level, const char* file, size_t line, const char* format, va
         return;
     const Auto_Log_Mutex guard;
     try {
-        if (!_initialized && !_absence.holds())
+        if (!_initialized)
             configure();
     } catch (const std::bad_alloc&) {
         return;

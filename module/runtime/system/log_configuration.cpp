@@ -1,11 +1,9 @@
 #include "module/runtime/system/log_configuration.h"
 #include "module/runtime/system/Regular_File.h"
 
-#include <cerrno>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <ctime>
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -83,6 +81,10 @@ bool read_log_configuration(Log_Configuration& configuration)
     if (!home || !make_path(rc_path, home, FOLDER, "rc"))
         return false;
 
+    // Most accounts have none, and each line comes here: to ask whether there is one takes half of a futile open.
+    struct stat status;
+    if (stat(rc_path, &status) != 0)
+        return false;
     const int descriptor = open_regular_file(rc_path, O_RDONLY);
     if (descriptor < 0)
         return false;
@@ -97,35 +99,6 @@ bool read_log_configuration(Log_Configuration& configuration)
     return found && make_path(configuration.directory, home, FOLDER, "") &&
            make_path(configuration.messages, configuration.directory, "messages", "") &&
            make_path(configuration.lock, configuration.directory, "messages", ".lock");
-}
-
-/// In nanoseconds.
-static long long moment()
-{
-    timespec now = {};
-    clock_gettime(CLOCK_MONOTONIC, &now);
-    return now.tv_sec * 1'000'000'000LL + now.tv_nsec;
-}
-
-bool Rc_File_Absence::holds()
-{
-    // Less than what it takes to make a file, or to give one another name.
-    constexpr long long SHORTEST = 2000;
-    const char* const home = getenv(cimple_home_envvar);
-    if (!home)
-        return true;
-    const long long now = moment();
-    if (_seen && now - _seen < SHORTEST && strcmp(home, _home) == 0)
-        return true;
-
-    char rc_path[LOG_PATH_SIZE];
-    struct stat status;
-    if (!make_path(rc_path, home, FOLDER, "rc"))
-        return true;
-    _seen = stat(rc_path, &status) != 0 && errno == ENOENT ? now : 0;
-    if (_seen)
-        memcpy(_home, home, strlen(home) + 1);
-    return _seen != 0;
 }
 
 } // namespace KPRV

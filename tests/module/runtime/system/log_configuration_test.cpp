@@ -2,7 +2,6 @@
 #include "tests/support/Temp_Folder.h"
 
 #include <cstring>
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <optional>
 
@@ -122,37 +121,4 @@ TEST(log_configuration, APathThatDoesNotFitIsNotShortened)
         const Environment_Override override("HOME", lengthened(folder, size));
         EXPECT_FALSE(read_log_configuration(configuration)) << size;
     }
-}
-
-TEST(log_configuration, AbsenceEndsWithAFileThatIsNotReadHere)
-{
-    Temp_Folder home;
-    const Environment_Override override("HOME", home.path());
-    Rc_File_Absence absence;
-    EXPECT_TRUE(absence.holds());
-    EXPECT_TRUE(absence.holds());
-    home.write(".cimplerc", "nothing of use");
-    EXPECT_FALSE(absence.holds());
-    std::filesystem::remove(home.path(".cimplerc"));
-    EXPECT_TRUE(absence.holds());
-}
-
-TEST(log_configuration, AbsenceIsThatOfOneHome)
-{
-    Temp_Folder without, with;
-    with.write(".cimplerc", "LOG_LEVEL=ERR");
-    Rc_File_Absence absence;
-    for (int turn = 0; turn < 100; turn++) {
-        const Environment_Override outer("HOME", without.path());
-        EXPECT_TRUE(absence.holds());
-        const Environment_Override inner("HOME", with.path());
-        EXPECT_FALSE(absence.holds());
-    }
-}
-
-TEST(log_configuration, NobodyIsAskedWithoutHome)
-{
-    const Environment_Override override("HOME", "/");
-    unsetenv("HOME");
-    EXPECT_TRUE(Rc_File_Absence().holds());
 }
