@@ -131,9 +131,14 @@ void Http_Client::set_up()
 Http_Head Http_Client::post(const Http_Message& message, const Body& body, std::chrono::seconds patience)
 {
     Exchange exchange = {body, _handle};
-    // Some servers refuse to be asked first, and some wait for it.
+    // Some servers refuse to be asked first, and some wait for it. Most send an answer while they make it
+    // only to who reads trailers.
     std::vector<std::string> fields = {"Content-Type: application/xml; charset=\"utf-8\"",
-                                       "Accept:", "Expect:", "User-Agent: kldrcim"};
+                                       "Accept:",
+                                       "Expect:",
+                                       "User-Agent: kldrcim",
+                                       "TE: trailers",
+                                       "Connection: TE"};
     fields.insert(fields.end(), message.fields.begin(), message.fields.end());
     const auto list = list_of(fields);
     char details[CURL_ERROR_SIZE] = {};

@@ -215,6 +215,7 @@ class Broken_Servers(unittest.TestCase):
         self.assertEqual("MethodCall", server.heads[-1]["CIMOperation"])
         self.assertEqual("M", server.heads[-1]["CIMMethod"])
         self.assertEqual("root%2Fkaldera%3AX.K%3D%22%C3%A4%20b%22", server.heads[-1]["CIMObject"])
+        self.assertEqual(("trailers", "TE"), (server.heads[-1]["TE"], server.heads[-1]["Connection"]))
         self.assertNotIn("Expect", server.heads[-1])
         self.assertNotIn("Authorization", server.heads[-1])
         run("--url", url, "ei", "X", "--properties", "A,B")

@@ -141,6 +141,17 @@ class Same_Answers(Serving_Case):
         self.assertEqual(2, run("--url", self.served.url, "serve")[0])
 
 
+class Late_Failures(Serving_Case):
+    module = "KLDR_PLAIN_TOY"
+    namespace = "root/toy"
+    environment = {"TOY_MANY": "20000", "TOY_MANY_FAILS": "1"}
+
+    def test_the_provider_is_heard_behind_what_came(self):
+        status, out, errors = run("--url", self.served.url, "--namespace", "root/toy", "ein", "TOY_Many")
+        self.assertEqual((1, "kldrcim: CIM_ERR_FAILED (1): no more of them\n"), (status, errors))
+        self.assertEqual(20000, out.count("\n"))
+
+
 class Jobs_Of_A_Server(Serving_Case):
     def test_a_test_is_followed_to_its_end(self):
         status, out, errors = run("--url", self.served.url, "diag", "run", "MemoryTest", "2000024b4c100000", "--wait")
