@@ -22,8 +22,7 @@ Path_Value Instance_Object::path() const
 
 Instance_Value Instance_Object::value() const
 {
-    Instance_Value value = content;
-    value.path = path();
+    Instance_Value value{path(), content.properties};
     if (filter)
         std::erase_if(value.properties,
                       [&](const Named_Value& property) { return !contains_name(*filter, property.name); });

@@ -4,11 +4,15 @@ namespace KPRV::broker {
 
 Ledger::Entry& Ledger::at(Object_Kind kind, const char* maker)
 {
+    for (const Known& known : _known)
+        if (known.maker == maker && known.kind == kind)
+            return *known.entry;
     Entry& entry = _entries[{kind, maker}];
     if (entry.maker.empty()) {
         entry.kind = kind;
         entry.maker = maker;
     }
+    _known.push_back({kind, maker, &entry});
     return entry;
 }
 
@@ -74,6 +78,7 @@ void Ledger::report(std::FILE* out) const
 void Ledger::clear()
 {
     const Auto_Lock lock(_mutex);
+    _known.clear();
     _entries.clear();
 }
 

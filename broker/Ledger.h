@@ -53,6 +53,14 @@ private:
 
     mutable Standard_Mutex<> _mutex;
     std::map<std::pair<Object_Kind, std::string_view>, Entry> _entries GUARDED_BY(_mutex);
+    /// The entries of names that have come before: the same constant comes again and again.
+    struct Known
+    {
+        Object_Kind kind;
+        const char* maker;
+        Entry* entry;
+    };
+    std::vector<Known> _known GUARDED_BY(_mutex);
 };
 
 } // namespace KPRV::broker

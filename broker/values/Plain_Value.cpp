@@ -164,8 +164,12 @@ void set_value(std::vector<Named_Value>& values, std::string_view name, Plain_Va
 {
     if (const Plain_Value* present = find_value(values, name))
         *const_cast<Plain_Value*>(present) = std::move(value);
-    else
+    else {
+        // Few instances have one or two properties only.
+        if (values.capacity() == 0)
+            values.reserve(8);
         values.push_back({std::string(name), std::move(value)});
+    }
 }
 
 bool same_object(const Path_Value& a, const Path_Value& b)

@@ -1,6 +1,7 @@
 #include "broker/values/Type_Words.h"
 
 #include <algorithm>
+#include <array>
 #include <iterator>
 
 namespace KPRV::broker {
@@ -23,11 +24,18 @@ constexpr Word type_words[] = {
     {CMPI_dateTime, "datetime", 0},
 };
 
+/// The places of `type_words` by type, one too high; 0 for a word that is no type of a value.
+constexpr auto places = [] {
+    std::array<std::uint8_t, CMPI_dateTime + 1> result{};
+    for (std::size_t i = 0; i < std::size(type_words); ++i)
+        result[type_words[i].type] = static_cast<std::uint8_t>(i + 1);
+    return result;
+}();
+
 const Word* find_word(CMPIType type)
 {
-    auto at = std::find_if(std::begin(type_words), std::end(type_words),
-                           [&](const Word& word) { return word.type == type; });
-    return at == std::end(type_words) ? nullptr : at;
+    const std::size_t place = type < places.size() ? places[type] : 0;
+    return place ? &type_words[place - 1] : nullptr;
 }
 
 int bits_of(CMPIType type)
@@ -98,7 +106,10 @@ std::string type_word_name(CMPIType type)
     const Word* word = find_word(static_cast<CMPIType>(type & ~CMPI_ARRAY));
     if (!word)
         return "type " + std::to_string(type);
-    return std::string(word->name) + (type & CMPI_ARRAY ? "[]" : "");
+    std::string name = word->name;
+    if (type & CMPI_ARRAY)
+        name += "[]";
+    return name;
 }
 
 std::uint64_t largest(CMPIType type)

@@ -59,6 +59,8 @@ void write_scalar(Xml_Writer& writer, const Plain_Value& value)
 {
     if (const Path_Value* path = value.as_path())
         return write_reference(writer, *path);
+    if (value.type == CMPI_string)
+        return write_text_value(writer, value.as_text());
     write_text_value(writer, value.type == CMPI_instance ? embedded_text(value) : wire_text(value));
 }
 

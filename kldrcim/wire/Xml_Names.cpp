@@ -13,15 +13,22 @@ struct Tag_Row
 {
     std::string_view name;
     std::string_view content;
+    std::string_view opening;
+    std::string_view closing;
 };
 
 constexpr Tag_Row tag_rows[] = {
-#define X(tag, name, content) {name, content},
+#define X(tag, name, content) {name, content, "<" name, "</" name ">"},
     KLDR_XML_TAGS(X)
 #undef X
 };
 constexpr std::string_view attribute_names[] = {
 #define X(name) #name,
+    KLDR_XML_ATTRIBUTES(X)
+#undef X
+};
+constexpr std::string_view attribute_openings[] = {
+#define X(name) " " #name "=\"",
     KLDR_XML_ATTRIBUTES(X)
 #undef X
 };
@@ -73,6 +80,21 @@ std::string_view name_of(Xml_Tag tag)
 std::string_view name_of(Xml_Attribute attribute)
 {
     return attribute_names[static_cast<std::size_t>(attribute)];
+}
+
+std::string_view opening_of(Xml_Tag tag)
+{
+    return tag_rows[number(tag)].opening;
+}
+
+std::string_view closing_of(Xml_Tag tag)
+{
+    return tag_rows[number(tag)].closing;
+}
+
+std::string_view opening_of(Xml_Attribute attribute)
+{
+    return attribute_openings[static_cast<std::size_t>(attribute)];
 }
 
 std::optional<Xml_Tag> tag_of(std::string_view name)

@@ -96,6 +96,11 @@ enum class Xml_Attribute : std::uint8_t
 std::string_view name_of(Xml_Tag tag);
 std::string_view name_of(Xml_Attribute attribute);
 
+/// As they are written: "<VALUE.ARRAY", "</VALUE.ARRAY>" and " NAME=\"".
+std::string_view opening_of(Xml_Tag tag);
+std::string_view closing_of(Xml_Tag tag);
+std::string_view opening_of(Xml_Attribute attribute);
+
 /// Nothing for a word that is none. The case counts.
 std::optional<Xml_Tag> tag_of(std::string_view name);
 std::optional<Xml_Attribute> attribute_of(std::string_view name);

@@ -99,17 +99,14 @@ void Xml_Writer::end_tag()
 Xml_Writer& Xml_Writer::open(Xml_Tag tag)
 {
     end_tag();
-    _out += '<';
-    _out += name_of(tag);
+    _out += opening_of(tag);
     _in_tag = true;
     return *this;
 }
 
 Xml_Writer& Xml_Writer::attribute(Xml_Attribute name, std::string_view value)
 {
-    _out += ' ';
-    _out += name_of(name);
-    _out += "=\"";
+    _out += opening_of(name);
     append(_out, value, true);
     _out += '"';
     return *this;
@@ -132,9 +129,7 @@ Xml_Writer& Xml_Writer::written(std::string_view elements)
 Xml_Writer& Xml_Writer::close(Xml_Tag tag)
 {
     end_tag();
-    _out += "</";
-    _out += name_of(tag);
-    _out += '>';
+    _out += closing_of(tag);
     return *this;
 }
 
