@@ -129,14 +129,15 @@ void PortHelper::walk_port(Json::Value& address, sint32 number, Walk& walk, Fres
         guarded_answer(LOG_HERE, {"libGetPortByWwn"}, libGetPortByWwn, walk.request, answered);
     if (!answered)
         return;
-    if (!ProviderUtil::isValidJsonResponse(answer)) {
-        if (walk.words.bad_port)
-            LOG(ERR, "%s", walk.words.bad_port);
-        return;
-    }
     _hbaPortInfo port;
-    if (guarded(LOG_HERE, {"libGetPortByWwn"}, [&] { fill_port(answer, number, walk.host, port); }))
+    bool is_valid = false;
+    if (!guarded(LOG_HERE, {"libGetPortByWwn"},
+                 [&] { is_valid = fill_port(answer, number, walk.host, port); }))
+        return;
+    if (is_valid)
         publish(walk.id, walk.wanted, answer, port, instances);
+    else if (walk.words.bad_port)
+        LOG(ERR, "%s", walk.words.bad_port);
 }
 
 } // namespace KPRV

@@ -12,6 +12,7 @@ namespace {
 enum : size_t
 {
     SYMBOLIC_NAME,
+    PORT_ERROR,
     MAX_FRAME_SIZE,
     NODE_WWN,
     OPERATING_SPEED,
@@ -22,8 +23,15 @@ enum : size_t
     NUM_PORT_MEMBERS
 };
 constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
-    "PortSymbolicName", "maxFrameSize",        "nodeWwn", "operatingSpeed", "portStatusValue",
-    "portTypeMOFValue", "supportedPortSpeeds", "wwn",
+    "PortSymbolicName",
+    "error",
+    "maxFrameSize",
+    "nodeWwn",
+    "operatingSpeed",
+    "portStatusValue",
+    "portTypeMOFValue",
+    "supportedPortSpeeds",
+    "wwn",
 };
 static_assert(std::ranges::is_sorted(port_members));
 
@@ -42,9 +50,11 @@ sint64 operating_speed(const Json::Value& gigabits)
 
 } // namespace
 
-void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
+bool fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
     const Members<NUM_PORT_MEMBERS> members(answer, port_members);
+    if (answer.isNull() || members.has(PORT_ERROR))
+        return false;
     copy_flat(port.localWWN, text_of(members[PORT_WWN]));
     copy_text(port.portWWN, port.localWWN);
     copy_flat(port.nodeWWN, text_of(members[NODE_WWN]));
@@ -56,6 +66,7 @@ void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _
     port.speed = operating_speed(members[OPERATING_SPEED]);
     port.maxSpeed = bits_per_second(element(members[SUPPORTED_SPEEDS], 0));
     port.portNumber = port_number;
+    return true;
 }
 
 void name_remote_port(const char* remote_wwn, _hbaPortInfo& port)

@@ -25,9 +25,9 @@ struct _hbaPortInfo
     sint32 portNumber;   ///< Place in the adapter's list, from 0.
 };
 
-/// Fills the record from an answer of `getPortByWwn`. Throws `Not_Convertible` for a member of the wrong
-/// type.
-void fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port);
+/// Fills the record from an answer of `getPortByWwn`; false if that is none, as
+/// `ProviderUtil::isValidJsonResponse` has it. Throws `Not_Convertible` for a member of the wrong type.
+bool fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port);
 
 /// Makes `portWWN` the name of the remote port with that WWN, in either form, as the local port sees it.
 void name_remote_port(const char* remote_wwn, _hbaPortInfo& port);
