@@ -43,6 +43,13 @@ inline bool is_of_empty_arrays(const void* address)
 /// capacity.
 __Array_Rep* empty_array_of(const __Array_Traits* traits, uint32 capacity);
 
+/// What a fresh array of a CIM type holds.
+inline __Array_Rep* fresh_array_of(Type type)
+{
+    const auto* const record = reinterpret_cast<const Empty_Arrays*>(__cim_array_traits[type]);
+    return const_cast<__Array_Rep*>(&record->fresh.head);
+}
+
 inline bool is_empty_array(const __Array_Rep* rep)
 {
     return is_of_empty_arrays(rep);

@@ -46,15 +46,12 @@ __Array_Rep* default_array(Type type, const Meta_Value* value)
         });
 }
 
-/// Builds an empty cell that is no text.
+/// Builds an empty cell that is no text and no array of a CIM type.
 void construct(Instance* instance, const Cell& cell)
 {
     switch (cell.kind) {
     case Cell_Kind::MOMENT:
         new (&cell.in<Datetime>(instance)) Datetime();
-        break;
-    case Cell_Kind::ARRAY:
-        __construct(cell.in<__Array_Rep*>(instance), __cim_array_traits[cell.element_type()]);
         break;
     case Cell_Kind::REFERENCE:
         cell.in<Instance*>(instance) = nullptr;
@@ -163,6 +160,8 @@ void __default_construct(const Meta_Class* meta_class, Instance* instance, bool 
     visit_cells(meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
         if (cell.kind == Cell_Kind::TEXT)
             new (&cell.in<String>(instance)) String();
+        else if (cell.kind == Cell_Kind::ARRAY)
+            cell.in<__Array_Rep*>(instance) = fresh_array_of(cell.element_type());
         else
             construct(instance, cell);
     });

@@ -73,7 +73,7 @@ struct Blanker
         visit_storage(
             f.type(), [&] { new (f.value(dest)) String(); }, [&] { new (f.value(dest)) Datetime(); }, [] {});
     }
-    void operator()(Array_Feature f) const { __construct(f.array(dest), __cim_array_traits[f.type()]); }
+    void operator()(Array_Feature f) const { f.array(dest) = fresh_array_of(f.type()); }
     void operator()(Reference_Feature f) const { f.target(dest) = nullptr; }
     void operator()(Reference_Array_Feature f) const { new (&f.targets(dest)) Array<Instance*>(); }
     void operator()(Method_Feature) const {}
