@@ -104,11 +104,12 @@ void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& 
     if (!guarded_call(LOG_HERE, {"libGetFcPhyPortIndicesByAdapter"}, libGetFcPhyPortIndicesByAdapter, request,
                       answer))
         return;
-    Json::Value* const ports = find_member(answer, "indexStrings");
-    const char* failure = !ProviderUtil::isValidJsonResponse(answer) ? walk.words.bad_answer
-                          : !ports                                   ? walk.words.no_list
-                          : !isArrayOrNull(*ports)                   ? walk.words.no_array
-                                                                     : nullptr;
+    const Address_List told(answer);
+    auto* const ports = const_cast<Json::Value*>(told.list());
+    const char* failure = !told.is_valid()         ? walk.words.bad_answer
+                          : !ports                 ? walk.words.no_list
+                          : !isArrayOrNull(*ports) ? walk.words.no_array
+                                                   : nullptr;
     if (failure) {
         LOG(ERR, "%s", failure);
         return;
