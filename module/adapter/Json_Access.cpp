@@ -42,10 +42,7 @@ T number(const Json::Value& value, const char* failure)
     throw Not_Convertible(failure);
 }
 
-Not_Convertible no_text()
-{
-    return Not_Convertible("Type is not convertible to string");
-}
+constexpr const char* no_text = "Type is not convertible to string";
 
 } // namespace
 
@@ -72,14 +69,14 @@ std::string_view asView(const Json::Value& value)
         return "";
     if (value.isBool())
         return value.asBool() ? "true" : "false";
-    throw no_text();
+    throw Not_Convertible(no_text);
 }
 
 void expectText(const Json::Value& value)
 {
     const Json::ValueType type = value.type();
     if (type != Json::stringValue && type != Json::nullValue && type != Json::booleanValue)
-        throw no_text();
+        throw Not_Convertible(no_text);
 }
 
 std::string asString(const Json::Value& value)

@@ -2,6 +2,7 @@
 
 #include "module/adapter/Guarded_Call.h"
 #include "module/adapter/ProviderUtil.h"
+
 namespace KPRV {
 
 Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json::objectValue)
