@@ -16,6 +16,7 @@ host in the process, and once more as a client of `kldrcim serve`, alone.
 import argparse
 import contextlib
 import json
+import math
 import os
 import pathlib
 import resource
@@ -60,7 +61,8 @@ class Run:
 
 
 def figures(run, name=""):
-    return {f"{name}time": f"{run.processor:.2f} s", f"{name}peak": run.peak()}
+    """Empty for what was not run."""
+    return {f"{name}time": f"{run.processor:.2f} s" if run else "", f"{name}peak": run.peak() if run else ""}
 
 
 def size_of(counts):
@@ -114,30 +116,32 @@ def simulated(build, counts):
 
 
 def walked(build, before, counts, host, *words):
-    """One row: in the process, as it was before, and as a client."""
-    there = Run(before, *words, **host) if before else None
-    here = Run(build / "kldrcim", *words, **host)
-    row = {"host": size_of(counts), "verb": " ".join(words), "lines": f"{here.lines:,}"} | figures(here)
+    """One row: in the process, as it was before, and as a client. What kept all of it would take tens of gigabytes of a larger host,
+    and of the largest the module's own lists take some."""
+    units = math.prod(counts)
+    there = Run(before, *words, **host) if before and units < 200_000 else None
+    here = Run(build / "kldrcim", *words, **host) if units < 1_000_000 else None
     with served(build, **host) as url:
-        row |= figures(Run(build / "kldrcim", "--url", url, *words), "as a client: ")
-    if there:
+        client = Run(build / "kldrcim", "--url", url, *words)
+    row = {"host": size_of(counts), "verb": " ".join(words), "lines": f"{client.lines:,}"}
+    row |= figures(here) | figures(client, "as a client: ")
+    if before:
         row |= figures(there, "before: ")
-    print(json.dumps(row), file=sys.stderr)
+    print(json.dumps(row), file=sys.stderr, flush=True)
     return row
 
 
 def of_the_module(build, before, most):
     for counts, verbs in ((UNITS, (("ei", "KALDERA_StorageExtent", "--format", "json"), ("ein", "KALDERA_StorageExtent"))),
                           *((each, (("tree",), ("tree", "--format", "json"), ("graph",))) for each in HOSTS)):
-        units = counts[0] * counts[1] * counts[2] * counts[3]
+        units = math.prod(counts)
         if units > most:
             continue
-        # What takes long is shown once: the lines of JSON are ten times as many.
+        # The lines of JSON are ten times as many.
         verbs = verbs if units < 200_000 else [words for words in verbs if "json" not in words]
         with simulated(build, counts) as host:
             for words in verbs:
-                # What kept all of it would take tens of gigabytes of the largest.
-                yield walked(build, before if units < 200_000 else None, counts, host, *words)
+                yield walked(build, before, counts, host, *words)
 
 
 def main():
@@ -152,9 +156,10 @@ def main():
     print(f"load of the machine before: {os.getloadavg()[0]:.1f}")
     with tempfile.TemporaryDirectory() as folder:
         tables = [list(enumerations(build, options.instances, folder))]
+    # The rest takes half an hour.
+    print_table(tables[0])
     tables.append(list(of_the_module(build, options.before, options.lines)))
-    for table in tables:
-        print_table(table)
+    print_table(tables[1])
     print(f"\nload of the machine behind: {os.getloadavg()[0]:.1f}")
     options.output.write_text(json.dumps({"tables": tables}, indent=2) + "\n", encoding="utf-8")
 
