@@ -64,7 +64,7 @@ bool read_options(const Cli_Options& options, Http_Options& http, Users_File& us
     else if (!options.users.empty() && users.read(options.users, error))
         http.users = &users;
     if (error.empty() && !is_loopback(http.address) && (http.certificate.empty() || !http.users))
-        error = http.address + " can be reached from outside: that takes --tls-cert, --tls-key and --users";
+        error = http.address + " can be reached from outside: that takes --tls and --users";
     return error.empty();
 }
 

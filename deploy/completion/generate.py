@@ -17,6 +17,7 @@ KINDS = {
     "METHOD": "methods",
     "TEST": "tests",
     "FILE": "files",
+    "CERT KEY": "files",
     "NAME=VALUE": "assignments",
     "NAME=VALUE...": "assignments",
     "A,B,C": "properties",

@@ -117,7 +117,7 @@ struct Cli_Options
 struct Cli_Option
 {
     const char* name;
-    /// What its value is, for the help; null if it takes none.
+    /// What its value is, for the help, or what its two are; null if it takes none.
     const char* value;
     /// False for a value that is none.
     bool (*set)(Cli_Options& options, const std::string& value);
@@ -128,6 +128,8 @@ struct Cli_Option
     /// All verbs know it; the others name theirs.
     bool is_common;
     const char* summary;
+    /// Of the second value of an option that takes two; null for all others.
+    bool (*set_second)(Cli_Options& options, const std::string& value) = nullptr;
 };
 
 std::span<const Cli_Option> cli_options();

@@ -47,7 +47,7 @@ const Cli_Verb* verb_among(const std::vector<std::string>& arguments)
             continue;
         if (depends_on_verb(arguments[i]) ? !is_option(arguments[i + 1]) && !find_verb(arguments[i + 1])
                                           : !option->flag)
-            ++i;
+            i += option->set_second ? 2 : 1;
     }
     return nullptr;
 }
@@ -151,6 +151,10 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
             options.*option->flag = true;
             continue;
         }
+        if (option->set_second && (equals != std::string::npos || i + 2 >= arguments.size())) {
+            error = std::string(option->name) + " wants two values: " + option->value;
+            return false;
+        }
         if (equals == std::string::npos && i + 1 == arguments.size()) {
             error = std::string(option->name) + " wants a value";
             return false;
@@ -160,6 +164,8 @@ bool parse_options(const std::vector<std::string>& arguments, Cli_Options& optio
             error = std::string(option->name) + " takes " + option->takes + ", not \"" + value + "\"";
             return false;
         }
+        if (option->set_second)
+            option->set_second(options, arguments[++i]);
     }
     if (options.version || (options.help && options.verb.empty()))
         return true;

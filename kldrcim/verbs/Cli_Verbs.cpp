@@ -90,7 +90,7 @@ constexpr Cli_Verb verbs[] = {
     {"flash",    2, 2,   "ADAPTER URI",                             flash,           Op{},                        "table json", "--yes",
      "update an adapter's firmware from file://PATH or tftp://HOST/FILE, through the module's installation service; "
      "ADAPTER is its DeviceID, with or without colons, or a PATH", "1 the update failed, or was not wanted."},
-    {"serve",    0, 0,   "",                                        nullptr,         Op{},                        "table",      "--listen --tls-cert --tls-key --users --state",
+    {"serve",    0, 0,   "",                                        nullptr,         Op{},                        "table",      "--listen --tls --tls-cert --tls-key --users --state",
      "a CIM server on the module, for any WBEM client (CIM-XML), until interrupted", nullptr},
     {"classes",  0, 1,   "[PATTERN]",                               list_classes,    Op{},                        "table json jsonl", names_options,
      "list the classes that have a provider; * and ? match as in file names", nullptr},

@@ -313,7 +313,7 @@ class Users_And_Certificates(unittest.TestCase):
         self.refused(r"^kldrcim: --password-file without a user", f"http://{at}", password("right"))
 
     def test_certificates(self):
-        served = self.serve("--tls-cert", self.file("localhost.pem"), "--tls-key", self.file("localhost.key"))
+        served = self.serve("--tls", self.file("localhost.pem"), self.file("localhost.key"))
         at = f"https://localhost:{served.port}"
         trust = "--cacert=" + self.file("localhost.pem")
         self.assertEqual(0, self.ask(at, trust)[0])
