@@ -1,8 +1,10 @@
 """How `kldrcim serve` does beside other servers with the same module: the same host and client, each in a machine of its own."""
 
+import json
 import random
 import statistics
 import sys
+from itertools import chain
 
 import bench_requests
 from rooms import Room
@@ -117,7 +119,12 @@ def shown(each):
 
 def measure_serving(servers, build, options):
     rooms = Rooms(servers, build)
-    rows = [*enumerations(rooms, options.rounds), *starts(rooms), *alerts(rooms), *memory(rooms, options.requests)]
+    rows = []
+    for each in chain(
+        enumerations(rooms, options.rounds), starts(rooms), alerts(rooms), memory(rooms, options.requests)
+    ):
+        print(json.dumps(each), file=sys.stderr, flush=True)
+        rows.append(each)
     rooms.end()
     print_table([shown(each) for each in rows])
     return rows
