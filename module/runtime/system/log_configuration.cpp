@@ -81,7 +81,8 @@ bool read_log_configuration(Log_Configuration& configuration)
     if (!home || !make_path(rc_path, home, FOLDER, "rc"))
         return false;
 
-    // Most accounts have none, and each line comes here: to ask whether there is one takes half of a futile open.
+    // Most accounts have none, and each line comes here: to ask whether there is one takes half of a futile
+    // open.
     struct stat status;
     if (stat(rc_path, &status) != 0)
         return false;
