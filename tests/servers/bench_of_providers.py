@@ -11,7 +11,7 @@ sys.path.insert(0, str(bench_requests.SOURCE / "tests/bench"))
 
 from markdown import print_table  # noqa: E402
 
-#: 64 ports that see 1,920 LUNs between them, 8 targets and 4 LUNs each; plain providers know no converged adapters.
+#: 64 ports that see 2,048 LUNs between them, of 8 targets each; plain providers know no converged adapters.
 HOST = ["--adapters", "32", "--ports", "2", "--targets", "8", "--luns", "4", "--cna", "0"]
 #: What the processor's time of the module's server is to stay below, where that of the plain providers' is 1.
 GOAL = 1.05
