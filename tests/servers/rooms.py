@@ -1,5 +1,6 @@
 """Machines with servers that wait for orders, as whoever measures them sees them from outside."""
 
+import atexit
 import json
 import subprocess
 import tempfile
@@ -19,6 +20,8 @@ class Room:
             env=machine.environment_for(server, plain=plain, log=log), stdin=subprocess.PIPE, stdout=subprocess.PIPE, stderr=self.errors,
             text=True,
         )  # fmt: skip
+        # Whatever ends this program, the machine ends with it.
+        atexit.register(self.process.kill)
 
     def wait(self):
         """The result of the order that was given last, or the word that it is ready for the first one."""
