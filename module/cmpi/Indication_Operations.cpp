@@ -70,9 +70,9 @@ static CMPIStatus deactivateFilter(CMPIIndicationMI* mi, const CMPIContext*, con
 
 namespace {
 
-/// Holds the adapter for one delivery. An operation that disables indications keeps the mutex while it waits
-/// for the worker to end; a worker that waited for the mutex meanwhile would never end. It delivers under the
-/// operation's hold instead: the operation does nothing but wait for it.
+/// Holds the adapter while a delivery is prepared. An operation that disables indications keeps the mutex
+/// while it waits for the worker to end; a worker that waited for the mutex meanwhile would never end. It
+/// goes on under the operation's hold instead: the operation does nothing but wait for it.
 class SCOPED_CAPABILITY Delivery_Hold
 {
 public:
@@ -110,18 +110,30 @@ private:
 
 } // namespace
 
-/// What the provider's worker calls with each indication: sends it into every name space with filters.
+/// The name space with filters that is next in order, copied: false if there is none.
+static bool name_space_at(CMPI_Adapter& adapter, uint32 index, Name_Space_Entry& entry)
+{
+    const Delivery_Hold hold(adapter);
+    if (index >= adapter.name_spaces.size())
+        return false;
+    entry = adapter.name_spaces[index];
+    return true;
+}
+
+/// What the provider's worker calls with each indication: sends it into every name space with filters. It
+/// waits for operations, but none for it while it is in the server: sfcb deletes a subscription under a lock
+/// that it wants for the delivery too, and calls `deactivateFilter` under it.
 static bool _indication_proc(Instance* instance, void* client_data)
 {
     auto* const adapter = static_cast<CMPI_Adapter*>(client_data);
-    const Delivery_Hold hold(*adapter);
-    if (!instance)
+    if (!instance) {
+        const Delivery_Hold hold(*adapter);
         return false;
+    }
     const Ref<Instance> owner(instance);
 
-    for (uint32 i = 0; i < adapter->name_spaces.size(); i++) {
-        // A copy: the server may change the filters while it takes the delivery.
-        const Name_Space_Entry entry = adapter->name_spaces[i];
+    Name_Space_Entry entry;
+    for (uint32 i = 0; name_space_at(*adapter, i, entry); i++) {
         CMPIInstance* ci = nullptr;
         if (make_cmpi_instance(adapter->broker, instance, entry.name_space.c_str(), nullptr, nullptr, ci) !=
             CMPI_RC_OK)

@@ -350,6 +350,24 @@ TEST_F(Indication_Operations, TheCodeOfADeliveryIsNotLookedAt)
     EXPECT_EQ(server.delivered.size(), 2u);
 }
 
+TEST_F(Indication_Operations, OperationsDoNotWaitForADeliveryThatIsInTheServer)
+{
+    enable();
+    activate("root/one");
+    activate("root/two");
+    std::future<CMPIrc> deleted;
+    server.on_deliver = [&] {
+        // A server that deletes a subscription under a lock which it wants for the delivery too.
+        if (!deleted.valid())
+            deleted = std::async(std::launch::async, [this] { return deactivate("root/two"); });
+        EXPECT_EQ(deleted.wait_for(std::chrono::seconds(30)), std::future_status::ready);
+    };
+    deliver_on_worker("alert");
+    EXPECT_EQ(deleted.get(), CMPI_RC_OK);
+    EXPECT_EQ(delivered_to(), Texts{"root/one"});
+    EXPECT_EQ(name_spaces(), Texts{"root/one 1"});
+}
+
 TEST_F(Indication_Operations, FiltersMayChangeDuringADelivery)
 {
     enable();
