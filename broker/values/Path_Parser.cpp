@@ -156,8 +156,10 @@ private:
             unsigned code = 0;
             const char* from = _text.data() + _at + 1;
             if (_text[_at] == 'x' && _text.size() - _at > 4 &&
-                std::from_chars(from, from + 4, code, 16).ptr == from + 4 && code > 0 && code < 0x80) {
-                text += static_cast<char>(code);
+                std::from_chars(from, from + 4, code, 16).ptr == from + 4 && code > 0 && code < 0x100) {
+                if (code >= 0x80)
+                    text += static_cast<char>(0xC0 | code >> 6);
+                text += static_cast<char>(code < 0x80 ? code : 0x80 | (code & 0x3F));
                 _at += 4;
                 return true;
             }

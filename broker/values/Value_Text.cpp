@@ -1,5 +1,6 @@
 #include "broker/values/Value_Text.h"
 
+#include "broker/values/Control_Text.h"
 #include "broker/values/Type_Words.h"
 
 #include <charconv>
@@ -61,7 +62,8 @@ std::string quoted(std::string_view text)
 {
     static const char digits[] = "0123456789ABCDEF";
     std::string result = "\"";
-    for (char c : text) {
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const char c = text[i];
         switch (c) {
         case '"':
         case '\\':
@@ -84,13 +86,14 @@ std::string quoted(std::string_view text)
             result += "\\f";
             break;
         default:
-            if (static_cast<unsigned char>(c) < 0x20) {
-                result += "\\x00";
-                result += digits[c >> 4];
-                result += digits[c & 15];
-            } else {
+            const std::size_t control = control_size(text.substr(i));
+            if (control == 0) {
                 result += c;
+                break;
             }
+            i += control - 1;
+            const auto code = static_cast<unsigned char>(text[i]);
+            result += {'\\', 'x', '0', '0', digits[code >> 4], digits[code & 15]};
         }
     }
     return result + '"';

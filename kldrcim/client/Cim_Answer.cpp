@@ -1,6 +1,7 @@
 // What a server answers: objects as they come, then the status; or why this is no answer.
 #include "kldrcim/client/Cim_Answer.h"
 
+#include "broker/values/Control_Text.h"
 #include "broker/values/Type_Words.h"
 #include "kldrcim/client/Cim_Request.h"
 #include "kldrcim/connection/Connection.h"
@@ -22,9 +23,12 @@ constexpr std::size_t MOST_KEPT = std::size_t(64) << 20;
 
 std::string visible(std::string_view text)
 {
-    std::string result(text.substr(0, 500));
-    std::ranges::replace_if(
-        result, [](unsigned char c) { return c < 0x20 || c == 0x7f; }, ' ');
+    std::string result;
+    for (text = text.substr(0, 500); !text.empty();) {
+        const std::size_t control = control_size(text);
+        result += control != 0 ? ' ' : text.front();
+        text.remove_prefix(std::max(control, std::size_t(1)));
+    }
     return result;
 }
 

@@ -1,15 +1,21 @@
 #include "kldrcim/formats/Visible_Text.h"
 
+#include "broker/values/Control_Text.h"
+
 namespace KPRV::kldrcim {
+
+using broker::control_size;
 
 namespace {
 
 std::string visible(const std::string& text, bool keep_lines)
 {
     std::string result;
-    for (char c : text) {
-        bool control = static_cast<unsigned char>(c) < 0x20 || c == 0x7F;
-        if (!control || (keep_lines && (c == '\n' || c == '\t')))
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const char c = text[i];
+        const std::size_t control = control_size(std::string_view(text).substr(i));
+        i += control == 2 ? 1 : 0;
+        if (control == 0 || (keep_lines && (c == '\n' || c == '\t')))
             result += c;
         else if (c == '\n')
             result += "\\n";

@@ -1,5 +1,7 @@
 #include "kldrcim/wire/Xml_Reader.h"
 
+#include "broker/values/Control_Text.h"
+
 #include <expat.h>
 
 #include <algorithm>
@@ -18,6 +20,14 @@ constexpr std::size_t MOST_BYTES = std::size_t(1) << 30;
 bool is_blank(std::string_view text)
 {
     return text.find_first_not_of(" \t\r\n") == std::string_view::npos;
+}
+
+bool has_control(std::string_view text)
+{
+    for (; !text.empty(); text.remove_prefix(1))
+        if (broker::control_size(text) != 0)
+            return true;
+    return false;
 }
 
 } // namespace
@@ -154,6 +164,8 @@ void Xml_Reader::start(const char* name, const char** attributes)
             return stop(Xml_Fault::TOO_LARGE, "too many attributes");
         if (const auto known = attribute_of(attributes[0])) {
             const std::string_view value = attributes[1];
+            if (known != Xml_Attribute::DESCRIPTION && has_control(value))
+                return stop(Xml_Fault::NOT_VALID, "a control character in a name");
             _document._attributes.push_back({*known, keep(value), static_cast<std::uint32_t>(value.size())});
             ++element.attribute_count;
         }

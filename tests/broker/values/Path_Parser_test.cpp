@@ -23,7 +23,8 @@ TEST(Path_Parser, ReadsAllKindsOfKeys)
 TEST(Path_Parser, ReadsWhatIsWritten)
 {
     Path_Error error;
-    for (const char* text : {R"(C)", R"(ns:C)", R"(C.K="a\\b\"c\n",N=5)", R"(C.R="ns:D.K=\"x:y.z=1\"")"}) {
+    for (const char* text : {R"(C)", R"(ns:C)", R"(C.K="a\\b\"c\n",N=5)", R"(C.K="\x0001\x007F\x0080\x009B")",
+                             R"(C.R="ns:D.K=\"x:y.z=1\"")"}) {
         auto path = parse_path(text, error);
         ASSERT_TRUE(path) << text;
         EXPECT_EQ(text, path_text(*path));

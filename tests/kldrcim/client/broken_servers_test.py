@@ -184,6 +184,25 @@ class Broken_Servers(unittest.TestCase):
 
     def test_control_characters_do_not_reach_the_terminal(self):
         self.refused(r"^kldrcim: CIM_ERR_FAILED \(1\): a b$", lambda at: at.send(200, answer("X", '<ERROR CODE="1" DESCRIPTION="a&#x9;b"/>')), status=1)
+        # Nor the one that stands for Escape and a bracket.
+        self.refused(r"^kldrcim: CIM_ERR_FAILED \(1\): a 31mb$", lambda at: at.send(200, answer("X", '<ERROR CODE="1" DESCRIPTION="a&#x9B;31mb"/>')), status=1)
+        self.refused("is no CIM server, or a broken one: .*a control character in a name$", lambda at: at.send(200, answer("X", ENUMERATED.format(NAMED.format("a").replace('"K"', '"K&#x9B;"')))))
+
+    def test_nor_do_those_of_values(self):
+        named = NAMED.format("k&#x9B;1m&#xA0;")
+        value = '<PROPERTY NAME="S" TYPE="string"><VALUE>v&#x9B;1m&#x7F;&#xA0;</VALUE></PROPERTY>'
+        found = f'<VALUE.NAMEDINSTANCE>{named}<INSTANCE CLASSNAME="X">{value}</INSTANCE></VALUE.NAMEDINSTANCE>'
+
+        def send(at):
+            asked = at.server.asked[-1]
+            at.send(200, answer("X", '<ERROR CODE="6"></ERROR>' if "GetClass" in asked else ENUMERATED.format(named if "Names" in asked else found)))
+
+        url = self.serve(send)[1]
+        self.assertEqual('root/kaldera:X.K="k\\x009B1m\u00a0"\n', run("--url", url, "ein", "X")[1])
+        for form, shown in (("table", "v?1m?\u00a0"), ("mof", '"v\\x009B1m\\x007F\u00a0"'), ("json", "v\\u009b1m")):
+            out = run("--url", url, "ei", "X", "--format", form)[1]
+            self.assertIn(shown, out)
+            self.assertNotRegex(out, "[\\x00-\\x09\\x0b-\\x1f\\x80-\\x9f]")
 
     def test_a_kept_connection_that_was_closed(self):
         def send(at):
