@@ -122,7 +122,8 @@ def walked(build, before, counts, host, *words):
     there = Run(before, *words, **host) if before and units < 200_000 else None
     here = Run(build / "kldrcim", *words, **host) if units < 1_000_000 else None
     with served(build, **host) as url:
-        client = Run(build / "kldrcim", "--url", url, *words)
+        # The module looks at all of a large host before it hands over the first.
+        client = Run(build / "kldrcim", "--url", url, "--timeout", "3600", *words)
     row = {"host": size_of(counts), "verb": " ".join(words), "lines": f"{client.lines:,}"}
     row |= figures(here) | figures(client, "as a client: ")
     if before:
@@ -158,6 +159,7 @@ def main():
         tables = [list(enumerations(build, options.instances, folder))]
     # The rest takes half an hour.
     print_table(tables[0])
+    sys.stdout.flush()
     tables.append(list(of_the_module(build, options.before, options.lines)))
     print_table(tables[1])
     print(f"\nload of the machine behind: {os.getloadavg()[0]:.1f}")
