@@ -86,7 +86,10 @@ struct Http_Connection::Callbacks
     static ssize_t read(void* data, std::uint64_t, char* buffer, std::size_t size)
     {
         auto& self = *static_cast<Http_Connection*>(data);
+        // A provider may be silent between two objects for longer than a client may be.
+        self.limit_silence(0);
         const std::size_t count = self._pipe.read(buffer, size);
+        self.limit_silence(IDLE_SECONDS);
         if (count != 0)
             return static_cast<ssize_t>(count);
         if (self._pipe.is_broken())
@@ -213,7 +216,7 @@ bool Http_Connection::finish()
         return true;
     // From here on it is us who take time.
     _server._watch->release(_peer.socket);
-    MHD_set_connection_option(_connection, MHD_CONNECTION_OPTION_TIMEOUT, 0U);
+    limit_silence(0);
     try {
         if (_reader)
             answer_message();
@@ -222,8 +225,13 @@ bool Http_Connection::finish()
     } catch (const Http_Refusal& refusal) {
         refuse(refusal);
     }
-    MHD_set_connection_option(_connection, MHD_CONNECTION_OPTION_TIMEOUT, IDLE_SECONDS);
+    limit_silence(IDLE_SECONDS);
     return _queued;
+}
+
+void Http_Connection::limit_silence(unsigned seconds)
+{
+    MHD_set_connection_option(_connection, MHD_CONNECTION_OPTION_TIMEOUT, seconds);
 }
 
 void Http_Connection::answer_page()

@@ -61,6 +61,8 @@ private:
     bool has_page(const std::string& path) const;
     /// False if the answer says that a password is needed.
     bool authenticate();
+    /// Of the client, from now on; 0 for no limit.
+    void limit_silence(unsigned seconds);
     void answer_page();
     void answer_message();
     void answer(const Cim_Message& message);

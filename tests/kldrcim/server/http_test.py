@@ -4,6 +4,7 @@ import http.client
 import os
 import re
 import tempfile
+import threading
 import time
 import unittest
 
@@ -398,6 +399,39 @@ class Streams(Serving_Case):
                 connection.sendall(post_bytes(intrinsic("EnumerateInstances", self.MANY, self.namespace)))
                 connection.recv(10000)
         self.assertEqual(error_code(self.served.call("EnumerateInstances", class_parameter("ClassName", "TOY_Item"))), 0)
+
+
+class Slow_Provider(Serving_Case):
+    module = "KLDR_PLAIN_TOY"
+    namespace = "root/toy"
+
+    @classmethod
+    def setUpClass(cls):
+        cls.folder = tempfile.TemporaryDirectory()
+        cls.fifo = os.path.join(cls.folder.name, "fifo")
+        os.mkfifo(cls.fifo)
+        cls.environment = {"TOY_MANY": "20000", "TOY_MANY_WAITS": cls.fifo}
+        super().setUpClass()
+
+    @classmethod
+    def tearDownClass(cls):
+        super().tearDownClass()
+        cls.folder.cleanup()
+
+    def go_on(self):
+        with open(self.fifo, "wb"):
+            pass
+
+    def test_a_long_pause_in_an_answer(self):
+        """Longer than a client may be silent, which reads all the while."""
+        later = threading.Timer(33, self.go_on)
+        later.start()
+        body = intrinsic("EnumerateInstances", class_parameter("ClassName", "TOY_Many"), self.namespace)
+        answer = self.served.raw(post_bytes(body, "Connection: close"))
+        later.join()
+        self.assertTrue(answer.endswith(b"0\r\n\r\n"), answer[-100:])
+        text, _ = chunks_of(answer.partition(b"\r\n\r\n")[2])
+        self.assertEqual(text.count(b"</VALUE.NAMEDINSTANCE>\n"), 20000)
 
 
 class Broken_Streams(Serving_Case):
