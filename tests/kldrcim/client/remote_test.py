@@ -10,7 +10,7 @@ import time
 import unittest
 
 from asking import in_process, run, start
-from serving import PATIENCE, Served, Serving_Case
+from serving import PATIENCE, WITH_ALERTS, Served, Serving_Case
 
 PORT = 'KALDERA_FCPort.SystemCreationClassName="KALDERA_ComputerSystem",SystemName="{}",CreationClassName="KALDERA_FCPort",DeviceID="1000024b4c100000"'
 AGENT = 'KALDERA_AgentService.Name="Kaldera Agent Service Provider"'
@@ -204,8 +204,7 @@ class The_End_Of_A_Server(unittest.TestCase):
 
 
 class Watching(Serving_Case):
-    # A delivered alert is never released, and once the module has been closed nobody can tell that it was one.
-    environment = {"KLDR_SIMULATOR_EVENTS": os.environ["KLDR_EVENTS"], "LSAN_OPTIONS": "detect_leaks=0"}
+    environment = {"KLDR_SIMULATOR_EVENTS": os.environ["KLDR_EVENTS"], **WITH_ALERTS}
     classes = ("CIM_IndicationSubscription", "CIM_IndicationFilter", "CIM_ListenerDestinationCIMXML")
 
     def left(self):

@@ -14,6 +14,9 @@ import unittest
 NAMESPACE = "root/kaldera"
 #: Seconds for what should take none.
 PATIENCE = 60
+#: What a server is started with that delivers alerts. A delivered alert is never released, and once the module has been closed
+#: nobody can tell that it was one.
+WITH_ALERTS = {"LSAN_OPTIONS": "detect_leaks=0"}
 
 
 class Served:

@@ -9,7 +9,7 @@ import tempfile
 import threading
 import unittest
 
-from serving import NAMESPACE, Served, error_code, intrinsic, message, parameter, request
+from serving import NAMESPACE, WITH_ALERTS, Served, error_code, intrinsic, message, parameter, request
 
 ALERTS = "KALDERA_AlertIndication"
 #: Seconds in which alerts arrive.
@@ -103,7 +103,7 @@ class Changes(unittest.TestCase):
         self.turn = 0
 
     def serve(self):
-        self.served = Served("--state", self.state)
+        self.served = Served("--state", self.state, **WITH_ALERTS)
 
     def tearDown(self):
         self.assertEqual(self.served.stop(), 0)
