@@ -12,10 +12,9 @@ namespace KPRV {
 class Address_List
 {
 public:
-    explicit Address_List(const Json::Value& answer) : _is_null(answer.isNull()), _members(answer, NAMES) {}
+    explicit Address_List(const Json::Value& answer) : _members(answer) {}
 
-    /// As `ProviderUtil::isValidJsonResponse` has it.
-    bool is_valid() const { return !_is_null && !_members.has(ERROR); }
+    bool is_valid() const { return _members.is_valid(); }
     /// `indexStrings`, of whatever type; a null pointer if there is none.
     const Json::Value* list() const { return _members.has(LIST) ? &_members[LIST] : nullptr; }
 
@@ -28,8 +27,7 @@ private:
     };
     static constexpr Members<NUM_MEMBERS>::Names NAMES = {"error", "indexStrings"};
 
-    bool _is_null;
-    Members<NUM_MEMBERS> _members;
+    Answer_Members<NAMES> _members;
 };
 
 /// Asks the library for the addresses of all adapters. `response` keeps the answer; the result is its array

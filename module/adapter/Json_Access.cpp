@@ -191,4 +191,13 @@ const Json::Value& element(const Json::Value& array, unsigned index)
     return array.isArray() && index < array.size() ? array[index] : Json::Value::nullSingleton();
 }
 
+Json::Value& Element_Walk::next()
+{
+    const unsigned place = _place++;
+    if (_next != _end && _next.index() == place)
+        return *_next++;
+    _hole = Json::Value();
+    return _hole;
+}
+
 } // namespace KPRV

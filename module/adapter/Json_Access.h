@@ -2,6 +2,7 @@
 
 #include <json/value.h>
 
+#include <algorithm>
 #include <array>
 #include <span>
 #include <stdexcept>
@@ -79,7 +80,44 @@ private:
     const Json::Value* _found[N];
 };
 
+/// What is read of one kind of answer of the library; as long as the answer stands. `NAMES` has "error".
+template <const auto& NAMES>
+class Answer_Members : public Members<NAMES.size()>
+{
+public:
+    explicit Answer_Members(const Json::Value& answer)
+        : Members<NAMES.size()>(answer, NAMES), _is_null(answer.isNull())
+    {
+    }
+
+    /// As `ProviderUtil::isValidJsonResponse` has it.
+    bool is_valid() const { return !_is_null && !this->has(ERROR); }
+
+private:
+    static constexpr size_t ERROR = size_t(std::ranges::find(NAMES, "error") - NAMES.begin());
+    static_assert(ERROR < NAMES.size() && std::ranges::is_sorted(NAMES));
+
+    bool _is_null;
+};
+
 /// Element of an array, or null beyond its end.
 const Json::Value& element(const Json::Value& array, unsigned index);
+
+/// The elements of an array (or null) one after another, by their places: an array may have holes, which
+/// count and give null.
+class Element_Walk
+{
+public:
+    explicit Element_Walk(Json::Value& array) : _next(array.begin()), _end(array.end()) {}
+
+    /// The next element, or null that is the walk's own.
+    Json::Value& next();
+
+private:
+    Json::Value::iterator _next;
+    Json::Value::iterator _end;
+    unsigned _place = 0;
+    Json::Value _hole;
+};
 
 } // namespace KPRV

@@ -9,6 +9,7 @@
 #include "module/runtime/system/assert.h"
 
 #include <memory>
+#include <utility>
 
 // Filters are not evaluated: what counts is in which name spaces there are active ones. Filters and enabling
 // are independent of each other, since servers call them in either order.
@@ -110,14 +111,17 @@ private:
 
 } // namespace
 
-/// The name space with filters that is next in order, copied: false if there is none.
-static bool name_space_at(CMPI_Adapter& adapter, uint32 index, Name_Space_Entry& entry)
+/// Adds the first name space with filters that has not been served: false if there is none. Not by place,
+/// since others may be removed while one is served.
+static bool add_next(CMPI_Adapter& adapter, Array<Name_Space_Entry>& served)
 {
     const Delivery_Hold hold(adapter);
-    if (index >= adapter.name_spaces.size())
-        return false;
-    entry = adapter.name_spaces[index];
-    return true;
+    for (const Name_Space_Entry& entry : std::as_const(adapter.name_spaces))
+        if (served.find(entry) == NPOS) {
+            served.append(entry);
+            return true;
+        }
+    return false;
 }
 
 /// What the provider's worker calls with each indication: sends it into every name space with filters. It
@@ -132,18 +136,17 @@ static bool _indication_proc(Instance* instance, void* client_data)
     }
     const Ref<Instance> owner(instance);
 
-    Name_Space_Entry entry;
-    for (uint32 i = 0; name_space_at(*adapter, i, entry); i++) {
+    Array<Name_Space_Entry> served;
+    while (add_next(*adapter, served)) {
+        const char* const name_space = served[served.size() - 1].name_space.c_str();
         CMPIInstance* ci = nullptr;
-        if (make_cmpi_instance(adapter->broker, instance, entry.name_space.c_str(), nullptr, nullptr, ci) !=
-            CMPI_RC_OK)
+        if (make_cmpi_instance(adapter->broker, instance, name_space, nullptr, nullptr, ci) != CMPI_RC_OK)
             continue;
         // Given back also if the server throws.
         const std::unique_ptr<CMPIInstance, void (*)(CMPIInstance*)> made(ci, give_back<CMPIInstance>);
         const auto* const thread_context = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
         CIMPLE_ASSERT(thread_context != 0);
-        CBDeliverIndication(thread_context->broker(), thread_context->context(), entry.name_space.c_str(),
-                            ci);
+        CBDeliverIndication(thread_context->broker(), thread_context->context(), name_space, ci);
     }
     return true;
 }

@@ -115,10 +115,10 @@ void PortHelper::walk_adapter(const String& index, Walk& walk, Fresh_Instances& 
         return;
     }
     LOG(DBG, "numOfPorts = %u", ports->size());
-    sint32 number = 0;
     // The requests take the addresses out of it.
-    for (Json::Value& address : *ports)
-        walk_port(address, number++, walk, instances);
+    Element_Walk addresses(*ports);
+    for (unsigned number = 0; number < ports->size(); number++)
+        walk_port(addresses.next(), static_cast<sint32>(number), walk, instances);
 }
 
 void PortHelper::walk_port(Json::Value& address, sint32 number, Walk& walk, Fresh_Instances& instances) const

@@ -2,8 +2,6 @@
 
 #include "module/model/Record_Filling.h"
 
-#include <algorithm>
-
 namespace KPRV {
 
 namespace {
@@ -22,7 +20,7 @@ enum : size_t
     PORT_WWN,
     NUM_PORT_MEMBERS
 };
-constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
+constexpr Members<NUM_PORT_MEMBERS>::Names port_members = {
     "PortSymbolicName",
     "error",
     "maxFrameSize",
@@ -33,7 +31,6 @@ constexpr std::array<std::string_view, NUM_PORT_MEMBERS> port_members = {
     "supportedPortSpeeds",
     "wwn",
 };
-static_assert(std::ranges::is_sorted(port_members));
 
 sint64 bits_per_second(const Json::Value& gigabits)
 {
@@ -52,8 +49,8 @@ sint64 operating_speed(const Json::Value& gigabits)
 
 bool fill_port(const Json::Value& answer, sint32 port_number, Host_Name& host, _hbaPortInfo& port)
 {
-    const Members<NUM_PORT_MEMBERS> members(answer, port_members);
-    if (answer.isNull() || members.has(PORT_ERROR))
+    const Answer_Members<port_members> members(answer);
+    if (!members.is_valid())
         return false;
     copy_flat(port.localWWN, text_of(members[PORT_WWN]));
     copy_text(port.portWWN, port.localWWN);

@@ -13,7 +13,7 @@ Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json
         _request["pPortWwn"] = index.c_str();
         _request["lPortWwn"] = index.c_str();
         _list = libGetAllRemotePorts(_request);
-        _next = _list.begin();
+        _elements = Element_Walk(_list);
     });
     if (answered && !listed())
         LOG_LINE(ERR, site.file, site.line, "libGetAllRemotePorts returns NULL.");
@@ -22,7 +22,7 @@ Remote_Ports::Remote_Ports(Call_Site site, const char* port_wwn) : _request(Json
 bool Remote_Ports::ask_next(Call_Site site, Json::Value& answer)
 {
     Json::Value none;
-    Json::Value* const listed_wwn = find_member(*_next++, "remotePortWwn");
+    Json::Value* const listed_wwn = find_member(_elements.next(), "remotePortWwn");
     Json::Value& remote_wwn = listed_wwn ? *listed_wwn : none;
     _wwn.clear();
     if (!guarded(site, {"libGetAllRemotePorts"}, [&] { _wwn = asView(remote_wwn); }))

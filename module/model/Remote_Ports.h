@@ -14,10 +14,9 @@ namespace KPRV {
 class Remote_Port
 {
 public:
-    explicit Remote_Port(const Json::Value& answer) : _is_null(answer.isNull()), _members(answer, NAMES) {}
+    explicit Remote_Port(const Json::Value& answer) : _members(answer) {}
 
-    /// As `ProviderUtil::isValidJsonResponse` has it.
-    bool is_valid() const { return !_is_null && !_members.has(ERROR); }
+    bool is_valid() const { return _members.is_valid(); }
     /// Null if the answer tells of none.
     const Json::Value& device() const { return _members[DEVICE_DATA]; }
     /// A null pointer if there is none.
@@ -32,10 +31,8 @@ private:
         NUM_MEMBERS
     };
     static constexpr Members<NUM_MEMBERS>::Names NAMES = {"deviceData", "error", "lunList"};
-    static_assert(std::ranges::is_sorted(NAMES));
 
-    bool _is_null;
-    Members<NUM_MEMBERS> _members;
+    Answer_Members<NAMES> _members;
 };
 
 /// The same of its device.
@@ -79,7 +76,7 @@ public:
     bool listed() const { return _list.isArray(); }
     unsigned size() const { return _list.size(); }
 
-    /// Asks for the next remote port; no more often than there are some. False if the call threw or there is
+    /// Asks for the next remote port; past the last one there is no WWN. False if the call threw or there is
     /// no WWN to ask for; an answer may still be a bad one.
     bool ask_next(Call_Site site, Json::Value& answer);
     /// WWN of the remote port asked for last, as the library wrote it.
@@ -87,7 +84,7 @@ public:
 
 private:
     Json::Value _list;
-    Json::Value::iterator _next;
+    Element_Walk _elements{_list};
     Json::Value _request;
     Json::Value* _asked = nullptr; ///< The member of the request that changes, from the first question on.
     std::string _wwn;

@@ -163,3 +163,27 @@ TEST(Json_Access, TextsWhereTheyStand)
     EXPECT_EQ(taken(json("true")), Json::Value("true"));
     EXPECT_THROW(taken(json("[]")), Not_Convertible);
 }
+
+TEST(Json_Access, AnAnswerIsBadIfItIsNullOrHasAnError)
+{
+    static constexpr Members<2>::Names NAMES = {"error", "list"};
+    EXPECT_TRUE(Answer_Members<NAMES>(json("{'list': 1}")).is_valid());
+    EXPECT_TRUE(Answer_Members<NAMES>(json("[]")).is_valid());
+    EXPECT_FALSE(Answer_Members<NAMES>(json("null")).is_valid());
+    EXPECT_FALSE(Answer_Members<NAMES>(json("{'error': null, 'list': 1}")).is_valid());
+}
+
+TEST(Json_Access, AWalkOverAnArrayCountsItsHoles)
+{
+    Json::Value array;
+    array[1] = "one";
+    array[3] = "three";
+    ASSERT_EQ(array.size(), 4u);
+    Element_Walk walk(array);
+    for (const char* expected : {"", "one", "", "three", "", ""})
+        EXPECT_EQ(asView(walk.next()), expected);
+    EXPECT_EQ(std::distance(array.begin(), array.end()), 2) << "a hole was filled";
+
+    Json::Value none;
+    EXPECT_TRUE(Element_Walk(none).next().isNull());
+}

@@ -368,6 +368,32 @@ TEST_F(Indication_Operations, OperationsDoNotWaitForADeliveryThatIsInTheServer)
     EXPECT_EQ(name_spaces(), Texts{"root/one 1"});
 }
 
+TEST_F(Indication_Operations, ANameSpaceThatGoesWhileItIsServedTakesNoneOfTheOthersAlong)
+{
+    enable();
+    for (const char* name_space : {"root/one", "root/two", "root/three"})
+        activate(name_space);
+    server.on_deliver = [&] {
+        if (server.delivered.size() == 1)
+            std::async(std::launch::async, [this] { deactivate("root/one"); }).wait();
+    };
+    deliver_on_worker("alert");
+    EXPECT_EQ(delivered_to(), (Texts{"root/one", "root/two", "root/three"}));
+}
+
+TEST_F(Indication_Operations, ANameSpaceThatComesBackDuringADeliveryIsNotServedTwice)
+{
+    enable();
+    activate("root/one");
+    activate("root/two");
+    server.on_deliver = [&] {
+        deactivate("root/one");
+        activate("root/one");
+    };
+    deliver_on_worker("alert");
+    EXPECT_EQ(delivered_to(), (Texts{"root/one", "root/two"}));
+}
+
 TEST_F(Indication_Operations, FiltersMayChangeDuringADelivery)
 {
     enable();

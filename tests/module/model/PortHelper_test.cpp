@@ -53,6 +53,17 @@ TEST_F(PortHelper_Walk, PortsAreNumberedByTheirPlaceAndJoinedInOrder)
     EXPECT_EQ(log.said("ERR"), Lines(2, "ERR libGetFcPhyPortIndicesByAdapter returns NULL."));
 }
 
+TEST_F(PortHelper_Walk, AHoleInTheListKeepsItsNumber)
+{
+    Json::Value list;
+    list["indexStrings"][1] = PORT;
+    library.answers("getFcPhyPortIndicesByAdapter", list);
+    library.answers("getPortByWwn", [](const Json::Value& request) {
+        return request["wwn"] == PORT ? fc_port() : Json::Value();
+    });
+    EXPECT_EQ(walk(FCPORT, "PortNumber"), Lines{"1"});
+}
+
 TEST_F(PortHelper_Walk, Speeds)
 {
     const std::pair<Json::Value, const char*> operating[] = {

@@ -219,6 +219,22 @@ TEST_F(Targets, WithoutALunList)
     EXPECT_EQ(log.said().back(), "DBG Number of Luns = 0.");
 }
 
+TEST_F(Targets, AHoleInTheListIsARemotePortWithoutAWwn)
+{
+    remote_ports({}, target("Disk", {described}));
+    Json::Value list;
+    list[2]["remotePortWwn"] = REMOTE;
+    library.answers("getAllRemotePorts", list);
+    EXPECT_EQ(walk(STORAGEEXTENT).size(), 3u);
+    Lines asked;
+    for (const Fake_Library::Call& call : library.calls)
+        if (call.name == "getCompleteRemotePort")
+            asked.push_back(call.request["rPortWwn"].asString());
+    EXPECT_EQ(asked, (Lines{"", "", REMOTE}));
+    EXPECT_EQ(log.said("DBG rPortWwns"),
+              (Lines{"DBG rPortWwns[0]=", "DBG rPortWwns[1]=", std::string("DBG rPortWwns[2]=") + REMOTE}));
+}
+
 TEST_F(Targets, ABadRemotePortIsLostAlone)
 {
     for (const char* answer : {"null", "{'error': 1}"}) {
