@@ -3,6 +3,8 @@
 #include "broker/values/Type_Words.h"
 #include "broker/values/Value_Bytes.h"
 
+#include <bit>
+
 namespace KPRV::broker {
 
 Array_Object::Array_Object(Core& owner_core, CMPIType type, std::size_t size)
@@ -37,7 +39,7 @@ void Array_Object::unpack()
     Byte_Reader reader(held());
     std::vector<Element> read(reader.number());
     for (Element& element : read) {
-        element.object = reinterpret_cast<const void*>(static_cast<std::uintptr_t>(reader.number()));
+        element.object = std::bit_cast<const void*>(static_cast<std::uintptr_t>(reader.number()));
         element.value = reader.value();
     }
     elements = std::move(read);

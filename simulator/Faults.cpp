@@ -160,7 +160,7 @@ Json::Value replaced_answer(const Fault& fault)
             throw HbaAgentError{code, words["message"].asString()};
         if (words["type"] == "std::runtime_error")
             throw std::runtime_error(words["message"].asString());
-        throw code;
+        throw words["code"].asInt();
     }
     return {};
 }

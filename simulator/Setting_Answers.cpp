@@ -78,7 +78,7 @@ Json::Value set_authentication(State& state, const Json::Value& request)
         named["names"].append(name);
     const Target target = find_target(state.inventory, request, Scope::FC_PORT);
     const bool was_enabled = is_authenticating(state, target);
-    const Json::Value answer = set_named(state, named, Setting::AUTHENTICATION, "portAuth", "names");
+    Json::Value answer = set_named(state, named, Setting::AUTHENTICATION, "portAuth", "names");
     const bool is_enabled = is_authenticating(state, target);
     if (is_enabled != was_enabled)
         occur(state, is_enabled ? Occurrence::AUTHENTICATION_ENABLED : Occurrence::AUTHENTICATION_DISABLED,

@@ -98,7 +98,7 @@ Json::Value create_virtual_port(State& state, const Json::Value& request)
 {
     const Json::Value port = addressed(request, Json::Value());
     return answer_for_target(state, port, Scope::FC_PORT, [&](const Target& target) {
-        const Json::Value refusal = objection(state, request, target);
+        Json::Value refusal = objection(state, request, target);
         if (!refusal.isNull())
             return refusal;
         target.port->virtual_ports.push_back(new_virtual_port(request));

@@ -4,9 +4,9 @@
 #include "kldrcim/connection/Connection.h"
 
 #include <algorithm>
-#include <cstring>
 #include <curl/curl.h>
 #include <new>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -26,8 +26,9 @@ std::unique_ptr<curl_slist, Free_List> list_of(const std::vector<std::string>& f
         curl_slist* const longer = curl_slist_append(list.get(), field.c_str());
         if (!longer)
             throw std::bad_alloc();
-        list.release();
-        list.reset(longer);
+        // What grows keeps its head.
+        if (!list)
+            list.reset(longer);
     }
     return list;
 }
@@ -175,7 +176,7 @@ void Http_Client::fail(int code, const char* details, std::chrono::seconds patie
     long number = 0;
     curl_easy_getinfo(_handle, CURLINFO_OS_ERRNO, &number);
     const std::string why = code == CURLE_COULDNT_CONNECT && number != 0
-                                ? std::strerror(static_cast<int>(number))
+                                ? std::generic_category().message(static_cast<int>(number))
                             : *details ? details
                                        : curl_easy_strerror(static_cast<CURLcode>(code));
     switch (code) {

@@ -9,6 +9,7 @@
 #include <microhttpd.h>
 #include <netinet/in.h>
 #include <random>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -117,7 +118,7 @@ std::unique_ptr<Indication_Listener> Indication_Listener::start(const std::strin
     const MHD_DaemonInfo* const info =
         listener->_daemon ? MHD_get_daemon_info(listener->_daemon, MHD_DAEMON_INFO_BIND_PORT) : nullptr;
     if (!info) {
-        error = "cannot listen for indications at " + address + ": " + std::strerror(errno);
+        error = "cannot listen for indications at " + address + ": " + std::generic_category().message(errno);
         return nullptr;
     }
     listener->_port = info->port;

@@ -3,10 +3,10 @@
 
 #include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <fstream>
 #include <memory>
 #include <sys/stat.h>
+#include <system_error>
 #include <termios.h>
 #include <unistd.h>
 
@@ -52,7 +52,8 @@ std::optional<std::string> password_of_file(const std::string& file, std::string
     std::ifstream in(file);
     std::string line;
     if (!std::getline(in, line) && line.empty()) {
-        error = file + ": " + (errno && !in.eof() ? std::strerror(errno) : "no password in it");
+        error =
+            file + ": " + (errno && !in.eof() ? std::generic_category().message(errno) : "no password in it");
         return std::nullopt;
     }
     if (line.ends_with('\r'))

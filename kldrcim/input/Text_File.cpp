@@ -2,8 +2,8 @@
 
 #include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <memory>
+#include <system_error>
 
 namespace KPRV::kldrcim {
 
@@ -27,7 +27,7 @@ std::optional<std::string> read_text_file(const std::string& name, std::string& 
             break;
     if (file && !std::ferror(file.get()))
         return text;
-    error = std::strerror(errno);
+    error = std::generic_category().message(errno);
     return std::nullopt;
 }
 

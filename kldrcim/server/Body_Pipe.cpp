@@ -1,8 +1,5 @@
 #include "kldrcim/server/Body_Pipe.h"
 
-#include <algorithm>
-#include <cstring>
-
 namespace KPRV::kldrcim {
 
 bool Body_Pipe::send(std::string&& text)
@@ -73,8 +70,7 @@ std::size_t Body_Pipe::read(char* to, std::size_t size)
     if (_pieces.empty())
         return 0;
     const std::string& piece = _pieces.front();
-    const std::size_t count = std::min(size, piece.size() - _taken);
-    std::memcpy(to, piece.data() + _taken, count);
+    const std::size_t count = piece.copy(to, size, _taken);
     _taken += count;
     _bytes -= count;
     if (_taken == piece.size()) {

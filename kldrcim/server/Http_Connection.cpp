@@ -94,8 +94,7 @@ struct Http_Connection::Callbacks
             return static_cast<ssize_t>(count);
         if (self._pipe.is_broken())
             return MHD_CONTENT_READER_END_WITH_ERROR;
-        const std::size_t rest = std::min(size, self._rest.size());
-        std::memcpy(buffer, self._rest.data(), rest);
+        const std::size_t rest = self._rest.copy(buffer, size);
         self._rest.erase(0, rest);
         if (rest != 0)
             return static_cast<ssize_t>(rest);

@@ -5,10 +5,10 @@
 #include "kldrcim/wire/Xml_Reader.h"
 
 #include <cerrno>
-#include <cstring>
 #include <fcntl.h>
 #include <fstream>
 #include <iterator>
+#include <system_error>
 #include <unistd.h>
 
 namespace KPRV::kldrcim {
@@ -56,7 +56,7 @@ bool read_state(const std::string& file, const Class_Catalogue& classes,
         return true;
     const std::string text(std::istreambuf_iterator<char>(in), {});
     if (!in && !in.eof()) {
-        error = file + ": " + std::strerror(errno);
+        error = file + ": " + std::generic_category().message(errno);
         return false;
     }
     try {
@@ -87,7 +87,7 @@ bool write_state(const std::string& file, const std::vector<Instance_Value>& ins
         failure = errno;
     }
     if (!done)
-        error = file + ": " + std::strerror(failure);
+        error = file + ": " + std::generic_category().message(failure);
     return done;
 }
 

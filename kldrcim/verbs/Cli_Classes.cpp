@@ -53,6 +53,7 @@ constexpr const char* listed_names[] = {"class", "superclass", "provider", "keys
 Plain_Value list_of(const std::vector<std::string>& words)
 {
     std::vector<Plain_Value> texts;
+    texts.reserve(words.size());
     for (const std::string& word : words)
         texts.push_back(Plain_Value::text(word));
     return Plain_Value::array(CMPI_string, std::move(texts));

@@ -106,8 +106,8 @@ bool Result_Filter::take(std::vector<Thing>& kept, const std::string& class_name
     if (_options.total)
         return true;
     if (_options.sort.empty())
-        return give(std::move(thing));
-    kept.push_back(std::move(thing));
+        return give(std::forward<Thing>(thing));
+    kept.push_back(std::forward<Thing>(thing));
     return true;
 }
 

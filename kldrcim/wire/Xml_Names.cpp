@@ -28,7 +28,7 @@ constexpr std::string_view attribute_names[] = {
 #undef X
 };
 constexpr std::string_view attribute_openings[] = {
-#define X(name) " " #name "=\"",
+#define X(name) (" " #name "=\""),
     KLDR_XML_ATTRIBUTES(X)
 #undef X
 };

@@ -156,7 +156,7 @@ void leave_descriptors(int kept)
 {
     sigset_t none;
     sigemptyset(&none);
-    sigprocmask(SIG_SETMASK, &none, nullptr);
+    pthread_sigmask(SIG_SETMASK, &none, nullptr);
     int code = NOT_FOUND;
     for (const char* const* place = program.places.data(); *place; place++) {
         execve(*place, const_cast<char* const*>(program.arguments), environ);

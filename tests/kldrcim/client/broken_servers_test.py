@@ -123,6 +123,25 @@ class Broken_Servers(unittest.TestCase):
         # What came is written.
         self.assertEqual('root/kaldera:X.K="a"\n', self.refused(r"the connection to http://\S+ broke: ", half))
 
+    def test_a_value_without_end(self):
+        """More than a whole answer may have in memory is not waited for."""
+        sent = []
+
+        def endless(at):
+            at.send_response(200)
+            at.end_headers()
+            at.close_connection = True
+            try:
+                at.wfile.write(answer("EnumerateInstanceNames", ENUMERATED.format(NAMED)).partition(b"{}")[0])
+                while len(sent) < 4096:
+                    at.wfile.write(b"x" * 0x10000)
+                    sent.append(None)
+            except OSError:
+                pass
+
+        self.assertEqual("", self.refused(r"^kldrcim: http://\S+ ", endless))
+        self.assertLess(len(sent) * 0x10000, 80 << 20)
+
     def test_errors_with_the_servers_own_words(self):
         for error, text in (
             ('<ERROR CODE="1" DESCRIPTION="the &#x41;dapter&#10;is gone"></ERROR>', "CIM_ERR_FAILED (1): the Adapter is gone"),

@@ -319,6 +319,21 @@ class Slowness(Serving_Case):
             for each in waiting:
                 each.close()
 
+    def test_one_connection_too_many(self):
+        waiting = [self.served.connect() for _ in range(64)]
+        try:
+            # One is served before the next is taken in.
+            for each in waiting:
+                each.sendall(b"GET /metrics HTTP/1.1\r\nHost: localhost\r\n")
+            with self.served.connect() as refused:
+                self.assertEqual(read_all(refused), b"")
+            waiting[0].sendall(b"Connection: close\r\n\r\n")
+            self.assertIn(b"# EOF", read_all(waiting[0]))
+            self.assertEqual(error_code(self.served.call("EnumerateInstanceNames", FCPORT)), 0)
+        finally:
+            for each in waiting:
+                each.close()
+
     def test_stopped_reader_holds_up_nobody(self):
         with self.served.connect() as connection:
             connection.sendall(post_bytes(intrinsic("EnumerateClasses", value_parameter("DeepInheritance", "TRUE"))) * 20)

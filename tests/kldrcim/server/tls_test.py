@@ -36,7 +36,8 @@ class Certificates:
         self.make("authority", "authority")
         self.make("stranger", "authority")
         for name in ("here", "elsewhere"):
-            self.make(name, name, "-CA", self.file("authority.pem"), "-CAkey", self.file("authority.key"))
+            self.make(name, name, *self.authority())
+        self.make_old("here", "old")
 
     def file(self, name):
         return os.path.join(self.folder, name)
@@ -46,6 +47,16 @@ class Certificates:
         command = ["/usr/bin/openssl", "req", "-x509", "-config", self.file("settings"), "-extensions", extensions, "-days", "2"]
         key = ("-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:P-256", "-nodes", "-subj", f"/CN={name}")
         subprocess.run([*command, *key, *files, *options], capture_output=True, check=True)
+
+    def make_old(self, name, old):
+        """The same again, over since yesterday."""
+        request = ["/usr/bin/openssl", "x509", "-x509toreq", "-in", self.file(f"{name}.pem"), "-signkey", self.file(f"{name}.key")]
+        asked = subprocess.run(request, capture_output=True, check=True).stdout
+        answer = ["/usr/bin/openssl", "x509", "-req", "-days", "-1", "-extfile", self.file("settings"), "-extensions", name]
+        subprocess.run([*answer, *self.authority(), "-CAcreateserial", "-out", self.file(f"{old}.pem")], input=asked, capture_output=True, check=True)
+
+    def authority(self):
+        return ("-CA", self.file("authority.pem"), "-CAkey", self.file("authority.key"))
 
     def options(self, name, key=None):
         return ("--tls-cert", self.file(f"{name}.pem"), "--tls-key", self.file(f"{key or name}.key"))
@@ -158,6 +169,13 @@ class Mistakes(Tls_Case):
         status, _, complaints = self.kldrcim("--url", served.url, "--cacert", self.made.file("authority.pem"))
         self.assertEqual(status, 2)
         self.assertIn("is not to be trusted", complaints)
+
+    def test_a_certificate_that_is_over(self):
+        served = self.serve(*self.made.options("old", "here"))
+        status, output, complaints = self.kldrcim("--url", served.url, "--cacert", self.made.file("authority.pem"))
+        self.assertEqual((status, output, complaints.count("\n")), (2, "", 1))
+        self.assertIn("is not to be trusted: ", complaints)
+        self.assertIn("expired", complaints)
 
     def test_tls_to_a_plain_server(self):
         served = self.serve()
