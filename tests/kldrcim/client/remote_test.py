@@ -15,6 +15,9 @@ from serving import PATIENCE, WITH_ALERTS, Served, Serving_Case
 PORT = 'KALDERA_FCPort.SystemCreationClassName="KALDERA_ComputerSystem",SystemName="{}",CreationClassName="KALDERA_FCPort",DeviceID="1000024b4c100000"'
 AGENT = 'KALDERA_AgentService.Name="Kaldera Agent Service Provider"'
 
+#: Of the classes: a sanitizer learns from a few what it would see in all of them, several times slower.
+EACH = 6 if os.environ.get("KLDR_SANITIZE") else 1
+
 #: What a server adds: arguments, then what there is in its place in process.
 ADDED = [
     ("ei KALDERA_None", "KALDERA_None", 'the module has no class KALDERA_None; "kldrcim classes" lists them'),
@@ -47,7 +50,7 @@ class Same_Answers(Serving_Case):
         classes = [each["class"] for each in json.loads(in_process("classes", "--format", "json")[1])]
         self.assertGreater(len(classes), 70)
         # An alert is no instance to enumerate, and the object manager is the server itself.
-        for name in sorted({*classes} - {"KALDERA_AlertIndication", "KALDERA_ObjectManager"}):
+        for name in sorted({*classes} - {"KALDERA_AlertIndication", "KALDERA_ObjectManager"})[::EACH]:
             self.same("ei", name, "--format", "json")
             self.same("ein", name)
 

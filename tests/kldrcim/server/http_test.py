@@ -27,7 +27,7 @@ from serving import (
 #: Sanitizers have memory of their own, of which nothing is promised.
 SANITIZED = bool(os.environ.get("KLDR_SANITIZE"))
 #: Sanitizers make each of them ten times as dear, and watch no memory.
-VERY_MANY = 20000 if SANITIZED else 100000
+VERY_MANY = 5000 if SANITIZED else 100000
 NAMES = intrinsic("EnumerateInstanceNames", class_parameter("ClassName", "CIM_FCPort"))
 FCPORT = class_parameter("ClassName", "CIM_FCPort")
 

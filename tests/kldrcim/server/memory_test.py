@@ -19,7 +19,7 @@ from serving import (
 
 SANITIZED = bool(os.environ.get("KLDR_SANITIZE"))
 #: KLDR_REQUESTS=100000 is the whole of it, which takes minutes.
-REQUESTS = int(os.environ.get("KLDR_REQUESTS", "2000" if SANITIZED else "10000"))
+REQUESTS = int(os.environ.get("KLDR_REQUESTS", "500" if SANITIZED else "10000"))
 CLIENTS = 4
 #: Sent before the first of their answers is read.
 BATCH = 20
