@@ -31,9 +31,10 @@ bool choose(Cli_Options& options, std::string& error)
         {"--leaks", options.leaks},
         {"--user", options.user.has_value()},
         {"serve", options.verb == "serve"}};
-    const std::pair<const char*, bool> of_a_server[] = {{"--password-file", !options.password_file.empty()},
-                                                        {"--cacert", !options.ca_file.empty()},
-                                                        {"--insecure", options.insecure}};
+    const std::pair<const char*, bool> of_a_server[] = {
+        {"--password-file", !options.password_file.empty()},
+        {"--cacert", !options.ca_file.empty() && options.verb != "serve"},
+        {"--insecure", options.insecure}};
     const bool is_remote = !options.url.empty();
     for (const auto& [name, is_given] :
          is_remote ? std::span(of_a_module) : std::span<const std::pair<const char*, bool>>(of_a_server))

@@ -53,6 +53,7 @@ bool read_file(const std::string& file, std::string& text, std::string& error)
 /// What stands on the command line, as the server takes it; false with `error`.
 bool read_options(const Cli_Options& options, Http_Options& http, Users_File& users, std::string& error)
 {
+    std::string authorities;
     if (!options.listen.empty() && !parse_listen(options.listen, http))
         error = "--listen takes ADDRESS:PORT, such as 127.0.0.1:5988 or [::1]:0";
     else if (options.tls_certificate.empty() != options.tls_key.empty())
@@ -60,6 +61,8 @@ bool read_options(const Cli_Options& options, Http_Options& http, Users_File& us
     else if (!options.tls_certificate.empty() &&
              (!read_file(options.tls_certificate, http.certificate, error) ||
               !read_file(options.tls_key, http.key, error)))
+        return false;
+    else if (!options.ca_file.empty() && !read_file(options.ca_file, authorities, error))
         return false;
     else if (!options.users.empty() && users.read(options.users, error))
         http.users = &users;
@@ -111,7 +114,8 @@ int serve_until(Interruption& interruption, const Cli_Options& options, const Ht
                                 {.system_name = host_name,
                                  .interop_names = interop_names,
                                  .state_file = options.state,
-                                 .log = [](const std::string& text) { complain(text, 0); }});
+                                 .log = [](const std::string& text) { complain(text, 0); },
+                                 .deliver = http_delivery(options.ca_file)});
     if (!subscriptions.restore(error))
         return complain(error, FAILURE);
     Interop_Space interop(interop_names[0], classes, {&objects, &subscriptions}, model);

@@ -156,7 +156,7 @@ constexpr Cli_Option option_table[] = {
     {"--password-file", "FILE",        set_text<&Options::password_file>,   nullptr,                 nullptr,                  true,
      "its first line is the password of USER (default: ask at the terminal)"},
     {"--cacert",     "FILE",           set_text<&Options::ca_file>,         nullptr,                 nullptr,                  true,
-     "certificates by which the server's may be signed (default: the system's)"},
+     "certificates by which the server's may be signed, or those of listeners of serve (default: the system's)"},
     {"--insecure",   nullptr,          nullptr,                             &Options::insecure,      nullptr,                  true,
      "do not look at the server's certificate: whoever answers is believed"},
     {"--timeout",    "SECONDS",        set_number<&Options::timeout>,       nullptr,                 "a number above 0",       true,

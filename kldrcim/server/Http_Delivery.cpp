@@ -42,24 +42,33 @@ struct Free_Curl
 CURL* own_handle()
 {
     thread_local const std::unique_ptr<CURL, Free_Curl> handle(curl_easy_init());
-    if (handle)
-        curl_easy_reset(handle.get());
     return handle.get();
 }
 
-} // namespace
+std::string trouble(CURLcode code, const char* details, const std::string& ca_file)
+{
+    const std::string why = *details ? details : curl_easy_strerror(code);
+    if (code == CURLE_PEER_FAILED_VERIFICATION)
+        return "its certificate is not to be trusted: " + why +
+               "; --cacert FILE names who may have signed it";
+    return code == CURLE_SSL_CACERT_BADFILE ? "--cacert: no certificates in " + ca_file : why;
+}
 
-Delivery deliver_by_http(const std::string& url, const std::string& message,
-                         const std::function<bool()>& stop)
+Delivery deliver(const std::string& ca_file, const std::string& url, const std::string& message,
+                 const std::function<bool()>& stop)
 {
     CURL* const curl = own_handle();
     if (!curl)
-        return Delivery::AGAIN;
+        return {.is_done = false, .why = "no memory"};
     std::unique_ptr<curl_slist, Free_Curl> headers;
     for (const char* line : {"Content-Type: application/xml; charset=\"utf-8\"", "CIMProtocolVersion: 1.0",
                              "CIMExport: MethodRequest", "CIMExportMethod: ExportIndication", "Expect:"})
         headers.reset(curl_slist_append(headers.release(), line));
     Exchange exchange{stop};
+    char details[CURL_ERROR_SIZE] = {};
+    curl_easy_setopt(curl, CURLOPT_ERRORBUFFER, details);
+    if (!ca_file.empty())
+        curl_easy_setopt(curl, CURLOPT_CAINFO, ca_file.c_str());
     curl_easy_setopt(curl, CURLOPT_URL, url.c_str());
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
     curl_easy_setopt(curl, CURLOPT_FOLLOWLOCATION, 0L);
@@ -79,7 +88,23 @@ Delivery deliver_by_http(const std::string& url, const std::string& message,
     long status = 0;
     curl_easy_getinfo(curl, CURLINFO_RESPONSE_CODE, &status);
     const bool answered = code == CURLE_OK || (code == CURLE_WRITE_ERROR && exchange.received > MOST_ANSWER);
-    return answered && status < server_error ? Delivery::DONE : Delivery::AGAIN;
+    // The handle outlives what it was given.
+    curl_easy_reset(curl);
+    if (!answered)
+        return {.is_done = false, .why = trouble(code, details, ca_file)};
+    if (status >= server_error)
+        return {.is_done = false, .why = "it answers with status " + std::to_string(status)};
+    return {};
+}
+
+} // namespace
+
+Delivery_Function http_delivery(std::string ca_file)
+{
+    return [ca_file = std::move(ca_file)](const std::string& url, const std::string& message,
+                                          const std::function<bool()>& stop) {
+        return deliver(ca_file, url, message, stop);
+    };
 }
 
 } // namespace KPRV::kldrcim

@@ -92,10 +92,10 @@ void Indication_Exporter::run()
             message = _messages.front();
         }
         const Delivery delivery = _deliver(_url, message, stopped);
-        if (delivery == Delivery::AGAIN && ++failures == _patience.quick)
-            _log("listener " + _url + ": no answer");
+        if (!delivery.is_done && ++failures == _patience.quick)
+            _log("listener " + _url + ": " + delivery.why);
         const Auto_Lock lock(_mutex);
-        if (delivery == Delivery::DONE) {
+        if (delivery.is_done) {
             failures = 0;
             _overflowed = false;
             _messages.pop_front();

@@ -15,21 +15,21 @@ namespace KPRV::kldrcim {
 using namespace broker;
 
 /// How an attempt to hand an indication over ended.
-enum class Delivery
+struct Delivery
 {
-    /// Taken, or refused for good: the listener has seen it.
-    DONE,
-    /// No answer, or one that says "later".
-    AGAIN,
+    /// Taken, or refused for good: the listener has seen it. Else it is tried again.
+    bool is_done = true;
+    /// Why there was no answer, or none that counts.
+    std::string why = {};
 };
 
 /// Sends a message to a listener; gives up soon after `stop` says so.
 using Delivery_Function = std::function<Delivery(const std::string& url, const std::string& message,
                                                  const std::function<bool()>& stop)>;
 
-/// By HTTP. Whatever the URL says: no redirects, no proxies, no protocols but http and https.
-Delivery deliver_by_http(const std::string& url, const std::string& message,
-                         const std::function<bool()>& stop);
+/// By HTTP. Whatever the URL says: no redirects, no proxies, no protocols but http and https. `ca_file` has
+/// the certificates by which those of listeners may be signed, empty for the system's.
+Delivery_Function http_delivery(std::string ca_file = {});
 
 /// Pauses between attempts.
 struct Delivery_Patience
@@ -52,7 +52,7 @@ public:
 
     /// `context` names the sequence; it is another one after each start.
     Indication_Exporter(std::string url, std::string context, Log log,
-                        Delivery_Function deliver = deliver_by_http, Delivery_Patience patience = {});
+                        Delivery_Function deliver = http_delivery(), Delivery_Patience patience = {});
     /// What still waits is lost.
     ~Indication_Exporter();
     Indication_Exporter(const Indication_Exporter&) = delete;

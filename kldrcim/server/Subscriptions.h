@@ -21,7 +21,7 @@ public:
         /// Empty: nothing is kept.
         std::string state_file = {};
         Indication_Exporter::Log log = [](const std::string&) {};
-        Delivery_Function deliver = deliver_by_http;
+        Delivery_Function deliver = http_delivery();
     };
 
     Subscriptions(Local_Server& host, const Interop_Classes& classes, Options options);

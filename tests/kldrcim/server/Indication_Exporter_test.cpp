@@ -18,10 +18,10 @@ public:
         _changed.notify_all();
         if (_refusals > 0) {
             --_refusals;
-            return Delivery::AGAIN;
+            return {.is_done = false, .why = "later"};
         }
         _messages.push_back(message);
-        return Delivery::DONE;
+        return {};
     }
     void refuse(unsigned count)
     {
@@ -87,7 +87,9 @@ TEST(Indication_Exporter, TriesAgainInOrderAndSaysSoOnce)
     listener.refuse(7);
     std::atomic<unsigned> lines = 0;
     Indication_Exporter exporter(
-        "http://l/", "c", [&](const std::string&) { ++lines; }, listener.function(), short_patience);
+        "http://l/", "c",
+        [&](const std::string& text) { lines += text == "listener http://l/: later" ? 1 : 2; },
+        listener.function(), short_patience);
     exporter.put({{.class_name = "Alert"}, {}});
     exporter.put({{.class_name = "Alert"}, {}});
     listener.wait_for_attempts(9);

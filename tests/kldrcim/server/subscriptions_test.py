@@ -5,10 +5,13 @@ import json
 import os
 import queue
 import re
+import ssl
 import tempfile
 import threading
+import time
 import unittest
 
+from certificates import Certificates
 from serving import NAMESPACE, WITH_ALERTS, Served, error_code, intrinsic, message, parameter, request
 
 ALERTS = "KALDERA_AlertIndication"
@@ -34,11 +37,13 @@ class Listener(http.server.BaseHTTPRequestHandler):
         pass
 
 
-def listen(case):
+def listen(case, tls=None):
     server = http.server.ThreadingHTTPServer(("127.0.0.1", 0), Listener)
     server.daemon_threads = True
     server.arrived = queue.Queue()
-    server.url = f"http://127.0.0.1:{server.server_port}"
+    server.url = f"{'https' if tls else 'http'}://127.0.0.1:{server.server_port}"
+    if tls:
+        server.socket = tls.wrap_socket(server.socket, server_side=True)
     thread = threading.Thread(target=server.serve_forever)
     thread.start()
     case.addCleanup(thread.join)
@@ -94,16 +99,15 @@ def subscription_of(name):
     return ("CIM_IndicationSubscription", {"Filter": filter_of(name), "Handler": listener_of(name)})
 
 
-class Changes(unittest.TestCase):
+class Subscribing_Case(unittest.TestCase):
     def setUp(self):
         self.folder = tempfile.TemporaryDirectory()
         self.addCleanup(self.folder.cleanup)
         self.state = os.path.join(self.folder.name, "state")
-        self.serve()
         self.turn = 0
 
-    def serve(self):
-        self.served = Served("--state", self.state, **WITH_ALERTS)
+    def serve(self, *options):
+        self.served = Served("--state", self.state, *options, **WITH_ALERTS)
 
     def tearDown(self):
         self.assertEqual(self.served.stop(), 0)
@@ -156,6 +160,12 @@ class Changes(unittest.TestCase):
 
     def take(self, listener, count):
         return [listener.arrived.get(timeout=PATIENCE) for _ in range(count)]
+
+
+class Changes(Subscribing_Case):
+    def setUp(self):
+        super().setUp()
+        self.serve()
 
     def test_a_listener_moves(self):
         old, new = listen(self), listen(self)
@@ -262,6 +272,61 @@ class Changes(unittest.TestCase):
         self.take(listener, 2)
         body = self.call("DeleteInstance", parameter("InstanceName", instance_name(subscription_of("a"))))
         self.assertEqual(error_code(body), 0, body)
+
+
+class Listeners_With_Tls(Subscribing_Case):
+    def setUp(self):
+        super().setUp()
+        self.made = Certificates(self.folder.name)
+
+    def listen(self, name):
+        tls = ssl.SSLContext(ssl.PROTOCOL_TLS_SERVER)
+        tls.load_cert_chain(self.made.file(f"{name}.pem"), self.made.file("here.key" if name == "old" else f"{name}.key"))
+        return listen(self, tls)
+
+    def test_who_is_trusted(self):
+        self.serve("--cacert", self.made.file("authority.pem"))
+        listener = self.listen("here")
+        self.subscribe("a", listener.url)
+        self.switch()
+        self.take(listener, 2)
+
+    def test_who_is_not(self):
+        self.serve("--cacert", self.made.file("authority.pem"))
+        unknown = {name: self.listen(name) for name in ("elsewhere", "old", "stranger")}
+        for name, listener in unknown.items():
+            self.subscribe(name, listener.url)
+        self.switch()
+        said = self.wait_for_lines(len(unknown))
+        for name, listener in unknown.items():
+            self.assertTrue(listener.arrived.empty(), name)
+            line = next(each for each in said if f"listener {listener.url}: " in each)
+            self.assertIn(": its certificate is not to be trusted: ", line)
+            self.assertIn("; --cacert FILE names who may have signed it", line)
+
+    def test_by_the_system_nobody_is_trusted_whom_it_does_not_know(self):
+        self.serve()
+        listener = self.listen("here")
+        self.subscribe("a", listener.url)
+        self.switch()
+        self.assertIn(": its certificate is not to be trusted: ", self.wait_for_lines(1)[0])
+        self.assertTrue(listener.arrived.empty())
+
+    def test_why_nobody_answers(self):
+        self.serve()
+        self.subscribe("a", "http://127.0.0.1:1")
+        self.switch()
+        self.assertRegex(self.wait_for_lines(1)[0], r"^kldrcim: listener http://127.0.0.1:1: .*[Cc]onnect")
+
+    def wait_for_lines(self, count):
+        end = time.monotonic() + PATIENCE
+        while time.monotonic() < end:
+            with open(self.served.errors.name, encoding="utf-8") as errors:
+                lines = errors.read().splitlines()
+            if len(lines) >= count:
+                return lines
+            time.sleep(0.05)
+        self.fail(f"{count} lines awaited")
 
 
 if __name__ == "__main__":
