@@ -193,11 +193,13 @@ const Json::Value& element(const Json::Value& array, unsigned index)
 
 Json::Value& Element_Walk::next()
 {
-    const unsigned place = _place++;
-    if (_next != _end && _next.index() == place)
-        return *_next++;
-    _hole = Json::Value();
-    return _hole;
+    // The last place is no hole: up to there is always a next element.
+    if (_place < _size && _next.index() == _place++) {
+        Json::Value& found = *_next;
+        ++_next;
+        return found;
+    }
+    return _hole.emplace();
 }
 
 } // namespace KPRV

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <array>
+#include <optional>
 #include <span>
 #include <stdexcept>
 #include <string>
@@ -108,16 +109,16 @@ const Json::Value& element(const Json::Value& array, unsigned index);
 class Element_Walk
 {
 public:
-    explicit Element_Walk(Json::Value& array) : _next(array.begin()), _end(array.end()) {}
+    explicit Element_Walk(Json::Value& array) : _next(array.begin()), _size(array.size()) {}
 
     /// The next element, or null that is the walk's own.
     Json::Value& next();
 
 private:
     Json::Value::iterator _next;
-    Json::Value::iterator _end;
+    unsigned _size;
     unsigned _place = 0;
-    Json::Value _hole;
+    std::optional<Json::Value> _hole;
 };
 
 } // namespace KPRV
