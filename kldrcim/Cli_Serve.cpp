@@ -50,10 +50,18 @@ bool read_file(const std::string& file, std::string& text, std::string& error)
     return error.empty();
 }
 
+/// They are read anew for each listener: a mistake is told at once.
+bool has_certificates(const std::string& file, std::string& error)
+{
+    std::string text;
+    if (read_file(file, text, error) && text.find("CERTIFICATE-----") == std::string::npos)
+        error = "--cacert: no certificates in " + file;
+    return error.empty();
+}
+
 /// What stands on the command line, as the server takes it; false with `error`.
 bool read_options(const Cli_Options& options, Http_Options& http, Users_File& users, std::string& error)
 {
-    std::string authorities;
     if (!options.listen.empty() && !parse_listen(options.listen, http))
         error = "--listen takes ADDRESS:PORT, such as 127.0.0.1:5988 or [::1]:0";
     else if (options.tls_certificate.empty() != options.tls_key.empty())
@@ -62,7 +70,7 @@ bool read_options(const Cli_Options& options, Http_Options& http, Users_File& us
              (!read_file(options.tls_certificate, http.certificate, error) ||
               !read_file(options.tls_key, http.key, error)))
         return false;
-    else if (!options.ca_file.empty() && !read_file(options.ca_file, authorities, error))
+    else if (!options.ca_file.empty() && !has_certificates(options.ca_file, error))
         return false;
     else if (!options.users.empty() && users.read(options.users, error))
         http.users = &users;

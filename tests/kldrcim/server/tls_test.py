@@ -13,6 +13,7 @@ from serving import PATIENCE, Served, basic, class_parameter, intrinsic, read_al
 
 NAMES = intrinsic("EnumerateInstanceNames", class_parameter("ClassName", "CIM_FCPort"))
 
+
 class Tls_Case(unittest.TestCase):
     @classmethod
     def setUpClass(cls):
@@ -137,6 +138,10 @@ class Mistakes(Tls_Case):
         self.assertIn(unusable, self.refused(*self.made.options("here", key="stranger")))
         self.assertIn(unusable, self.refused("--tls-cert", self.made.file("settings"), "--tls-key", self.made.file("here.key")))
         self.assertIn("No such file", self.refused("--tls-cert", "/proc/none", "--tls-key", self.made.file("here.key")))
+
+    def test_authorities_that_are_none(self):
+        self.assertIn("--cacert: no certificates in ", self.refused("--cacert", self.made.file("here.key")))
+        self.assertIn("/proc/none: No such file", self.refused("--cacert", "/proc/none"))
 
     def test_other_hosts_take_tls_and_users(self):
         users, password = self.made.file("users"), self.made.file("password")
