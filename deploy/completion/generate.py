@@ -52,6 +52,11 @@ def values(tables):
     return rows
 
 
+def pairs(tables):
+    """The options that take two values."""
+    return sorted({each["name"] for verb in tables["verbs"] for each in verb["options"] if " " in (each["value"] or "")})
+
+
 def arguments(tables):
     """(verb, first word or *, place or *, kind) of the arguments that have something to offer."""
     rows, firsts = [], {}
@@ -119,6 +124,8 @@ def fills(tables, tests, rpc_methods):
             (f"'{verb}'", "printf '%s\\n' " + described((name, summaries[name]) for name in known)) for verb, known in offers
         ),
         "COMMON": " ".join(every),
+        "PAIRS": "|".join(pairs(tables)),
+        "PAIRS_FISH": " ".join(pairs(tables)),
         "VERBS": " ".join(sorted(verb["name"] for verb in tables["verbs"])),
         "VERBS_FISH": described((verb["name"], verb["summary"].split("\n")[0]) for verb in tables["verbs"]),
         "TESTS": " ".join(tests),

@@ -82,6 +82,12 @@ class Completion(CompletionCase):
         self.assertEqual(self.bash(f"kldrcim --module {SOURCE}/LIC"), [f"{SOURCE}/LICENSE"])
         self.assertEqual(self.fish(f"kldrcim --module {SOURCE}/LIC"), [f"{SOURCE}/LICENSE"])
 
+    def test_an_option_of_two_values(self):
+        for line in ("kldrcim serve --tls ", "kldrcim serve --tls /some/certificate "):
+            for shell in (self.bash, self.fish):
+                self.assertEqual(shell(f"{line}{SOURCE}/LIC"), [f"{SOURCE}/LICENSE"], line)
+        self.everywhere("kldrcim --tls certificate key conf", ["conform"])
+
     def test_kldr_register(self):
         usage = output_of(self.prefix / "sbin/kldr-register", "--help")
         verbs = re.match(r"usage: kldr-register ([a-z|]+) ", usage)[1].split("|")
