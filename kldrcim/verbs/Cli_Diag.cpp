@@ -6,6 +6,7 @@
 #include "kldrcim/verbs/Cli_Complaints.h"
 #include "kldrcim/verbs/Cli_Output.h"
 #include "kldrcim/verbs/Interruption.h"
+#include "kldrcim/verbs/Result_Filter.h"
 #include "kldrcim/walks/Diag_Job.h"
 #include "kldrcim/walks/Diag_Names.h"
 
@@ -54,28 +55,48 @@ std::string characteristics_of(const Instance_Value& test)
     return text;
 }
 
+/// The tests, and behind them what they can be run on.
+class Tests_Table final : public Result_Writer
+{
+public:
+    explicit Tests_Table(Connection& connection) : _connection(connection) {}
+
+    bool instance(Instance_Value&& test) override
+    {
+        _tests.push_back(
+            {text_of(test, "Name"), element_words(test.path.class_name), characteristics_of(test)});
+        return true;
+    }
+    bool path(Path_Value&&) override { return true; }
+    void end(bool) override
+    {
+        put(rows_as_table({"Test", "On", "Remarks"}, _tests));
+        std::vector<std::vector<std::string>> rows;
+        for (const Element_Kind& kind : element_kinds())
+            for (const Instance_Value& each : _connection.enumerate_instances(kind.class_name).instances)
+                rows.push_back({text_of(each, "DeviceID"), kind.words, text_of(each, "ElementName")});
+        put("\n" + rows_as_table({"Element", "Kind", "Name"}, rows));
+    }
+
+private:
+    Connection& _connection;
+    std::vector<std::vector<std::string>> _tests;
+};
+
 int list(const Cli_Options& options, Connection& connection)
 {
-    Result tests = connection.enumerate_instances(test_class, options.properties);
+    std::string error;
+    if (!check_filter(options, connection.classes(), test_class, false, error))
+        return complain(error, USAGE_ERROR);
+    Result tests = connection.enumerate_instances(test_class, properties_for(options));
     if (!tests.ok())
         return complain_of(tests);
-    if (options.format != Cli_Options::Format::TABLE || options.properties) {
-        const auto writer = make_writer(options);
-        for (Instance_Value& test : tests.instances)
-            writer->instance(std::move(test));
-        writer->end(true);
-        return 0;
-    }
-    std::vector<std::vector<std::string>> rows;
-    for (const Instance_Value& test : tests.instances)
-        rows.push_back(
-            {text_of(test, "Name"), element_words(test.path.class_name), characteristics_of(test)});
-    put(rows_as_table({"Test", "On", "Remarks"}, rows));
-    rows.clear();
-    for (const Element_Kind& kind : element_kinds())
-        for (const Instance_Value& element : connection.enumerate_instances(kind.class_name).instances)
-            rows.push_back({text_of(element, "DeviceID"), kind.words, text_of(element, "ElementName")});
-    put("\n" + rows_as_table({"Element", "Kind", "Name"}, rows));
+    const bool has_own_table = options.format == Cli_Options::Format::TABLE && !options.properties;
+    Result_Filter filter(options,
+                         has_own_table ? std::make_unique<Tests_Table>(connection) : make_writer(options));
+    for (Instance_Value& test : tests.instances)
+        filter.instance(std::move(test));
+    filter.end(true);
     return 0;
 }
 
@@ -215,7 +236,8 @@ int diag(const Cli_Options& options, Connection& connection)
     const std::vector<std::string>& words = options.arguments;
     if (words[0] == "list" && words.size() == 1 && !options.wait)
         return list(options, connection);
-    if (words[0] == "run" && words.size() == 3)
+    const bool is_filtered = options.total || !filter_names(options).empty();
+    if (words[0] == "run" && words.size() == 3 && !is_filtered)
         return run(options, connection);
     return complain("usage: kldrcim [options] diag list | diag run TEST ELEMENT [--wait]", USAGE_ERROR);
 }

@@ -79,7 +79,7 @@ constexpr Cli_Verb verbs[] = {
      "what a client of the Storage HBA profile expects, beside what it finds", "1 something mandatory is missing."},
     {"watch",    0, 1,   "[CLASS]",                                 watch,           Op{},                        many_formats,  "--filter --where --count= --raw",
      "subscribe to indications (default: KALDERA_AlertIndication) and write each as it comes, until interrupted", nullptr},
-    {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        all_formats,  "--wait",
+    {"diag",     1, 3,   "list\nrun TEST ELEMENT",                  diag,            Op{},                        many_formats,  "--wait --where --sort --count --raw",
      "the hardware tests, and the ports and adapters that they can be run on\n"
      "run a test, by its name, on a port or adapter, by its address or PATH; the test takes the element out of service while it runs",
      "run: 3 the test was refused; 128 and its number after a signal. With --wait: 0 the test passed, 1 it failed."},

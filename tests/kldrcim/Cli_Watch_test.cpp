@@ -70,7 +70,7 @@ TEST(Cli_Watch, KnowsItsOptions)
     }
     EXPECT_EQ("kldrcim: --filter takes a namespace, not \"\"\n", kldrcim("watch --filter ''").error);
     EXPECT_EQ("kldrcim: --count wants a value\n", kldrcim("watch --count").error);
-    EXPECT_EQ("kldrcim: --sort makes no sense for watch; it is for ei ein ai ain ri rin luns classes\n",
+    EXPECT_EQ("kldrcim: --sort makes no sense for watch; it is for ei ein ai ain ri rin luns diag classes\n",
               kldrcim("watch --sort Text").error);
     EXPECT_EQ("kldrcim: usage: kldrcim [options] watch [CLASS]\n", kldrcim("watch A B").error);
 }

@@ -159,9 +159,9 @@ TEST(Filtered_Results, NameTheCulpritOfBadInput)
         {"ei TOY_Item --count=1", "--count takes no value"},
         {"cm TOY_Item Echo --format jsonl", "--format jsonl makes no sense for cm"},
         {"gi TOY_Item.Id=1 --where A=1",
-         "--where makes no sense for gi; it is for ei ein ai ain ri rin luns watch classes"},
+         "--where makes no sense for gi; it is for ei ein ai ain ri rin luns watch diag classes"},
         {"gi TOY_Item.Id=1 --count",
-         "--count makes no sense for gi; it is for ei ein ai ain ri rin luns watch classes"},
+         "--count makes no sense for gi; it is for ei ein ai ain ri rin luns watch diag classes"},
     };
     for (const auto& [arguments, error] : mistakes) {
         const Outcome run = kldrcim(arguments);

@@ -1,6 +1,8 @@
 // kldrcim diag, as users run it: over the built module and the simulator.
 #include "tests/module/exports/Kldrcim_Fixture.h"
 
+#include <algorithm>
+
 namespace KPRV {
 namespace {
 
@@ -27,6 +29,30 @@ TEST_F(Diag_Verb, ListsTestsAndElements)
           "024b4c200000      Ethernet port  eth2\n", "2000024b4c100000  adapter        KLDR00A1001\n"})
         EXPECT_TRUE(has(run.out, words)) << words << run.out;
     EXPECT_TRUE(has(kldrcim("diag list --format json").out, "\"Kaldera:MemoryTest\""));
+}
+
+TEST_F(Diag_Verb, FiltersAndSortsTheTests)
+{
+    const Outcome loopback = kldrcim("diag list --where Name~*PCI*");
+    EXPECT_EQ(0u, loopback.out.find("Test                     On                      Remarks\n"))
+        << loopback.out;
+    EXPECT_TRUE(has(loopback.out, "Kaldera:PCILoopbackTest  FC port, Ethernet port\n\nElement "))
+        << loopback.out;
+    EXPECT_EQ("7\n", kldrcim("diag list --count").out);
+    const std::string plug =
+        kldrcim("diag list --where Characteristics=10 --format jsonl --properties Name").out;
+    EXPECT_EQ(std::to_string(std::ranges::count(plug, '\n')) + "\n",
+              kldrcim("diag list --where Characteristics=10 --count").out);
+    EXPECT_TRUE(has(plug, "Kaldera:ExternalLoopbackTest")) << plug;
+    EXPECT_FALSE(has(plug, "Kaldera:MemoryTest") || has(plug, "Characteristics")) << plug;
+    const std::string sorted = kldrcim("diag list --sort -Name").out;
+    EXPECT_LT(sorted.find("Kaldera:PCILoopbackTest"), sorted.find("Kaldera:MemoryTest"));
+    EXPECT_LT(sorted.find("Kaldera:MemoryTest"), sorted.find("Kaldera:ExternalEthLoopbackTest"));
+    const Outcome nothing = kldrcim("diag list --where Nmae=x");
+    EXPECT_EQ(2, nothing.status);
+    EXPECT_TRUE(has(nothing.error, "\"Nmae\"")) << nothing.error;
+    EXPECT_EQ(2, kldrcim("diag run MemoryTest 1000024b4c100000 --where Name=x").status);
+    EXPECT_EQ(2, kldrcim("diag run MemoryTest 1000024b4c100000 --count").status);
 }
 
 TEST_F(Diag_Verb, FollowsATestThatPasses)
