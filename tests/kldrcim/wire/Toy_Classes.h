@@ -71,7 +71,7 @@ public:
     }
     std::string module_name() const override { return "toy"; }
 
-private:
+protected:
     void add(const char* name, const char* superclass, std::vector<Feature_Info> properties,
              std::vector<Method_Info> methods)
     {
