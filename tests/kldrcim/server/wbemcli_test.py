@@ -106,6 +106,8 @@ class Wbemcli(Serving_Case):
         service = self.first("KALDERA_AgentService")
         lines = self.run_wbemcli("cm", service, 'executeMethod.request="{}"')
         self.assertIn("executeMethod: 0", lines[0])
+        document = "".join(self.run_wbemcli("cmx", service, 'executeMethod.request="{}"'))
+        self.assertRegex(document, '<METHODRESPONSE NAME="executeMethod">.*<PARAMVALUE NAME="response"')
         self.failed(17, "cm", service, "nothing")
 
     def test_what_cannot_be_changed(self):
