@@ -5,9 +5,7 @@ namespace KPRV::broker {
 namespace {
 
 thread_local Call_Frame* innermost = nullptr;
-
-/// More than what a provider has in hand at a time.
-constexpr std::size_t MOST_NOT_PACKED = 1024;
+thread_local Late_Freeing* late = nullptr;
 
 std::string described(const Object& object)
 {
@@ -17,19 +15,18 @@ std::string described(const Object& object)
 } // namespace
 
 Call_Frame::Call_Frame(std::shared_ptr<Core> core, const CMPIContext* context)
-    : _core(std::move(core)), _context(context), _outer(innermost)
+    : _objects(std::make_unique<Frame_Objects>(std::move(core))), _context(context), _outer(innermost)
 {
     innermost = this;
 }
 
 Call_Frame::~Call_Frame()
 {
-    for (Object* object = _first; object;) {
-        Object* const next = object->after;
-        _core->ledger.freed_by_frame(object->kind, object->maker);
-        _core->retire(*object);
-        object = next;
-    }
+    // Calls that come back into the module while another one runs are many.
+    if (late && !_outer)
+        late->_left = std::move(_objects);
+    else
+        _objects.reset();
     innermost = _outer;
 }
 
@@ -38,45 +35,22 @@ Call_Frame* Call_Frame::top()
     return innermost;
 }
 
-bool Call_Frame::is_on_this_thread(const Call_Frame* frame)
+bool Call_Frame::is_on_this_thread(const Frame_Objects* objects)
 {
     for (const Call_Frame* at = innermost; at; at = at->_outer)
-        if (at == frame)
+        if (at->_objects.get() == objects)
             return true;
     return false;
 }
 
-void Call_Frame::record(Object& object)
+Late_Freeing::Late_Freeing()
 {
-    object.frame = this;
-    object.before = _last;
-    (_last ? _last->after : _first) = &object;
-    _last = &object;
-    if (!_oldest)
-        _oldest = &object;
-    ++_not_packed;
+    late = this;
 }
 
-void Call_Frame::forget(Object& object)
+Late_Freeing::~Late_Freeing()
 {
-    if (_oldest == &object)
-        _oldest = object.after;
-    if (!object.is_old)
-        --_not_packed;
-    (object.before ? object.before->after : _first) = object.after;
-    (object.after ? object.after->before : _last) = object.before;
-    object.frame = nullptr;
-}
-
-void Call_Frame::pack_old()
-{
-    while (_not_packed > MOST_NOT_PACKED) {
-        Object& object = *_oldest;
-        _oldest = object.after;
-        object.is_old = true;
-        --_not_packed;
-        _core->pack(object);
-    }
+    late = nullptr;
 }
 
 void detail::settle_on_frame(Object& object)

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "broker/Core.h"
+#include "broker/Frame_Objects.h"
 
 namespace KPRV::broker {
 
@@ -28,26 +28,35 @@ public:
 
     /// The innermost frame of the calling thread, null if it has none.
     static Call_Frame* top();
-    /// True if the frame is one of the calling thread's.
-    static bool is_on_this_thread(const Call_Frame* frame);
+    /// True if these are the objects of one of the calling thread's frames.
+    static bool is_on_this_thread(const Frame_Objects* objects);
 
-    Core& core() const { return *_core; }
+    Core& core() const { return _objects->core(); }
     const CMPIContext* context() const { return _context; }
 
-    void record(Object& object);
-    void forget(Object& object);
+    void record(Object& object) { _objects->record(object); }
     /// Packs all but those made last. No object of this frame may be in hand meanwhile.
-    void pack_old();
+    void pack_old() { _objects->pack_old(); }
 
 private:
-    std::shared_ptr<Core> _core;
+    std::unique_ptr<Frame_Objects> _objects;
     const CMPIContext* _context;
-    /// Recorded objects in the order in which they were made, and the first that may still be packed.
-    Object* _first = nullptr;
-    Object* _last = nullptr;
-    Object* _oldest = nullptr;
-    std::size_t _not_packed = 0;
     Call_Frame* _outer;
+};
+
+/// While it stands, what the thread's calls leave behind is freed later than with their end: with the end of
+/// the next call, or of this. For a server whose client need not wait for it.
+class Late_Freeing
+{
+public:
+    Late_Freeing();
+    ~Late_Freeing();
+    Late_Freeing(const Late_Freeing&) = delete;
+    Late_Freeing& operator=(const Late_Freeing&) = delete;
+
+private:
+    friend Call_Frame;
+    std::unique_ptr<Frame_Objects> _left;
 };
 
 /// Makes an object for the provider under the name of the call that makes it, and records it on the thread's

@@ -39,14 +39,7 @@ void Object::let_go()
 Core::~Core()
 {
     while (Object* const object = blocks.any())
-        destroy(*object);
-}
-
-void Core::destroy(Object& object)
-{
-    Object_Blocks::find(object.address());
-    object.~Object();
-    blocks.give_object(&object);
+        blocks.end(*object);
 }
 
 void Core::adopt(Object& object)
@@ -73,7 +66,7 @@ void Core::retire(Object& object)
         last = _retired.front();
         _retired.pop_front();
     }
-    destroy(*last);
+    blocks.end(*last);
 }
 
 void Core::pack(Object& object)

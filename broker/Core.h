@@ -48,8 +48,6 @@ public:
     void unpack(Object& object);
 
 private:
-    void destroy(Object& object);
-
     Standard_Mutex<> _mutex;
     std::deque<Object*> _retired GUARDED_BY(_mutex);
 };

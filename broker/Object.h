@@ -10,8 +10,8 @@
 
 namespace KPRV::broker {
 
-class Call_Frame;
 class Core;
+class Frame_Objects;
 
 /// Who has to end an object's life.
 enum class Owner : std::uint8_t
@@ -54,7 +54,7 @@ struct Object
     Core& core;
     /// The call that made it.
     const char* maker = "";
-    Call_Frame* frame = nullptr;
+    Frame_Objects* frame = nullptr;
     /// Those that the frame recorded before and after it.
     Object* before = nullptr;
     Object* after = nullptr;

@@ -208,9 +208,13 @@ void* Object_Blocks::take(Rows& rows, std::size_t size)
     return place;
 }
 
-void Object_Blocks::give(Rows& rows, void* place)
+Object_Blocks::Places* Object_Blocks::places_of(const void* place)
 {
-    Places* const places = address_book<Places>().with(place, [](Places& found) { return &found; });
+    return address_book<Places>().with(place, [](Places& found) { return &found; });
+}
+
+void Object_Blocks::give(Rows& rows, Places* places, void* place)
+{
     Row& row = rows[places->row];
     if (places->free == 0)
         row.free.splice(row.free.end(), row.full, places->self);
@@ -238,12 +242,23 @@ void Object_Blocks::announce(const void* place)
 
 void Object_Blocks::give_object(void* place)
 {
-    address_book<Places>().with(place, [&](Places& places) {
-        places.know(place, false);
-        return &places;
-    });
+    give_known(places_of(place), place);
+}
+
+void Object_Blocks::give_known(Places* places, void* place)
+{
+    places->know(place, false);
     const Auto_Lock lock(_mutex);
-    give(_objects, place);
+    give(_objects, places, place);
+}
+
+void Object_Blocks::end(Object& object)
+{
+    // The block stays while the object stands in it.
+    Places* const places = places_of(&object);
+    _memory.touch(places->block);
+    object.~Object();
+    give_known(places, &object);
 }
 
 char* Object_Blocks::take_bytes(std::size_t size)
@@ -258,8 +273,9 @@ void Object_Blocks::give_bytes(char* place, std::size_t size)
 {
     if (!bytes_in_blocks || size > LARGEST)
         return ::operator delete(place);
+    Places* const places = places_of(place);
     const Auto_Lock lock(_mutex);
-    give(_bytes, place);
+    give(_bytes, places, place);
 }
 
 void Object_Blocks::touch_bytes(const char* place, std::size_t size)

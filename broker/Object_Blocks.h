@@ -26,6 +26,8 @@ public:
     void* take_for_object(std::size_t size);
     void announce(const void* place);
     void give_object(void* place);
+    /// Destroys an object that was announced, and gives its place back.
+    void end(Object& object);
 
     /// A place for bytes that an object holds; large ones lie in the heap.
     char* take_bytes(std::size_t size);
@@ -53,7 +55,9 @@ private:
     using Rows = std::array<Row, 65>;
 
     void* take(Rows& rows, std::size_t size) REQUIRES(_mutex);
-    void give(Rows& rows, void* place) REQUIRES(_mutex);
+    void give(Rows& rows, Places* places, void* place) REQUIRES(_mutex);
+    void give_known(Places* places, void* place);
+    static Places* places_of(const void* place);
 
     Block_Memory _memory;
     Standard_Mutex<> _mutex;

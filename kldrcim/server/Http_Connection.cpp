@@ -1,5 +1,6 @@
 #include "kldrcim/server/Http_Connection.h"
 
+#include "broker/Call_Frame.h"
 #include "kldrcim/server/Connection_Watch.h"
 
 #include <algorithm>
@@ -280,6 +281,8 @@ void Http_Connection::answer(const Cim_Message& message)
 void Http_Connection::answer_in_pieces(const Cim_Message& message)
 {
     _maker = std::thread([this, &message] {
+        // Nobody waits until what a large enumeration has left is freed.
+        const Late_Freeing later;
         bool broken = true;
         try {
             Cim_Server::Reply reply = _server._server.answer(message, _user, _pipe);

@@ -1,4 +1,5 @@
 // Results that are handed over as the provider returns them.
+#include "broker/Call_Frame.h"
 #include "broker/values/Path_Identity.h"
 #include "broker/values/Receiver.h"
 #include "tests/broker/Toy_Server.h"
@@ -203,6 +204,24 @@ TEST_F(Receiver_Of_Associations, AFailingProviderIsNamed)
     EXPECT_EQ(kept.paths.size(), notes.paths.size());
     ASSERT_EQ(1u, result.failures.size());
     EXPECT_EQ("TOY_Broken", result.failures[0].provider_class);
+}
+
+TEST_F(Receiver_Test, IsNotKeptWaitingUntilWhatIsLeftIsFreed)
+{
+    setenv("TOY_MANY_LEAVES", "1", 1);
+    std::size_t left = 0;
+    {
+        const Late_Freeing later;
+        EXPECT_TRUE(server->run(enumerate, &notes).ok());
+        left = server->ledger().live();
+        EXPECT_LE(notes.paths.size(), left);
+        // What the next call leaves takes its place.
+        EXPECT_TRUE(server->run(enumerate, &notes).ok());
+        EXPECT_EQ(left, server->ledger().live());
+    }
+    EXPECT_EQ(0u, server->ledger().live());
+    EXPECT_TRUE(server->run(enumerate, &notes).ok());
+    EXPECT_EQ(0u, server->ledger().live());
 }
 
 } // namespace
