@@ -27,7 +27,7 @@ std::unique_ptr<Local_Connection> open_module(const Cli_Options& options, std::s
     server_options.name_space = options.name_space;
     // A large answer should not be outweighed by what remembers its objects, nor should what runs for months.
     server_options.most_shells = options.verb == "serve" ? 1 << 10 : 1 << 14;
-    server_options.most_object_memory = std::size_t(4) << 20;
+    server_options.most_object_memory = std::size_t(options.verb == "serve" ? 16 : 4) << 20;
     std::unique_ptr<Local_Server> server =
         Local_Server::open(options.module.empty() ? default_module() : options.module, server_options, error);
     if (!server) {
