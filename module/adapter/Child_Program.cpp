@@ -92,6 +92,7 @@ public:
 private:
     static void close_end(int& end)
     {
+        // Either way (boundary): no end takes the place of a standard descriptor.
         if (end >= 0)
             close(end);
         end = -1;

@@ -93,6 +93,7 @@ static CMPIrc import(const Meta_Class* meta_class, uint32 mask, const CMPIObject
     instance.reset(create(meta_class, false));
     Instance* target = instance.ptr();
     auto container = make_container(name_space);
+    // Either way (statement): in this direction what does not convert is left out, and that is no failure.
     if (container.convert(meta_class, mask, target) != 0)
         return CMPI_RC_ERR_FAILED;
     const bool shared = neighbour && neighbour->__name_space == name_space;

@@ -38,14 +38,12 @@ auto run_contained(Function function, Otherwise otherwise) -> decltype(function(
     }
 }
 
-/// Where a text must end that was cut there: no part of a character stays.
+/// Where a text must end that was cut there: no part of a character stays. It begins with an entry's name.
 size_t end_of_whole_characters(std::string_view text)
 {
     size_t lead = text.size();
-    while (lead > 0 && (text[lead - 1] & 0xC0) == 0x80)
+    while ((text[lead - 1] & 0xC0) == 0x80)
         lead--;
-    if (lead == 0)
-        return text.size();
     const auto first = static_cast<unsigned char>(text[lead - 1]);
     const size_t length = first >= 0xF0 ? 4 : first >= 0xE0 ? 3 : first >= 0xC0 ? 2 : 1;
     return lead - 1 + length > text.size() ? lead - 1 : text.size();
@@ -140,7 +138,7 @@ void contain_exceptions(CMPI_Static_Data& data)
     CONTAIN(association_ft, referenceNames);
     CONTAIN(indication_ft, cleanup);
     CONTAIN(indication_ft, authorizeFilter);
-    CONTAIN(indication_ft, mustPoll);
+    CONTAIN(indication_ft, mustPoll); // Either way (statement): it writes to the log, which never throws.
     CONTAIN(indication_ft, activateFilter);
     CONTAIN(indication_ft, deActivateFilter);
     CONTAIN(indication_ft, enableIndications);

@@ -29,7 +29,7 @@ struct DiagnosticTestInput : Tested_Element
     int adapter_id = 0;
     uint32 frame_count = 0;
     uint32 data_pattern = 0;
-    /// See `Diagnostic_Test`.
+    /// See `Diagnostic_Test`. Either way (constant): the start of a test sets it.
     uint32 mode = 0;
     /// Link speed in Gbit/s, 4 or 10, of the loopback test.
     uint32 speed = 0;
@@ -61,7 +61,7 @@ struct DiagnosticRecord : Tested_Element
     String record_data;
     /// Name of the test.
     String service_name;
-    /// 4 of a service record, 6 of a completion record.
+    /// 4 of a service record, 6 of a completion record. Either way (constant): whoever makes one says which.
     uint16 record_type = 0;
     /// Of a completion record.
     diag_compl_record_state_t completion_state = COMPLETION_PASSED;

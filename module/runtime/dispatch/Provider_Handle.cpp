@@ -103,6 +103,7 @@ struct Find_Associators
                                           self->role, self->result_role, far_ends);
         for (int i = 0; i < count; i++) {
             ref(far_ends[i]);
+            // Either way (constant): nobody looks at the second argument.
             self->proc(far_ends[i], 0, self->client_data);
         }
         return true;

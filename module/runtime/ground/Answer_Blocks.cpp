@@ -104,6 +104,7 @@ void Answer_Blocks::end_piece()
 void* Answer_Blocks::cut(size_t size)
 {
     const size_t taken = WORD + (size + WORD - 1) / WORD * WORD;
+    // Either way (boundary): the last place of a piece would stay free.
     if (taken > _left) [[unlikely]]
         begin_piece();
     void* const block = _next + WORD;

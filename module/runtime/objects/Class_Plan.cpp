@@ -145,7 +145,8 @@ bool belongs(const Cell& cell, Cells cells)
 
 const Class_Plan* plan_of(const Meta_Class* meta_class)
 {
-    // Mostly it stands in its place; that it has one, it owes to what is looked at below.
+    // Mostly it stands in its place; that it has one, it owes to what is looked at below. Either way
+    // (comparison): what is not found here is found there.
     const Class_Plan* const first = places[place_of(meta_class)].load(std::memory_order_acquire);
     if (first && first->owner == meta_class && first->features == meta_class->meta_features &&
         atomic_get(meta_class->refs) == 0) [[likely]]

@@ -190,9 +190,11 @@ TEST_F(Child_Program, WritesWhereTheServerWrites)
 
 TEST_F(Child_Program, OfAServerWithoutStandardDescriptorsHasThem)
 {
-    programs.program("program", "echo lost; echo lost >&2; { [ -e /proc/$$/fd/1 ] && [ -e /proc/$$/fd/2 ] && "
-                                "echo both; } > " +
-                                    folder.path("seen") + "; exit 4");
+    // What is asked must not be redirected itself.
+    programs.program("program",
+                     "echo lost; echo lost >&2; [ -e /proc/$$/fd/1 ] && [ -e /proc/$$/fd/2 ] && found=both; "
+                     "echo $found > " +
+                         folder.path("seen") + "; exit 4");
     in_child([] {
         // What expectations print has no place to go: the status tells.
         const int output = fcntl(STDOUT_FILENO, F_DUPFD, 50), errors = fcntl(STDERR_FILENO, F_DUPFD, 50);

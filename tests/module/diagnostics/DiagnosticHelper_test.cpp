@@ -134,6 +134,23 @@ TEST_F(Diagnostic_Helper, FillsATest)
               taken(helper.getInstancesByClass(ETHLOOPBACKDIAGNOSTICTEST)).at(1).at("ElementName"));
 }
 
+TEST_F(Diagnostic_Helper, KnowsTheCharacteristicsOfEachTest)
+{
+    std::map<std::string, std::string> found;
+    for (const classId_t id :
+         {MEMORYDIAGNOSTICTEST, LOOPBACKDIAGNOSTICTEST, PCILOOPBACKDIAGNOSTICTEST, ETHLOOPBACKDIAGNOSTICTEST})
+        for (const Set_Properties& test : taken(helper.getInstancesByClass(id)))
+            found[test.at("Name")] = test.at("Characteristics");
+    EXPECT_EQ((std::map<std::string, std::string>{{"Kaldera:ExternalEthLoopbackTest", "{2, 4, 10}"},
+                                                  {"Kaldera:ExternalLoopbackTest", "{2, 4, 10}"},
+                                                  {"Kaldera:InternalLoopbackTest", "{2, 4}"},
+                                                  {"Kaldera:MemoryTest", "{2, 4}"},
+                                                  {"Kaldera:PCILoopbackTest", "{2}"},
+                                                  {"Kaldera:SerdesEthLoopbackTest", "{2, 4}"},
+                                                  {"Kaldera:SerdesLoopbackTest", "{2, 4}"}}),
+              found);
+}
+
 TEST_F(Diagnostic_Helper, KnowsNoCharacteristicsOfWhatIsNoTest)
 {
     for (const uint32 id : {0u, 8u, 99u}) {

@@ -79,6 +79,39 @@ TEST_P(Module_Exceptions, OfUnguardedCalls)
     EXPECT_EQ(1u, enumerate(name).instances.size());
 }
 
+TEST_P(Module_Exceptions, OfAssociations)
+{
+    open("one_cna.json");
+    const std::string name = "KALDERA_PortControllerSystemDevice";
+    const broker::Path_Value host = server->enumerate_instance_names("KALDERA_ComputerSystem").paths.at(0);
+    simulator.add_fault(R"({"call": "getAllAdaptersIndexString", "do": "throw", "message": "gone",
+        "type": "std::runtime_error"})");
+    expect_thrown(server->associators(name, host, {}), "associators", "gone");
+    expect_thrown(server->associator_names(name, host, {}), "associatorNames", "gone");
+    expect_thrown(server->references(name, host, {}), "references", "gone");
+    expect_thrown(server->reference_names(name, host, {}), "referenceNames", "gone");
+}
+
+// A status holds a kilobyte of text, and no part of a character at its end.
+TEST_P(Module_Exceptions, OfManyWords)
+{
+    open("one_cna.json");
+    const std::string entry = "enumerateInstances: ";
+    for (const size_t odd : {0, 1}) {
+        simulator.clear_faults();
+        std::string words(odd, 'x');
+        while (words.size() < 2000)
+            words += "\u00e9";
+        simulator.add_fault(R"({"call": "getAllAdaptersIndexString", "do": "throw", "message": ")" + words +
+                            R"(", "type": "std::runtime_error"})");
+        const broker::Result result = server->enumerate_instances("KALDERA_PortController");
+        EXPECT_EQ(is_contained() ? (entry + words).substr(0, 1023 - (1023 - entry.size() - odd) % 2) : "",
+                  result.message);
+        EXPECT_TRUE(result.exception.value_or("none") == (is_contained() ? "none" : words));
+        server->violations().clear();
+    }
+}
+
 INSTANTIATE_TEST_SUITE_P(Form, Module_Exceptions, testing::Bool(),
                          [](const auto& form) { return form.param ? "Contained" : "Passing"; });
 

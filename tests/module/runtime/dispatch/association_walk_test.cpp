@@ -4,6 +4,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <array>
+#include <cstddef>
 #include <vector>
 
 using namespace KPRV;
@@ -38,6 +41,49 @@ TEST(association_walk, GivesTheOtherEnd)
     const Ref<Instance> link(make_link(make_named("a"), make_port("b")));
     EXPECT_EQ(far_ends(Ref<Instance>(make_named("a")), link), "b;");
     EXPECT_EQ(far_ends(Ref<Instance>(make_port("b")), link), "a;");
+}
+
+namespace {
+
+/// More far ends than there is room for.
+struct Many_Ends : Instance
+{
+    static constexpr size_t COUNT = MAX_ASSOCIATORS + 2;
+    Instance* ends[COUNT];
+};
+
+constexpr auto end_records = [] {
+    std::array<Meta_Reference, Many_Ends::COUNT> records{};
+    for (size_t i = 0; i < records.size(); i++)
+        records[i] = {{{0, FLAG_REFERENCE | FLAG_READ, "End", nullptr, 0}},
+                      0,
+                      &Sample_Port::static_meta_class,
+                      uint32(offsetof(Many_Ends, ends) + i * sizeof(Instance*))};
+    return records;
+}();
+
+} // namespace
+
+TEST(association_walk, MoreEndsThanThereIsRoomForAreLeftOut)
+{
+    std::array<const Meta_Feature*, Many_Ends::COUNT> features;
+    std::ranges::transform(end_records, features.begin(), [](const Meta_Reference& each) { return &each; });
+    const std::array<uint8, Many_Ends::COUNT> locals{};
+    Meta_Class many = Sample_Link::static_meta_class;
+    many.meta_features = features.data();
+    many.num_meta_features = Many_Ends::COUNT;
+    many.size = sizeof(Many_Ends);
+    many.locals = locals.data();
+    many.num_keys = 0;
+    // Counted, so that nobody keeps what is known of it.
+    many.refs = 1;
+    const Ref<Instance> association(create(&many, false));
+    std::string names;
+    for (size_t i = 0; i < Many_Ends::COUNT; i++) {
+        static_cast<Many_Ends*>(association.ptr())->ends[i] = make_port("p", int(i));
+        names += i == 0 || i > MAX_ASSOCIATORS ? "" : "p;";
+    }
+    EXPECT_EQ(far_ends(Ref<Instance>(make_port("p", 0)), association), names);
 }
 
 TEST(association_walk, AnAssociationThatDoesNotTouchGivesMinusOne)

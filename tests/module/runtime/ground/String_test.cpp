@@ -312,6 +312,7 @@ TEST(String, Equality)
     EXPECT_TRUE(x.equal(1, "bX", 1));
     EXPECT_FALSE(x.equal(1, "bd", 2));
     EXPECT_FALSE(x.equal(2, "cd", 2));
+    EXPECT_TRUE(x.equal(3, "", 0));
     EXPECT_FALSE(x.equal(4, "", 0));
     EXPECT_TRUE(x == "abc");
     EXPECT_TRUE(x == String("abc"));

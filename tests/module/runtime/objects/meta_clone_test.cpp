@@ -8,6 +8,8 @@
 
 #include <gtest/gtest.h>
 
+#include <malloc.h>
+
 namespace KPRV {
 
 namespace {
@@ -37,6 +39,18 @@ TEST(meta_clone, AClassIsCopiedWithAllThatItOwns)
     }
     EXPECT_NE(PORT->locals, copy->locals);
     EXPECT_TRUE(identical(PORT, copy.get()));
+}
+
+TEST(meta_clone, ACopyThatIsDestroyedLeavesNothing)
+{
+    const auto copy_each = [] {
+        for (const Meta_Class* each : {PORT, ELEMENT, LINK})
+            cloned(each);
+    };
+    copy_each();
+    const size_t before = mallinfo2().uordblks;
+    copy_each();
+    EXPECT_EQ(before, mallinfo2().uordblks);
 }
 
 TEST(meta_clone, InstancesOfACopyWorkAsThoseOfTheSource)
