@@ -122,6 +122,7 @@ private:
 int wait_for(pid_t child)
 {
     int status = -1;
+    // Either way (boundary): it never gives 0, since it waits.
     while (waitpid(child, &status, 0) < 0)
         if (errno != EINTR)
             return -1;
@@ -148,6 +149,7 @@ void leave_descriptors(int kept)
             dup2(null, standard);
     dup3(kept, FIRST_AFTER_STANDARD, O_CLOEXEC);
     constexpr unsigned FIRST_TO_GO = FIRST_AFTER_STANDARD + 1;
+    // Either way (constant): what is closed may be closed once more.
     if (close_range(FIRST_TO_GO, ~0u, 0) != 0)
         for (long each = sysconf(_SC_OPEN_MAX); each >= long(FIRST_TO_GO); each--)
             close(int(each));
@@ -175,9 +177,10 @@ void leave_descriptors(int kept)
     const pid_t child = _Fork();
     if (child == 0)
         become(program);
+    // Either way (boundary): the child itself has become the program.
     const int status = child < 0 ? -1 : wait_for(child);
     (void)!write(FIRST_AFTER_STANDARD, &status, sizeof status);
-    _exit(0);
+    _exit(0); // Either way (constant): nobody asks how it ended.
 }
 
 } // namespace

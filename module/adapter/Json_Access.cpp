@@ -150,9 +150,10 @@ namespace {
     };
     // The last part may overlap the one before.
     constexpr size_t LONG = sizeof(uint64_t), SHORT = sizeof(uint32_t);
+    // Either way (boundary): what is not compared here is compared below.
     if (size >= LONG && size <= 2 * LONG)
         return same(uint64_t(), 0) && same(uint64_t(), size - LONG);
-    // Either way (boundary): what is not compared here is compared below.
+    // Either way (boundary): as above.
     if (size >= SHORT && size < LONG)
         return same(uint32_t(), 0) && same(uint32_t(), size - SHORT);
     return a == b;

@@ -70,6 +70,7 @@ bool read_json(std::string_view text, Json::Value& value, std::string& errors)
 
 bool read_json(Json::Reader& reader, std::string_view text, Json::Value& value, std::string& errors)
 {
+    // Either way (boundary): so many brackets are not too many.
     if (text.size() > MOST_NESTED && is_nested_too_deep(text)) {
         errors = "nested deeper than " + std::to_string(MOST_NESTED) + " levels";
         return false;

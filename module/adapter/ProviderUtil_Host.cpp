@@ -111,7 +111,8 @@ struct Host_Facts : Request_Scope::Note
     char host[NAME_SIZE] = {};
     Lookup lookup = Lookup::NONE;
     char address[INET_ADDRSTRLEN] = {}; ///< The first one that is no loopback address.
-    // Only where there are loopback addresses and no others.
+    // Only where there are loopback addresses and no others. Either way (constant): nobody looks at them
+    // elsewhere.
     bool still_named = false;
     bool in_domain = false;
     char domain[NAME_SIZE] = {};

@@ -83,6 +83,7 @@ void Method_Shapes::host_completed(const Method& method, const Json::Value& para
     if (is_text(member(host, "hostManufacturer")) && is_text(member(host, "hostModel")))
         return;
     const Array<String> known = ProviderDiscoveryMethods::getOtherIdentifyingInfo();
+    // Either way (constant): there are both, or none.
     if (known.size() < 2)
         return;
     // Beside the inner object, not inside: clients look for them there, and the inner texts stay empty.

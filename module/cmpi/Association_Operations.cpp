@@ -113,6 +113,7 @@ static CMPIStatus referenceNames(CMPIAssociationMI* mi, const CMPIContext* conte
         return *end;
 
     const Ref<Instance> model = own_model(scope);
+    // Either way (constant): whatever is not 0 is null.
     __set_null_flags(model.ptr(), false, true, 1);
     Association_Results data = results_of(scope, context, result, cop, nullptr);
     const int status = scope.adapter()->enum_references(instance.ptr(), model.ptr(), filter_of(role),

@@ -45,7 +45,7 @@ size_t end_of_whole_characters(std::string_view text)
     while ((text[lead - 1] & 0xC0) == 0x80)
         lead--;
     const auto first = static_cast<unsigned char>(text[lead - 1]);
-    const size_t length = first >= 0xF0 ? 4 : first >= 0xE0 ? 3 : first >= 0xC0 ? 2 : 1;
+    const size_t length = first >= 0xF0 ? 4 : first >= 0xE0 ? 3 : first >= 0xC2 ? 2 : 1;
     return lead - 1 + length > text.size() ? lead - 1 : text.size();
 }
 

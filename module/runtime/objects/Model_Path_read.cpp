@@ -104,7 +104,7 @@ bool read(Reader& reader, T& cell)
     } else if constexpr (std::is_same_v<T, String>) {
         return reader.string_literal(cell);
     } else if constexpr (std::is_integral_v<T> && !std::is_same_v<T, char16>) {
-        long long number = 0;
+        long long number = 0; // Either way (constant): it is read, or nobody looks at it.
         if (!reader.integer(number))
             return false;
         cell = static_cast<T>(number);

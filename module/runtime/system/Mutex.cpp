@@ -2,13 +2,11 @@
 #include "module/runtime/system/assert.h"
 
 #include <cerrno>
-#include <cstring>
 
 namespace KPRV {
 
 Mutex::Mutex(bool recursive)
 {
-    memset(&_mutex, 0, sizeof(_mutex));
     if (!recursive) {
         pthread_mutex_init(&_mutex, nullptr);
         return;

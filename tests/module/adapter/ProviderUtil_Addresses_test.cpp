@@ -73,6 +73,12 @@ TEST(ProviderUtil_Addresses, RawForms)
     ProviderUtil::getRawMacFromStr("", mac.data());
     EXPECT_EQ(mac, Mac{});
 
+    // Nothing behind it is touched.
+    std::array<unsigned char, 7> longer;
+    longer.fill(0xEE);
+    ProviderUtil::getRawMacFromStr("8C7cFF000a01", longer.data());
+    EXPECT_EQ(longer[6], 0xEE);
+
     using Wwn = std::array<unsigned char, 8>;
     Wwn wwn;
     ProviderUtil::getRawWWNFromStr("10008C7CFF000aFE", wwn.data());
