@@ -6,6 +6,8 @@
 #include "module/runtime/objects/Ref.h"
 #include "module/runtime/system/log.h"
 
+#include <utility>
+
 namespace KPRV {
 
 /// What a provider says when its list does not have the count that it needs; `text` null says nothing. Write
@@ -38,12 +40,14 @@ template <class T>
 class List
 {
 public:
-    explicit List(const Array<Instance*>& instances) : _instances(instances) {}
-    ~List()
-    {
-        for (Instance* instance : _instances)
-            unref(instance);
+    explicit List(Array<Instance*>&& instances)
+    try : _instances(std::move(instances)) {
+    } catch (...) {
+        // The empty array in their place may be one allocation.
+        release(instances);
+        throw;
     }
+    ~List() { release(_instances); }
     List(const List&) = delete;
     List& operator=(const List&) = delete;
 
@@ -65,15 +69,21 @@ public:
     }
 
 private:
+    static void release(const Array<Instance*>& instances)
+    {
+        for (Instance* instance : instances)
+            unref(instance);
+    }
+
     Array<Instance*> _instances;
 };
 
 /// Delivers the list, whatever its length; an empty one is said and is a success.
 template <class T>
-Enum_Instances_Status deliver_all(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
+Enum_Instances_Status deliver_all(Array<Instance*>&& instances, Enum_Instances_Handler<T>& handler,
                                   const Message& when_empty)
 {
-    List<T> list(instances);
+    List<T> list(std::move(instances));
     if (list.empty())
         return when_empty.answer(ENUM_INSTANCES_OK);
     when_empty.trace("Returning instances");
@@ -94,10 +104,10 @@ Enum_Instances_Status deliver_one(List<T>& list, Enum_Instances_Handler<T>& hand
 }
 
 template <class T>
-Enum_Instances_Status deliver_one(const Array<Instance*>& instances, Enum_Instances_Handler<T>& handler,
+Enum_Instances_Status deliver_one(Array<Instance*>&& instances, Enum_Instances_Handler<T>& handler,
                                   const Message& when_not_one, Enum_Instances_Status otherwise)
 {
-    List<T> list(instances);
+    List<T> list(std::move(instances));
     return deliver_one(list, handler, when_not_one, otherwise);
 }
 

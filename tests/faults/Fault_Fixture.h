@@ -28,6 +28,15 @@ protected:
     void open(const std::string& inventory)
     {
         simulator.load_file(std::string(KLDR_INVENTORIES "/") + inventory);
+        open_server();
+    }
+    void open_text(const std::string& inventory)
+    {
+        simulator.load_text(inventory);
+        open_server();
+    }
+    void open_server()
+    {
         std::string error;
         server = broker::Local_Server::open(module_under_test(), {}, error);
         ASSERT_TRUE(server) << error;

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "tests/module/providers/Instance_Script.h"
-#include "tests/module/providers/Live_Blocks.h"
 #include "tests/module/providers/Scripted_Managers.h"
 #include "tests/support/Fake_Library.h"
+#include "tests/support/Live_Blocks.h"
 #include "tests/support/Log_Capture.h"
 
 #include "module/runtime/dispatch/Handler.h"
@@ -78,12 +78,30 @@ protected:
         library_calls = library.calls;
 
         forget_calls();
-        Receiver nobody{{}, nullptr};
+        refuse_block(0);
         const size_t before = live_blocks();
-        call(provider, nobody);
-        forget_calls();
+        call_for_nobody(provider);
         EXPECT_EQ(before, live_blocks()) << association << " leaves something behind";
+        expect_nothing_lost(provider, grant_blocks());
         return result;
+    }
+
+    /// Whatever is being made when a block of memory is refused has an owner.
+    void expect_nothing_lost(const Registration* provider, size_t blocks)
+    {
+        for (size_t nth = 1; nth <= blocks; nth++) {
+            const size_t before = live_blocks();
+            refuse_block(nth);
+            try {
+                call_for_nobody(provider);
+            } catch (const std::bad_alloc&) {
+                // As a provider lets it pass.
+            }
+            grant_blocks();
+            forget_calls();
+            ASSERT_EQ(before, live_blocks())
+                << provider->provider_name << " without block " << nth << " of " << blocks;
+        }
     }
 
     /// Success with these pairs, "a b, a c", after the line about building.
@@ -110,6 +128,13 @@ private:
         std::vector<std::string>().swap(managers_script.fetched);
     }
 
+    void call_for_nobody(const Registration* provider)
+    {
+        Receiver nobody{{}, nullptr};
+        call(provider, nobody);
+        forget_calls();
+    }
+
     struct Receiver
     {
         std::vector<std::string> roles;
@@ -130,13 +155,15 @@ private:
         void* object = nullptr;
         provider->proc(provider, OP_CREATE_PROVIDER, &object, nullptr, nullptr, nullptr, nullptr, nullptr,
                        nullptr, nullptr);
+        const auto destroy_provider = [=](void* made) {
+            provider->proc(provider, OP_DESTROY_PROVIDER, made, nullptr, nullptr, nullptr, nullptr, nullptr,
+                           nullptr, nullptr);
+        };
+        const std::unique_ptr<void, decltype(destroy_provider)> owner(object, destroy_provider);
         const Ref<Instance> model(create(provider->meta_class, true));
-        const int status =
-            provider->proc(provider, OP_ENUM_INSTANCES, object, model.ptr(),
-                           reinterpret_cast<void*>(&receive), &receiver, nullptr, nullptr, nullptr, nullptr);
-        provider->proc(provider, OP_DESTROY_PROVIDER, object, nullptr, nullptr, nullptr, nullptr, nullptr,
-                       nullptr, nullptr);
-        return status;
+        return provider->proc(provider, OP_ENUM_INSTANCES, object, model.ptr(),
+                              reinterpret_cast<void*>(&receive), &receiver, nullptr, nullptr, nullptr,
+                              nullptr);
     }
 
     static bool receive(Instance* instance, int status, void* data)

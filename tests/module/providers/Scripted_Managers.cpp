@@ -5,6 +5,7 @@
 #include "module/managers/HDRManager.h"
 #include "module/managers/ServerManager.h"
 #include "module/model/EthernetPortHelper.h"
+#include "module/model/Fresh_Instances.h"
 #include "module/model/Registered_Profiles.h"
 
 #include <stdexcept>
@@ -28,10 +29,10 @@ namespace {
 Array<Instance*> fetch(const std::string& name)
 {
     managers_script.fetched.push_back(name);
-    Array<Instance*> result;
+    Fresh_Instances result;
     for (const Instance* instance : managers_script.lists[name])
         result.append(clone(instance));
-    return result;
+    return result.release();
 }
 
 Array<Instance*> fetch(classId_t id)

@@ -1,4 +1,4 @@
-#include "tests/module/providers/Live_Blocks.h"
+#include "tests/support/Live_Blocks.h"
 
 #include <atomic>
 #include <cstdlib>
@@ -10,9 +10,12 @@
 namespace {
 
 std::atomic<size_t> live = 0;
+thread_local size_t blocks_asked = 0, block_refused = 0;
 
 void* counted(size_t size)
 {
+    if (++blocks_asked == block_refused)
+        throw std::bad_alloc();
     void* const block = std::malloc(size ? size : 1);
     if (!block)
         throw std::bad_alloc();
@@ -32,6 +35,18 @@ void returned(void* block)
 size_t KPRV::live_blocks()
 {
     return live;
+}
+
+void KPRV::refuse_block(size_t nth)
+{
+    blocks_asked = 0;
+    block_refused = nth;
+}
+
+size_t KPRV::grant_blocks()
+{
+    block_refused = 0;
+    return blocks_asked;
 }
 
 void* operator new(size_t size)
