@@ -6,26 +6,30 @@
 #include "module/runtime/ground/Array.h"
 #include "module/schema/CIM_LogicalDevice.h"
 
-#include <utility>
-
 namespace KPRV {
 
 namespace {
 
-/// All instances of the element's class, and the address that is its key among them.
-std::pair<Array<Instance*>, const String*> candidates(const Tested_Element& element)
+/// The element's address, which is a key of its class.
+const String& address_of(const Tested_Element& element)
 {
-    switch (element.class_id) {
+    return element.class_id == FCPORT         ? element.port_wwn
+           : element.class_id == ETHERNETPORT ? element.port_mac
+                                              : element.adapter_address;
+}
+
+/// All instances of the class, for the caller to release.
+Array<Instance*> candidates(classId_t id)
+{
+    switch (id) {
     case FCPORT:
-        return {PortHelper::getPortHelperObject()->getInstancesByClass(FCPORT), &element.port_wwn};
+        return PortHelper::getPortHelperObject()->getInstancesByClass(FCPORT);
     case ETHERNETPORT:
-        return {EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(ETHERNETPORT),
-                &element.port_mac};
+        return EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(ETHERNETPORT);
     case PORTCONTROLLER:
-        return {AdapterHelper::getAdapterHelperInstance()->getInstancesByClass(PORTCONTROLLER),
-                &element.adapter_address};
+        return AdapterHelper::getAdapterHelperInstance()->getInstancesByClass(PORTCONTROLLER);
     default:
-        return {{}, nullptr};
+        return {};
     }
 }
 
@@ -33,11 +37,12 @@ std::pair<Array<Instance*>, const String*> candidates(const Tested_Element& elem
 
 Instance* find_tested_element(const Tested_Element& element)
 {
-    const auto [list, address] = candidates(element);
+    const String& address = address_of(element);
+    const Array<Instance*> list = candidates(element.class_id);
     Instance* found = nullptr;
     for (Instance* const instance : list) {
         const CIM_LogicalDevice* const device = cast<CIM_LogicalDevice>(instance);
-        if (!found && device && device->DeviceID.value.equali(*address))
+        if (!found && device && device->DeviceID.value.equali(address))
             found = instance;
         else
             destroyer(instance);

@@ -2,6 +2,7 @@
 #include "tests/module/alerts/Event_Fixture.h"
 
 #include "module/adapter/Json_Access.h"
+#include "tests/support/Live_Blocks.h"
 
 namespace KPRV {
 namespace {
@@ -35,6 +36,26 @@ TEST_F(Processed_Events, GiveAlertsByCategoryAndId)
     for (const int id : {-1, 31, 32, 33, 65536 + 1, INT32_MAX, INT32_MIN})
         for (const int category : {2, 3, 4, 5, 8, 9, 10})
             EXPECT_TRUE(alerts_of(category, id).empty()) << category << "/" << id;
+}
+
+// Each alert has an owner from its making until the queue has it.
+TEST_F(Processed_Events, LoseNoAlertThatIsBeingMade)
+{
+    const auto forget = [&] {
+        take_alerts(helper);
+        log.clear();
+        library.calls.clear();
+    };
+    for (const int category : {2, 4, 9, 99}) {
+        const std::string event = text(category, 1);
+        EXPECT_EQ("", lost_without_a_block(
+                          [&] {
+                              helper.processEvent(event.c_str());
+                              take_alerts(helper);
+                          },
+                          forget))
+            << category;
+    }
 }
 
 TEST_F(Processed_Events, BearTheMessageIdsOfTheirKeys)

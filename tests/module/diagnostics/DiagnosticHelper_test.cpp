@@ -9,6 +9,7 @@
 #include "tests/module/model/Taken_Instances.h"
 #include "tests/support/Fake_Library.h"
 #include "tests/support/Fixed_Host.h"
+#include "tests/support/Live_Blocks.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
@@ -149,6 +150,29 @@ TEST_F(Diagnostic_Helper, KnowsTheCharacteristicsOfEachTest)
                                                   {"Kaldera:SerdesEthLoopbackTest", "{2, 4}"},
                                                   {"Kaldera:SerdesLoopbackTest", "{2, 4}"}}),
               found);
+}
+
+TEST_F(Diagnostic_Helper, LosesNothingThatIsBeingMade)
+{
+    add_job();
+    for (const bool is_service : {true, true, false, false})
+        record(is_service);
+    for (const classId_t id :
+         {MEMORYDIAGNOSTICTEST, LOOPBACKDIAGNOSTICTEST, DIAGNOSTICSOFTWAREIDENTITY, CONCRETEJOB,
+          DIAGNOSTICSERVICERECORD, DIAGNOSTICCOMPLETIONRECORD, AFFECTEDJOBELEMENT,
+          SERVICERECORDAPPLIESTOELEMENT, COMPLETIONRECORDAPPLIESTOELEMENT}) {
+        SCOPED_TRACE(ProviderUtil::getClassName(id));
+        EXPECT_FALSE(taken(helper.getInstancesByClass(id)).empty());
+        const auto enumerate = [&] {
+            for (Instance* instance : helper.getInstancesByClass(id))
+                destroy(instance);
+        };
+        const auto forget = [&] {
+            log.clear();
+            library.calls.clear();
+        };
+        EXPECT_EQ("", lost_without_a_block(enumerate, forget));
+    }
 }
 
 TEST_F(Diagnostic_Helper, KnowsNoCharacteristicsOfWhatIsNoTest)

@@ -78,30 +78,12 @@ protected:
         library_calls = library.calls;
 
         forget_calls();
-        refuse_block(0);
         const size_t before = live_blocks();
         call_for_nobody(provider);
         EXPECT_EQ(before, live_blocks()) << association << " leaves something behind";
-        expect_nothing_lost(provider, grant_blocks());
+        EXPECT_EQ("", lost_without_a_block([&] { call_for_nobody(provider); }, [&] { forget_calls(); }))
+            << association;
         return result;
-    }
-
-    /// Whatever is being made when a block of memory is refused has an owner.
-    void expect_nothing_lost(const Registration* provider, size_t blocks)
-    {
-        for (size_t nth = 1; nth <= blocks; nth++) {
-            const size_t before = live_blocks();
-            refuse_block(nth);
-            try {
-                call_for_nobody(provider);
-            } catch (const std::bad_alloc&) {
-                // As a provider lets it pass.
-            }
-            grant_blocks();
-            forget_calls();
-            ASSERT_EQ(before, live_blocks())
-                << provider->provider_name << " without block " << nth << " of " << blocks;
-        }
     }
 
     /// Success with these pairs, "a b, a c", after the line about building.
