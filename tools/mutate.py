@@ -22,7 +22,7 @@ MODULE = ["allocation_failures_test", "faults_test", "module_test", "bad_answers
 TESTS = {
     "runtime":     ["runtime_test", "cmpi_test", "providers_test", "model_test", "alerts_test", "schema_test", *MODULE],
     "adapter":     ["adapter_test", "model_test", "missing_symbols_test", *MODULE],
-    "cmpi":        ["cmpi_test", "contracts_test", "providers_test", "module_alerts_test", *MODULE],
+    "cmpi":        ["cmpi_test", "cmpi_contained_test", "contracts_test", "providers_test", "module_alerts_test", *MODULE],
     "model":       ["model_test", "providers_test", *MODULE],
     "agent":       ["agent_test", *MODULE],
     "diagnostics": ["diagnostics_test", "module_diagnostics_test", "bad_answers_alone_test", *MODULE],

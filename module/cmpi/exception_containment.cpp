@@ -138,7 +138,7 @@ void contain_exceptions(CMPI_Static_Data& data)
     CONTAIN(association_ft, referenceNames);
     CONTAIN(indication_ft, cleanup);
     CONTAIN(indication_ft, authorizeFilter);
-    CONTAIN(indication_ft, mustPoll); // Either way (statement): it writes to the log, which never throws.
+    CONTAIN(indication_ft, mustPoll);
     CONTAIN(indication_ft, activateFilter);
     CONTAIN(indication_ft, deActivateFilter);
     CONTAIN(indication_ft, enableIndications);

@@ -211,7 +211,9 @@ TEST_F(Contained_Exceptions, AreCutBehindAWholeCharacter)
 {
     const std::string head = "enumerateInstances: ";
     constexpr size_t MOST = 1023;
-    for (const std::string character : {"a", "\u00e4", "\u20ac", "\U0001F600"}) {
+    // The first ones of two, three and four bytes, and one of each that stands among others.
+    for (const std::string character :
+         {"a", "\u0080", "\u00e4", "\u0800", "\u20ac", "\U00010000", "\U0001F600"}) {
         for (size_t offset = 0; offset < character.size(); offset++) {
             std::string text(offset, '-');
             const size_t fitting = (MOST - head.size() - offset) / character.size();

@@ -92,30 +92,6 @@ TEST_P(Module_Exceptions, OfAssociations)
     expect_thrown(server->reference_names(name, host, {}), "referenceNames", "gone");
 }
 
-// A status holds a kilobyte of text, and no part of a character at its end.
-TEST_P(Module_Exceptions, OfManyWords)
-{
-    open("one_cna.json");
-    const std::string entry = "enumerateInstances: ";
-    constexpr size_t MOST = 1023;
-    // The first characters of two, three and four bytes; the text is cut behind each byte of one.
-    for (const std::string character : {"\u0080", "\u0800", "\U00010000"})
-        for (size_t odd = 0; odd < character.size(); odd++) {
-            SCOPED_TRACE(std::to_string(character.size()) + " " + std::to_string(odd));
-            simulator.clear_faults();
-            std::string words(odd, 'x');
-            while (words.size() < 2000)
-                words += character;
-            simulator.add_fault(R"({"call": "getAllAdaptersIndexString", "do": "throw", "message": ")" +
-                                words + R"(", "type": "std::runtime_error"})");
-            const broker::Result result = server->enumerate_instances("KALDERA_PortController");
-            const size_t half = (MOST - entry.size() - odd) % character.size();
-            EXPECT_TRUE(result.message == (is_contained() ? (entry + words).substr(0, MOST - half) : ""));
-            EXPECT_TRUE(result.exception.value_or("none") == (is_contained() ? "none" : words));
-            server->violations().clear();
-        }
-}
-
 INSTANTIATE_TEST_SUITE_P(Form, Module_Exceptions, testing::Bool(),
                          [](const auto& form) { return form.param ? "Contained" : "Passing"; });
 
