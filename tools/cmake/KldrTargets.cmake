@@ -93,7 +93,7 @@ endif()
 
 # They go first in a build folder that has not seen yet how long its tests take: begun last, one of them would end alone.
 set(KLDR_LONG_TESTS module_test faults_test bad_answers_test bad_answers_alone_test allocation_failures_test missing_symbols_test
-    module_diagnostics_test broker_test alerts_test simulator_test)
+    module_diagnostics_test broker_test alerts_test simulator_test kldrcim_test)
 
 # What every test of a sanitized build is started with. How the leak checker learns where the thread-local storage of an opened
 # library lies is a guess that C libraries of today prove wrong: it reads wild memory at the end of the process. A child that
