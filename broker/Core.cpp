@@ -57,14 +57,16 @@ void Core::retire(Object& object)
         return;
     object.packed = false;
     object.drop();
-    Object* last = nullptr;
-    {
+    Object* last = &object;
+    try {
         const Auto_Lock lock(_mutex);
         _retired.push_back(&object);
         if (_retired.size() <= options.most_shells)
             return;
         last = _retired.front();
         _retired.pop_front();
+    } catch (const std::bad_alloc&) {
+        // Its shell is what can be spared.
     }
     blocks.end(*last);
 }

@@ -18,9 +18,19 @@ struct Instance_Value;
 /// CMPI type word, array bit included; a null value keeps its type and holds nothing.
 struct Plain_Value
 {
+    /// In the place of no value. Not trivial, so that not all alternatives are of the kinds that libstdc++ 12
+    /// takes to be always there: a copy that fails for lack of memory would then be destroyed as if it stood.
+    struct Nothing
+    {
+        Nothing() = default;
+        Nothing(const Nothing&) noexcept {}
+        Nothing& operator=(const Nothing&) noexcept { return *this; }
+        bool operator==(const Nothing&) const = default;
+    };
+
     /// Numbers are held widest: unsigned integers and char16 as uint64, signed as sint64, reals as double.
     /// Text holds strings and the 25 characters of a datetime.
-    using Data = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, std::string,
+    using Data = std::variant<Nothing, bool, std::uint64_t, std::int64_t, double, std::string,
                               std::shared_ptr<const Path_Value>, std::shared_ptr<const Instance_Value>,
                               std::vector<Plain_Value>>;
 
