@@ -90,14 +90,13 @@ static CMPIrc import(const Meta_Class* meta_class, uint32 mask, const CMPIObject
     if (!path)
         return CMPI_RC_ERR_FAILED;
     const char* const name_space = name_space_of(path);
-    instance.reset(create(meta_class, false));
-    Instance* target = instance.ptr();
-    auto container = make_container(name_space);
+    Instance* imported = nullptr;
     // Either way (statement): in this direction what does not convert is left out, and that is no failure.
-    if (container.convert(meta_class, mask, target) != 0)
+    if (make_container(name_space).convert(meta_class, mask, imported) != 0)
         return CMPI_RC_ERR_FAILED;
+    instance = Ref<Instance>(imported);
     const bool shared = neighbour && neighbour->__name_space == name_space;
-    __set_name_space_recursive(target, shared ? neighbour->__name_space : String(name_space), false);
+    __set_name_space_recursive(instance.ptr(), shared ? neighbour->__name_space : String(name_space), false);
     return CMPI_RC_OK;
 }
 

@@ -5,6 +5,7 @@
 #include "module/cmpi/cmpi_text.h"
 #include "module/cmpi/entries.h"
 #include "module/cmpi/status_translation.h"
+#include "module/runtime/ground/Answer_Blocks.h"
 
 namespace KPRV {
 
@@ -88,6 +89,7 @@ static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* 
                                          const CMPIResult* result, const CMPIObjectPath* cop)
 {
     const Operation_Scope scope(_adapter(mi), context, "enumInstanceNames", LOG_HERE);
+    const Answer_Blocks blocks;
     Ref<Instance> model;
     if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
@@ -107,6 +109,7 @@ static CMPIStatus enumerateInstances(CMPIInstanceMI* mi, const CMPIContext* cont
                                      const CMPIObjectPath* cop, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "enumInstances", LOG_HERE);
+    const Answer_Blocks blocks;
     Ref<Instance> model;
     if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);
@@ -127,6 +130,7 @@ static CMPIStatus getInstance(CMPIInstanceMI* mi, const CMPIContext* context, co
                               const CMPIObjectPath* cop, const char** properties)
 {
     const Operation_Scope scope(_adapter(mi), context, "getInstance", LOG_HERE);
+    const Answer_Blocks blocks;
     Ref<Instance> model;
     if (const CMPIrc rc = model_of(scope, cop, model); rc != CMPI_RC_OK)
         return scope.ret(LOG_HERE, rc);

@@ -27,12 +27,11 @@ static Instance* import(CMPI_Container&& container, const Meta_Class* meta_class
 {
     if (!may_descend(nesting.depth))
         return nullptr;
-    Ref<Instance> instance(create(meta_class, false));
     if (nesting.wanted && !is_subclass(nesting.wanted, meta_class))
-        return instance.steal();
+        return create(meta_class, false);
     container.lies_in(nesting.depth + 1);
-    Instance* target = instance.ptr();
-    return container.convert(meta_class, mask, target) == 0 ? instance.steal() : nullptr;
+    Instance* instance = nullptr;
+    return container.convert(meta_class, mask, instance) == 0 ? instance : nullptr;
 }
 
 Instance* _to_cimple_instance(const Meta_Repository* repository, const CMPIBroker* broker,

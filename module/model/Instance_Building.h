@@ -5,7 +5,6 @@
 #include "module/runtime/ground/Array.h"
 #include "module/runtime/ground/Lasting_Array.h"
 #include "module/runtime/objects/Instance.h"
-#include "module/runtime/objects/Prototype.h"
 #include "module/runtime/objects/Ref.h"
 #include "module/runtime/objects/Wanted.h"
 
@@ -14,20 +13,9 @@
 
 namespace KPRV {
 
-/// A fresh instance with a count of 1 in which every property is null, those with a default in the schema
-/// too: what a builder does not set is not known.
-template <class T>
-T* create_null()
-{
-    static const Prototype<T> all_null([] {
-        Ref<T> instance(create<T>(false));
-        clear(instance.ptr());
-        return instance.steal();
-    }());
-    return all_null.copy();
-}
-
-/// The same, if an instance with that text, given in parts, in its telling key is wanted; else null.
+/// A fresh instance, in which every property is null, those with a default in the schema too (what a builder
+/// does not set is not known), if an instance with that text, given in parts, in its telling key is wanted;
+/// else null.
 template <class T>
 Ref<T> create_wanted(const Wanted& wanted, Property<String> T::*key, std::span<const std::string_view> parts)
 {

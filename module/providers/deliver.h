@@ -40,14 +40,12 @@ template <class T>
 class List
 {
 public:
-    explicit List(Array<Instance*>&& instances)
-    try : _instances(std::move(instances)) {
-    } catch (...) {
-        // The empty array in their place may be one allocation.
-        release(instances);
-        throw;
+    explicit List(Array<Instance*>&& instances) noexcept : _instances(std::move(instances)) {}
+    ~List()
+    {
+        for (Instance* instance : _instances)
+            unref(instance);
     }
-    ~List() { release(_instances); }
     List(const List&) = delete;
     List& operator=(const List&) = delete;
 
@@ -69,12 +67,6 @@ public:
     }
 
 private:
-    static void release(const Array<Instance*>& instances)
-    {
-        for (Instance* instance : instances)
-            unref(instance);
-    }
-
     Array<Instance*> _instances;
 };
 

@@ -72,8 +72,8 @@ class Array
 public:
     Array() { __construct(_rep, __Array_Traits_Factory<T>::traits()); }
     Array(const Array& x) : _rep(_clone(x._rep)) {}
-    // Where no empty block is shared, one is made. NOLINTNEXTLINE(performance-noexcept-move-constructor)
-    Array(Array&& x) : Array() { std::swap(_rep, x._rep); }
+    /// Where no empty block is shared, one is made, and the move fails without memory.
+    Array(Array&& x) noexcept(__Array_Traits_Factory<T>::SHARES_EMPTY) : Array() { std::swap(_rep, x._rep); }
     Array(const T* data, uint32 n) { __construct(_rep, __Array_Traits_Factory<T>::traits(), data, n); }
     ~Array() { __destruct(_rep); }
 

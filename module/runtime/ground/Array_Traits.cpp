@@ -38,6 +38,7 @@ enum Index
     _real64_traits,
     _String_traits,
     _Datetime_traits,
+    _pointer_traits,
     NUM_KINDS,
 };
 static_assert(NUM_KINDS == ELEMENT_KINDS);
@@ -73,7 +74,10 @@ constinit const Empty_Arrays empty_arrays[ELEMENT_KINDS] = {
     bytes<boolean>(_boolean_traits), bytes<uint8>(_uint8_traits),     bytes<uint16>(_uint16_traits),
     bytes<uint32>(_uint32_traits),   bytes<uint64>(_uint64_traits),   reals<real32>(_real32_traits),
     reals<real64>(_real64_traits),   handles<String>(_String_traits), handles<Datetime>(_Datetime_traits),
+    bytes<void*>(_pointer_traits),
 };
+
+constinit const __Array_Traits* const __pointer_array_traits = &empty_arrays[_pointer_traits].traits;
 
 constinit const __Array_Traits* const __cim_array_traits[NUM_TYPES] = {
     &empty_arrays[_boolean_traits].traits, &empty_arrays[_uint8_traits].traits,

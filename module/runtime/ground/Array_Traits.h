@@ -18,10 +18,16 @@ struct __Array_Traits
 /// Traits of the CIM scalar types, by `Type`.
 extern const __Array_Traits* const __cim_array_traits[NUM_TYPES];
 
+/// Traits of all pointers, which are copied and compared as bytes.
+extern const __Array_Traits* const __pointer_array_traits;
+
 /// Traits of any other class: copy construction, destruction, `operator==`.
 template <class T>
 struct __Array_Traits_Factory
 {
+    /// Whether arrays without elements share a block, so that none is allocated.
+    static constexpr bool SHARES_EMPTY = false;
+
     static void construct(void* element, const void* from) { new (element) T(*static_cast<const T*>(from)); }
     static void destruct(void* element) { static_cast<T*>(element)->~T(); }
     static bool equal(const void* a, const void* b)
@@ -32,12 +38,13 @@ struct __Array_Traits_Factory
     static const __Array_Traits* traits() { return &record; }
 };
 
-/// Traits of elements that are copied and compared as bytes, such as pointers.
 template <class T>
-struct __Array_Traits_Factory_Raw
+struct __Array_Traits_Factory_Raw;
+template <>
+struct __Array_Traits_Factory_Raw<void*>
 {
-    static constexpr __Array_Traits record = {sizeof(T), nullptr, nullptr, nullptr};
-    static const __Array_Traits* traits() { return &record; }
+    static constexpr bool SHARES_EMPTY = true;
+    static const __Array_Traits* traits() { return __pointer_array_traits; }
 };
 
 template <class T>
@@ -51,6 +58,7 @@ class Datetime;
 template <Type CODE>
 struct __Array_Traits_Of_Type
 {
+    static constexpr bool SHARES_EMPTY = true;
     static const __Array_Traits* traits() { return __cim_array_traits[CODE]; }
 };
 

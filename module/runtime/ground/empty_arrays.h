@@ -6,15 +6,15 @@
 
 namespace KPRV {
 
-// Most arrays of an instance never hold an element. Those of CIM types then share constant blocks, so that
-// making, cloning and releasing such a cell allocates nothing. Nothing may be written to one: what would
-// write to an array takes a block of its own first.
+// Most arrays of an instance never hold an element. Those of CIM types and of pointers then share constant
+// blocks, so that making, cloning, moving and releasing one allocates nothing. Nothing may be written to one:
+// what would write to an array takes a block of its own first.
 
 /// Capacity of an array that never held an element.
 inline constexpr uint32 FIRST_CAPACITY = 8;
 
-/// CIM types whose elements are handled differently.
-inline constexpr size_t ELEMENT_KINDS = 9;
+/// Elements that are handled differently: nine of CIM types, and pointers.
+inline constexpr size_t ELEMENT_KINDS = 10;
 
 struct Empty_Block
 {
@@ -23,7 +23,7 @@ struct Empty_Block
     char rest[__ARRAY_HEAD - sizeof(__Array_Rep) + 8];
 };
 
-/// Traits of a CIM type, and its arrays of no element: a fresh one and a clone of one.
+/// Traits of such elements, and their arrays of none: a fresh one and a clone of one.
 struct Empty_Arrays
 {
     __Array_Traits traits;
@@ -39,15 +39,17 @@ inline bool is_of_empty_arrays(const void* address)
            sizeof(empty_arrays);
 }
 
-/// The shared block of that capacity or of 0 for arrays of a CIM type; null for other traits or another
-/// capacity.
+/// The shared block of that capacity or of 0 for such arrays; null for other traits or another capacity.
 __Array_Rep* empty_array_of(const __Array_Traits* traits, uint32 capacity);
 
-/// What a fresh array of a CIM type holds.
+/// What a fresh array of such elements holds.
+inline __Array_Rep* fresh_array_of(const __Array_Traits* traits)
+{
+    return const_cast<__Array_Rep*>(&reinterpret_cast<const Empty_Arrays*>(traits)->fresh.head);
+}
 inline __Array_Rep* fresh_array_of(Type type)
 {
-    const auto* const record = reinterpret_cast<const Empty_Arrays*>(__cim_array_traits[type]);
-    return const_cast<__Array_Rep*>(&record->fresh.head);
+    return fresh_array_of(__cim_array_traits[type]);
 }
 
 inline bool is_empty_array(const __Array_Rep* rep)

@@ -1,10 +1,11 @@
 #include "module/runtime/objects/Class_Plan.h"
 
-#include "module/runtime/ground/Atomic.h"
+#include "module/runtime/ground/Datetime.h"
+#include "module/runtime/ground/String.h"
+#include "module/runtime/ground/empty_arrays.h"
 #include "module/runtime/system/Standard_Mutex.h"
 
 #include <algorithm>
-#include <atomic>
 
 namespace KPRV {
 
@@ -24,20 +25,12 @@ Cell_Kind kind_of(const Meta_Property* meta)
 
 // Plans live in the module's own zeroed pages and are never given back: there is nothing that could fail, be
 // released under a thread that still walks, or outlive the module.
-constexpr size_t ROOM = 8192 * sizeof(Cell);
+constexpr size_t ROOM = 12288 * sizeof(Cell);
 constinit Standard_Mutex<> room_mutex;
 alignas(Class_Plan) constinit char room[ROOM] GUARDED_BY(room_mutex) = {};
 constinit size_t room_used GUARDED_BY(room_mutex) = 0;
 
-/// Open addressing; twice as many places as there are classes and methods.
-constexpr size_t PLACES = 512;
-constinit std::atomic<const Class_Plan*> places[PLACES] = {};
 constinit size_t places_used GUARDED_BY(room_mutex) = 0;
-
-size_t place_of(const Meta_Class* meta_class)
-{
-    return reinterpret_cast<size_t>(meta_class) / alignof(Meta_Class) * 40503 / 16 % PLACES;
-}
 
 template <class T>
 T* take(size_t count) REQUIRES(room_mutex)
@@ -66,6 +59,22 @@ bool fill_group(const Meta_Class* meta_class, Cells cells, Class_Plan& plan) REQ
     return true;
 }
 
+const Instance* make_all_null(const Meta_Class* meta_class, const Class_Plan& plan) REQUIRES(room_mutex)
+{
+    const void** const words = take<const void*>((meta_class->size + sizeof(void*) - 1) / sizeof(void*));
+    if (!words)
+        return nullptr;
+    Instance* const instance = reinterpret_cast<Instance*>(words);
+    write_head(instance, meta_class);
+    for (const Cell& cell : plan[Cells::HOLDERS])
+        cell.in<const void*>(instance) = fresh_handle(cell);
+    for (const Cell& cell : plan[Cells::ALL]) {
+        if (has_null_flag(cell))
+            cell.null(instance) = 1;
+    }
+    return instance;
+}
+
 const Class_Plan* make_plan(const Meta_Class* meta_class) REQUIRES(room_mutex)
 {
     Class_Plan* const plan = take<Class_Plan>(1);
@@ -75,21 +84,22 @@ const Class_Plan* make_plan(const Meta_Class* meta_class) REQUIRES(room_mutex)
     plan->features = meta_class->meta_features;
     plan->refers = std::ranges::any_of(
         features_of(meta_class), [](const Meta_Feature* feature) { return feature->flags & FLAG_REFERENCE; });
-    for (const Cells cells : {Cells::ALL, Cells::KEYS, Cells::HOLDERS}) {
+    for (const Cells cells : {Cells::ALL, Cells::KEYS, Cells::NON_KEYS, Cells::HOLDERS}) {
         if (!fill_group(meta_class, cells, *plan))
             return nullptr;
     }
-    return plan;
+    plan->all_null = make_all_null(meta_class, *plan);
+    return plan->all_null ? plan : nullptr;
 }
 
 /// Where the class's plan stands or would stand.
 std::atomic<const Class_Plan*>& find_place(const Meta_Class* meta_class)
 {
-    size_t at = place_of(meta_class);
-    for (;; at = (at + 1) % PLACES) {
-        const Class_Plan* const plan = places[at].load(std::memory_order_acquire);
+    size_t at = plan_place_of(meta_class);
+    for (;; at = (at + 1) % PLAN_PLACES) {
+        const Class_Plan* const plan = plan_places[at].load(std::memory_order_acquire);
         if (!plan || plan->owner == meta_class)
-            return places[at];
+            return plan_places[at];
     }
 }
 
@@ -100,7 +110,7 @@ std::atomic<const Class_Plan*>& find_place(const Meta_Class* meta_class)
     std::atomic<const Class_Plan*>& place = find_place(meta_class);
     if (const Class_Plan* const earlier = place.load(std::memory_order_relaxed))
         return earlier;
-    if (places_used == PLACES / 2)
+    if (places_used == PLAN_PLACES / 2)
         return nullptr;
     const Class_Plan* const plan = make_plan(meta_class);
     if (plan) {
@@ -111,6 +121,8 @@ std::atomic<const Class_Plan*>& find_place(const Meta_Class* meta_class)
 }
 
 } // namespace
+
+constinit std::atomic<const Class_Plan*> plan_places[PLAN_PLACES] = {};
 
 Cell cell_of(const Meta_Feature* feature)
 {
@@ -129,6 +141,22 @@ Cell cell_of(const Meta_Feature* feature)
     return {feature, 0, -1, 0, Cell_Kind::NONE};
 }
 
+const void* fresh_handle(const Cell& cell)
+{
+    switch (cell.kind) {
+    case Cell_Kind::TEXT:
+        return &String::_empty;
+    case Cell_Kind::MOMENT:
+        return &Datetime::_zero;
+    case Cell_Kind::ARRAY:
+        return fresh_array_of(cell.element_type());
+    case Cell_Kind::REFERENCE_ARRAY:
+        return fresh_array_of(__pointer_array_traits);
+    default:
+        return nullptr;
+    }
+}
+
 bool belongs(const Cell& cell, Cells cells)
 {
     if (cell.kind == Cell_Kind::NONE)
@@ -136,6 +164,8 @@ bool belongs(const Cell& cell, Cells cells)
     switch (cells) {
     case Cells::KEYS:
         return is_key(cell.feature);
+    case Cells::NON_KEYS:
+        return !is_key(cell.feature);
     case Cells::HOLDERS:
         return cell.kind != Cell_Kind::PLAIN;
     default:
@@ -143,14 +173,8 @@ bool belongs(const Cell& cell, Cells cells)
     }
 }
 
-const Class_Plan* plan_of(const Meta_Class* meta_class)
+const Class_Plan* find_or_make_plan(const Meta_Class* meta_class)
 {
-    // Mostly it stands in its place; that it has one, it owes to what is looked at below. Either way
-    // (comparison): what is not found here is found there.
-    const Class_Plan* const first = places[place_of(meta_class)].load(std::memory_order_acquire);
-    if (first && first->owner == meta_class && first->features == meta_class->meta_features &&
-        atomic_get(meta_class->refs) == 0) [[likely]]
-        return first;
     // A record that is counted may go, and another may take its place. A method's ends before the repository.
     const bool lasts = meta_class->flags & FLAG_METHOD || meta_class->meta_repository;
     if (atomic_get(meta_class->refs) != 0 || !lasts)

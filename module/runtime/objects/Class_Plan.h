@@ -1,14 +1,16 @@
 #pragma once
 
+#include "module/runtime/ground/Atomic.h"
 #include "module/runtime/objects/features.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cstring>
 
 // How it works. The metadata of a class lists its features; where a feature's value lies stands in the
 // feature's own record. A walk by it would read three places for each cell: list, record, instance. The plan
-// of a class puts what walks need side by side, in three groups: all cells, the keys, and those behind which
-// memory stands.
+// of a class puts what walks need side by side, in groups: all cells, the keys, the others, and those behind
+// which memory stands. Beside them stands an instance that is all null, whose bytes make others.
 //
 // A plan is made when it is first asked for, under a mutex, out of zeroed pages of the module, and never
 // given back. It enters a table by the address of its class with one release store; who looks it up follows
@@ -83,10 +85,21 @@ struct Cell
 
 Cell cell_of(const Meta_Feature* feature);
 
+/// Whether its null byte is one of the flags that are set and asked; a reference is null by its pointer, and
+/// arrays of them keep theirs to themselves.
+inline bool has_null_flag(const Cell& cell)
+{
+    return cell.kind < Cell_Kind::REFERENCE;
+}
+
+/// What a holder holds in a fresh instance; all fresh instances share it, and nobody releases it.
+const void* fresh_handle(const Cell& cell);
+
 enum class Cells
 {
     ALL,
     KEYS,
+    NON_KEYS,
     HOLDERS, ///< Those that hold a text, a moment, an array or an instance.
 };
 
@@ -99,15 +112,37 @@ struct Class_Plan
 {
     const Meta_Class* owner;
     const Meta_Feature* const* features;
-    std::span<const Cell> groups[3];
-    bool refers; ///< Whether some cell is a reference, or several.
+    std::span<const Cell> groups[4];
+    bool refers;              ///< Whether some cell is a reference, or several.
+    const Instance* all_null; ///< See `create_null`.
 
     std::span<const Cell> operator[](Cells cells) const { return groups[static_cast<size_t>(cells)]; }
 };
 
+/// Where the plans are found: open addressing, twice as many places as there are classes and methods.
+inline constexpr size_t PLAN_PLACES = 512;
+extern std::atomic<const Class_Plan*> plan_places[PLAN_PLACES];
+
+inline size_t plan_place_of(const Meta_Class* meta_class)
+{
+    return reinterpret_cast<size_t>(meta_class) / alignof(Meta_Class) * 40503 / 16 % PLAN_PLACES;
+}
+
+/// For `plan_of`, which has looked into the first place.
+const Class_Plan* find_or_make_plan(const Meta_Class* meta_class);
+
 /// The plan of a class or method of the catalogue, made when it is first asked for. Null for all other
 /// records, and when there is no room for another plan.
-const Class_Plan* plan_of(const Meta_Class* meta_class);
+inline const Class_Plan* plan_of(const Meta_Class* meta_class)
+{
+    // Mostly it stands in its place; that it has one, it owes to what is looked at elsewhere. Either way
+    // (comparison): what is not found here is found there.
+    const Class_Plan* const first = plan_places[plan_place_of(meta_class)].load(std::memory_order_acquire);
+    if (first && first->owner == meta_class && first->features == meta_class->meta_features &&
+        atomic_get(meta_class->refs) == 0) [[likely]]
+        return first;
+    return find_or_make_plan(meta_class);
+}
 
 /// For visitors that look at most cells only to pass on: `[](const Cell& cell) INLINE { ... }`.
 #define INLINE __attribute__((always_inline))

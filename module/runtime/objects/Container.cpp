@@ -1,6 +1,7 @@
 #include "module/runtime/objects/Container.h"
 
 #include "module/runtime/objects/Lent_Value.h"
+#include "module/runtime/objects/Ref.h"
 #include "module/runtime/system/log.h"
 
 namespace KPRV {
@@ -65,9 +66,10 @@ static int replace(Instance* instance, const Meta_Feature* feature, Value& value
 
 int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& instance)
 {
-    if (!instance)
-        instance = create(meta_class, false);
-    __set_null_flags(instance, true, true, 1);
+    Ref<Instance> fresh(instance ? nullptr : create_null(meta_class));
+    Instance* const target = fresh ? fresh.ptr() : instance;
+    if (!fresh)
+        __set_null_flags(target, true, true, 1);
 
     const uint32 size = get_size();
     String hold;
@@ -93,9 +95,11 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Instance*& ins
         const int status = feature->flags & FLAG_REFERENCE
                                ? get_reference(i, static_cast<const Meta_Reference*>(feature), type, value)
                                : get_value(i, type, value);
-        if (status != 0 || replace(instance, feature, value) != 0)
+        if (status != 0 || replace(target, feature, value) != 0)
             LOG_CONVERSION(WARN, "conversion error: %s.%s", meta_class->name, feature->name);
     }
+    if (fresh)
+        instance = fresh.steal();
     return 0;
 }
 

@@ -46,24 +46,6 @@ __Array_Rep* default_array(Type type, const Meta_Value* value)
         });
 }
 
-/// Builds an empty cell that is no text and no array of a CIM type.
-void construct(Instance* instance, const Cell& cell)
-{
-    switch (cell.kind) {
-    case Cell_Kind::MOMENT:
-        new (&cell.in<Datetime>(instance)) Datetime();
-        break;
-    case Cell_Kind::REFERENCE:
-        cell.in<Instance*>(instance) = nullptr;
-        break;
-    case Cell_Kind::REFERENCE_ARRAY:
-        new (&cell.in<Array<Instance*>>(instance)) Array<Instance*>();
-        break;
-    default:
-        break;
-    }
-}
-
 /// Gives an empty cell its default, or makes it null if it has none. References have no defaults, and their
 /// null bytes are left alone.
 struct Default_Giver
@@ -148,25 +130,37 @@ Instance* create(const Meta_Method* meta_method)
     return create(as_class(meta_method), false);
 }
 
+Instance* create_null(const Meta_Class* meta_class)
+{
+    Instance* const instance = static_cast<Instance*>(take_block(meta_class->size));
+    if (const Class_Plan* const plan = plan_of(meta_class)) {
+        // Without a count: a class that has a plan is not counted.
+        memcpy(static_cast<void*>(instance), static_cast<const void*>(plan->all_null), meta_class->size);
+        return instance;
+    }
+    __default_construct(meta_class, instance, true, false);
+    __set_null_flags(instance, true, true, 1);
+    return instance;
+}
+
 void __default_construct(const Meta_Class* meta_class, Instance* instance, bool clear, bool defaults)
 {
     ref(meta_class);
     if (clear)
         memset(static_cast<void*>(instance), 0, meta_class->size);
+    write_head(instance, meta_class);
+    visit_cells(meta_class, Cells::HOLDERS,
+                [=](const Cell& cell) { cell.in<const void*>(instance) = fresh_handle(cell); });
+    if (defaults)
+        give_defaults(instance);
+}
+
+void write_head(Instance* instance, const Meta_Class* meta_class)
+{
     instance->__magic = INSTANCE_MAGIC;
     instance->__refs = 1;
     instance->__meta_class = meta_class;
     new (&instance->__name_space) String();
-    visit_cells(meta_class, Cells::HOLDERS, [=](const Cell& cell) INLINE {
-        if (cell.kind == Cell_Kind::TEXT)
-            new (&cell.in<String>(instance)) String();
-        else if (cell.kind == Cell_Kind::ARRAY)
-            cell.in<__Array_Rep*>(instance) = fresh_array_of(cell.element_type());
-        else
-            construct(instance, cell);
-    });
-    if (defaults)
-        give_defaults(instance);
 }
 
 void __destruct(Instance* instance)

@@ -29,8 +29,13 @@ struct Instance
 Instance* create(const Meta_Class* meta_class, bool defaults);
 /// A fresh invocation record; all cells zero and not null.
 Instance* create(const Meta_Method* meta_method);
+/// A fresh instance, or record of a method, with a count of 1 whose null flags are all set, also where the
+/// schema has a default. References are as ever.
+Instance* create_null(const Meta_Class* meta_class);
 /// Builds in place in `meta_class->size` bytes; `clear` zeroes them first.
 void __default_construct(const Meta_Class* meta_class, Instance* instance, bool clear, bool defaults);
+/// Writes what stands before the cells: a count of 1, no name space. The class is not counted.
+void write_head(Instance* instance, const Meta_Class* meta_class);
 /// Releases what the cells hold; the block itself stays.
 void __destruct(Instance* instance);
 
@@ -108,6 +113,11 @@ template <class T>
 T* create(bool defaults)
 {
     return static_cast<T*>(create(&T::static_meta_class, defaults));
+}
+template <class T>
+T* create_null()
+{
+    return static_cast<T*>(create_null(&T::static_meta_class));
 }
 template <class T>
 T* clone_of(const T* instance)

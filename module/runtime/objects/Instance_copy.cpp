@@ -234,8 +234,7 @@ Instance* key_clone(const Instance* instance)
 {
     if (!instance)
         return nullptr;
-    Ref<Instance> keys(create(instance->__meta_class, false));
-    __set_null_flags(keys.ptr(), true, true, 1);
+    Ref<Instance> keys(create_null(instance->__meta_class));
     copy_keys(keys.ptr(), instance);
     return keys.steal();
 }

@@ -10,18 +10,11 @@ void __set_null_flags(Instance* instance, bool include_keys, bool include_non_ke
 {
     if (!include_keys && !include_non_keys)
         return;
-    if (include_keys && include_non_keys) {
-        visit_cells(instance->__meta_class, Cells::ALL, [=](const Cell& cell) INLINE {
-            if (cell.kind < Cell_Kind::REFERENCE)
-                cell.null(instance) = null_value;
-        });
-        return;
-    }
-    visit_cells(instance->__meta_class, include_non_keys ? Cells::ALL : Cells::KEYS,
-                [=](const Cell& cell) INLINE {
-                    if (cell.kind < Cell_Kind::REFERENCE && (include_keys || !is_key(cell.feature)))
-                        cell.null(instance) = null_value;
-                });
+    const Cells cells = !include_keys ? Cells::NON_KEYS : include_non_keys ? Cells::ALL : Cells::KEYS;
+    visit_cells(instance->__meta_class, cells, [=](const Cell& cell) INLINE {
+        if (has_null_flag(cell))
+            cell.null(instance) = null_value;
+    });
 }
 
 int filter_properties(Instance* instance, const char* const* names, bool keep_keys)

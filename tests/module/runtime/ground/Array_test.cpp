@@ -8,6 +8,8 @@
 
 #include <cmath>
 #include <new>
+#include <type_traits>
+#include <utility>
 
 namespace KPRV {
 
@@ -328,6 +330,25 @@ TEST(Array, ElementsOfAnyClassAreConstructedAndDestructed)
         EXPECT_EQ(20, Counted::alive);
     }
     EXPECT_EQ(0, Counted::alive);
+}
+
+// Lists of instances move where there may be no memory, and their owner must not lose them.
+TEST(Array, ThoseOfPointersMoveWithoutMemory)
+{
+    static_assert(std::is_nothrow_move_constructible_v<Array<int*>>);
+    static_assert(std::is_nothrow_move_constructible_v<Array<String>>);
+    static_assert(!std::is_nothrow_move_constructible_v<Array<Counted>>);
+    int x = 0;
+    Array<int*> a, b;
+    EXPECT_EQ(std::as_const(a).data(), std::as_const(b).data());
+    EXPECT_EQ(8u, a.capacity());
+    a.append(&x);
+    const Array<int*> moved(std::move(a));
+    ASSERT_EQ(1u, moved.size());
+    EXPECT_EQ(&x, moved[0]);
+    // NOLINTNEXTLINE(bugprone-use-after-move): what is left is a fresh one.
+    EXPECT_EQ(std::as_const(b).data(), std::as_const(a).data());
+    EXPECT_EQ(0u, b.size());
 }
 
 TEST(Array, PointersAreRaw)

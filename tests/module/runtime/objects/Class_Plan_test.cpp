@@ -27,14 +27,13 @@ TEST(Class_Plan, ItsGroupsAreTheFeaturesInTheirOrder)
     for (uint32 i = 0; i < sample_repository.num_meta_classes; i++) {
         const Meta_Class* const meta_class = sample_repository.meta_classes[i];
         SCOPED_TRACE(meta_class->name);
-        std::vector<const Meta_Feature*> all, keys, holders;
+        std::vector<const Meta_Feature*> all, keys, non_keys, holders;
         for (const Meta_Feature* feature : features_of(meta_class)) {
             const Value::Type type = type_of(feature);
             if (type == Value::NONE)
                 continue;
             all.push_back(feature);
-            if (feature->flags & FLAG_KEY)
-                keys.push_back(feature);
+            (feature->flags & FLAG_KEY ? keys : non_keys).push_back(feature);
             if (type >= int(STRING))
                 holders.push_back(feature);
         }
@@ -42,6 +41,7 @@ TEST(Class_Plan, ItsGroupsAreTheFeaturesInTheirOrder)
         ASSERT_NE(nullptr, plan);
         EXPECT_EQ(all, features_in((*plan)[Cells::ALL]));
         EXPECT_EQ(keys, features_in((*plan)[Cells::KEYS]));
+        EXPECT_EQ(non_keys, features_in((*plan)[Cells::NON_KEYS]));
         EXPECT_EQ(holders, features_in((*plan)[Cells::HOLDERS]));
         EXPECT_EQ(plan, plan_of(meta_class));
     }

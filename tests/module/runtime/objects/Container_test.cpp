@@ -1,6 +1,7 @@
 #include "module/runtime/objects/Container.h"
 
 #include "tests/module/runtime/objects/sample_values.h"
+#include "tests/support/Live_Blocks.h"
 #include "tests/support/Log_Capture.h"
 
 #include <gtest/gtest.h>
@@ -172,6 +173,15 @@ TEST(Container_import, FillsANewInstanceAndLeavesTheRestNull)
     EXPECT_EQ(1, port->EnabledState.null);
     EXPECT_EQ(0, port->EnabledState.value);
     EXPECT_EQ((Names{"NUMBER as uint64", "words as string_array"}), bag.asked);
+}
+
+TEST(Container_import, LosesNothingWhereThereIsNoMemory)
+{
+    Bag bag;
+    bag.add("Name", "longer than what a text holds without a block");
+    bag.add("Words", sample_array<String>(0));
+    bag.add("Caption", "another one");
+    EXPECT_EQ("", lost_without_a_block([&] { import <Sample_Port>(bag, 0); }, [&] { bag.asked.clear(); }));
 }
 
 TEST(Container_import, IntoAnInstanceNullsWhatIsNotNamed)

@@ -1,5 +1,7 @@
 #include "module/runtime/objects/Instance.h"
 
+#include "module/runtime/objects/meta_build.h"
+#include "module/runtime/objects/meta_destroy.h"
 #include "tests/module/runtime/objects/sample_values.h"
 
 #include <gtest/gtest.h>
@@ -79,6 +81,29 @@ TEST(Instance, InvocationsAreZeroAndNotNull)
     EXPECT_EQ(0, call->return_value.null);
     EXPECT_EQ(nullptr, call->Target);
     EXPECT_EQ(nullptr, cast<Sample_Element>(x.ptr()));
+}
+
+// By the plan of its class or, where that has none, cell by cell.
+TEST(Instance, OfNullsIsAFreshOneWithItsNullFlagsSet)
+{
+    Meta_Class* const made = create_meta_class("Made", &Sample_Port::static_meta_class, 0);
+    for (const Meta_Class* meta_class :
+         {&Sample_Types::static_meta_class, &Sample_Port::static_meta_class, &Sample_Group::static_meta_class,
+          &Sample_Link::static_meta_class, as_class(&Sample_Element_Reset_method::static_meta_class),
+          static_cast<const Meta_Class*>(made)}) {
+        SCOPED_TRACE(meta_class->name);
+        const Ref<Instance> expected(create(meta_class, false));
+        __set_null_flags(expected.ptr(), true, true, 1);
+        const Ref<Instance> x(create_null(meta_class));
+        EXPECT_EQ(0, memcmp(static_cast<const void*>(expected.ptr()), static_cast<const void*>(x.ptr()),
+                            meta_class->size));
+    }
+    EXPECT_EQ(1, made->refs);
+    destroy(made);
+    const Ref<Sample_Port> port(create_null<Sample_Port>());
+    EXPECT_EQ(1, port->EnabledState.null);
+    EXPECT_EQ(0, port->EnabledState.value);
+    EXPECT_EQ(0, Ref<Sample_Group>(create_null<Sample_Group>())->Members.null);
 }
 
 TEST(Instance, ConstructionInPlaceWithoutClearingLeavesNumbers)
