@@ -25,7 +25,7 @@ Cell_Kind kind_of(const Meta_Property* meta)
 
 // Plans live in the module's own zeroed pages and are never given back: there is nothing that could fail, be
 // released under a thread that still walks, or outlive the module.
-constexpr size_t ROOM = 12288 * sizeof(Cell);
+constexpr size_t ROOM = 20480 * sizeof(Cell);
 constinit Standard_Mutex<> room_mutex;
 alignas(Class_Plan) constinit char room[ROOM] GUARDED_BY(room_mutex) = {};
 constinit size_t room_used GUARDED_BY(room_mutex) = 0;

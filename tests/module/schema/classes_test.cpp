@@ -1,5 +1,6 @@
 #include "tests/module/schema/Catalogue_View.h"
 
+#include "module/runtime/objects/Class_Plan.h"
 #include "module/runtime/objects/Instance.h"
 
 #include <gtest/gtest.h>
@@ -172,6 +173,19 @@ TEST(Classes, InheritTheRecordsThatTheyDoNotDeclare)
                 EXPECT_EQ(meta_class->meta_features[i], superclass->meta_features[i]);
             } else {
                 EXPECT_STREQ(meta_class->meta_features[i]->name, superclass->meta_features[i]->name);
+            }
+        }
+    }
+}
+
+// There is room for the plans of all of them, and of their methods, in whatever order they are asked for.
+TEST(Classes, EachHasAPlan)
+{
+    for (const Meta_Class* meta_class : classes()) {
+        EXPECT_TRUE(plan_of(meta_class)) << meta_class->name;
+        for (const Meta_Feature* feature : features_of(meta_class)) {
+            if (feature->flags & FLAG_METHOD) {
+                EXPECT_TRUE(plan_of(as_class(static_cast<const Meta_Method*>(feature)))) << feature->name;
             }
         }
     }
